@@ -1,0 +1,59 @@
+// Lists and tuples of the host, read in place. A list that host code can reach may change whenever host code
+// runs, so every index is checked.
+#pragma once
+
+#include <string_view>
+
+#include <nanobind/nanobind.h>
+
+namespace nb = nanobind;
+
+namespace codeloom {
+
+[[noreturn]] void RaiseIndexError(const char* message);
+
+// `candidate` as a list or none; anything else is the host's TypeError.
+nb::object ListOrNone(nb::handle candidate);
+
+inline Py_ssize_t ListSize(nb::handle list) {
+    return PyList_GET_SIZE(list.ptr());
+}
+
+// Borrowed. A negative index counts from the end, as the host's does; IndexError outside the list.
+inline nb::handle ListItem(nb::handle list, Py_ssize_t i) {
+    const Py_ssize_t size = PyList_GET_SIZE(list.ptr());
+    if (i < 0) i += size;
+    if (i < 0 || i >= size) [[unlikely]]
+        RaiseIndexError("list index out of range");
+    return PyList_GET_ITEM(list.ptr(), i);
+}
+
+inline Py_ssize_t TupleSize(nb::handle tuple) {
+    return PyTuple_GET_SIZE(tuple.ptr());
+}
+
+inline nb::handle TupleItem(nb::handle tuple, Py_ssize_t i) {
+    const Py_ssize_t size = PyTuple_GET_SIZE(tuple.ptr());
+    if (i < 0) i += size;
+    if (i < 0 || i >= size) [[unlikely]]
+        RaiseIndexError("tuple index out of range");
+    return PyTuple_GET_ITEM(tuple.ptr(), i);
+}
+
+// A new tuple of `size` items, item i made by make(i), which returns an nb::object.
+template <class Make>
+nb::tuple MakeTuple(Py_ssize_t size, Make make) {
+    nb::tuple result = nb::steal<nb::tuple>(PyTuple_New(size));
+    if (!result.is_valid()) throw nb::python_error();
+    for (Py_ssize_t i = 0; i < size; ++i) PyTuple_SET_ITEM(result.ptr(), i, make(i).release().ptr());
+    return result;
+}
+
+// The UTF-8 bytes of a text string or a byte string, borrowed from it; anything else is the host's TypeError.
+std::string_view Utf8View(nb::handle text);
+
+inline bool IsText(nb::handle candidate) {
+    return PyUnicode_Check(candidate.ptr());
+}
+
+}  // namespace codeloom

@@ -1,0 +1,49 @@
+// Failures at the boundary: raising the host's exceptions, and the exception that is being handled.
+#pragma once
+
+#include <nanobind/nanobind.h>
+
+namespace nb = nanobind;
+
+namespace codeloom {
+
+// Raises AssertionError, unless the host runs with assertions off (-O). For what the definition of an
+// operation requires of its arguments; what the system requires of itself is an assert().
+void HostAssert(bool condition);
+
+// True when the host runs with assertions on.
+bool HostAssertionsOn();
+
+// Raises an exception of the host class `type` with `message`.
+[[noreturn]] void RaiseHost(nb::handle type, const char* message);
+
+// Calls `raise`, which must throw, and gives the host exception that it threw. A C++ exception becomes the
+// host's as it would at the boundary.
+class CHostError {
+  public:
+    // Takes the C++ exception that is being handled; call it inside a catch block.
+    static CHostError Current();
+
+    nb::object Value() const { return _fValue; }
+    bool Is(nb::handle type) const;
+    [[noreturn]] void Raise() const;
+
+  private:
+    explicit CHostError(nb::object value) : _fValue(std::move(value)) {}
+
+    nb::object _fValue;
+};
+
+// While it lives, `sys.exc_info()` of the host gives `error`, as inside an except clause.
+class CHandlingScope {
+  public:
+    explicit CHandlingScope(const CHostError& error);
+    ~CHandlingScope();
+    CHandlingScope(const CHandlingScope&) = delete;
+    CHandlingScope& operator=(const CHandlingScope&) = delete;
+
+  private:
+    nb::object _fPrevious;
+};
+
+}  // namespace codeloom

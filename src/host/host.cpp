@@ -1,0 +1,197 @@
+#include <string>
+
+#include <cxxabi.h>
+
+#include "host/collections.h"
+#include "host/errors.h"
+#include "host/hosted.h"
+#include "host/neighbour_call.h"
+#include "host/overrides.h"
+#include "host/text.h"
+
+namespace codeloom {
+
+namespace {
+
+// The name of a class as the host knows it: `codeloom::CNode` is CNode, `CRef<CNode>` is CNode too.
+std::string HostName(const std::type_info& type) {
+    char* const demangled = abi::__cxa_demangle(type.name(), nullptr, nullptr, nullptr);
+    std::string name = demangled == nullptr ? type.name() : demangled;
+    std::free(demangled);
+    if (const size_t start = name.rfind("::"); start != std::string::npos) name.erase(0, start + 2);
+    if (name.ends_with('>')) name.pop_back();
+    return name;
+}
+
+// Borrowed; null without an exception when the type has no such attribute.
+PyObject* TypeAttribute(nb::handle type, PyObject* name) {
+    return _PyType_Lookup(reinterpret_cast<PyTypeObject*>(type.ptr()), name);
+}
+
+// The host's class for an exception that nanobind raises natively.
+nb::handle HostClass(const nb::builtin_exception& error) {
+    switch (error.type()) {
+        case nb::exception_type::index_error:
+            return PyExc_IndexError;
+        case nb::exception_type::key_error:
+            return PyExc_KeyError;
+        case nb::exception_type::value_error:
+            return PyExc_ValueError;
+        case nb::exception_type::type_error:
+            return PyExc_TypeError;
+        case nb::exception_type::attribute_error:
+            return PyExc_AttributeError;
+        default:
+            return PyExc_RuntimeError;
+    }
+}
+
+}  // namespace
+
+void RaiseWrongType(const char* expected, nb::handle found) {
+    PyErr_Format(PyExc_TypeError, "expected %s, %s found", expected, Py_TYPE(found.ptr())->tp_name);
+    throw nb::python_error();
+}
+
+void RaiseWrongType(const std::type_info& expected, nb::handle found) {
+    RaiseWrongType(HostName(expected).c_str(), found);
+}
+
+void RaiseNoneUsed(const std::type_info& wanted) {
+    PyErr_Format(PyExc_AttributeError, "expected %s, NoneType found", HostName(wanted).c_str());
+    throw nb::python_error();
+}
+
+// errors.h
+
+bool HostAssertionsOn() {
+    static const bool on = nb::cast<int>(nb::module_::import_("sys").attr("flags").attr("optimize")) == 0;
+    return on;
+}
+
+void HostAssert(bool condition) {
+    if (condition || !HostAssertionsOn()) return;
+    PyErr_SetNone(PyExc_AssertionError);
+    throw nb::python_error();
+}
+
+void RaiseHost(nb::handle type, const char* message) {
+    PyErr_SetString(type.ptr(), message);
+    throw nb::python_error();
+}
+
+CHostError CHostError::Current() {
+    try {
+        throw;
+    } catch (nb::python_error& error) {
+        return CHostError(nb::borrow<nb::object>(error.value()));
+    } catch (const nb::builtin_exception& error) {
+        return CHostError(nb::borrow<nb::object>(HostClass(error))(error.what()));
+    } catch (const std::bad_alloc&) {
+        return CHostError(nb::borrow<nb::object>(PyExc_MemoryError)());
+    } catch (const std::exception& error) {
+        return CHostError(nb::borrow<nb::object>(PyExc_RuntimeError)(error.what()));
+    }
+}
+
+bool CHostError::Is(nb::handle type) const {
+    return PyErr_GivenExceptionMatches(_fValue.ptr(), type.ptr()) != 0;
+}
+
+void CHostError::Raise() const {
+    PyErr_SetObject(reinterpret_cast<PyObject*>(Py_TYPE(_fValue.ptr())), _fValue.ptr());
+    throw nb::python_error();
+}
+
+CHandlingScope::CHandlingScope(const CHostError& error)
+    : _fPrevious(nb::steal<nb::object>(PyErr_GetHandledException())) {
+    PyErr_SetHandledException(error.Value().ptr());
+}
+
+CHandlingScope::~CHandlingScope() {
+    PyErr_SetHandledException(_fPrevious.ptr());
+}
+
+// overrides.h
+
+CHostOperation::CHostOperation(const char* name) : _fName(PyUnicode_InternFromString(name)) {}
+
+bool CHostOperation::IsOverridden(nb::handle self, nb::handle native_type) const {
+    return TypeAttribute(self.type(), _fName) != TypeAttribute(native_type, _fName);
+}
+
+nb::object CHostOperation::Call(PyObject* const* stack, size_t count) const {
+    PyObject* const result = PyObject_VectorcallMethod(_fName, stack, count + 1, nullptr);
+    if (result == nullptr) throw nb::python_error();
+    return nb::steal<nb::object>(result);
+}
+
+// collections.h
+
+void RaiseIndexError(const char* message) {
+    throw nb::index_error(message);
+}
+
+nb::object ListOrNone(nb::handle candidate) {
+    if (!candidate.is_none() && !PyList_Check(candidate.ptr())) RaiseWrongType("list", candidate);
+    return nb::borrow<nb::object>(candidate);
+}
+
+std::string_view Utf8View(nb::handle text) {
+    Py_ssize_t size = 0;
+    if (PyUnicode_Check(text.ptr())) {
+        const char* const utf8 = PyUnicode_AsUTF8AndSize(text.ptr(), &size);
+        if (utf8 == nullptr) throw nb::python_error();
+        return {utf8, static_cast<size_t>(size)};
+    }
+    if (PyBytes_Check(text.ptr()))
+        return {PyBytes_AS_STRING(text.ptr()), static_cast<size_t>(PyBytes_GET_SIZE(text.ptr()))};
+    RaiseWrongType("str or bytes", text);
+}
+
+// text.h
+
+nb::object TextFromUtf8(std::string_view utf8) {
+    PyObject* const text =
+        PyUnicode_DecodeUTF8(utf8.data(), static_cast<Py_ssize_t>(utf8.size()), "surrogatepass");
+    if (text == nullptr) throw nb::python_error();
+    return nb::steal<nb::object>(text);
+}
+
+nb::object InternedText(std::string_view utf8) {
+    PyObject* text = TextFromUtf8(utf8).release().ptr();
+    PyUnicode_InternInPlace(&text);
+    return nb::steal<nb::object>(text);
+}
+
+std::string_view Utf8OfText(nb::handle text, std::string& storage) {
+    Py_ssize_t size = 0;
+    if (const char* const utf8 = PyUnicode_AsUTF8AndSize(text.ptr(), &size))
+        return {utf8, static_cast<size_t>(size)};
+    PyErr_Clear();
+    const nb::object bytes =
+        nb::steal<nb::object>(PyUnicode_AsEncodedString(text.ptr(), "utf-8", "surrogatepass"));
+    if (!bytes.is_valid()) throw nb::python_error();
+    storage = Utf8View(bytes);
+    return storage;
+}
+
+// neighbour_call.h
+
+namespace {
+PyObject* gHomeModule = nullptr;  // the home module is never unloaded
+}
+
+void SetHomeModule(nb::module_ module) {
+    gHomeModule = module.release().ptr();
+}
+
+nb::module_ HomeModule() {
+    return nb::borrow<nb::module_>(gHomeModule);
+}
+
+nb::object CNeighbourFunction::Find() const {
+    return HomeModule().attr(_fModuleName).attr(_fFunctionName);
+}
+
+}  // namespace codeloom

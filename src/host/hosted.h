@@ -1,0 +1,172 @@
+// host/: the only place that touches raw interpreter machinery.
+//   in     the C++ classes of the system
+//   out    the same classes as the host sees them: subclassable, collectable, with overrides honoured
+//   keeps  nothing
+//   start  at CHosted and CRef here; overrides.h for operations, binding.h for class set-up
+//
+// An object of the system lives inside its host object: the host object owns it, CRef owns the host object.
+#pragma once
+
+#include <utility>
+
+#include <nanobind/nanobind.h>
+
+namespace nb = nanobind;
+
+namespace codeloom {
+
+// Base of every class of the system. It knows the host object that it lives in.
+class CHosted {
+  public:
+    CHosted() = default;
+    CHosted(const CHosted&) = delete;
+    CHosted& operator=(const CHosted&) = delete;
+    virtual ~CHosted() = default;
+
+    nb::handle Self() const { return _fSelf; }
+
+    // Class set-up and MakeInstance call this once, before anything else.
+    void SetSelf(nb::handle self) { _fSelf = self; }
+
+  private:
+    nb::handle _fSelf;  // borrowed: it owns us
+};
+
+// Raises the host's TypeError, "expected <class>, <class of found> found".
+[[noreturn]] void RaiseWrongType(const char* expected, nb::handle found);
+
+[[noreturn]] void RaiseWrongType(const std::type_info& expected, nb::handle found);
+
+// Raises the host's AttributeError of an operation on none.
+[[noreturn]] void RaiseNoneUsed(const std::type_info& wanted);
+
+// The object of class T inside `candidate`; null when it is of another class or not yet constructed.
+template <class T>
+T* TryInstance(nb::handle candidate) {
+    static PyTypeObject* const type = reinterpret_cast<PyTypeObject*>(nb::type<T>().ptr());
+    if (!PyObject_TypeCheck(candidate.ptr(), type) || !nb::inst_ready(candidate)) return nullptr;
+    return nb::inst_ptr<T>(candidate);
+}
+
+// The same; a foreign object is the host's TypeError.
+template <class T>
+T* Instance(nb::handle candidate) {
+    T* const found = TryInstance<T>(candidate);
+    if (found == nullptr) RaiseWrongType(nb::type_name(nb::type<T>()).c_str(), candidate);
+    return found;
+}
+
+// Owns one reference to the host object of a T; may be empty, which the host sees as none.
+template <class T>
+class CRef {
+  public:
+    CRef() = default;
+    CRef(std::nullptr_t) {}
+    explicit CRef(T* object) : _fObject(object) { _Retain(); }
+    CRef(const CRef& other) : CRef(other._fObject) {}
+    CRef(CRef&& other) noexcept : _fObject(std::exchange(other._fObject, nullptr)) {}
+    CRef& operator=(CRef other) noexcept {
+        std::swap(_fObject, other._fObject);
+        return *this;
+    }
+    ~CRef() { _Release(); }
+
+    // Takes over the reference that `owner` holds to the host object of `object`.
+    static CRef Steal(T* object, nb::object owner) {
+        owner.release();
+        CRef result;
+        result._fObject = object;
+        return result;
+    }
+
+    // The object inside a host object; none gives an empty reference, a foreign object the host's TypeError.
+    static CRef FromHost(nb::handle candidate) {
+        return candidate.is_none() ? CRef() : CRef(Instance<T>(candidate));
+    }
+
+    T* get() const { return _fObject; }
+    explicit operator bool() const { return _fObject != nullptr; }
+    T& operator*() const { return *_Checked(); }
+    T* operator->() const { return _Checked(); }
+
+    // The host's view: the object itself, or none.
+    nb::object AsHost() const {
+        return _fObject == nullptr ? nb::none() : nb::borrow<nb::object>(_fObject->Self());
+    }
+
+    // The reference itself, to be given to the host; the holder is empty afterwards.
+    nb::object Release() {
+        if (_fObject == nullptr) return nb::none();
+        return nb::steal<nb::object>(std::exchange(_fObject, nullptr)->Self());
+    }
+
+    void reset() { CRef().Swap(*this); }
+    void Swap(CRef& other) noexcept { std::swap(_fObject, other._fObject); }
+
+  private:
+    T* _Checked() const {
+        if (_fObject == nullptr) [[unlikely]]
+            RaiseNoneUsed(typeid(T));
+        return _fObject;
+    }
+    void _Retain() const {
+        if (_fObject != nullptr) _fObject->Self().inc_ref();
+    }
+    void _Release() const {
+        if (_fObject != nullptr) _fObject->Self().dec_ref();
+    }
+
+    T* _fObject = nullptr;
+};
+
+// Makes an object of class T in a new host object. Its constructor takes `arguments`.
+template <class T, class... Arguments>
+CRef<T> MakeInstance(Arguments&&... arguments) {
+    nb::object owner = nb::inst_alloc(nb::type<T>());
+    T* const made = new (nb::inst_ptr<void>(owner)) T(std::forward<Arguments>(arguments)...);
+    made->SetSelf(owner);
+    nb::inst_mark_ready(owner);
+    return CRef<T>::Steal(made, std::move(owner));
+}
+
+}  // namespace codeloom
+
+// How references to objects of the system cross the boundary.
+namespace nanobind::detail {
+
+// An object of the system knows its host object, so that handing it out needs no search.
+template <class T>
+struct type_caster<T, enable_if_t<std::is_base_of_v<codeloom::CHosted, T>>> : type_caster_base<T> {
+    template <class U>
+    static handle from_cpp(U&& value, rv_policy, cleanup_list*) noexcept {
+        const codeloom::CHosted* object;
+        if constexpr (std::is_pointer_v<std::remove_reference_t<U>>) {
+            object = value;
+        } else {
+            object = &value;
+        }
+        return object == nullptr ? none().release() : object->Self().inc_ref();
+    }
+};
+
+template <class T>
+struct type_caster<codeloom::CRef<T>> {
+    NB_TYPE_CASTER(codeloom::CRef<T>, make_caster<T>::Name + const_name(" | None"))
+
+    bool from_python(handle source, uint32_t, cleanup_list*) noexcept {
+        if (source.is_none()) {
+            value = codeloom::CRef<T>();
+            return true;
+        }
+        T* const object = codeloom::TryInstance<T>(source);
+        if (object == nullptr) return false;
+        value = codeloom::CRef<T>(object);
+        return true;
+    }
+
+    static handle from_cpp(const codeloom::CRef<T>& source, rv_policy, cleanup_list*) noexcept {
+        return source.AsHost().release();
+    }
+};
+
+}  // namespace nanobind::detail

@@ -1,0 +1,23 @@
+// Text strings of the host from UTF-8. Lone surrogates, which a host text may hold, pass both ways in three
+// bytes.
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include <nanobind/nanobind.h>
+
+namespace nb = nanobind;
+
+namespace codeloom {
+
+nb::object TextFromUtf8(std::string_view utf8);
+
+// The same as an interned string.
+nb::object InternedText(std::string_view utf8);
+
+// The UTF-8 form of a text string, with lone surrogates in three bytes: a view into the text itself where it
+// has none, else into `storage`.
+std::string_view Utf8OfText(nb::handle text, std::string& storage);
+
+}  // namespace codeloom
