@@ -28,6 +28,9 @@ inline nb::handle ListItem(nb::handle list, Py_ssize_t i) {
     return PyList_GET_ITEM(list.ptr(), i);
 }
 
+// Removes the item at `i`; IndexError outside the list.
+void DeleteListItem(nb::handle list, Py_ssize_t i);
+
 inline Py_ssize_t TupleSize(nb::handle tuple) {
     return PyTuple_GET_SIZE(tuple.ptr());
 }
@@ -49,8 +52,21 @@ nb::tuple MakeTuple(Py_ssize_t size, Make make) {
     return result;
 }
 
+// True when `key` is a key of `dict`.
+inline bool DictContains(nb::handle dict, nb::handle key) {
+    const int found = PyDict_Contains(dict.ptr(), key.ptr());
+    if (found < 0) throw nb::python_error();
+    return found != 0;
+}
+
+// The value of `key`; an invalid object when there is none, or no dictionary at all.
+nb::object FindInDict(nb::handle dict_or_none, nb::handle key);
+
 // The UTF-8 bytes of a text string or a byte string, borrowed from it; anything else is the host's TypeError.
 std::string_view Utf8View(nb::handle text);
+
+// True when `candidate` is a class derived from `base`, or `base` itself.
+bool IsSubclass(nb::handle candidate, nb::handle base);
 
 inline bool IsText(nb::handle candidate) {
     return PyUnicode_Check(candidate.ptr());

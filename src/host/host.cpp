@@ -80,10 +80,20 @@ void RaiseHost(nb::handle type, const char* message) {
     throw nb::python_error();
 }
 
+CRecursionScope::CRecursionScope() {
+    if (Py_EnterRecursiveCall(" in codeloom") != 0) throw nb::python_error();
+}
+
+CRecursionScope::~CRecursionScope() {
+    Py_LeaveRecursiveCall();
+}
+
 CHostError CHostError::Current() {
     try {
         throw;
     } catch (nb::python_error& error) {
+        if (error.traceback().is_valid())
+            PyException_SetTraceback(error.value().ptr(), error.traceback().ptr());
         return CHostError(nb::borrow<nb::object>(error.value()));
     } catch (const nb::builtin_exception& error) {
         return CHostError(nb::borrow<nb::object>(HostClass(error))(error.what()));
@@ -135,6 +145,22 @@ void RaiseIndexError(const char* message) {
 nb::object ListOrNone(nb::handle candidate) {
     if (!candidate.is_none() && !PyList_Check(candidate.ptr())) RaiseWrongType("list", candidate);
     return nb::borrow<nb::object>(candidate);
+}
+
+void DeleteListItem(nb::handle list, Py_ssize_t i) {
+    if (PySequence_DelItem(list.ptr(), i) != 0) throw nb::python_error();
+}
+
+bool IsSubclass(nb::handle candidate, nb::handle base) {
+    return PyType_IsSubtype(reinterpret_cast<PyTypeObject*>(candidate.ptr()),
+                            reinterpret_cast<PyTypeObject*>(base.ptr())) != 0;
+}
+
+nb::object FindInDict(nb::handle dict_or_none, nb::handle key) {
+    if (dict_or_none.is_none()) return nb::object();
+    PyObject* const value = PyDict_GetItemWithError(dict_or_none.ptr(), key.ptr());
+    if (value == nullptr && PyErr_Occurred() != nullptr) throw nb::python_error();
+    return nb::borrow(value);
 }
 
 std::string_view Utf8View(nb::handle text) {

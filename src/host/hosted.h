@@ -7,6 +7,7 @@
 // An object of the system lives inside its host object: the host object owns it, CRef owns the host object.
 #pragma once
 
+#include <tuple>
 #include <utility>
 
 #include <nanobind/nanobind.h>
@@ -100,6 +101,9 @@ class CRef {
         return nb::steal<nb::object>(std::exchange(_fObject, nullptr)->Self());
     }
 
+    // True when nobody else holds the host object.
+    bool IsOnlyReference() const { return _fObject != nullptr && Py_REFCNT(_fObject->Self().ptr()) == 1; }
+
     void reset() { CRef().Swap(*this); }
     void Swap(CRef& other) noexcept { std::swap(_fObject, other._fObject); }
 
@@ -127,6 +131,12 @@ CRef<T> MakeInstance(Arguments&&... arguments) {
     made->SetSelf(owner);
     nb::inst_mark_ready(owner);
     return CRef<T>::Steal(made, std::move(owner));
+}
+
+// The same by calling the class as the host would.
+template <class T, class... Arguments>
+CRef<T> NewInstance(Arguments&&... arguments) {
+    return CRef<T>(Instance<T>(nb::object(nb::type<T>()(std::forward<Arguments>(arguments)...))));
 }
 
 }  // namespace codeloom

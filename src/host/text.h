@@ -20,4 +20,14 @@ nb::object InternedText(std::string_view utf8);
 // has none, else into `storage`.
 std::string_view Utf8OfText(nb::handle text, std::string& storage);
 
+// A text constant as an interned string, for the life of the process.
+class CHostText {
+  public:
+    explicit CHostText(const char* text) : _fText(InternedText(text).release()) {}
+    operator nb::handle() const { return _fText; }
+
+  private:
+    nb::handle _fText;
+};
+
 }  // namespace codeloom

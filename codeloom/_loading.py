@@ -1,0 +1,61 @@
+"""What the engine needs of the interpreter while it loads."""
+
+import importlib
+import sys
+import warnings
+from collections.abc import Iterator
+from contextlib import contextmanager
+from types import ModuleType
+
+# The modules that a host product supplies under top-level names, with the names that must be in them.
+_HOST_MODULES = {
+    "config": {"config": ("GetTarnFilename",)},
+    "bytebuffer": {"bytebuffer": ("CWritableByteBuffer", "CEncodedByteBufferReader")},
+    "tarnutils": {
+        "tarnutils": (),
+        "tarnutils.reflect": ("ReportCurrentException", "RaiseWithTraceback"),
+    },
+    "tarnbase": {
+        "tarnbase": (),
+        "tarnbase.destroyable": ("_CHandlerRecord", "_CEmissionStackItem", "CDestroyable"),
+    },
+}
+
+
+def _IsSuppliedByHost(modules: dict[str, tuple[str, ...]]) -> bool:
+    return all(
+        name in sys.modules and all(hasattr(sys.modules[name], wanted) for wanted in names)
+        for name, names in modules.items()
+    )
+
+
+@contextmanager
+def StandinsOffered() -> Iterator[None]:
+    """Offer our own modules under the host's names, where the host hasn't supplied them.
+
+    A user's module that merely has such a name is neither run nor used, and `sys.modules` is
+    afterwards as it was.
+    """
+    offered = [
+        name
+        for modules in _HOST_MODULES.values()
+        if not _IsSuppliedByHost(modules)
+        for name in modules
+    ]
+    standins = {name: importlib.import_module(f"codeloom._standins.{name}") for name in offered}
+    hidden = {name: sys.modules[name] for name in offered if name in sys.modules}
+    sys.modules.update(standins)
+    try:
+        yield
+    finally:
+        for name in offered:
+            del sys.modules[name]
+        sys.modules.update(hidden)
+
+
+def ImportPgen() -> ModuleType:
+    """The interpreter's pgen module, for its operator table, without the warning of its own age."""
+    with warnings.catch_warnings():
+        warnings.simplefilter("ignore", DeprecationWarning)
+        from lib2to3.pgen2 import pgen
+    return pgen

@@ -1,0 +1,41 @@
+#include "analysis/embedded.h"
+
+#include "analysis/syntax_error.h"
+#include "neighbours/imported_names.h"
+
+namespace codeloom {
+
+namespace {
+
+const char* MessageFor(const CLogicalLine& exp_logical) {
+    if (IsOfType(exp_logical, gLogicalTypes.kCommentedTypeHint))
+        return "invalid syntax in commented type hint";
+    if (IsOfType(exp_logical, gLogicalTypes.kStringifiedTypeHint))
+        return "invalid syntax in stringified type hint";
+    return "invalid syntax";
+}
+
+}  // namespace
+
+void RaiseEmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_logical, nb::handle context) {
+    const nb::str message(MessageFor(exp_logical));
+    const nb::object inner = CreateSyntaxError(message, exp_logical.Self(), context, nb::none());
+    const nb::int_ rows_down(exp_logical.fFirstLine - logical.fFirstLine);
+    // The message stands in the place of the file name too.
+    const nb::object error = nb::borrow(PyExc_SyntaxError)(
+        message,
+        nb::make_tuple(message, rows_down + inner.attr("lineno"), inner.attr("offset"), inner.attr("text")));
+    PyErr_SetObject(PyExc_SyntaxError, error.ptr());
+    throw nb::python_error();
+}
+
+void LiftTypeEquivs(const CLogicalLine& exp_logical, CLogicalLine& logical) {
+    if (exp_logical.fTypeEquivs.is_none()) return;
+    for (nb::handle item : exp_logical.fTypeEquivs) {
+        const nb::tuple pair(nb::borrow(item));
+        if (pair.size() != 2) throw nb::value_error("a type equiv must be a pair of name and equiv");
+        logical.AppendTypeEquiv(pair[0], pair[1]);
+    }
+}
+
+}  // namespace codeloom

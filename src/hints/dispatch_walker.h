@@ -1,0 +1,64 @@
+// hints/: nodes and comments into type hints.
+//   in     the typed tree of one line, and its CLogicalLine
+//   out    hint records appended to that line
+//   keeps  nothing from one line to the next, but its limits
+//   start  at CTypeHintWalker::Walk
+//
+// The dispatch walker calls a visit for each node by the node's exact class. A visit that returns true, or no
+// visit at all, has the children visited; the False object in place of a visit skips a class and its
+// children.
+#pragma once
+
+#include <vector>
+
+#include <nanobind/nanobind.h>
+
+#include "neighbours/logicalline/logical_line.h"
+#include "tree/node.h"
+
+namespace codeloom {
+
+class CDispatchWalker : public CHosted {
+  public:
+    // `dispatch_dict` maps node classes to callables of (walker, node), or to False; it may be none.
+    void Init(nb::object dispatch_dict);
+
+    virtual void Walk(CNodeRef node, CLogicalLine& logical, bool first_in_def);
+    virtual void _VisitNode(CNodeRef node);
+
+    template <class Visitor>
+    void References(Visitor&& visit) {
+        visit(_fLogical);
+        visit(_fDispatchDict);
+        for (CNodeRef& node : _fNodeStack) visit(node);
+    }
+
+  protected:
+    CRef<CLogicalLine> _fLogical;  // the line being walked; none between walks
+    nb::object _fDispatchDict = nb::none();
+
+  private:
+    bool _AreChildrenWanted(const CNodeRef& node);
+    void _VisitChildren(const CNodeRef& node);
+
+    int _fVisitCount = 0;
+    int _fRecurseCount = 0;
+    std::vector<CNodeRef> _fNodeStack;  // from the root to the node now visited
+};
+
+template <class Class>
+class TDispatchWalkerOperations : public Class {
+    FIRST_OPERATIONS
+    OPERATION(
+        Walk,
+        "Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's "
+        "ambiguous.",
+        "node"_a.none(), "logical"_a, "first_in_def"_a)
+    OPERATION(_VisitNode, "Visit the node and all children. Dispatches to a visit method based on node type.",
+              "node"_a.none())
+    END_OPERATIONS
+};
+
+void BindDispatchWalker(nb::module_& module);
+
+}  // namespace codeloom

@@ -1,0 +1,204 @@
+#include "parse/parser_driver.h"
+
+#include "host/errors.h"
+#include "host/neighbour_call.h"
+#include "host/text.h"
+#include "neighbours/token_type.h"
+#include "parse/token_feed.h"
+
+namespace codeloom {
+
+namespace {
+
+constexpr CNeighbourFunction kGetTarnFilename("config", "GetTarnFilename");
+constexpr CNeighbourFunction kParserGenerator("optpgen", "ParserGenerator");
+constexpr CNeighbourFunction kCreateParser("optpgen", "CreateParser");
+constexpr CNeighbourFunction kParseError("optpgen", "ParseError");
+constexpr CNeighbourFunction kIsAbs("os", "path.isabs");
+
+// The names of the token types, from the constants of the token classifier.
+nb::dict TokenNames() {
+    constexpr std::string_view kNamePrefix = "kTokenId_";
+    nb::dict names;
+    const nb::dict constants = nb::borrow<nb::dict>(HomeModule().attr("_fastaccess").attr("__dict__"));
+    for (auto [name, value] : constants) {
+        const std::string_view text = Utf8View(name);
+        if (text.starts_with(kNamePrefix) && nb::isinstance<nb::int_>(value))
+            names[value] = TextFromUtf8(text.substr(kNamePrefix.size()));
+    }
+    return names;
+}
+
+// Operator texts to token types: the interpreter's table and three operators that it lacks.
+nb::object OperatorTypes() {
+    nb::object types = HomeModule().attr("pgen").attr("grammar").attr("opmap").attr("copy")();
+    types["..."] = static_cast<int>(kTokenId_ELLIPSIS);
+    types["->"] = static_cast<int>(kTokenId_RARROW);
+    types[":="] = static_cast<int>(kTokenId_COLONEQUAL);
+    return types;
+}
+
+nb::object PathOfGrammar(nb::object grammar_file) {
+    if (nb::cast<bool>(nb::bool_(HomeModule().attr("os").attr("path").attr("isabs")(grammar_file))))
+        return grammar_file;
+    return kGetTarnFilename(nb::str("resources/pgen-grammars/") + grammar_file);
+}
+
+nb::dict KeywordsOf(nb::object keyword_seq) {
+    if (keyword_seq.is_none()) keyword_seq = HomeModule().attr("keyword").attr("kwlist");
+    nb::dict keywords;
+    for (nb::handle keyword : keyword_seq) keywords[InternedText(Utf8View(keyword))] = nb::none();
+    return keywords;
+}
+
+int32_t SymbolNumber(nb::handle grammar, const char* symbol) {
+    return ResultFromHost<int32_t>(nb::object(grammar.attr("symbol2number")[symbol]));
+}
+
+}  // namespace
+
+void CPGenParserImpl::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
+                           nb::object py3_grammar) {
+    const nb::dict token_names = TokenNames();
+    const nb::object operator_types = OperatorTypes();
+    const nb::object generator = kParserGenerator(
+        PathOfGrammar(grammar_file), "tok_number2name"_a = token_names, "op_text2number"_a = operator_types);
+    _fGrammar = generator.attr("make_grammar")();
+    _fPy3Grammar = nb::cast<bool>(nb::bool_(py3_grammar));
+    if (!version_triple.is_none() && !nb::isinstance<nb::tuple>(version_triple))
+        RaiseWrongType("tuple", version_triple);
+    _fVersionTriple = std::move(version_triple);
+    _fAsyncAlwaysKeyword = _fVersionTriple >= nb::make_tuple(3, 7);
+    _fKeywords = KeywordsOf(std::move(keyword_seq));
+    _fParser = CRef<Parser>(
+        Instance<Parser>(nb::object(kCreateParser(_fGrammar, Self(), "promotesinglechild"_a = true))));
+    _fFileInputNumber = SymbolNumber(_fGrammar, "file_input");
+    _fClsForStateList = _BuildClsForStateList();
+    _fNodeFactory = MakeInstance<CNodeFactory>();
+    _fNodeFactory->Init(_fGrammar, _fClsForStateList, _fKeywords, token_names, operator_types);
+    __GetTime = HomeModule().attr("time").attr("time");
+}
+
+nb::object CPGenParserImpl::convert(nb::handle, int type, nb::handle value, nb::handle context,
+                                    nb::handle children) {
+    return _fNodeFactory->ConvertSingleNode(type, value, context, children).Release();
+}
+
+void CPGenParserImpl::DiscardNode(nb::handle node) {
+    _fNodeFactory->DiscardNodes(node);
+}
+
+CNodeRef CPGenParserImpl::ParseToNode(CLogicalLine& logical, bool in_async_def) {
+    return ParseToksToNode(logical.fToks, in_async_def, CPositions(logical));
+}
+
+CNodeRef CPGenParserImpl::ParseToksToNode(nb::object toks, bool in_async_def, CPositions positions) {
+    nb::tuple tok_tuple(toks);
+    CNodeRef node = _ParseSpecialCases(tok_tuple, in_async_def, positions);
+    if (node) return node;
+    return _ParseToksToNodeImpl(std::move(tok_tuple), in_async_def, std::move(positions));
+}
+
+CNodeRef CPGenParserImpl::ParseTokenListToNode(nb::list toks, bool in_async_def) {
+    return _ParseToksToNodeImpl(nb::tuple(toks), in_async_def, CPositions());
+}
+
+CNodeRef CPGenParserImpl::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, CPositions positions) {
+    if (TupleSize(toks) == 0) return CNodeRef();
+    CTokenFeed feed(*this, toks, in_async_def, positions);
+    feed.FeedAll();
+    return _PeelRoot(_fParser->finish(), feed.IsDecorator());
+}
+
+// The root holds the statement and the end marker; a decorated statement holds the decorator and an invented
+// function.
+CNodeRef CPGenParserImpl::_PeelRoot(nb::object parsed, bool is_decorator) {
+    const bool is_raw = parsed.type().is(reinterpret_cast<PyObject*>(&PyTuple_Type));
+    CNodeRef root = is_raw ? _fNodeFactory->RecursiveConvert(nb::borrow<nb::tuple>(parsed))
+                           : CNodeRef(Instance<CNode>(parsed));
+    parsed.reset();
+    const auto take_first_child = [this](CNodeRef& parent) {
+        CNodeRef first(Instance<CNode>(ListItem(parent->fChildren, 0)));
+        DeleteListItem(parent->fChildren, 0);
+        _fNodeFactory->DiscardNodes(parent->Self());
+        return first;
+    };
+    const CNodeRef last = root->_GetChildCount() == 2 ? root->GetChild(1) : CNodeRef();
+    if (!last || !last->fClsInfo || last->fClsInfo->fNodeType != kTokenId_ENDMARKER) {
+        _fNodeFactory->DiscardNodes(root->Self());
+        return CNodeRef();
+    }
+    CNodeRef statement = take_first_child(root);
+    if (is_decorator && statement->_GetChildCount() == 2) return take_first_child(statement);
+    return statement;
+}
+
+Py_ssize_t CPGenParserImpl::_FindNextNonSkipIndex(nb::tuple toks, Py_ssize_t index) {
+    const Py_ssize_t count = TupleSize(toks);
+    for (++index; index < count; ++index) {
+        const nb::handle tok = TupleItem(toks, index);
+        if (tok.is_none()) continue;
+        const std::string_view text = Utf8View(tok);
+        if (!text.empty() && text[0] != '#' && text[0] != '\\') break;
+    }
+    return index < count ? index : count;
+}
+
+Py_ssize_t CPGenParserImpl::_NonNestedFindTokenIndex(nb::object target, nb::tuple toks, Py_ssize_t start,
+                                                     Py_ssize_t end) {
+    const std::string_view target_text = Utf8View(target);
+    int depth = 0;
+    for (Py_ssize_t i = start; i < end; ++i) {
+        const std::string_view text = Utf8View(TupleItem(toks, i));
+        if (depth == 0 && text == target_text) return i;
+        if (text.size() != 1) continue;
+        if (text[0] == '(' || text[0] == '[' || text[0] == '{') ++depth;
+        if (text[0] == ')' || text[0] == ']' || text[0] == '}') --depth;
+    }
+    return -1;
+}
+
+CNodeRef CPGenParserImpl::_ParseSpecialCases(nb::tuple, bool, CPositions) {
+    return CNodeRef();
+}
+
+void CPGenParserImpl::_RaiseParseError(nb::handle tok_i) {
+    const nb::object error = kParseError("syntax error", nb::none(), nb::none(), tok_i);
+    PyErr_SetObject(error.type().ptr(), error.ptr());
+    throw nb::python_error();
+}
+
+void CPGenParserImpl::_AddTokenList(nb::list toks, Py_ssize_t tok_i) {
+    const nb::int_ context(tok_i);
+    for (Py_ssize_t i = 0; i < ListSize(toks); ++i) {
+        const nb::object tok = nb::borrow(ListItem(toks, i));
+        _fParser->addtoken(GetTokenType(Utf8View(tok)), tok, context);
+    }
+}
+
+bool CPGenParserImpl::_ShouldSkipSlash(Py_ssize_t tok_i, CPositions positions) {
+    if (positions.IsNone()) return true;
+    const nb::object entries = positions.AsHost();
+    const Py_ssize_t count = static_cast<Py_ssize_t>(nb::len(entries));
+    if (tok_i >= count) return false;
+    if (tok_i + 1 == count) return true;
+    const nb::object row = entries[tok_i][0], next_row = entries[tok_i + 1][0];
+    return next_row > row;
+}
+
+void BindParserDriver(nb::module_& module) {
+    nb::class_<CPGenParserImpl, CPGenAnalyzer, TParserDriverOperations<CPGenParserImpl>> binding(
+        module, "CPGenParserImpl", Collected<CPGenParserImpl>(),
+        " Analyzes logical using a parser implemented via the pgen2 package ");
+    binding
+        .def(TInit<nb::object, nb::object, nb::object, nb::object>(), "version_triple"_a.none(),
+             "grammar_file"_a = module.attr("kPy3DefaultGrammar"), "keyword_seq"_a = nb::none(),
+             "py3_grammar"_a = true)
+        .def_ro("_fVersionTriple", &CPGenParserImpl::_fVersionTriple, "The Python version analysed, a tuple.")
+        .def_ro("_fAsyncAlwaysKeyword", &CPGenParserImpl::_fAsyncAlwaysKeyword,
+                "True when `async` and `await` are keywords everywhere (3.7 on, PEP 492).");
+    BindOperations(binding);
+    binding.attr("kClsForState") = DirectClsForState();
+}
+
+}  // namespace codeloom

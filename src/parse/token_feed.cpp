@@ -1,0 +1,107 @@
+#include "parse/token_feed.h"
+
+#include "analysis/syntax_error.h"
+#include "host/text.h"
+#include "neighbours/token_type.h"
+
+namespace codeloom {
+
+CTokenFeed::CTokenFeed(CPGenParserImpl& driver, const nb::tuple& toks, bool in_async_def,
+                       const CPositions& positions)
+    : _fDriver(driver),
+      _fParser(*driver._fParser),
+      _fToks(toks),
+      _fPositions(positions),
+      _fAsyncIsKeyword(driver._fAsyncAlwaysKeyword || in_async_def) {
+    _fParser.setup(nb::int_(driver._fFileInputNumber));
+}
+
+void CTokenFeed::FeedAll() {
+    const Py_ssize_t count = TupleSize(_fToks);
+    for (Py_ssize_t i = 0; i < count; ++i) _FeedToken(i);
+    _CompleteStatement();
+    static const CHostText kNewline("\n");
+    const nb::int_ end(count);  // the context of the invented tail: behind the last real token
+    _fParser.addtoken(kTokenId_NEWLINE, kNewline, end);
+    _fParser.addtoken(kTokenId_ENDMARKER, nb::none(), end);
+}
+
+void CTokenFeed::_FeedToken(Py_ssize_t i) {
+    nb::handle tok = TupleItem(_fToks, i);
+    if (tok.is_none()) return;
+    int type = GetTokenType(Utf8View(tok));
+    if (!_fFirstToken.is_valid()) type = _BeginStatement(tok, type, i);
+    if (type == kTokenId_NAME && _fAsyncIsKeyword) type = _AsyncTokenType(tok, type);
+    if (_IsSkipped(type, i)) return;
+    if (type == kTokenId_ELLIPSIS && !_fDriver._fPy3Grammar) return _FeedThreeDots(tok, i);
+    _fParser.addtoken(type, tok, nb::int_(i));
+    _fLastFedType = type;
+    if (!_fFirstToken.is_valid()) _fFirstToken = nb::borrow(tok);
+}
+
+// Treats a token that may begin the statement; gives its type. `elif` is read as `if` from here on.
+int CTokenFeed::_BeginStatement(nb::handle& tok, int type, Py_ssize_t i) {
+    if (type == kTokenId_AT) _fIsDecorator = true;
+    if (type != kTokenId_NAME) return type;
+    static const CHostText kIf("if");
+    const std::string_view text = Utf8View(tok);
+    if (text == "elif") {
+        tok = kIf;
+    } else if (text == "except" || text == "finally") {
+        _FeedInventedHead({"try", ":", "pass", "\n"}, i);
+    } else if (text == "else") {
+        _FeedInventedHead({"if", "0", ":", "pass", "\n"}, i);
+    } else if (text == "async" && !_fAsyncIsKeyword) {
+        const nb::object next = NextNonRemovedTokenInTuple(_fToks, i);
+        if (!next.is_none() && Utf8View(next) == "def") return kTokenId_ASYNC;
+    }
+    return type;
+}
+
+int CTokenFeed::_AsyncTokenType(nb::handle tok, int type) const {
+    const std::string_view text = Utf8View(tok);
+    if (text == "async") return kTokenId_ASYNC;
+    if (text == "await") return kTokenId_AWAIT;
+    return type;
+}
+
+bool CTokenFeed::_IsSkipped(int type, Py_ssize_t i) {
+    if (type == kTokenId_COMMENT) return true;
+    return type == kTokenId_BACKSLASH && _fDriver._ShouldSkipSlash(i, _fPositions);
+}
+
+// The 2.7 grammar knows an ellipsis as three dots.
+void CTokenFeed::_FeedThreeDots(nb::handle tok, Py_ssize_t i) {
+    nb::list dots;
+    for (int dot_i = 0; dot_i < 3; ++dot_i) dots.append(".");
+    _fDriver._AddTokenList(dots, i);
+    if (!_fFirstToken.is_valid()) _fFirstToken = nb::borrow(tok);
+}
+
+void CTokenFeed::_CompleteStatement() {
+    const bool lacks_body = _fLastFedType == kTokenId_COLON;
+    if (_fFirstToken.is_valid() && Utf8View(_fFirstToken) == "try") {
+        if (lacks_body) {
+            _FeedInventedTail({"pass", "\n", "finally", ":", "pass"});
+        } else {
+            _FeedInventedTail({"\n", "finally", ":", "pass"});
+        }
+    } else if (_fIsDecorator) {
+        _FeedInventedTail({"\n", "def", "function", "(", ")", ":", "pass"});
+    } else if (lacks_body) {
+        static const CHostText kPass("pass");
+        _fParser.addtoken(kTokenId_NAME, kPass, nb::int_(TupleSize(_fToks)));
+    }
+}
+
+void CTokenFeed::_FeedInventedHead(std::initializer_list<const char*> texts, Py_ssize_t i) {
+    for (const char* text : texts) _fParser.addtoken(GetTokenType(text), InternedText(text), nb::int_(i));
+}
+
+void CTokenFeed::_FeedInventedTail(std::initializer_list<const char*> texts) {
+    nb::list invented;
+    for (const char* text : texts) invented.append(InternedText(text));
+    _fDriver._AddTokenList(invented, TupleSize(_fToks));
+}
+
+}  // namespace codeloom

@@ -1,0 +1,96 @@
+// tree/: the typed syntax tree of one logical line, made of recycled nodes.
+//   in     tokens and completed grammar rules, from the parser
+//   out    typed nodes; accessors read them by position and make nothing
+//   keeps  free nodes, on the class record that made them
+//   start  at CNode here, CNodeFactory in node_factory.h, the classes in node_classes.h
+#pragma once
+
+#include <nanobind/nanobind.h>
+
+#include "host/binding.h"
+#include "host/collections.h"
+
+namespace codeloom {
+
+class CNode;
+using CNodeRef = CRef<CNode>;
+
+// One record for each grammar state and token type of a factory, and one for keywords. A node goes back to
+// the free list of the record that made it.
+class CNodeClassInfo : public CHosted {
+  public:
+    // `name` is a text string or none.
+    void Init(nb::object cls, int nodetype, nb::object name);
+
+    template <class Visitor>
+    void References(Visitor&& visit) {
+        visit(fCls);
+        visit(fName);
+        visit(fFirstFree);
+    }
+
+    nb::object fCls = nb::none();
+    int fNodeType = 0;
+    nb::object fName = nb::none();
+    CNodeRef fFirstFree;
+};
+
+template <class Class>
+class TNodeOperations;
+
+// Base of all node classes, and the class of every state that has none of its own.
+// A node class stores nothing: it reads fChildren by position or by short search.
+class CNode : public CHosted {
+  public:
+    // The mixin of the class's operations; a class with operations of its own names another.
+    template <class Class>
+    using TOperations = TNodeOperations<Class>;
+
+    CNode() = default;
+    ~CNode() override;
+    void Init(CRef<CNodeClassInfo> cls_info) { fClsInfo = std::move(cls_info); }
+
+    virtual Py_ssize_t GetChildCount();
+    virtual Py_ssize_t _GetChildCount();
+    virtual nb::object GetChildText(Py_ssize_t child_i);
+    virtual nb::object _GetChildText(Py_ssize_t i);
+    virtual CNodeRef GetChild(Py_ssize_t child_i);
+    virtual nb::object GetStateName();
+    virtual bool _DoesChildTextMatch(nb::str text);
+
+    template <class Visitor>
+    void References(Visitor&& visit) {
+        visit(fChildren);
+        visit(fText);
+        visit(fContext);
+        visit(fClsInfo);
+        visit(fNextFree);
+    }
+
+    nb::object fChildren = nb::none();  // list of CNode in source order; none for a leaf
+    nb::object fText = nb::none();      // text string; none for a non-terminal
+    nb::object fContext = nb::none();   // by convention the index of the node's (first) token
+    CRef<CNodeClassInfo> fClsInfo;      // the record that made the node
+    CNodeRef fNextFree;                 // link of the free list; stale while the node is in use
+};
+
+template <class Class>
+class TNodeOperations : public Class {
+    FIRST_OPERATIONS
+    OPERATION(GetChildCount, "The number of direct children; 0 for a leaf.")
+    OPERATION(GetChildText,
+              "The text of the child at `child_i`; None at or past the end, and for a child without text. A "
+              "negative "
+              "index counts from the end; IndexError below the start.",
+              "child_i"_a)
+    OPERATION(GetChild,
+              "The child at `child_i`; None at or past the end. A negative index counts from the end; "
+              "IndexError below "
+              "the start.",
+              "child_i"_a)
+    OPERATION(GetStateName, "The name of the grammar state; the class name of a node without a class record.")
+    OPERATION(_DoesChildTextMatch, "True when a direct child's text equals `text`.", "text"_a)
+    END_OPERATIONS
+};
+
+}  // namespace codeloom

@@ -1,0 +1,70 @@
+// Makes every node: from the free list of its record, or new.
+#pragma once
+
+#include <vector>
+
+#include <nanobind/nanobind.h>
+
+#include "host/binding.h"
+#include "tree/node.h"
+
+namespace codeloom {
+
+class CNodeFactory : public CHosted {
+  public:
+    // `gram.number2symbol` names the grammar states, `tok_number2name` the token types; `cls_for_nodetype`
+    // gives the class for each; `keywords` is a dictionary or any false value, shared and not copied.
+    void Init(nb::object gram, nb::object cls_for_nodetype, nb::object keywords, nb::object tok_number2name,
+              nb::object op_text2number);
+
+    virtual CNodeRef ConvertSingleNode(int type, nb::handle text, nb::handle context, nb::handle children);
+    virtual CNodeRef NewNode(CNodeClassInfo& clsinfo, int type, nb::handle text, nb::handle context,
+                             nb::handle children);
+    virtual CNodeRef NewKeywordNode(nb::handle text, nb::handle context);
+    virtual CNodeRef NewNameNode(nb::handle text, nb::handle context);
+    virtual CNodeRef CreateOperatorNode(nb::handle text, nb::handle context);
+    virtual void DiscardNodes(nb::handle node);
+    virtual CNodeRef RecursiveConvert(nb::tuple raw);
+
+    nb::list GetClassInfoList() const;
+
+    template <class Visitor>
+    void References(Visitor&& visit) {
+        for (CRef<CNodeClassInfo>& info : _fClassInfoList) visit(info);
+        visit(_fKeywordClassInfo);
+        visit(_fKeywords);
+        visit(_fOperatorStrToNumber);
+    }
+
+    nb::object _fOperatorStrToNumber = nb::none();  // operator text to token type
+
+  private:
+    CNodeClassInfo& _ClassInfo(Py_ssize_t type) const;
+    CNodeClassInfo& _RecordFor(int type, nb::handle text) const;
+
+    std::vector<CRef<CNodeClassInfo>> _fClassInfoList;  // by node type: token types and grammar states alike
+    CRef<CNodeClassInfo> _fKeywordClassInfo;            // one for all keywords; empty without keywords
+    nb::object _fKeywords = nb::none();                 // keyword texts as keys
+};
+
+template <class Class>
+class TNodeFactoryOperations : public Class {
+    FIRST_OPERATIONS
+    OPERATION(ConvertSingleNode,
+              "The node for a token (children None) or a completed rule (a list of at least two nodes). A "
+              "statement "
+              "followed by its newline is the statement itself.",
+              "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none())
+    OPERATION(NewNode, "A node of the record `clsinfo`, from its free list or new; `type` is ignored.",
+              "clsinfo"_a, "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none())
+    OPERATION(NewKeywordNode, "A leaf for a keyword; AttributeError on a factory without keywords.",
+              "text"_a.none(), "context"_a.none())
+    OPERATION(NewNameNode, "A CNameLiteral leaf.", "text"_a.none(), "context"_a.none())
+    OPERATION(CreateOperatorNode, "A leaf for an operator; None when `text` isn't one.", "text"_a.none(),
+              "context"_a.none())
+    OPERATION(DiscardNodes, "Give the tree under `node` back to the free lists.", "node"_a.none())
+    OPERATION(RecursiveConvert, "Convert a raw tree of (type, text, context, children) tuples.", "raw"_a)
+    END_OPERATIONS
+};
+
+}  // namespace codeloom

@@ -1,0 +1,28 @@
+// The limits of a walk over one logical line, and how a walk ends that breaks them.
+#pragma once
+
+#include <nanobind/nanobind.h>
+
+namespace nb = nanobind;
+
+namespace codeloom {
+
+constexpr int kMaxVisits = 10000;
+constexpr int kMaxRecurseCount = 40;
+
+[[noreturn]] void RaiseTooManyVisits();
+[[noreturn]] void RaiseTooDeep();
+[[noreturn]] void RaiseWalkInProgress();
+
+// Runs `walk`. The host's RuntimeError ends the walk with a printed line, as though it had ended normally.
+template <class Walk>
+void RunLimited(Walk walk) {
+    try {
+        walk();
+    } catch (nb::python_error& error) {
+        if (!error.matches(PyExc_RuntimeError)) throw;
+        nb::print(nb::str("RuntimeError raised in CNodeWalker.Walk: {}").format(nb::repr(error.value())));
+    }
+}
+
+}  // namespace codeloom
