@@ -136,6 +136,10 @@ CNodeRef CPGenAnalyzerImpl::ParseTokenListToNode(nb::list logical, bool in_async
     return _fLogicalParser->ParseTokenListToNode(std::move(logical), in_async_def);
 }
 
+nb::list CPGenAnalyzerImpl::GetTypeParameterNodes(nb::tuple toks) {
+    return _fLogicalParser->GetTypeParameterNodes(std::move(toks));
+}
+
 void BindAnalyzer(nb::module_& module) {
     nb::class_<CPGenAnalyzerImpl, CPGenAnalyzer, TAnalyzerOperations<CPGenAnalyzerImpl>> binding(
         module, "CPGenAnalyzerImpl", Collected<CPGenAnalyzerImpl>(),
@@ -150,7 +154,11 @@ void BindAnalyzer(nb::module_& module) {
         .def("ParseToNode", &CPGenAnalyzerImpl::ParseToNode, "logical"_a, "in_async_def"_a = false,
              "The node of a logical's statement, or None. ParseError on a token that the grammar refuses.")
         .def("ParseTokenListToNode", &CPGenAnalyzerImpl::ParseTokenListToNode, "logical"_a,
-             "in_async_def"_a = false, "The same for a list of token texts, without the special cases.");
+             "in_async_def"_a = false, "The same for a list of token texts, without the special cases.")
+        .def("GetTypeParameterNodes", &CPGenAnalyzerImpl::GetTypeParameterNodes, "toks"_a,
+             " Get type parameters defined in toks. Tries to ignore parse errors\n        and get all names "
+             "if "
+             "possible ");
     BindOperations(binding);
 }
 

@@ -36,6 +36,7 @@ class CPGenAnalyzerImpl : public CPGenAnalyzer {
 
     CNodeRef ParseToNode(CLogicalLine& logical, bool in_async_def);
     CNodeRef ParseTokenListToNode(nb::list logical, bool in_async_def);
+    nb::list GetTypeParameterNodes(nb::tuple toks);
 
     template <class Visitor>
     void References(Visitor&& visit) {

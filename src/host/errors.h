@@ -17,8 +17,16 @@ bool HostAssertionsOn();
 // Raises an exception of the host class `type` with `message`.
 [[noreturn]] void RaiseHost(nb::handle type, const char* message);
 
-// Calls `raise`, which must throw, and gives the host exception that it threw. A C++ exception becomes the
-// host's as it would at the boundary.
+// Counts one level of native recursion against the host's limit, whose RecursionError it raises.
+class CRecursionScope {
+  public:
+    CRecursionScope();
+    ~CRecursionScope();
+    CRecursionScope(const CRecursionScope&) = delete;
+    CRecursionScope& operator=(const CRecursionScope&) = delete;
+};
+
+// An exception on its way, as the host's object. A C++ exception becomes the host's as it would at the boundary.
 class CHostError {
   public:
     // Takes the C++ exception that is being handled; call it inside a catch block.

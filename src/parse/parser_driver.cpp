@@ -4,6 +4,7 @@
 #include "host/neighbour_call.h"
 #include "host/text.h"
 #include "neighbours/token_type.h"
+#include "parse/class_table.h"
 #include "parse/token_feed.h"
 
 namespace codeloom {

@@ -31,10 +31,21 @@ class CPGenParserImpl : public CPGenAnalyzer {
     virtual Py_ssize_t _NonNestedFindTokenIndex(nb::object target, nb::tuple toks, Py_ssize_t start,
                                                 Py_ssize_t end);
     virtual CNodeRef _ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions);
+    virtual CNodeRef _ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def,
+                                                        CPositions positions, Py_ssize_t i);
+    virtual CNodeRef _ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                 Py_ssize_t i);
+    virtual CNodeRef _ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool in_async_def,
+                                                        CPositions positions, Py_ssize_t i);
+    virtual nb::list _NodesForTypeParameters(nb::tuple toks, bool in_async_def, CPositions positions,
+                                             Py_ssize_t start, Py_ssize_t end, bool raise_errors);
+    virtual CNodeRef _CreateSingleTypeParameterNode(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                    Py_ssize_t start, Py_ssize_t end, bool raise_errors);
     virtual void _RaiseParseError(nb::handle tok_i);
     virtual CNodeRef ParseTokenListToNode(nb::list toks, bool in_async_def);
     virtual void _AddTokenList(nb::list toks, Py_ssize_t tok_i);
     virtual bool _ShouldSkipSlash(Py_ssize_t tok_i, CPositions positions);
+    virtual nb::list GetTypeParameterNodes(nb::tuple toks);
 
     template <class Visitor>
     void References(Visitor&& visit) {
@@ -53,6 +64,8 @@ class CPGenParserImpl : public CPGenAnalyzer {
   private:
     friend class CTokenFeed;
 
+    CNodeRef _ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                         Py_ssize_t colon_i, Py_ssize_t end, bool raise_errors);
     CNodeRef _PeelRoot(nb::object parsed, bool is_decorator);
 
     nb::object _fGrammar = nb::none();
@@ -92,6 +105,25 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
     OPERATION(_ParseSpecialCases,
               "The node of a statement that is parsed by hand; None for the ordinary road.", "toks"_a,
               "in_async_def"_a, "positions"_a.none())
+    OPERATION(
+        _ParseSpecialCaseParenthesizedWith,
+        "A `with` whose items stand in parentheses, with `i` the index of `with`; None when they don't.",
+        "toks"_a, "in_async_def"_a, "positions"_a.none(), "i"_a)
+    OPERATION(_ParseSpecialCaseExceptStar,
+              "An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.",
+              "toks"_a, "in_async_def"_a, "positions"_a.none(), "i"_a)
+    OPERATION(_ParseSpecialCaseWithTypeParameter,
+              "A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of "
+              "its keyword; "
+              "None for the ordinary road.",
+              "toks"_a, "in_async_def"_a, "positions"_a.none(), "i"_a)
+    OPERATION(_NodesForTypeParameters,
+              "The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors` "
+              "malformed "
+              "parameters are dropped.",
+              "toks"_a, "in_async_def"_a, "positions"_a.none(), "start"_a, "end"_a, "raise_errors"_a)
+    OPERATION(_CreateSingleTypeParameterNode, "The node of the one type parameter in [start, end), or None.",
+              "toks"_a, "in_async_def"_a, "positions"_a.none(), "start"_a, "end"_a, "raise_errors"_a)
     OPERATION(_RaiseParseError, "Raise a ParseError at a token index.", "tok_i"_a)
     OPERATION(ParseTokenListToNode, "ParseToNode for a list of token texts, without the special cases.",
               "toks"_a, "in_async_def"_a = false)
@@ -102,6 +134,10 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
               "since slashes "
               "are uncommon and is usually called\n        after testing token is a slash. ",
               "tok_i"_a, "positions"_a.none())
+    OPERATION(GetTypeParameterNodes,
+              " Get type parameters defined in toks. Tries to ignore parse errors\n        and get all names "
+              "if possible ",
+              "toks"_a)
     END_OPERATIONS
 };
 

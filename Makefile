@@ -1,0 +1,78 @@
+# make run     set up what is missing, build, and check the examples and the interpreter's own library
+# make test    set up what is missing, build, and run all tests
+# The rest: lint, format, asan, leaks, fuzz, bench, clean.
+
+PYTHON ?= python3.11
+VENV   := .venv
+BIN    := $(VENV)/bin
+STAMP  := $(VENV)/.installed
+
+SOURCES   := $(shell find src resources -type f) CMakeLists.txt pyproject.toml
+CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
+STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
+
+.PHONY: run test lint format asan asan-short leaks fuzz bench build clean
+
+build: $(STAMP)
+
+$(BIN)/python:
+	$(PYTHON) -m venv $(VENV)
+	$(BIN)/pip install --quiet --upgrade pip
+
+$(VENV)/.tools: pyproject.toml | $(BIN)/python
+	$(BIN)/pip install --quiet 'scikit-build-core>=1.1' 'nanobind>=3.1,<4' 'cmake>=3.26' 'ninja>=1.11'
+	touch $@
+
+$(STAMP): $(SOURCES) $(VENV)/.tools
+	$(BIN)/pip install --quiet --no-build-isolation --editable '.[test,lint]'
+	touch $@
+
+run: build
+	-$(BIN)/codeloom check examples
+	-$(BIN)/codeloom check $(STDLIB) | tail -n 1
+
+test: build
+	$(BIN)/pytest
+
+lint: build
+	$(BIN)/clang-format --dry-run --Werror $(CXX_FILES)
+	$(BIN)/ruff format --check codeloom tests benchmarks tools
+	$(BIN)/ruff check codeloom tests benchmarks tools
+	$(BIN)/mypy
+
+format: build
+	$(BIN)/clang-format -i $(CXX_FILES)
+	$(BIN)/ruff format codeloom tests benchmarks tools
+	$(BIN)/ruff check --fix codeloom tests benchmarks tools
+
+# Address and undefined-behaviour sanitizers over the tests, in a build of their own.
+ASAN := build/asan
+ASAN_RUN = LD_PRELOAD="$$(g++ -print-file-name=libasan.so) $$(g++ -print-file-name=libubsan.so)" \
+	ASAN_OPTIONS=detect_leaks=0 PYTHONMALLOC=malloc PYTHONPATH=$(ASAN)/site $(BIN)/python -P
+
+$(ASAN)/.built: $(SOURCES) $(shell find codeloom -name '*.py') $(STAMP)
+	$(BIN)/cmake -S . -B $(ASAN) -G Ninja -DCODELOOM_SANITIZE=ON -DCMAKE_BUILD_TYPE=Debug \
+		-DCMAKE_MAKE_PROGRAM=$(abspath $(BIN)/ninja) -DPython_EXECUTABLE=$(abspath $(BIN)/python)
+	$(BIN)/cmake --build $(ASAN)
+	rm -rf $(ASAN)/site && mkdir -p $(ASAN)/site
+	cp -R codeloom $(ASAN)/site/
+	$(BIN)/cmake --install $(ASAN) --prefix $(ASAN)/site > /dev/null
+	touch $@
+
+asan: $(ASAN)/.built
+	$(ASAN_RUN) -m pytest -q
+
+asan-short: $(ASAN)/.built
+	$(ASAN_RUN) -m pytest -q -m 'not slow'
+
+leaks: build
+	$(BIN)/python tests/leaks.py
+
+fuzz: build
+	$(BIN)/python tests/fuzz.py --seconds $(or $(SECONDS),60)
+
+bench: build
+	$(BIN)/python benchmarks/bench_analyze.py
+
+clean:
+	rm -rf build $(VENV)

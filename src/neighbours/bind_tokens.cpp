@@ -1,0 +1,33 @@
+#include "host/collections.h"
+#include "neighbours/bind.h"
+#include "neighbours/logicalline/logical_types_host.h"
+#include "neighbours/match_case.h"
+#include "neighbours/token_type.h"
+
+namespace codeloom {
+
+using namespace nb::literals;
+
+namespace {
+
+nb::object HostFindMatchOrCaseType(nb::tuple toks, Py_ssize_t first, Py_ssize_t end) {
+    std::vector<std::string_view> texts;
+    for (nb::handle tok : toks) texts.push_back(tok.is_none() ? std::string_view() : Utf8View(tok));
+    return HostText(FindMatchOrCaseType(texts, first, end));
+}
+
+}  // namespace
+
+void BindTokenTypes(nb::module_& module) {
+    for (const CTokenTypeName& type : kTokenTypeNames)
+        module.attr((std::string("kTokenId_") + std::string(type.name)).c_str()) = static_cast<int>(type.number);
+    module.def(
+        "GetTokenType", [](nb::object token, nb::handle) { return GetTokenType(Utf8View(token)); }, "token"_a,
+        "unused"_a.none() = nb::none(),
+        "The token type, an integer, of a token text (text or byte string): 1 for a name, 54 for what is no token.");
+    module.def("FindMatchOrCaseType", &HostFindMatchOrCaseType, "toks"_a, "first"_a, "end"_a,
+               "The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form the header of\n"
+               "such a statement (PEP 634), kUnknown when the word is a name.");
+}
+
+}  // namespace codeloom

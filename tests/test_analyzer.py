@@ -1,0 +1,328 @@
+"""The analyzer's error policy, embedded expressions, and syntax errors with their places."""
+
+import logging
+from types import SimpleNamespace
+
+import pytest
+
+from codeloom import treesift
+from codeloom.logicalline import (
+    CLogicalLine,
+    kAssignment,
+    kComment,
+    kCommentedTypeHint,
+    kFstringFieldExp,
+    kStringifiedTypeHint,
+)
+from codeloom.treesift import CNodeWalker, CPGenAnalyzerImpl, CreateSyntaxError
+from codeloom.utils import GetLogicalsFromText
+
+VERSION = (3, 8, 0)
+ANALYZER = CPGenAnalyzerImpl(VERSION)
+
+
+def Logical(text):
+    (logical,) = GetLogicalsFromText(text)
+    return logical
+
+
+def ByHand(text, type=kAssignment, first_line=0, exp_logicals=()):
+    """A logical of blank-separated tokens on one row."""
+    toks = tuple(text.split())
+    columns = [sum(len(tok) + 1 for tok in toks[:i]) for i in range(len(toks))]
+    return CLogicalLine(type, toks, tuple((0, col) for col in columns), first_line, exp_logicals)
+
+
+def Analyze(logical, in_async_def=False, first_in_def=False):
+    return ANALYZER.AnalyzeSingleLogical(logical, in_async_def, first_in_def)
+
+
+def Place(error):
+    return (error.filename, error.lineno, error.offset, error.text)
+
+
+class Failing(CPGenAnalyzerImpl):
+    """An analyzer whose walk raises or does what a test says."""
+
+    def __init__(self, action):
+        super().__init__(VERSION)
+        self.action = action
+        self.seen = []
+
+    def _InspectEmbeddedExpressions(self, logical, node, in_async_def, first_in_def):
+        self.seen.append((logical, node))
+        self.action(logical)
+
+
+def Raising(error):
+    def Action(logical):
+        logical.AppendTypeEquiv(b"x", b"y")
+        raise error
+
+    return Failing(Action)
+
+
+@pytest.mark.parametrize(
+    ("text", "row", "offset"),
+    [
+        ("x = (", 1, 6),  # behind the last token
+        (") = 1", 1, 1),
+        ("x = = 1", 1, 5),
+        ("f(a,\n  b,\n  c d)", 3, 5),
+        ("é = = 1", 1, 6),  # columns count bytes
+        ("x = 'abc", 1, 5),
+        ("class", 1, 6),
+        ("x = 1 \\ y", 1, 7),
+        ("else x", 1, 6),
+        ("@ = 1", 1, 3),
+        ("try: x = = 1", 1, 10),
+    ],
+)
+def test_place_of_a_syntax_error(text, row, offset):
+    error = Analyze(Logical(text))
+    assert type(error) is SyntaxError and error.msg == "invalid syntax"
+    assert Place(error) == ("<string>", row, offset, text)
+
+
+def test_an_error_is_reported_once():
+    logical = Logical("x = = 1")
+    assert Analyze(logical) is not None and logical.fParsed
+    assert Analyze(logical) is None
+    logical.MarkParsed(False)
+    assert Analyze(logical) is not None
+
+
+def test_an_analyzed_logical_is_left_alone():
+    logical = Logical("x = 1")
+    logical.MarkParsed(True)
+    logical.AppendTypeEquiv(b"x", b"y")
+    assert Analyze(logical) is None and logical.fTypeEquivs == [(b"x", b"y")]
+
+
+def test_logicals_of_nothing():
+    for logical in (CLogicalLine(kAssignment, (), ()), CLogicalLine(kAssignment, (None, None), ((0, 0), (0, 1)))):
+        assert Analyze(logical) is None
+
+
+def test_a_comment_is_not_parsed_but_inspected():
+    analyzer = Failing(lambda logical: None)
+    comment = Logical("# = = =")
+    assert analyzer.AnalyzeSingleLogical(comment, False) is None
+    assert analyzer.seen == [(comment, None)]
+
+
+@pytest.mark.parametrize("error", [TypeError("odd"), KeyboardInterrupt(), RuntimeError("x")])
+def test_other_failures_are_logged_and_swallowed(error, caplog):
+    logical = Logical("x = 1")
+    with caplog.at_level(logging.ERROR, logger="codeloom"):
+        assert Raising(error).AnalyzeSingleLogical(logical, False) is None
+    (record,) = caplog.records
+    assert record.exc_info[1] is not None and record.exc_info[2] is not None
+    assert logical.fTypeEquivs is None
+    if isinstance(error, Exception):
+        assert str(record.exc_info[1]) == (
+            f"Could not analyze logical -- inner exception is {error!r}\n  logical tokens: x = 1"
+        )
+        assert "Raising" in caplog.text  # the inner traceback
+
+
+def test_a_syntax_error_of_a_walk_is_returned_as_it_is():
+    error = SyntaxError("rejected")
+    logical = Logical("x = 1")
+    assert Raising(error).AnalyzeSingleLogical(logical, False) is error
+    assert logical.fTypeEquivs is None
+
+
+def test_a_removed_token_spoils_the_log_text(caplog):
+    logical = CLogicalLine(kAssignment, ("x", None, "=", "1"), ((0, 0), (0, 1), (0, 2), (0, 4)))
+    assert Raising(ValueError("odd")).AnalyzeSingleLogical(logical, False) is None
+    assert isinstance(caplog.records[0].exc_info[1], TypeError)
+
+
+def test_the_report_is_looked_up_at_the_call(monkeypatch):
+    calls = []
+    fake = SimpleNamespace(
+        ReportCurrentException=lambda **options: calls.append(options),
+        RaiseWithTraceback=treesift.reflect.RaiseWithTraceback,
+    )
+    monkeypatch.setattr(treesift, "reflect", fake)
+    assert Raising(TypeError()).AnalyzeSingleLogical(Logical("x"), False) is None
+    assert calls == [{"suppress_gui": True}]
+
+
+def test_a_failure_of_a_handler_is_raised(monkeypatch):
+    def Report(**options):
+        raise OSError("no log")
+
+    monkeypatch.setattr(treesift, "reflect", SimpleNamespace(ReportCurrentException=Report))
+    with pytest.raises(OSError, match="no log"):
+        Raising(KeyboardInterrupt()).AnalyzeSingleLogical(Logical("x"), False)
+
+
+def test_nodes_go_back_on_every_road():
+    class Driver:
+        discarded = 0
+
+    for action in (lambda logical: None, lambda logical: 1 / 0, lambda logical: exec("raise SyntaxError")):
+        analyzer = Failing(action)
+        analyzer.AnalyzeSingleLogical(Logical("x = f(1)"), False)
+        ((_, node),) = analyzer.seen
+        assert (node.fText, node.fChildren) == (None, None)
+        assert node.fClsInfo.fFirstFree is node
+
+
+def test_after_an_error_the_next_logical_is_sound():
+    for text in ("x = (", "x = 'a", "def f(:", "x y z"):
+        assert Analyze(Logical(text)) is not None
+        assert Analyze(Logical("x = (1, 2)")) is None
+
+
+# Embedded expressions
+
+
+def test_a_broken_field_of_an_fstring():
+    error = Analyze(Logical("x = f'''a\n{b c}'''"))
+    assert Place(error) == ("invalid syntax", 2, 3, "b c")
+
+
+@pytest.mark.parametrize(
+    ("type", "message"),
+    [(kFstringFieldExp, "invalid syntax"), (kStringifiedTypeHint, "invalid syntax in stringified type hint")],
+)
+def test_messages_of_embedded_errors(type, message):
+    inner = ByHand("a b", type, first_line=7)
+    logical = ByHand("x = 1", first_line=5, exp_logicals=(ByHand("a"), inner))
+    error = Analyze(logical)
+    assert error.msg == message
+    assert Place(error) == (message, 3, 3, "a b")
+
+
+def test_commented_hints_are_left_to_the_hint_walker():
+    assert Analyze(ByHand("x = 1", exp_logicals=(ByHand("a b", kCommentedTypeHint),))) is None
+
+
+def test_equivs_are_lifted_in_order():
+    class Analyzer(CPGenAnalyzerImpl):
+        def _InspectSingleLogical(self, logical, in_async_def, in_embedded_expression=False, first_in_def=False):
+            if in_embedded_expression:
+                logical.AppendTypeEquiv(logical.fToks[0].encode(), b"seen")
+                logical.AppendArgTypeEquiv(b"not", b"lifted")
+            return super()._InspectSingleLogical(logical, in_async_def, in_embedded_expression, first_in_def)
+
+    logical = ByHand("x = 1", exp_logicals=(ByHand("a", kFstringFieldExp), ByHand("b", kStringifiedTypeHint)))
+    assert Analyzer(VERSION).AnalyzeSingleLogical(logical, False) is None
+    names = [name for name, equiv in logical.fTypeEquivs if equiv == b"seen"]
+    assert names == [b"a", b"b"] and logical.fArgTypeEquivs is None
+
+
+def test_embedded_logicals_have_no_embedded_logicals_of_their_own():
+    inner = ByHand("a", kFstringFieldExp, exp_logicals=(ByHand("b c", kFstringFieldExp),))
+    assert Analyze(ByHand("x = 1", exp_logicals=(inner,))) is None
+
+
+def test_exp_logicals_must_be_a_tuple(caplog):
+    class Odd(CLogicalLine):
+        def GetExpLogicals(self):
+            return None
+
+    assert Analyze(Odd(kAssignment, ("x",), ((0, 0),))) is None
+    assert "TypeError" in caplog.text
+
+
+# Syntax errors
+
+
+def Attributes(**changed):
+    logical = {"fToks": ("ab", "é\ncd"), "fPositions": ((0, 0), (0, 3)), "fTokenCount": 2}
+    return SimpleNamespace(**logical | changed)
+
+
+@pytest.mark.parametrize(
+    ("context", "lineno", "offset"),
+    [(0, 1, 1), (1, 1, 4), (2, 1, 9), (99, 1, 9), ((4, 2), 5, 3), (-1, 1, 4)],
+)
+def test_create_syntax_error(context, lineno, offset):
+    error = CreateSyntaxError("message", Attributes(), context)
+    assert (error.msg, error.filename, error.lineno, error.offset) == ("message", "<string>", lineno, offset)
+
+
+def test_places_within_a_token():
+    same_row = SimpleNamespace(lineno=0, utf8_col=2)
+    later_row = SimpleNamespace(lineno=2, utf8_col=1)
+    for context, info, place in [
+        (1, same_row, (1, 6)),
+        (1, later_row, (3, 2)),
+        ((4, 2), later_row, (5, 3)),  # a given place isn't refined
+        (2, later_row, (1, 9)),  # nor is the end
+    ]:
+        error = CreateSyntaxError("m", Attributes(), context, info)
+        assert (error.lineno, error.offset) == place
+
+
+def test_an_empty_logical_is_at_its_start():
+    error = CreateSyntaxError("m", Attributes(fToks=(), fPositions=(), fTokenCount=0), None)
+    assert (error.lineno, error.offset, error.text) == (1, 1, "")
+
+
+@pytest.mark.parametrize(
+    ("logical", "context", "failure"),
+    [
+        (Attributes(), None, TypeError),
+        (Attributes(), "x", TypeError),
+        (Attributes(), (1, 2, 3), ValueError),
+        (Attributes(fPositions=((0, 0), (0, 1, 2))), 1, ValueError),
+        (Attributes(fTokenCount=5), 3, IndexError),
+        (SimpleNamespace(), 0, AttributeError),
+    ],
+)
+def test_broken_places(logical, context, failure):
+    with pytest.raises(failure):
+        CreateSyntaxError("m", logical, context)
+
+
+# Walks
+
+
+def test_limits_end_a_walk_with_a_printed_line(capsys):
+    walker_limits = [("x = " + "(" * 60 + "1,1" + ",)" * 60, "recurse count"), ("f(" + "1, " * 10_000 + ")", "number of calls")]
+    for text, limit in walker_limits:
+        logical = Logical(text)
+        assert Analyze(logical) is None
+        assert f"RuntimeError raised in CNodeWalker.Walk: RuntimeError('Maximum {limit}" in capsys.readouterr().out
+        assert Analyze(Logical("x = 1")) is None and capsys.readouterr().out == ""
+
+
+def test_only_one_walk_at_a_time():
+    class Walker(CNodeWalker):
+        def _VisitNode(self, node):
+            with pytest.raises(ValueError, match="Only one logical may be walked at a time"):
+                self.Walk(node, logical)
+            with pytest.raises(ValueError):
+                self.Walk(None, logical)
+            return super()._VisitNode(node)
+
+    logical = Logical("x = 1")
+    tree = ANALYZER.ParseToNode(logical)
+    Walker(VERSION).Walk(tree, logical)
+    Walker(VERSION).Walk(None, logical)
+
+
+def test_wrong_types_are_refused():
+    logical = Logical("x")
+    for call in [
+        lambda: CPGenAnalyzerImpl("3.8"),
+        lambda: CPGenAnalyzerImpl(None),
+        lambda: CPGenAnalyzerImpl(VERSION, 7),
+        lambda: ANALYZER.AnalyzeSingleLogical("x = 1", False),
+        lambda: ANALYZER.AnalyzeSingleLogical(None, False),
+        lambda: ANALYZER.AnalyzeSingleLogical(logical, "no"),
+        lambda: ANALYZER.ParseTokenListToNode("x"),
+        lambda: CLogicalLine(1, (), ()),
+        lambda: CLogicalLine(kComment, [], []),
+        lambda: CLogicalLine(kComment, (1,), ((0, 0),)),
+        lambda: CLogicalLine(kComment, (), (), 0, ("x",)),
+    ]:
+        with pytest.raises(TypeError):
+            call()
+    with pytest.raises(ValueError, match="one length"):
+        CLogicalLine(kComment, ("x",), ())

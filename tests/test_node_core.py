@@ -1,0 +1,239 @@
+"""The node base class, the factory and the free lists."""
+
+from types import SimpleNamespace
+
+import pytest
+
+from codeloom.treesift import (
+    CExpression,
+    CKeywordLiteral,
+    CNameLiteral,
+    CNode,
+    CNodeClassInfo,
+    CNodeFactory,
+    FinishedWithNode,
+    NotCompiledFinishedWithNode,
+)
+
+NAME, NEWLINE, EXPR = 1, 4, 7
+
+
+def MakeFactory(keywords=("if",), classes=None):
+    gram = SimpleNamespace(number2symbol={EXPR: "expr"})
+    classes = classes or [CNode, CNameLiteral, CNode, CNode, CNode, CNode, CNode, CExpression]
+    names = {NAME: "NAME", NEWLINE: "NEWLINE", EXPR: "hidden by the grammar's name"}
+    return CNodeFactory(gram, classes, dict.fromkeys(keywords), names, {"->": 6, "odd": "no number"})
+
+
+def Leaf(text, factory=None):
+    return (factory or MakeFactory()).NewNameNode(text, 0)
+
+
+def Chain(factory, depth):
+    """A tree of `depth` levels below its root, each with two children."""
+    node = factory.NewNameNode("bottom", 0)
+    for level in range(depth):
+        node = factory.NewNode(Info(factory), EXPR, None, level, [node, factory.NewNameNode("x", 0)])
+    return node
+
+
+def Info(factory, number=EXPR):
+    return factory._fClassInfoList[number]
+
+
+def FreeNodes(info):
+    nodes, node = [], info.fFirstFree
+    while node is not None:
+        nodes.append(node)
+        node = node.fNextFree
+    return nodes
+
+
+def test_leaf_has_no_children():
+    leaf = Leaf("x")
+    assert (leaf.GetChildCount(), leaf.GetChild(0), leaf.GetChildText(0)) == (0, None, None)
+    assert not leaf._DoesChildTextMatch("x")
+    assert leaf.GetChild(-1) is None and leaf.GetChildText(-1) is None
+
+
+def test_children_by_index():
+    factory = MakeFactory()
+    a, b = factory.NewNameNode("a", 0), factory.NewNameNode("b", 1)
+    node = factory.NewNode(Info(factory), 0, None, 0, [a, b])
+    assert node.GetChildCount() == 2
+    assert node.GetChild(0) is a and node.GetChild(-1) is b
+    assert node.GetChild(2) is None and node.GetChildText(5) is None
+    assert (node.GetChildText(1), node.GetChildText(-2)) == ("b", "a")
+    assert node._DoesChildTextMatch("b") and not node._DoesChildTextMatch("c")
+    for below in (node.GetChild, node.GetChildText):
+        with pytest.raises(IndexError):
+            below(-3)
+
+
+def test_foreign_children_are_the_hosts_type_error():
+    factory = MakeFactory()
+    node = factory.NewNode(Info(factory), 0, None, 0, [1, None])
+    for access in (node.GetChild, node.GetChildText):
+        with pytest.raises(TypeError, match="CNode"):
+            access(0)
+    with pytest.raises(TypeError):
+        node._DoesChildTextMatch("x")
+    with pytest.raises(TypeError):
+        FinishedWithNode(node)
+    with pytest.raises(TypeError, match="list"):
+        factory.NewNode(Info(factory), 0, None, 0, (1, 2))
+
+
+def test_state_names():
+    factory = MakeFactory()
+    assert Leaf("x", factory).GetStateName() == "NAME"
+    assert factory.NewKeywordNode("if", 0).GetStateName() == "KEYWORD"
+    assert CExpression().GetStateName() == "CExpression"
+    assert Info(factory).fName == "expr" and Info(factory, 2).fName is None
+    assert repr(Leaf("x", factory)) == "<class 'codeloom.treesift.CNameLiteral'>: NAME"
+
+
+def test_fields_are_read_only():
+    leaf = Leaf("x")
+    for field in ("fChildren", "fText", "fContext", "fClsInfo", "fNextFree"):
+        with pytest.raises(AttributeError):
+            setattr(leaf, field, None)
+
+
+def test_class_info_checks_its_name():
+    assert CNodeClassInfo(CNode, 3, None).fName is None
+    with pytest.raises(TypeError):
+        CNodeClassInfo(CNode, 3, b"x")
+    with pytest.raises(TypeError):
+        CNodeClassInfo(CNode, 3)
+
+
+def test_convert_chooses_the_record():
+    factory = MakeFactory()
+    assert type(factory.ConvertSingleNode(NAME, "if", 0, None)) is CKeywordLiteral
+    assert type(factory.ConvertSingleNode(NAME, "x", 0, None)) is CNameLiteral
+    for async_or_await in (55, 56):
+        assert type(factory.ConvertSingleNode(async_or_await, "x", 0, None)) is CKeywordLiteral
+    with pytest.raises(IndexError):
+        factory.ConvertSingleNode(99, "x", 0, None)
+
+
+def test_convert_collapses_a_statement_and_its_newline():
+    factory = MakeFactory()
+    a = factory.NewNameNode("a", 0)
+    newline = factory.ConvertSingleNode(NEWLINE, "\n", 1, None)
+    assert factory.ConvertSingleNode(EXPR, None, 0, [a, newline]) is a
+    assert Info(factory, NEWLINE).fFirstFree is newline and newline.fText is None
+    b = factory.NewNameNode("b", 0)
+    assert type(factory.ConvertSingleNode(EXPR, None, 0, [a, b])) is CExpression
+    newline = factory.ConvertSingleNode(NEWLINE, "\n", 1, None)
+    assert factory.ConvertSingleNode(EXPR, None, 0, [a, b, newline]).GetChildCount() == 3
+
+
+@pytest.mark.parametrize("children", [[], [CNode()]])
+def test_convert_asserts_two_children(children):
+    with pytest.raises(AssertionError):
+        MakeFactory().ConvertSingleNode(EXPR, None, 0, children)
+
+
+def test_text_must_be_text():
+    with pytest.raises(AssertionError):
+        MakeFactory().NewNameNode(b"x", 0)
+
+
+def test_operator_nodes():
+    factory = MakeFactory()
+    arrow = factory.CreateOperatorNode("->", 7)
+    assert (arrow.fText, arrow.fContext, arrow.fClsInfo) == ("->", 7, Info(factory, 6))
+    assert factory.CreateOperatorNode("nonsense", 0) is None
+    assert factory.CreateOperatorNode("odd", 0) is None
+
+
+def test_a_factory_without_keywords():
+    factory = MakeFactory(keywords=())
+    assert type(factory.ConvertSingleNode(NAME, "if", 0, None)) is CNameLiteral
+    with pytest.raises(AttributeError):
+        factory.NewKeywordNode("if", 0)
+    with pytest.raises(TypeError):
+        MakeFactory(classes=[None, None]).NewNameNode("x", 0)
+
+
+def test_recycling_gives_the_same_objects_again():
+    factory = MakeFactory()
+
+    def Nodes(node):
+        yield node
+        for child in node.fChildren or ():
+            yield from Nodes(child)
+
+    tree = Chain(factory, 5)
+    first = {id(node) for node in Nodes(tree)}
+    FinishedWithNode(tree)
+    assert (tree.fText, tree.fContext, tree.fChildren) == (None, None, None)
+    tree = Chain(factory, 5)
+    assert {id(node) for node in Nodes(tree)} == first
+    NotCompiledFinishedWithNode(tree)
+    assert {id(node) for info in factory._fClassInfoList for node in FreeNodes(info)} == first
+
+
+def test_deeper_nodes_stand_nearer_the_head():
+    factory = MakeFactory()
+    tree = Chain(factory, 3)
+    FinishedWithNode(tree)
+    assert FreeNodes(Info(factory))[-1] is tree
+
+
+def test_recycling_stops_below_a_hundred_levels(capsys):
+    factory = MakeFactory()
+    FinishedWithNode(Chain(factory, 101))
+    assert capsys.readouterr().out == "depth too great\n" * 2
+    assert len(FreeNodes(Info(factory))) == 101
+
+
+def test_none_is_no_tree():
+    factory = MakeFactory()
+    with pytest.raises(AttributeError, match="fClsInfo"):
+        FinishedWithNode(None)
+    with pytest.raises(AttributeError, match="fClsInfo"):
+        factory.DiscardNodes(factory.NewNode(Info(factory), 0, None, 0, [CNode(), None]))
+    with pytest.raises(TypeError):
+        NotCompiledFinishedWithNode(None)
+
+
+def test_odd_trees_of_the_host_end():
+    factory = MakeFactory()
+    children = []
+    node = factory.NewNode(Info(factory), 0, None, 0, children)
+    children += [node, node, CNode()]
+    FinishedWithNode(node)  # contains itself
+    FinishedWithNode(node)  # and is given back twice
+    assert factory.NewNode(Info(factory), 0, None, 0, None) is node
+
+
+def test_recursive_convert():
+    factory = MakeFactory()
+    raw = (EXPR, None, 0, [(NAME, "a", 0, None), (EXPR, None, 1, [(NAME, "b", 1, None), (NEWLINE, "\n", 2, None)])])
+    node = factory.RecursiveConvert(raw)
+    assert [child.fText for child in node.fChildren] == ["a", "b"]
+    for broken, error in [
+        ((1, "a", 0), ValueError),
+        ((EXPR, None, 0, [1, 2]), TypeError),
+        ((EXPR, None, 0, ((NAME, "a", 0, None),) * 2), TypeError),
+        (("x", None, 0, None), TypeError),
+    ]:
+        with pytest.raises(error):
+            factory.RecursiveConvert(broken)
+
+
+def test_recursive_convert_of_a_bottomless_tree():
+    raw = (NAME, "a", 0, None)
+    for _ in range(100_000):
+        raw = (EXPR, None, 0, [raw, (NAME, "b", 0, None)])
+    with pytest.raises(RecursionError):
+        MakeFactory().RecursiveConvert(raw)
+
+
+def test_a_long_free_list_is_dropped_without_recursion():
+    factory = MakeFactory()
+    FinishedWithNode(factory.NewNode(Info(factory), 0, None, 0, [Leaf("x", factory) for _ in range(200_000)]))
+    del factory
