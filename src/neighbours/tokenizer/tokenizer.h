@@ -6,11 +6,15 @@
 // It never fails and loses no byte: separators apart, every non-blank character lies in a token.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 #include <vector>
 
 #include "neighbours/logical_types.h"
+#include "neighbours/tokenizer/lexer.h"
+#include "neighbours/tokenizer/place.h"
+#include "neighbours/tokenizer/scopes.h"
 
 namespace codeloom {
 
@@ -48,6 +52,42 @@ class CTokenizer {
 
     // The next logical line into `logical`, whose storage is reused; false at the end of the text.
     bool NextLogical(CRawLogical& logical);
+
+  private:
+    // How far a logical line reaches beyond, or falls short of, what its brackets say. Row ends before
+    // `until` don't end it; the next one does, whatever is open, if it `ends_there`.
+    struct CReach {
+        size_t until = 0;
+        bool ends_there = false;
+    };
+    struct COpenBracket {
+        size_t pos;
+        char closer;
+    };
+    enum class EEnd { kSound, kUnclosed };
+
+    bool _SkipToLogical();
+    void _CollectComment(CRawLogical& logical);
+    void _CollectStatement(CRawLogical& logical);
+    EEnd _CollectTokens(CRawLogical& logical, const CReach& reach);
+    void _AddToken(CRawLogical& logical);
+    bool _TrackBracket();
+    bool _IsSeparator(const CRawLogical& logical);
+    void _EndAtSeparator(CRawLogical& logical);
+    bool _ProvesUnclosed(const CRawLogical& logical) const;
+    void _RememberUnclosed();
+    bool _IsKnownUnclosed(size_t pos);
+
+    CLexer _fLexer;
+    CPlace _fPlace;
+    CScopes _fScopes;
+    bool _fMidRow = false;  // behind a separator
+    int32_t _fIndent = 0;   // of the first row of the logical line
+    bool _fIsCompound = false;
+    std::vector<COpenBracket> _fBrackets;
+    // Brackets that an earlier look ahead has proven to be unclosed, in source order.
+    std::vector<size_t> _fUnclosed;
+    size_t _fUnclosed_i = 0;
 };
 
 }  // namespace codeloom

@@ -1,0 +1,11 @@
+// Pairs of brackets.
+#pragma once
+
+namespace codeloom {
+
+constexpr char CloserOf(char opener) {
+    if (opener == '(') return ')';
+    return opener == '[' ? ']' : '}';
+}
+
+}  // namespace codeloom

@@ -1,0 +1,56 @@
+// What a keyword says about the row or the expression that it stands in.
+#pragma once
+
+#include <array>
+#include <cstddef>
+#include <string_view>
+
+#include "neighbours/tokenizer/char_class.h"
+#include "neighbours/tokenizer/string_lexer.h"
+
+namespace codeloom {
+
+namespace keywords {
+
+template <size_t count>
+constexpr bool IsOneOf(std::string_view word, const std::array<std::string_view, count>& words) {
+    for (const std::string_view candidate : words) {
+        if (word == candidate) return true;
+    }
+    return false;
+}
+
+// Begin a statement and stand nowhere else: in no version of the language inside brackets.
+inline constexpr auto kStatementOnly = std::to_array<std::string_view>(
+    {"def", "class", "return", "import", "raise", "pass", "break", "continue", "del", "global", "assert",
+     "while", "with", "try", "except", "finally", "elif"});
+
+// Stand between two operands, or begin what may follow an operand.
+inline constexpr auto kBinary =
+    std::to_array<std::string_view>({"and", "or", "in", "is", "not", "if", "else", "for", "async", "as"});
+
+}  // namespace keywords
+
+// The ASCII word at `pos`, empty where none begins, or where it runs on with other characters.
+constexpr std::string_view WordAt(std::string_view text, size_t pos) {
+    size_t end = pos;
+    while (IsNameByte(ByteAt(text, end))) ++end;
+    const bool runs_on = !IsAscii(ByteAt(text, end)) || ByteKind(ByteAt(text, end)) == EByteKind::kQuote;
+    return runs_on ? std::string_view() : text.substr(pos, end - pos);
+}
+
+// A row inside brackets that begins like this at `pos` proves that the brackets should have been closed
+// before.
+constexpr bool StartsStatement(std::string_view text, size_t pos) {
+    const char first = ByteAt(text, pos);
+    if (first < 'a' || first > 'w') return false;
+    const std::string_view word = WordAt(text, pos);
+    if (keywords::IsOneOf(word, keywords::kStatementOnly)) return true;
+    if (word != "async" && word != "nonlocal") return false;
+    // Names in old versions, so the word behind them decides.
+    const std::string_view next = WordAt(text, SkipBlanks(text, pos + word.size()));
+    if (word == "async") return next == "def" || next == "with";
+    return !next.empty() && !IsDigit(next[0]) && !keywords::IsOneOf(next, keywords::kBinary);
+}
+
+}  // namespace codeloom

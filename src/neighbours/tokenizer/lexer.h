@@ -1,0 +1,47 @@
+// One token at a place of the text.
+#pragma once
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+#include "neighbours/tokenizer/string_lexer.h"
+
+namespace codeloom {
+
+struct CLexedToken {
+    size_t end = 0;
+    int16_t type = 0;
+    bool may_span_rows = false;
+};
+
+class CLexer {
+  public:
+    explicit CLexer(std::string_view text);
+
+    std::string_view Text() const { return _fText; }
+
+    // The token at `pos`, which is in the text and neither a blank nor a row's end. Every character makes a
+    // token: what isn't part of the language is an error token of one character, a string without closing
+    // quotes one up to the end of its row, or of the text for triple quotes. `depth` counts the f-strings
+    // around it.
+    CLexedToken Lex(size_t pos, int depth = 0);
+
+  private:
+    CLexedToken _LexNameOrString(size_t pos, int depth);
+    CLexedToken _LexString(size_t pos, const CStringStart& start, int depth);
+    CStringEnd _FindFieldStringEnd(size_t pos, const CStringStart& start, int depth);
+    CStringEnd _FindPlainStringEnd(size_t pos, const CStringStart& start);
+    CLexedToken _LexBackslash(size_t pos) const;
+    CLexedToken _LexOperator(size_t pos) const;
+
+    std::string_view _fText;
+    // Bytes that may still be scanned in vain for the end of broken f-strings: a share of the text's length,
+    // so that hostile text takes linear time too. Sound text wastes nothing.
+    size_t _fWasteLeft;
+    // From where on no triple quotes are left, for each of the two quotes.
+    std::array<size_t, 2> _fNoTripleFrom;
+};
+
+}  // namespace codeloom

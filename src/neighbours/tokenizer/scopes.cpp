@@ -1,0 +1,48 @@
+#include "neighbours/tokenizer/scopes.h"
+
+#include "neighbours/tokenizer/tokenizer.h"
+
+namespace codeloom {
+
+namespace {
+
+bool IsAsyncHeader(const CRawLogical& logical) {
+    for (const CRawToken& token : logical.tokens) {
+        if (token.text == "async") return true;
+        if (token.text == "def") return false;
+    }
+    return false;
+}
+
+}  // namespace
+
+void CScopes::Visit(CRawLogical& logical, int32_t indent, bool is_mid_row) {
+    logical.first_in_def = !is_mid_row && indent > _fAwaitingDef;
+    if (logical.type == ELogicalType::kComment) {
+        logical.in_async_def = _IsInAsync(indent);
+        return;
+    }
+    _fAwaitingDef = kNoDef;
+    if (!is_mid_row) {
+        while (!_fScopes.empty() && _fScopes.back().indent >= indent) _fScopes.pop_back();
+    }
+    logical.in_async_def = !_fScopes.empty() && _fScopes.back().is_async;
+    if (logical.type == ELogicalType::kFunctionDef) {
+        const bool is_async = IsAsyncHeader(logical);
+        logical.in_async_def |= is_async;
+        _fScopes.push_back({indent, is_async});
+        _fAwaitingDef = indent;
+    } else if (logical.type == ELogicalType::kClassDef) {
+        _fScopes.push_back({indent, false});
+    }
+}
+
+// A comment ends no scope, since its indentation is free.
+bool CScopes::_IsInAsync(int32_t indent) const {
+    for (auto scope = _fScopes.rbegin(); scope != _fScopes.rend(); ++scope) {
+        if (scope->indent < indent) return scope->is_async;
+    }
+    return false;
+}
+
+}  // namespace codeloom

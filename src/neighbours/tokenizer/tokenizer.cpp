@@ -1,0 +1,166 @@
+#include "neighbours/tokenizer/tokenizer.h"
+
+#include "neighbours/token_type.h"
+#include "neighbours/tokenizer/brackets.h"
+#include "neighbours/tokenizer/keywords.h"
+#include "neighbours/tokenizer/logical_type.h"
+#include "neighbours/tokenizer/recovery.h"
+
+namespace codeloom {
+
+namespace {
+
+constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+
+// The last token that is neither a comment nor a backslash; none when there is none.
+const CRawToken* FindLastSignificant(const std::vector<CRawToken>& tokens) {
+    for (auto token = tokens.rbegin(); token != tokens.rend(); ++token) {
+        if (token->type != kTokenId_COMMENT && token->type != kTokenId_BACKSLASH) return &*token;
+    }
+    return nullptr;
+}
+
+bool EndsInBackslash(const std::vector<CRawToken>& tokens) {
+    return !tokens.empty() && tokens.back().type == kTokenId_BACKSLASH;
+}
+
+}  // namespace
+
+CTokenizer::CTokenizer(std::string_view text) : _fLexer(text) {
+    if (text.starts_with(kByteOrderMark)) _fPlace.pos = _fPlace.row_start = kByteOrderMark.size();
+}
+
+bool CTokenizer::NextLogical(CRawLogical& logical) {
+    logical.tokens.clear();
+    logical.embedded.clear();
+    const bool is_mid_row = _fMidRow;
+    if (!_SkipToLogical()) return false;
+
+    logical.first_row = _fPlace.row;
+    logical.origin = {_fPlace.row, 0};
+    if (_fLexer.Text()[_fPlace.pos] == '#') {
+        _CollectComment(logical);
+    } else {
+        _CollectStatement(logical);
+    }
+    _fScopes.Visit(logical, _fIndent, is_mid_row);
+    return true;
+}
+
+bool CTokenizer::_SkipToLogical() {
+    if (_fMidRow) {
+        _fMidRow = false;
+        return true;
+    }
+    if (!SkipBlankRows(_fLexer.Text(), _fPlace)) return false;
+    _fIndent = _fPlace.indent;
+    return true;
+}
+
+void CTokenizer::_CollectComment(CRawLogical& logical) {
+    _AddToken(logical);
+    SkipRowEnd(_fLexer.Text(), _fPlace);
+    logical.type = ELogicalType::kComment;
+}
+
+void CTokenizer::_CollectStatement(CRawLogical& logical) {
+    const CPlace start = _fPlace;
+    _fIsCompound = false;
+    if (_CollectTokens(logical, CReach()) == EEnd::kUnclosed) {
+        _RememberUnclosed();
+        _fPlace = start;
+        logical.tokens.clear();
+        _CollectTokens(logical, {FindRecoveredEnd(_fLexer, start), true});
+    }
+    logical.type = FindLogicalType(logical.tokens);
+}
+
+// Adds tokens up to the end of the logical line, and moves behind it.
+CTokenizer::EEnd CTokenizer::_CollectTokens(CRawLogical& logical, const CReach& reach) {
+    const std::string_view text = _fLexer.Text();
+    _fBrackets.clear();
+    bool at_row_start = false;
+    for (;;) {
+        _fPlace.pos = SkipBlanks(text, _fPlace.pos);
+        if (_fPlace.pos >= text.size()) {
+            return _fBrackets.empty() || reach.ends_there ? EEnd::kSound : EEnd::kUnclosed;
+        }
+        const char c = text[_fPlace.pos];
+        if (IsRowEnd(c)) {
+            SkipRowEnd(text, _fPlace);
+            const bool may_end = _fPlace.pos >= reach.until;
+            if (may_end && (_fBrackets.empty() || reach.ends_there)) return EEnd::kSound;
+            SkipBlankRows(text, _fPlace);
+            at_row_start = true;
+            continue;
+        }
+        if (at_row_start && !reach.ends_there && !_fBrackets.empty() && _ProvesUnclosed(logical)) {
+            return EEnd::kUnclosed;
+        }
+        at_row_start = false;
+        if (c == ';' && _IsSeparator(logical) && (_fBrackets.empty() || reach.ends_there)) {
+            _EndAtSeparator(logical);
+            return EEnd::kSound;
+        }
+        if (!reach.ends_there && !_TrackBracket()) return EEnd::kUnclosed;
+        _AddToken(logical);
+        if (EndsInBackslash(logical.tokens)) SkipRowEnd(text, _fPlace);
+    }
+}
+
+void CTokenizer::_AddToken(CRawLogical& logical) {
+    const std::string_view text = _fLexer.Text();
+    const size_t pos = _fPlace.pos;
+    const CLexedToken token = _fLexer.Lex(pos);
+    logical.tokens.push_back(
+        {text.substr(pos, token.end - pos), {_fPlace.row - logical.first_row, _fPlace.Column()}, token.type});
+    if (token.may_span_rows) SkipRows(text, token.end, _fPlace);
+    _fPlace.pos = token.end;
+}
+
+// Takes account of the bracket at the place, if there is one; false when it proves that the brackets aren't
+// closed as they should be.
+bool CTokenizer::_TrackBracket() {
+    const char c = _fLexer.Text()[_fPlace.pos];
+    if (ByteKind(c) == EByteKind::kOpener) {
+        _fBrackets.push_back({_fPlace.pos, CloserOf(c)});
+        return !_IsKnownUnclosed(_fPlace.pos);
+    }
+    if (ByteKind(c) == EByteKind::kCloser && !_fBrackets.empty()) {
+        if (_fBrackets.back().closer != c) return false;
+        _fBrackets.pop_back();
+    }
+    return true;
+}
+
+// The ";" at the place parts two logical lines. One that parts nothing is a token, and a fault.
+bool CTokenizer::_IsSeparator(const CRawLogical& logical) {
+    if (_fIsCompound || FindLastSignificant(logical.tokens) == nullptr) return false;
+    _fIsCompound = IsCompound(logical.tokens);
+    return !_fIsCompound;
+}
+
+void CTokenizer::_EndAtSeparator(CRawLogical& logical) {
+    const std::string_view text = _fLexer.Text();
+    _fPlace.pos = SkipBlanks(text, _fPlace.pos + 1);
+    if (ByteAt(text, _fPlace.pos) == '#') _AddToken(logical);
+    _fMidRow = _fPlace.pos < text.size() && !SkipRowEnd(text, _fPlace);
+}
+
+// The row that begins at the place can't lie inside the brackets that are open.
+bool CTokenizer::_ProvesUnclosed(const CRawLogical&) const {
+    return StartsStatement(_fLexer.Text(), _fPlace.pos);
+}
+
+void CTokenizer::_RememberUnclosed() {
+    _fUnclosed.clear();
+    _fUnclosed_i = 0;
+    for (const COpenBracket& bracket : _fBrackets) _fUnclosed.push_back(bracket.pos);
+}
+
+bool CTokenizer::_IsKnownUnclosed(size_t pos) {
+    while (_fUnclosed_i < _fUnclosed.size() && _fUnclosed[_fUnclosed_i] < pos) ++_fUnclosed_i;
+    return _fUnclosed_i < _fUnclosed.size() && _fUnclosed[_fUnclosed_i] == pos;
+}
+
+}  // namespace codeloom
