@@ -1,5 +1,6 @@
 #include "neighbours/match_case.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 
@@ -74,18 +75,20 @@ bool SkipToHeaderEnd(CTokenReader& reader, std::string_view token) {
 
 }  // namespace
 
-ELogicalType FindMatchOrCaseType(std::span<const std::string_view> tokens) {
-    CTokenReader reader(tokens);
+ELogicalType FindMatchOrCaseType(std::span<const std::string_view> tokens, size_t first, size_t end) {
+    end = std::min(end, tokens.size());
+    if (first >= end) return ELogicalType::kUnknown;
+    CTokenReader reader(tokens.subspan(first, end - first));
     const std::string_view keyword = reader.Next();
     const bool is_match = keyword == "match";
     if (!is_match && keyword != "case") return ELogicalType::kUnknown;
 
-    const std::string_view first = reader.Next();
-    CTokenReader behind_first = reader;
-    if (!CanBeginSubject(first, behind_first.Next())) return ELogicalType::kUnknown;
-    if (!SkipToHeaderEnd(reader, first)) return ELogicalType::kUnknown;
+    const std::string_view subject = reader.Next();
+    CTokenReader behind_subject = reader;
+    if (!CanBeginSubject(subject, behind_subject.Next())) return ELogicalType::kUnknown;
+    if (!SkipToHeaderEnd(reader, subject)) return ELogicalType::kUnknown;
 
-    const bool may_be_target = first[0] == '(' || first[0] == '[';
+    const bool may_be_target = subject[0] == '(' || subject[0] == '[';
     const bool has_body = !reader.Next().empty();
     if (is_match && may_be_target && has_body) return ELogicalType::kUnknown;
     return is_match ? ELogicalType::kMatch : ELogicalType::kCase;

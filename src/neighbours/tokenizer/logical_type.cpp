@@ -64,7 +64,7 @@ ELogicalType TypeOfMatchOrCase(const std::vector<CRawToken>& tokens) {
     std::vector<std::string_view> texts;
     texts.reserve(tokens.size());
     for (const CRawToken& token : tokens) texts.push_back(token.text);
-    return FindMatchOrCaseType(texts);
+    return FindMatchOrCaseType(texts, 0, texts.size());
 }
 
 // `async` before `def`, `for` or `with`.
