@@ -1,3 +1,6 @@
+#include <string>
+#include <vector>
+
 #include "host/collections.h"
 #include "neighbours/bind.h"
 #include "neighbours/logicalline/logical_types_host.h"

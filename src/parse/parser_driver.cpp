@@ -159,10 +159,6 @@ Py_ssize_t CPGenParserImpl::_NonNestedFindTokenIndex(nb::object target, nb::tupl
     return -1;
 }
 
-CNodeRef CPGenParserImpl::_ParseSpecialCases(nb::tuple, bool, CPositions) {
-    return CNodeRef();
-}
-
 void CPGenParserImpl::_RaiseParseError(nb::handle tok_i) {
     const nb::object error = kParseError("syntax error", nb::none(), nb::none(), tok_i);
     PyErr_SetObject(error.type().ptr(), error.ptr());
