@@ -60,7 +60,7 @@ CLexedToken CLexer::_LexString(size_t pos, const CStringStart& start, int depth)
     if (!found.is_closed && depth > 0 && start.has_fields) return {found.end, kTokenId_ERRORTOKEN, true};
     if (!found.is_closed) found = _FindPlainStringEnd(content, start);
     const int16_t type = found.is_closed ? kTokenId_STRING : kTokenId_ERRORTOKEN;
-    return {found.end, type, found.may_span_rows};
+    return {found.end, type, found.may_span_rows, start.has_fields};
 }
 
 // Inside another f-string a failure is no waste of its own: the outermost string fails with it and counts it.

@@ -14,6 +14,7 @@ struct CLexedToken {
     size_t end = 0;
     int16_t type = 0;
     bool may_span_rows = false;
+    bool has_fields = false;  // an f-string or a t-string
 };
 
 class CLexer {

@@ -98,12 +98,6 @@ ELogicalType TypeOfSoftKeyword(const std::vector<CRawToken>& tokens, size_t word
     return is_named ? ELogicalType::kTypeStatement : ELogicalType::kUnknown;
 }
 
-bool IsAssignmentOperator(int16_t type) {
-    return type == kTokenId_EQUAL || type == kTokenId_COLON || type == kTokenId_ATEQUAL ||
-           (type >= kTokenId_PLUSEQUAL && type <= kTokenId_DOUBLESTAREQUAL) ||
-           type == kTokenId_DOUBLESLASHEQUAL;
-}
-
 // An assignment sign outside brackets that isn't a lambda's.
 bool HasAssignment(const std::vector<CRawToken>& tokens) {
     int depth = 0;
@@ -114,7 +108,7 @@ bool HasAssignment(const std::vector<CRawToken>& tokens) {
         if (kind == EByteKind::kCloser) --depth;
         if (depth != 0) continue;
         if (kind == EByteKind::kNameStart && token.text == "lambda") ++open_lambdas;
-        if (kind != EByteKind::kOperator || !IsAssignmentOperator(token.type) || token.text == "->") continue;
+        if (kind != EByteKind::kOperator || !IsAssignmentOperator(token)) continue;
         if (open_lambdas == 0) return true;
         if (token.type == kTokenId_COLON) --open_lambdas;
     }
@@ -129,6 +123,20 @@ bool IsStringAlone(const std::vector<CRawToken>& tokens) {
 }
 
 }  // namespace
+
+const CRawToken* FindFirstSignificant(const std::vector<CRawToken>& tokens) {
+    const size_t first_i = FindSignificant(tokens, 0);
+    return first_i == tokens.size() ? nullptr : &tokens[first_i];
+}
+
+// "->" has the number of "@=".
+bool IsAssignmentOperator(const CRawToken& token) {
+    const int16_t type = token.type;
+    return type == kTokenId_EQUAL || type == kTokenId_COLON ||
+           (type == kTokenId_ATEQUAL && token.text != "->") ||
+           (type >= kTokenId_PLUSEQUAL && type <= kTokenId_DOUBLESTAREQUAL) ||
+           type == kTokenId_DOUBLESLASHEQUAL;
+}
 
 ELogicalType FindLogicalType(const std::vector<CRawToken>& tokens) {
     const size_t first_i = FindSignificant(tokens, 0);

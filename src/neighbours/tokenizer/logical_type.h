@@ -4,9 +4,15 @@
 #include <vector>
 
 #include "neighbours/logical_types.h"
-#include "neighbours/tokenizer/tokenizer.h"
+#include "neighbours/tokenizer/raw_logical.h"
 
 namespace codeloom {
+
+// The first token that is neither a comment nor a backslash; none when there is none.
+const CRawToken* FindFirstSignificant(const std::vector<CRawToken>& tokens);
+
+// `=`, an augmented assignment, or the ":" of an annotation.
+bool IsAssignmentOperator(const CRawToken& token);
 
 ELogicalType FindLogicalType(const std::vector<CRawToken>& tokens);
 

@@ -1,6 +1,6 @@
 #include "neighbours/tokenizer/scopes.h"
 
-#include "neighbours/tokenizer/tokenizer.h"
+#include "neighbours/tokenizer/raw_logical.h"
 
 namespace codeloom {
 

@@ -4,11 +4,9 @@
 #include <cstdint>
 #include <vector>
 
-#include "neighbours/logical_types.h"
+#include "neighbours/tokenizer/raw_logical.h"
 
 namespace codeloom {
-
-struct CRawLogical;
 
 class CScopes {
   public:

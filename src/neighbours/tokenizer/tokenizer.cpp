@@ -26,13 +26,14 @@ bool EndsInBackslash(const std::vector<CRawToken>& tokens) {
 
 }  // namespace
 
-CTokenizer::CTokenizer(std::string_view text) : _fLexer(text) {
+CTokenizer::CTokenizer(std::string_view text) : _fLexer(text), _fEmbedded(text) {
     if (text.starts_with(kByteOrderMark)) _fPlace.pos = _fPlace.row_start = kByteOrderMark.size();
 }
 
 bool CTokenizer::NextLogical(CRawLogical& logical) {
     logical.tokens.clear();
-    logical.embedded.clear();
+    _fEmbedded.Clear(logical);
+    _fEmbedding = {};
     const bool is_mid_row = _fMidRow;
     if (!_SkipToLogical()) return false;
 
@@ -44,6 +45,7 @@ bool CTokenizer::NextLogical(CRawLogical& logical) {
         _CollectStatement(logical);
     }
     _fScopes.Visit(logical, _fIndent, is_mid_row);
+    _fEmbedded.Find(logical, _fEmbedding);
     return true;
 }
 
@@ -114,6 +116,9 @@ void CTokenizer::_AddToken(CRawLogical& logical) {
     const CLexedToken token = _fLexer.Lex(pos);
     logical.tokens.push_back(
         {text.substr(pos, token.end - pos), {_fPlace.row - logical.first_row, _fPlace.Column()}, token.type});
+    _fEmbedding.has_fields |= token.has_fields;
+    _fEmbedding.has_strings |= token.type == kTokenId_STRING;
+    _fEmbedding.has_comments |= token.type == kTokenId_COMMENT;
     if (token.may_span_rows) SkipRows(text, token.end, _fPlace);
     _fPlace.pos = token.end;
 }
