@@ -4,6 +4,7 @@
 #include "host/errors.h"
 #include "host/neighbour_call.h"
 #include "host/overrides.h"
+#include "host/text.h"
 
 namespace codeloom {
 
@@ -30,7 +31,7 @@ CPlace Unpack(nb::handle pair) {
 CPlace PlaceAtEnd(nb::handle logical) {
     const nb::object last_token = logical.attr("fToks")[-1];
     CPlace place = Unpack(logical.attr("fPositions")[-1]);
-    place.offset = place.offset + nb::int_(Utf8View(last_token).size());
+    place.offset = place.offset + nb::int_(CUtf8(last_token)->size());
     return place;
 }
 
@@ -66,9 +67,9 @@ nb::object CreateSyntaxError(nb::handle msg, nb::handle logical, nb::handle cont
 nb::object NextNonRemovedTokenInTuple(nb::handle toks, Py_ssize_t i) {
     while (++i < TupleSize(toks)) {
         const nb::handle tok = TupleItem(toks, i);
-        const std::string_view text = Utf8View(tok);
-        if (text.empty()) RaiseIndexError("string index out of range");
-        if (text[0] != '\\' && text[0] != '#') return nb::borrow(tok);
+        const CUtf8 text(tok);
+        if (text->empty()) RaiseIndexError("string index out of range");
+        if (text->front() != '\\' && text->front() != '#') return nb::borrow(tok);
     }
     return nb::none();
 }

@@ -26,7 +26,8 @@ class CRecursionScope {
     CRecursionScope& operator=(const CRecursionScope&) = delete;
 };
 
-// An exception on its way, as the host's object. A C++ exception becomes the host's as it would at the boundary.
+// An exception on its way, as the host's object. A C++ exception becomes the host's as it would at the
+// boundary.
 class CHostError {
   public:
     // Takes the C++ exception that is being handled; call it inside a catch block.

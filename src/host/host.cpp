@@ -202,6 +202,10 @@ std::string_view Utf8OfText(nb::handle text, std::string& storage) {
     return storage;
 }
 
+std::string_view CUtf8::_ViewOf(nb::handle text) {
+    return PyUnicode_Check(text.ptr()) ? Utf8OfText(text, _fStorage) : Utf8View(text);
+}
+
 // neighbour_call.h
 
 namespace {

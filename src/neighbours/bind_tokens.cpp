@@ -2,6 +2,7 @@
 #include <vector>
 
 #include "host/collections.h"
+#include "host/text.h"
 #include "neighbours/bind.h"
 #include "neighbours/logicalline/logical_types_host.h"
 #include "neighbours/match_case.h"
@@ -25,7 +26,7 @@ void BindTokenTypes(nb::module_& module) {
     for (const CTokenTypeName& type : kTokenTypeNames)
         module.attr((std::string("kTokenId_") + std::string(type.name)).c_str()) = static_cast<int>(type.number);
     module.def(
-        "GetTokenType", [](nb::object token, nb::handle) { return GetTokenType(Utf8View(token)); }, "token"_a,
+        "GetTokenType", [](nb::object token, nb::handle) { return GetTokenType(CUtf8(token)); }, "token"_a,
         "unused"_a.none() = nb::none(),
         "The token type, an integer, of a token text (text or byte string): 1 for a name, 54 for what is no token.");
     module.def("FindMatchOrCaseType", &HostFindMatchOrCaseType, "toks"_a, "first"_a, "end"_a,

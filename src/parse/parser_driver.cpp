@@ -139,19 +139,20 @@ Py_ssize_t CPGenParserImpl::_FindNextNonSkipIndex(nb::tuple toks, Py_ssize_t ind
     for (++index; index < count; ++index) {
         const nb::handle tok = TupleItem(toks, index);
         if (tok.is_none()) continue;
-        const std::string_view text = Utf8View(tok);
-        if (!text.empty() && text[0] != '#' && text[0] != '\\') break;
+        const CUtf8 text(tok);
+        if (!text->empty() && text->front() != '#' && text->front() != '\\') break;
     }
     return index < count ? index : count;
 }
 
 Py_ssize_t CPGenParserImpl::_NonNestedFindTokenIndex(nb::object target, nb::tuple toks, Py_ssize_t start,
                                                      Py_ssize_t end) {
-    const std::string_view target_text = Utf8View(target);
+    const CUtf8 target_text(target);
     int depth = 0;
     for (Py_ssize_t i = start; i < end; ++i) {
-        const std::string_view text = Utf8View(TupleItem(toks, i));
-        if (depth == 0 && text == target_text) return i;
+        const CUtf8 utf8(TupleItem(toks, i));
+        const std::string_view text = utf8;
+        if (depth == 0 && target_text == text) return i;
         if (text.size() != 1) continue;
         if (text[0] == '(' || text[0] == '[' || text[0] == '{') ++depth;
         if (text[0] == ')' || text[0] == ']' || text[0] == '}') --depth;
@@ -169,7 +170,7 @@ void CPGenParserImpl::_AddTokenList(nb::list toks, Py_ssize_t tok_i) {
     const nb::int_ context(tok_i);
     for (Py_ssize_t i = 0; i < ListSize(toks); ++i) {
         const nb::object tok = nb::borrow(ListItem(toks, i));
-        _fParser->addtoken(GetTokenType(Utf8View(tok)), tok, context);
+        _fParser->addtoken(GetTokenType(CUtf8(tok)), tok, context);
     }
 }
 

@@ -2,6 +2,7 @@
 // way are removed from a copy of the tuple, and the rest is parsed by the grammar; the indexes of all other
 // tokens stay.
 #include "host/errors.h"
+#include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/token_type.h"
 #include "parse/parser_driver.h"
@@ -13,11 +14,11 @@ namespace codeloom {
 namespace {
 
 bool IsToken(const nb::tuple& toks, Py_ssize_t i, std::string_view text) {
-    return i < TupleSize(toks) && Utf8View(TupleItem(toks, i)) == text;
+    return i < TupleSize(toks) && CUtf8(TupleItem(toks, i)) == text;
 }
 
 bool IsName(const nb::tuple& toks, Py_ssize_t i) {
-    return GetTokenType(Utf8View(TupleItem(toks, i))) == kTokenId_NAME;
+    return GetTokenType(CUtf8(TupleItem(toks, i))) == kTokenId_NAME;
 }
 
 bool IsParseError(const nb::python_error& error) {
@@ -29,7 +30,7 @@ bool IsParseError(const nb::python_error& error) {
 CNodeRef CPGenParserImpl::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
     const Py_ssize_t i = _FindNextNonSkipIndex(toks, -1);
     if (i >= TupleSize(toks)) return CNodeRef();
-    const std::string_view text = Utf8View(TupleItem(toks, i));
+    const CUtf8 text(TupleItem(toks, i));
     if (text == "with") return _ParseSpecialCaseParenthesizedWith(toks, in_async_def, positions, i);
     if (text == "except") return _ParseSpecialCaseExceptStar(toks, in_async_def, positions, i);
     if (text == "type" || text == "def" || text == "class")

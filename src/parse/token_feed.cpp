@@ -29,7 +29,7 @@ void CTokenFeed::FeedAll() {
 void CTokenFeed::_FeedToken(Py_ssize_t i) {
     nb::handle tok = TupleItem(_fToks, i);
     if (tok.is_none()) return;
-    int type = GetTokenType(Utf8View(tok));
+    int type = GetTokenType(CUtf8(tok));
     if (!_fFirstToken.is_valid()) type = _BeginStatement(tok, type, i);
     if (type == kTokenId_NAME && _fAsyncIsKeyword) type = _AsyncTokenType(tok, type);
     if (_IsSkipped(type, i)) return;
@@ -44,7 +44,7 @@ int CTokenFeed::_BeginStatement(nb::handle& tok, int type, Py_ssize_t i) {
     if (type == kTokenId_AT) _fIsDecorator = true;
     if (type != kTokenId_NAME) return type;
     static const CHostText kIf("if");
-    const std::string_view text = Utf8View(tok);
+    const CUtf8 text(tok);
     if (text == "elif") {
         tok = kIf;
     } else if (text == "except" || text == "finally") {
@@ -53,13 +53,13 @@ int CTokenFeed::_BeginStatement(nb::handle& tok, int type, Py_ssize_t i) {
         _FeedInventedHead({"if", "0", ":", "pass", "\n"}, i);
     } else if (text == "async" && !_fAsyncIsKeyword) {
         const nb::object next = NextNonRemovedTokenInTuple(_fToks, i);
-        if (!next.is_none() && Utf8View(next) == "def") return kTokenId_ASYNC;
+        if (!next.is_none() && CUtf8(next) == "def") return kTokenId_ASYNC;
     }
     return type;
 }
 
 int CTokenFeed::_AsyncTokenType(nb::handle tok, int type) const {
-    const std::string_view text = Utf8View(tok);
+    const CUtf8 text(tok);
     if (text == "async") return kTokenId_ASYNC;
     if (text == "await") return kTokenId_AWAIT;
     return type;
@@ -80,7 +80,7 @@ void CTokenFeed::_FeedThreeDots(nb::handle tok, Py_ssize_t i) {
 
 void CTokenFeed::_CompleteStatement() {
     const bool lacks_body = _fLastFedType == kTokenId_COLON;
-    if (_fFirstToken.is_valid() && Utf8View(_fFirstToken) == "try") {
+    if (_fFirstToken.is_valid() && CUtf8(_fFirstToken) == "try") {
         if (lacks_body) {
             _FeedInventedTail({"pass", "\n", "finally", ":", "pass"});
         } else {

@@ -1,6 +1,7 @@
 #include "neighbours/logicalline/logical_line.h"
 
 #include "host/errors.h"
+#include "host/text.h"
 #include "neighbours/token_type.h"
 
 namespace codeloom {
@@ -10,7 +11,7 @@ namespace {
 nb::object TypesOf(nb::handle toks) {
     return MakeTuple(TupleSize(toks), [&](Py_ssize_t i) -> nb::object {
         const nb::handle tok = TupleItem(toks, i);
-        return nb::int_(tok.is_none() ? -1 : GetTokenType(Utf8View(tok)));
+        return nb::int_(tok.is_none() ? -1 : GetTokenType(CUtf8(tok)));
     });
 }
 
