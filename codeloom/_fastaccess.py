@@ -1,12 +1,71 @@
-"""Token classification: `GetTokenType` and the numbers that it gives, `kTokenId_...`."""
+"""Fast access to bytes, numbers, the clock and tokens.
+
+Among them are the classification of tokens, `GetTokenType` with its numbers `kTokenId_...`, and
+`CNonNestedSearch`, which skips the strings and brackets of Python source.
+"""
+
+import logging
+import time
 
 from codeloom import _neighbours
-from codeloom._neighbours import GetTokenType
+from codeloom._neighbours import (
+    CNonNestedSearch,
+    CStringTokenizer,
+    DoubleValueForPyIntBits,
+    DoubleValueForULongLongBits,
+    GetNowTime,
+    GetTokenType,
+    IsAlnum,
+    IsDigit,
+    LocationsEqual,
+    OutOfTime,
+    StrInStr,
+    ULongLongValueForDoubleBits,
+    _FindStringEndNonNested,
+)
 
-__all__ = ["GetTokenType"]
+__all__ = [
+    "CLogger",
+    "CNonNestedSearch",
+    "CStringTokenizer",
+    "DoubleValueForPyIntBits",
+    "DoubleValueForULongLongBits",
+    "GetNowTime",
+    "GetTokenType",
+    "IsAlnum",
+    "IsDigit",
+    "LocationsEqual",
+    "OutOfTime",
+    "StrInStr",
+    "ULongLongValueForDoubleBits",
+    "_FindStringEndNonNested",
+]
 
 _TOKEN_IDS = {
     name: value for name, value in vars(_neighbours).items() if name.startswith("kTokenId_")
 }
 globals().update(_TOKEN_IDS)
 __all__ += _TOKEN_IDS
+
+__TimeFunc = time.time
+"""What GetNowTime calls; a host or a test may put another clock here."""
+
+
+class CLogger:
+    """Writes to the logger "codeloom", in three levels by number: the higher, the more detail."""
+
+    def Log1(self, s: str | None, args: tuple[object, ...] | None = None) -> None:
+        """Log a warning: `s` with its `%` places filled from `args`; nothing for None."""
+        self._Log(logging.WARNING, s, args)
+
+    def Log2(self, s: str | None, args: tuple[object, ...] | None = None) -> None:
+        """Log what goes on, likewise."""
+        self._Log(logging.INFO, s, args)
+
+    def Log3(self, s: str | None, args: tuple[object, ...] | None = None) -> None:
+        """Log a detail for those who look for a fault, likewise."""
+        self._Log(logging.DEBUG, s, args)
+
+    def _Log(self, level: int, s: str | None, args: tuple[object, ...] | None) -> None:
+        if s is not None:
+            logging.getLogger("codeloom").log(level, s, *(args or ()))

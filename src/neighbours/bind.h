@@ -10,5 +10,8 @@ namespace codeloom {
 void BindTokenTypes(nb::module_& module);
 void BindLogicals(nb::module_& module);
 void BindOptpgen(nb::module_& module);
+void BindStrutils(nb::module_& module);
+void BindFastAccess(nb::module_& module);
+void BindSymbolInfo(nb::module_& module);
 
 }  // namespace codeloom

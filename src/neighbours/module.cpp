@@ -6,4 +6,6 @@ NB_MODULE(_neighbours, module) {
     codeloom::BindTokenTypes(module);
     codeloom::BindLogicals(module);
     codeloom::BindOptpgen(module);
+    codeloom::BindStrutils(module);
+    codeloom::BindFastAccess(module);
 }
