@@ -15,7 +15,6 @@ constexpr CNeighbourFunction kGetTarnFilename("config", "GetTarnFilename");
 constexpr CNeighbourFunction kParserGenerator("optpgen", "ParserGenerator");
 constexpr CNeighbourFunction kCreateParser("optpgen", "CreateParser");
 constexpr CNeighbourFunction kParseError("optpgen", "ParseError");
-constexpr CNeighbourFunction kIsAbs("os", "path.isabs");
 
 // The names of the token types, from the constants of the token classifier.
 nb::dict TokenNames() {

@@ -30,7 +30,7 @@ nb::object CTokenTexts::Get(std::string_view token, bool is_name) {
     if (token.size() > kMaxKeptLength) return TextFromUtf8(token);
     const uint64_t hash = HashOf(token);
     CSlot& slot = _fSlots[hash % kSlotCount];
-    if (slot.hash == hash && slot.text.is_valid() && Utf8View(slot.text) == token) return slot.text;
+    if (slot.hash == hash && slot.text.is_valid() && CUtf8(slot.text) == token) return slot.text;
     slot.hash = hash;
     slot.text = is_name ? InternedText(token) : TextFromUtf8(token);
     return slot.text;
