@@ -1,16 +1,8 @@
 #include "tree/node.h"
 
+#include "host/errors.h"
+
 namespace codeloom {
-
-namespace {
-
-// Past the end is no child; below the start is the host's IndexError.
-CNode* ChildOrNull(const nb::object& children, Py_ssize_t i) {
-    if (children.is_none() || i >= ListSize(children)) return nullptr;
-    return Instance<CNode>(ListItem(children, i));
-}
-
-}  // namespace
 
 void CNodeClassInfo::Init(nb::object cls, int nodetype, nb::object name) {
     if (!name.is_none() && !IsText(name)) RaiseWrongType("str", name);
@@ -38,12 +30,11 @@ nb::object CNode::GetChildText(Py_ssize_t child_i) {
 }
 
 nb::object CNode::_GetChildText(Py_ssize_t i) {
-    const CNode* const child = ChildOrNull(fChildren, i);
-    return child == nullptr ? nb::none() : child->fText;
+    return ChildText(i);
 }
 
 CNodeRef CNode::GetChild(Py_ssize_t child_i) {
-    return CNodeRef(ChildOrNull(fChildren, child_i));
+    return _HasItem(child_i) ? CNodeRef(&ChildAt(child_i)) : CNodeRef();
 }
 
 nb::object CNode::GetStateName() {
@@ -51,11 +42,22 @@ nb::object CNode::GetStateName() {
 }
 
 bool CNode::_DoesChildTextMatch(nb::str text) {
-    const nb::object children = fChildren;
-    if (children.is_none()) return false;
-    for (Py_ssize_t i = 0; i < ListSize(children); ++i)
-        if (Instance<CNode>(ListItem(children, i))->fText.equal(text)) return true;
+    for (Py_ssize_t i = 0; _HasItem(i); ++i) {
+        const nb::object child_text = ChildAt(i).fText;
+        if (IsText(child_text) && child_text.equal(text)) return true;
+    }
     return false;
+}
+
+bool CNode::HasToken(std::string_view token) const {
+    for (Py_ssize_t i = 0; _HasItem(i); ++i)
+        if (ChildAt(i).HasText(token)) return true;
+    return false;
+}
+
+nb::handle CNode::_ItemAt(Py_ssize_t i) const {
+    if (fChildren.is_none()) RaiseHost(PyExc_TypeError, "'NoneType' object is not subscriptable");
+    return ListItem(fChildren, i);
 }
 
 }  // namespace codeloom

@@ -5,10 +5,13 @@
 //   start  at CNode here, CNodeFactory in node_factory.h, the classes in node_classes.h
 #pragma once
 
+#include <string_view>
+
 #include <nanobind/nanobind.h>
 
 #include "host/binding.h"
 #include "host/collections.h"
+#include "host/text_match.h"
 
 namespace codeloom {
 
@@ -58,6 +61,37 @@ class CNode : public CHosted {
     virtual nb::object GetStateName();
     virtual bool _DoesChildTextMatch(nb::str text);
 
+    // Reading by position, for native code. A borrowed child belongs to the tree: whoever runs host code
+    // while holding one holds a CNodeRef.
+
+    // The child at `i`, borrowed. TypeError for a leaf, IndexError outside the list.
+    CNode& ChildAt(Py_ssize_t i) const { return *Instance<CNode>(_ItemAt(i)); }
+
+    // The same as a T; TypeError when it is of another class.
+    template <class T>
+    CRef<T> ChildAs(Py_ssize_t i) const {
+        return CRef<T>::FromHost(_ItemAt(i));
+    }
+
+    // The child at `i`, borrowed, when it is a T; null when it isn't, and past the end.
+    template <class T>
+    T* TryChild(Py_ssize_t i) const {
+        return _HasItem(i) ? TryInstance<T>(ListItem(fChildren, i)) : nullptr;
+    }
+
+    // The text of the child at `i`; none past the end, and for a child without text.
+    nb::object ChildText(Py_ssize_t i) const { return _HasItem(i) ? ChildAt(i).fText : nb::none(); }
+
+    // True when the child at `i` has the text `token`; false past the end.
+    bool IsToken(Py_ssize_t i, std::string_view token) const {
+        return _HasItem(i) && ChildAt(i).HasText(token);
+    }
+
+    bool HasText(std::string_view text) const { return TextIs(fText, text); }
+
+    // True when a direct child has the text `token`.
+    bool HasToken(std::string_view token) const;
+
     template <class Visitor>
     void References(Visitor&& visit) {
         visit(fChildren);
@@ -72,6 +106,10 @@ class CNode : public CHosted {
     nb::object fContext = nb::none();   // by convention the index of the node's (first) token
     CRef<CNodeClassInfo> fClsInfo;      // the record that made the node
     CNodeRef fNextFree;                 // link of the free list; stale while the node is in use
+
+  private:
+    bool _HasItem(Py_ssize_t i) const { return !fChildren.is_none() && i < ListSize(fChildren); }
+    nb::handle _ItemAt(Py_ssize_t i) const;
 };
 
 template <class Class>
