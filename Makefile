@@ -1,6 +1,6 @@
 # make run     set up what is missing, build, and check the examples and the interpreter's own library
 # make test    set up what is missing, build, and run all tests
-# The rest: lint, format, asan, leaks, fuzz, bench, clean.
+# The rest: lint, tidy, format, asan, leaks, fuzz, bench, clean.
 
 PYTHON ?= python3.11
 VENV   := .venv
@@ -11,7 +11,7 @@ SOURCES   := $(shell find src resources -type f) CMakeLists.txt pyproject.toml
 CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
 STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
 
-.PHONY: run test lint format asan asan-short leaks fuzz bench build clean
+.PHONY: run test lint tidy format asan asan-short leaks fuzz bench build clean
 
 build: $(STAMP)
 
@@ -39,6 +39,10 @@ lint: build
 	$(BIN)/ruff format --check codeloom tests benchmarks tools
 	$(BIN)/ruff check codeloom tests benchmarks tools
 	$(BIN)/mypy
+
+# Slow, and needs a clang-tidy on the PATH.
+tidy: build
+	clang-tidy --quiet -p build $(filter %.cpp,$(CXX_FILES))
 
 format: build
 	$(BIN)/clang-format -i $(CXX_FILES)

@@ -51,7 +51,7 @@ struct CTraverseReferences {
     }
     template <class T>
     void operator()(const CRef<T>& reference) {
-        if (reference) (*this)(reference.get()->Self());
+        if (reference) (*this)(reference->Self());
     }
 };
 

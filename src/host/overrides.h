@@ -79,7 +79,7 @@ struct TOperationTraits<Result_ (Owner::*)(Arguments...)> {
 
     // A function object for the binding, with `Caller` as its body.
     template <class Class, class Caller>
-    struct Bound {
+    struct CBound {
         Result operator()(Class& self, Arguments... arguments) const {
             return Caller{}(self, std::forward<Arguments>(arguments)...);
         }
@@ -134,7 +134,7 @@ struct TOperationLine {};
             return self.Class::Name(std::forward<decltype(arguments)>(arguments)...);        \
         };                                                                                   \
         visit(#Name, static_cast<typename Traits::DeclaringClass*>(nullptr),                 \
-              typename Traits::template Bound<Class, std::remove_const_t<decltype(call)>>{}, \
+              typename Traits::template CBound<Class, std::remove_const_t<decltype(call)>>{}, \
               doc __VA_OPT__(, ) __VA_ARGS__);                                               \
     }
 
