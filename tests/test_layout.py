@@ -1,0 +1,48 @@
+"""The folders are the phases: includes go only down the road of a source file."""
+
+import re
+from pathlib import Path
+
+SOURCES = Path(__file__).parent.parent / "src"
+
+# Each folder may include those of its own step and of the steps before it.
+STEPS = [
+    ["host"],
+    ["neighbours", "strutils", "_fastaccess", "symbolinfo"],
+    ["tree"],
+    ["parse"],
+    ["walker"],
+    ["hints"],
+    ["analysis"],
+]
+STEP_OF = {folder: step for step, folders in enumerate(STEPS) for folder in folders}
+
+# Headers that depend on nothing above the logical line, for everybody.
+FOR_ALL = {"analysis/syntax_error.h", "analysis/pgen_analyzer.h"}
+
+
+def Includes(path):
+    return re.findall(r'^#include "([^"]+)"', path.read_text(), re.MULTILINE)
+
+
+def test_includes_go_down_the_road():
+    wrong = []
+    for path in sorted(SOURCES.rglob("*.[hc]*")):
+        folder = path.relative_to(SOURCES).parts[0]
+        for included in Includes(path):
+            other = included.split("/")[0]
+            if included not in FOR_ALL and STEP_OF[other] > STEP_OF[folder]:
+                wrong.append(f"{path.relative_to(SOURCES)} includes {included}")
+    assert not wrong
+
+
+def test_what_everybody_may_include_depends_on_little():
+    for header in FOR_ALL:
+        for included in Includes(SOURCES / header):
+            assert STEP_OF[included.split("/")[0]] <= STEP_OF["neighbours"], (header, included)
+
+
+def test_references_are_counted_in_the_host_layer_only():
+    for path in SOURCES.rglob("*.[hc]*"):
+        if path.relative_to(SOURCES).parts[0] != "host":
+            assert not re.search(r"\bPy_(X?INCREF|X?DECREF|CLEAR)\b|\.(inc|dec)_ref\(", path.read_text()), path
