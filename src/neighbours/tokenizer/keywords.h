@@ -29,14 +29,35 @@ inline constexpr auto kStatementOnly = std::to_array<std::string_view>(
 inline constexpr auto kBinary =
     std::to_array<std::string_view>({"and", "or", "in", "is", "not", "if", "else", "for", "async", "as"});
 
+// Of these, the ones that nothing can begin with.
+inline constexpr auto kBehindOperand = std::to_array<std::string_view>({"and", "or", "in", "is", "as"});
+
+// Further words that are no operands, or not surely.
+inline constexpr auto kNoOperand =
+    std::to_array<std::string_view>({"lambda", "yield", "from", "await", "print", "exec"});
+
+// Begin the header of a compound statement, the soft ones perhaps.
+inline constexpr auto kCompound =
+    std::to_array<std::string_view>({"def", "class", "if", "elif", "else", "for", "while", "with", "try",
+                                     "except", "finally", "async", "match", "case"});
+
 }  // namespace keywords
 
-// The ASCII word at `pos`, empty where none begins, or where it runs on with other characters.
+// The ASCII word at `pos`; empty where none begins, or where it runs on with other characters.
 constexpr std::string_view WordAt(std::string_view text, size_t pos) {
     size_t end = pos;
     while (IsNameByte(ByteAt(text, end))) ++end;
-    const bool runs_on = !IsAscii(ByteAt(text, end)) || ByteKind(ByteAt(text, end)) == EByteKind::kQuote;
-    return runs_on ? std::string_view() : text.substr(pos, end - pos);
+    return IsAscii(ByteAt(text, end)) ? text.substr(pos, end - pos) : std::string_view();
+}
+
+// The word is a name or a constant, in all versions of the language.
+constexpr bool IsOperandWord(std::string_view word) {
+    return !keywords::IsOneOf(word, keywords::kBinary) && !keywords::IsOneOf(word, keywords::kNoOperand) &&
+           !keywords::IsOneOf(word, keywords::kStatementOnly);
+}
+
+constexpr bool IsCompoundWord(std::string_view word) {
+    return keywords::IsOneOf(word, keywords::kCompound);
 }
 
 // A row inside brackets that begins like this at `pos` proves that the brackets should have been closed

@@ -12,81 +12,114 @@ namespace {
 // A header of more rows than this isn't believed, so that looking for its end takes bounded time.
 constexpr int kMostHeaderRows = 200;
 
-constexpr auto kCompoundWords =
-    std::to_array<std::string_view>({"def", "class", "if", "elif", "else", "for", "while", "with", "try",
-                                     "except", "finally", "async", "match", "case"});
+// Decides row by row whether a simple statement goes on.
+class CStatementRows {
+  public:
+    CStatementRows(const CTokenRow& first, int32_t indent) : _fIndent(indent) { _Note(first); }
+
+    // Rows indented deeper belong to the statement, those that nothing can begin with, and the entries of a
+    // display that isn't indented.
+    bool Continue(const CTokenRow& row) {
+        if (row.indent <= _fIndent && !row.continues) {
+            if (!_IsEntry(row)) return false;
+            _fIsInDisplay = true;
+        }
+        _Note(row);
+        return true;
+    }
+
+  private:
+    void _Note(const CTokenRow& row) { _fMayEnter = row.ends_open; }
+
+    bool _IsEntry(const CTokenRow& row) const {
+        if (!_fMayEnter || row.begins_statement || (row.begins_with_word && row.goes_on_with_operand))
+            return false;
+        return row.is_entry || row.closes_outer || (_fIsInDisplay && !row.has_assignment);
+    }
+
+    int32_t _fIndent;
+    bool _fMayEnter = false;     // the row before ends open
+    bool _fIsInDisplay = false;  // of entries that aren't indented
+};
 
 // The end of a simple statement. Comment rows directly before the row that ends it stay outside, unless they
 // are indented deeper.
-size_t FindIndentedEnd(CLexer& lexer, const CPlace& place) {
+size_t FindStatementEnd(CLexer& lexer, const CPlace& place) {
     CRowReader reader(lexer, place);
     CTokenRow row;
     reader.Next(row);
-    size_t comments_start = 0;
+    CStatementRows rows(row, place.indent);
     size_t end = row.end;
+    bool is_behind_comment = false;  // one that may stay outside
     while (reader.Next(row)) {
-        const bool is_deeper = row.indent > place.indent;
-        if (row.is_comment && !is_deeper) {
-            if (comments_start == 0) comments_start = row.start;
-            continue;
+        if (row.is_comment) {
+            is_behind_comment |= row.indent <= place.indent;
+            if (!is_behind_comment) end = row.end;
+        } else {
+            if (!rows.Continue(row)) break;
+            is_behind_comment = false;
+            end = row.end;
         }
-        if (!is_deeper && !row.begins_with_closer) break;
-        if (row.is_comment && comments_start) continue;
-        comments_start = 0;
-        end = row.end;
     }
     return end;
 }
 
-struct CHeaderEnd {
-    size_t end = 0;  // behind the row that ends the header; zero when none does
-    bool is_sure = false;
-};
-
-// The end of a compound header whose rows begin at `place`. A header without a row that ends in ":" ends
-// before the body, that is before the first of the least indented rows among those that are deeper than its
-// own.
+// The end of a compound header whose rows begin at `place`: behind the first row that ends in ":", or else
+// before the body, that is before the first of the least indented rows among those that are deeper than the
+// header.
 size_t FindHeaderEnd(CLexer& lexer, const CPlace& place) {
     CRowReader reader(lexer, place);
     CTokenRow row;
     reader.Next(row);
+    row.begins_statement = false;  // but the header itself
     size_t body_start = row.end;
+    size_t comments_start = 0;
     int32_t body_indent = INT32_MAX;
     for (int row_count = 0; row_count < kMostHeaderRows; ++row_count) {
+        if (row.begins_statement || row.follows_operand) break;
         if (row.ends_in_colon) return row.end;
         if (!reader.Next(row)) break;
-        const bool is_deeper = row.indent > place.indent;
-        if (!is_deeper && !row.begins_with_closer) break;
-        if (is_deeper && !row.is_comment && row.indent < body_indent) {
-            body_indent = row.indent;
-            body_start = row.start;
+        if (row.is_comment) {
+            if (comments_start == 0) comments_start = row.start;
+            continue;
         }
-        if (row.begins_statement) break;
+        if (row.indent <= place.indent && !row.continues) break;
+        if (row.indent < body_indent) {
+            body_indent = row.indent;
+            body_start = comments_start ? comments_start : row.start;
+        }
+        comments_start = 0;
     }
     return body_start;
+}
+
+// The row at `place` ends as headers do, although it doesn't begin with a keyword: that may be lost. A
+// dictionary may end a row so too.
+bool IsSpoiltHeader(CLexer& lexer, const CPlace& place) {
+    CRowReader reader(lexer, place);
+    CTokenRow row;
+    if (!reader.Next(row) || !row.ends_in_colon) return false;
+    const bool begins_with_bracket = ByteKind(lexer.Text()[place.pos]) == EByteKind::kOpener;
+    return begins_with_bracket || reader.OpenBrackets().empty() || reader.OpenBrackets().back() != '}';
 }
 
 }  // namespace
 
 size_t FindRecoveredEnd(CLexer& lexer, const CPlace& place) {
-    const bool is_compound = keywords::IsOneOf(WordAt(lexer.Text(), place.pos), kCompoundWords);
-    if (is_compound) return FindHeaderEnd(lexer, place);
-    CRowReader reader(lexer, place);
-    CTokenRow row;
-    reader.Next(row);
-    const bool is_spoilt_header =
-        row.ends_in_colon && (reader.OpenBrackets().empty() || reader.OpenBrackets().back() == ')');
-    return is_spoilt_header ? row.end : FindIndentedEnd(lexer, place);
+    if (IsCompoundWord(WordAt(lexer.Text(), place.pos))) return FindHeaderEnd(lexer, place);
+    return IsSpoiltHeader(lexer, place) ? FindHeaderEnd(lexer, place) : FindStatementEnd(lexer, place);
 }
 
-size_t FindStrayCloser(CLexer& lexer, CPlace place, int32_t indent, size_t& looked_at) {
+size_t FindStrayCloser(CLexer& lexer, const CPlace& place, int32_t indent, size_t& looked_at) {
     CRowReader reader(lexer, place);
     CTokenRow row;
     bool is_inside = false;
     while (reader.Next(row)) {
         looked_at = row.start;
-        const bool can_continue = is_inside || row.indent > indent || row.begins_with_closer;
-        if (!can_continue || row.begins_statement) return 0;
+        const bool is_deeper = row.indent > indent;
+        if (!is_deeper && !is_inside && !row.begins_with_closer) return 0;
+        if (row.begins_statement || (row.begins_with_closer && !is_deeper && row.goes_on_with_operand))
+            return 0;
         if (row.stray_closer_end) return row.stray_closer_end;
         is_inside = !reader.OpenBrackets().empty();
     }

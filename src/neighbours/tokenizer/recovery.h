@@ -17,6 +17,6 @@ size_t FindRecoveredEnd(CLexer& lexer, const CPlace& place);
 // The place behind the closing bracket without an opening one to which a logical line reaches that seemed to
 // end before `place`, the beginning of a row; zero when there is none. `indent` is the line's indentation.
 // `looked_at` is where the search ended.
-size_t FindStrayCloser(CLexer& lexer, CPlace place, int32_t indent, size_t& looked_at);
+size_t FindStrayCloser(CLexer& lexer, const CPlace& place, int32_t indent, size_t& looked_at);
 
 }  // namespace codeloom

@@ -4,7 +4,9 @@
 #include "neighbours/tokenizer/brackets.h"
 #include "neighbours/tokenizer/keywords.h"
 #include "neighbours/tokenizer/logical_type.h"
+#include "neighbours/tokenizer/operands.h"
 #include "neighbours/tokenizer/recovery.h"
+#include "neighbours/tokenizer/rows.h"
 
 namespace codeloom {
 
@@ -68,13 +70,45 @@ void CTokenizer::_CollectComment(CRawLogical& logical) {
 void CTokenizer::_CollectStatement(CRawLogical& logical) {
     const CPlace start = _fPlace;
     _fIsCompound = false;
-    if (_CollectTokens(logical, CReach()) == EEnd::kUnclosed) {
-        _RememberUnclosed();
-        _fPlace = start;
-        logical.tokens.clear();
-        _CollectTokens(logical, {FindRecoveredEnd(_fLexer, start), true});
-    }
+    CReach reach;
+    do {
+        if (_CollectTokens(logical, reach) == EEnd::kUnclosed) {
+            _RememberUnclosed();
+            _fPlace = start;
+            logical.tokens.clear();
+            _CollectTokens(logical, {FindRecoveredEnd(_fLexer, start), true});
+            break;
+        }
+        reach.until = _FindStrayCloserBehind(logical);
+    } while (reach.until);
     logical.type = FindLogicalType(logical.tokens);
+}
+
+// A closing bracket without an opening one in the rows behind the logical line, deeper than it, shows that
+// the line goes on up to there: its opening bracket is lost. Sound text has no such rows, a header's body
+// apart.
+size_t CTokenizer::_FindStrayCloserBehind(const CRawLogical& logical) {
+    const std::string_view text = _fLexer.Text();
+    CPlace next = _fPlace;
+    if (_fMidRow || !SkipBlankRows(text, next) || next.pos < _fNoStrayCloserBefore) return 0;
+    if (next.indent <= _fIndent) {
+        const bool is_closer = ByteKind(text[next.pos]) == EByteKind::kCloser;
+        if (!is_closer || !_EndsDeeper(logical)) return 0;
+    }
+    const CRawToken* last = FindLastSignificant(logical.tokens);
+    if (last && last->text == ":" && IsCompoundWord(logical.tokens[0].text)) return 0;
+    return FindStrayCloser(_fLexer, next, _fIndent, _fNoStrayCloserBefore);
+}
+
+// The last row of the logical line is indented deeper than its first one.
+bool CTokenizer::_EndsDeeper(const CRawLogical& logical) const {
+    const CRawToken& last = logical.tokens.back();
+    if (last.position.row == 0) return false;
+    const std::string_view text = _fLexer.Text();
+    CPlace row;
+    row.pos = static_cast<size_t>(last.text.data() - text.data()) - static_cast<size_t>(last.position.col);
+    SkipIndent(text, row);
+    return row.indent > _fIndent;
 }
 
 // Adds tokens up to the end of the logical line, and moves behind it.
@@ -93,6 +127,10 @@ CTokenizer::EEnd CTokenizer::_CollectTokens(CRawLogical& logical, const CReach& 
             const bool may_end = _fPlace.pos >= reach.until;
             if (may_end && (_fBrackets.empty() || reach.ends_there)) return EEnd::kSound;
             SkipBlankRows(text, _fPlace);
+            if (reach.ends_there && _fPlace.row_start >= reach.until) {
+                _fPlace.pos = _fPlace.row_start;
+                return EEnd::kSound;
+            }
             at_row_start = true;
             continue;
         }
@@ -138,11 +176,23 @@ bool CTokenizer::_TrackBracket() {
     return true;
 }
 
-// The ";" at the place parts two logical lines. One that parts nothing is a token, and a fault.
+// The ";" at the place parts two logical lines. One that parts nothing is a token, and a fault. One in a row
+// whose quotes don't match may as well stand in a string, and parts nothing either.
 bool CTokenizer::_IsSeparator(const CRawLogical& logical) {
     if (_fIsCompound || FindLastSignificant(logical.tokens) == nullptr) return false;
     _fIsCompound = IsCompound(logical.tokens);
-    return !_fIsCompound;
+    return !_fIsCompound && !_HasOpenQuote();
+}
+
+// The row of the place ends with a string that isn't closed. Looks at each row once.
+bool CTokenizer::_HasOpenQuote() {
+    if (_fPlace.pos < _fQuotesKnownUpTo) return _fHasOpenQuote;
+    CPlace row = _fPlace;
+    CRowReader reader(_fLexer, row);
+    CTokenRow found;
+    reader.Next(found);
+    _fQuotesKnownUpTo = found.end;
+    return _fHasOpenQuote = found.has_open_quote;
 }
 
 void CTokenizer::_EndAtSeparator(CRawLogical& logical) {
@@ -152,9 +202,13 @@ void CTokenizer::_EndAtSeparator(CRawLogical& logical) {
     _fMidRow = _fPlace.pos < text.size() && !SkipRowEnd(text, _fPlace);
 }
 
-// The row that begins at the place can't lie inside the brackets that are open.
-bool CTokenizer::_ProvesUnclosed(const CRawLogical&) const {
-    return StartsStatement(_fLexer.Text(), _fPlace.pos);
+// The row that begins at the place can't lie inside the brackets that are open: it begins with a statement,
+// or, no deeper than the logical line, with an operand although the row before ends with one.
+bool CTokenizer::_ProvesUnclosed(const CRawLogical& logical) const {
+    if (StartsStatement(_fLexer.Text(), _fPlace.pos)) return true;
+    if (_fPlace.indent > _fIndent) return false;
+    const CRawToken* last = FindLastSignificant(logical.tokens);
+    return last && AreOperandsSideBySide(*last, _fLexer.Text(), _fPlace.pos);
 }
 
 void CTokenizer::_RememberUnclosed() {

@@ -47,8 +47,11 @@ class CTokenizer {
     void _AddToken(CRawLogical& logical);
     bool _TrackBracket();
     bool _IsSeparator(const CRawLogical& logical);
+    bool _HasOpenQuote();
     void _EndAtSeparator(CRawLogical& logical);
     bool _ProvesUnclosed(const CRawLogical& logical) const;
+    size_t _FindStrayCloserBehind(const CRawLogical& logical);
+    bool _EndsDeeper(const CRawLogical& logical) const;
     void _RememberUnclosed();
     bool _IsKnownUnclosed(size_t pos);
 
@@ -64,6 +67,9 @@ class CTokenizer {
     // Brackets that an earlier look ahead has proven to be unclosed, in source order.
     std::vector<size_t> _fUnclosed;
     size_t _fUnclosed_i = 0;
+    size_t _fQuotesKnownUpTo = 0;  // as far as _fHasOpenQuote is known
+    bool _fHasOpenQuote = false;
+    size_t _fNoStrayCloserBefore = 0;  // as far as an earlier look ahead has seen
 };
 
 }  // namespace codeloom

@@ -1,0 +1,68 @@
+// Operands side by side, which no version of the language allows, strings apart.
+#pragma once
+
+#include <cstddef>
+#include <string_view>
+
+#include "neighbours/token_type.h"
+#include "neighbours/tokenizer/keywords.h"
+#include "neighbours/tokenizer/raw_logical.h"
+
+namespace codeloom {
+
+// The token ends an operand. A string without closing quotes counts, unless its text may go on behind a sign.
+constexpr bool IsOperandEnd(const CRawToken& token) {
+    switch (token.type) {
+        case kTokenId_NAME:
+            return IsOperandWord(token.text);
+        case kTokenId_NUMBER:
+        case kTokenId_STRING:
+        case kTokenId_RPAR:
+        case kTokenId_RSQB:
+        case kTokenId_RBRACE:
+            return true;
+        case kTokenId_ERRORTOKEN: {
+            const EByteKind last_kind = ByteKind(token.text.back());
+            return token.text.size() > 1 && last_kind != EByteKind::kOperator &&
+                   last_kind != EByteKind::kOpener;
+        }
+        default:
+            return false;
+    }
+}
+
+// A name, number or string begins at `pos`.
+constexpr bool BeginsOperand(std::string_view text, size_t pos) {
+    const EByteKind kind = ByteKind(text[pos]);
+    if (kind == EByteKind::kDigit || kind == EByteKind::kQuote) return true;
+    return kind == EByteKind::kNameStart && IsOperandWord(WordAt(text, pos));
+}
+
+constexpr bool BeginsString(std::string_view text, size_t pos) {
+    return CanBeginString(text[pos]) && ReadStringStart(text, pos).quote_length > 0;
+}
+
+// What begins at `pos` must follow an operand: a closing bracket, a binary operator that is no sign, a comma.
+constexpr bool ContinuesExpression(std::string_view text, size_t pos) {
+    const char c = text[pos];
+    switch (ByteKind(c)) {
+        case EByteKind::kCloser:
+            return true;
+        case EByteKind::kNameStart:
+            return keywords::IsOneOf(WordAt(text, pos), keywords::kBehindOperand);
+        case EByteKind::kDot:
+            return !IsDigit(ByteAt(text, pos + 1)) && ByteAt(text, pos + 1) != '.';
+        case EByteKind::kOperator:
+            return std::string_view("+-~*@`!;").find(c) == std::string_view::npos;
+        default:
+            return false;
+    }
+}
+
+// What begins at `pos` can't follow `token`.
+constexpr bool AreOperandsSideBySide(const CRawToken& token, std::string_view text, size_t pos) {
+    if (!BeginsOperand(text, pos) || !IsOperandEnd(token)) return false;
+    return token.type != kTokenId_STRING || !BeginsString(text, pos);
+}
+
+}  // namespace codeloom
