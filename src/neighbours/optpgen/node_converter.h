@@ -1,0 +1,40 @@
+// What makes the nodes of a parse. The engine derives its own; everything is inline, since the engine is an
+// extension of its own.
+#pragma once
+
+#include <nanobind/nanobind.h>
+
+#include "host/overrides.h"
+
+namespace codeloom {
+
+class NodeConverter : public CHosted {
+  public:
+    void Init() {}
+
+    // The node of a token (children none, `type` below 256) or of a rule (value none, `type` its number,
+    // context that of its first token). Here it is the tuple of the last four arguments.
+    virtual nb::object convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
+                               nb::handle children) {
+        static_cast<void>(grammar);
+        return nb::make_tuple(type, value, context, children);
+    }
+};
+
+template <class Class>
+class TNodeConverterOperations : public Class {
+    FIRST_OPERATIONS
+    OPERATION(
+        convert,
+        "Make the node of a token or of a rule; what it returns is what the rule above gets as a child.\n\n"
+        "Called once for each token that the grammar takes, with its type (int), text (str) and context "
+        "(any\n"
+        "object) and None as children, and once for each rule that is complete, with the rule's number, "
+        "None\n"
+        "as value, the context of its first token and the list of its children. This one returns the tuple\n"
+        "(type, value, context, children).",
+        "grammar"_a.none(), "type"_a, "value"_a.none(), "context"_a.none(), "children"_a.none())
+    END_OPERATIONS
+};
+
+}  // namespace codeloom
