@@ -4,7 +4,6 @@ Among them are the classification of tokens, `GetTokenType` with its numbers `kT
 `CNonNestedSearch`, which skips the strings and brackets of Python source.
 """
 
-import logging
 import time
 
 from codeloom import _neighbours
@@ -52,20 +51,26 @@ __TimeFunc = time.time
 
 
 class CLogger:
-    """Writes to the logger "codeloom", in three levels by number: the higher, the more detail."""
+    """Writes to the logger "codeloom" in three levels by number: the higher, the more detail.
+
+    Each operation takes a text, with `%` places for `args`; None as the text logs nothing.
+    """
 
     def Log1(self, s: str | None, args: tuple[object, ...] | None = None) -> None:
-        """Log a warning: `s` with its `%` places filled from `args`; nothing for None."""
-        self._Log(logging.WARNING, s, args)
+        """Log a warning."""
+        self._Log("warning", s, args)
 
     def Log2(self, s: str | None, args: tuple[object, ...] | None = None) -> None:
-        """Log what goes on, likewise."""
-        self._Log(logging.INFO, s, args)
+        """Log what goes on."""
+        self._Log("info", s, args)
 
     def Log3(self, s: str | None, args: tuple[object, ...] | None = None) -> None:
-        """Log a detail for those who look for a fault, likewise."""
-        self._Log(logging.DEBUG, s, args)
+        """Log a detail, for those who look for a fault."""
+        self._Log("debug", s, args)
 
-    def _Log(self, level: int, s: str | None, args: tuple[object, ...] | None) -> None:
-        if s is not None:
-            logging.getLogger("codeloom").log(level, s, *(args or ()))
+    def _Log(self, level: str, s: str | None, args: tuple[object, ...] | None) -> None:
+        if s is None:
+            return
+        import logging  # not needed to load the engine
+
+        getattr(logging.getLogger("codeloom"), level)(s, *(args or ()))

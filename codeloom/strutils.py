@@ -5,8 +5,6 @@ text string; a code point comes back as a text string of one character. Malforme
 U+FFFD, and no byte outside the buffer is ever read.
 """
 
-from dataclasses import dataclass
-
 from codeloom._neighbours import (
     AdjustUtf8Pos,
     AsStr,
@@ -29,6 +27,7 @@ from codeloom._neighbours import (
     Utf8Len,
     _NonInlineUcs4CharAtUtf8Pos,
 )
+from codeloom._plain_record import CPlainRecord
 
 __all__ = [
     "AdjustUtf8Pos",
@@ -56,16 +55,19 @@ __all__ = [
 ]
 
 
-@dataclass(slots=True)
-class _CTextPosInfo:
-    """A place in a piece of text, which may span several rows."""
+class _CTextPosInfo(CPlainRecord):
+    """A place in a piece of text, which may span several rows.
 
-    lineno: int
-    """The row within the text, from zero."""
-    pos: int
-    """The byte offset in the text; -1 when it isn't known."""
-    utf8_col: int
-    """The column in its row, in UTF-8 bytes from zero."""
+    `lineno` is the row within the text, from zero, `pos` the byte offset in the text, -1 when it
+    isn't known, and `utf8_col` the column in its row, in UTF-8 bytes from zero.
+    """
+
+    __slots__ = ("lineno", "pos", "utf8_col")
+
+    def __init__(self, lineno: int, pos: int, utf8_col: int) -> None:
+        self.lineno = lineno
+        self.pos = pos
+        self.utf8_col = utf8_col
 
 
 def TextPosInfo(lineno: int = 0, pos: int = -1, utf8_col: int = 0) -> _CTextPosInfo:

@@ -3,6 +3,7 @@
 
 #include <nanobind/nanobind.h>
 
+#include "_fastaccess/bind.h"
 #include "analysis/analyzer.h"
 #include "analysis/syntax_error.h"
 #include "hints/dispatch_walker.h"
@@ -10,6 +11,10 @@
 #include "host/restore.h"
 #include "neighbours/imported_names.h"
 #include "parse/parser_driver.h"
+#include "strutils/bind.h"
+#include "strutils/text.h"
+#include "symbolinfo/bind.h"
+#include "symbolinfo/module_constants.h"
 #include "tree/node_classes.h"
 #include "walker/node_walker.h"
 
@@ -19,8 +24,21 @@ namespace codeloom {
 
 namespace {
 
-nb::module_ ImportNeighbour(const char* name) {
-    return nb::module_::import_((std::string("codeloom.") + name).c_str());
+constexpr CNeighbourFunction kEnsureScopeNameIndicies("symbolinfo", "EnsureScopeNameIndicies");
+constexpr CNeighbourFunction kGetInstanceNameForClass("symbolinfo", "GetInstanceNameForClass");
+
+void DefinePrimitives(nb::module_& module) {
+    BindTextPrimitives(module);
+    BindFastAccessPrimitives(module);
+    BindSymbolPrimitives(module);
+}
+
+// A module of the package under its own name, with the functions that are called through it.
+void ImportNeighbour(nb::module_& module, const char* name,
+                     std::initializer_list<const char*> functions = {}) {
+    const std::string full_name = std::string("codeloom.") + name;
+    RequireNames(full_name.c_str(), functions);
+    module.attr(name) = nb::module_::import_(full_name.c_str());
 }
 
 // Modules whose functions are looked up at the call, as globals that a host or a test can replace.
@@ -28,17 +46,40 @@ void ImportModules(nb::module_& module, nb::handle loading) {
     for (const char* name : {"keyword", "re", "sys", "token", "os", "time"})
         module.attr(name) = nb::module_::import_(name);
     module.attr("pgen") = loading.attr("ImportPgen")();
-    for (const char* name : {"_fastaccess", "strutils"}) module.attr(name) = ImportNeighbour(name);
+    ImportNeighbour(module, "_fastaccess", {"__TimeFunc"});
+    ImportNeighbour(module, "strutils");
+    RequireNames("config", {"GetTarnFilename"});
     module.attr("config") = nb::module_::import_("config");
-    for (const char* name : {"logicalline", "symbolinfo", "logicalinspect"})
-        module.attr(name) = ImportNeighbour(name);
+    ImportNeighbour(module, "logicalline", {"FindMatchOrCaseType", "IsScopeStartLogical"});
+    ImportNeighbour(module, "symbolinfo");
+    ImportNeighbour(module, "logicalinspect", {"TextFromTokens"});
+    RequireNames("tarnutils.reflect", {"ReportCurrentException", "RaiseWithTraceback"});
     module.attr("reflect") = nb::module_::import_("tarnutils.reflect");
-    for (const char* name : {"optpgen", "utils"}) module.attr(name) = ImportNeighbour(name);
+    ImportNeighbour(module, "optpgen", {"ParserGenerator", "CreateParser", "ParseError"});
+    ImportNeighbour(module, "utils", {"GetLogicalsFromText"});
+}
+
+nb::object _GetBuiltinInstanceName(nb::handle cls_name) {
+    const nb::object name = AsUtf8(kGetInstanceNameForClass(kEnsureScopeNameIndicies(cls_name)));
+    return Utf8Concat2(gPrefixes.kTypedLiteralPrefix, name);
+}
+
+nb::handle DefineInstanceName(nb::module_& module, const char* constant, const char* cls_name) {
+    nb::object name = _GetBuiltinInstanceName(nb::str(cls_name));
+    module.attr(constant) = name;
+    return name.release();
 }
 
 void SetConstants(nb::module_& module) {
-    module.attr("kPy2DefaultGrammar") = "Python-Grammar-2.7";
-    module.attr("kPy3DefaultGrammar") = "Python-Grammar-3.8";
+    module.attr("kPy2DefaultGrammar") = kPy2DefaultGrammar;
+    module.attr("kPy3DefaultGrammar") = kPy3DefaultGrammar;
+    module.attr("kLiteralPrefix") = gPrefixes.kTypedLiteralPrefix;
+#define CODELOOM_DEFINE_INSTANCE_NAME(name, cls_name) DefineInstanceName(module, #name, cls_name),
+    gInstanceNames = {CODELOOM_INSTANCE_NAMES(CODELOOM_DEFINE_INSTANCE_NAME)};
+#undef CODELOOM_DEFINE_INSTANCE_NAME
+    module.def("_GetBuiltinInstanceName", &_GetBuiltinInstanceName, "cls_name"_a,
+               nb::sig("def _GetBuiltinInstanceName(cls_name: str) -> bytes"),
+               "The equiv of an instance of a builtin class, by the name of the class.");
 }
 
 void BindClasses(nb::module_& module) {
@@ -60,7 +101,9 @@ void Load(nb::module_& module) {
     const nb::object standins = loading.attr("StandinsOffered")();
     standins.attr("__enter__")();
     const CCallOnExit withdrawn([&] { standins.attr("__exit__")(nb::none(), nb::none(), nb::none()); });
+    RequireNames("codeloom.optpgen", {"NodeConverter"});
     ImportNames(module);
+    DefinePrimitives(module);
     ImportModules(module, loading);
     SetConstants(module);
     BindClasses(module);

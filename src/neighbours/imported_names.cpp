@@ -6,6 +6,7 @@
 namespace codeloom {
 
 CLogicalTypes gLogicalTypes;
+CPrefixes gPrefixes;
 
 namespace {
 
@@ -24,6 +25,53 @@ nb::handle Kept(nb::handle module, const char* name) {
     return nb::object(module.attr(name)).release();
 }
 
+void ImportClasses(nb::module_& module) {
+    ImportFrom(module, "codeloom.optpgen", {"Parser"});
+    ImportFrom(module, "bytebuffer", {"CWritableByteBuffer", "CEncodedByteBufferReader"});
+    ImportFrom(module, "codeloom.strutils", {"_CTextPosInfo"});
+    ImportFrom(module, "codeloom._fastaccess", {"CLogger", "CStringTokenizer", "CNonNestedSearch"});
+    ImportFrom(module, "codeloom.logicalline", {"CLogicalLine"});
+    ImportFrom(module, "tarnbase.destroyable", {"_CHandlerRecord", "_CEmissionStackItem", "CDestroyable"});
+    ImportFrom(module, "codeloom.symbolinfo",
+               {"CSingleResolvedInfo", "CLocationCache", "CFullyScopedName", "CDefInfo", "CArgTextInfo",
+                "CInfoBytesBuilder", "CKindFilter"});
+}
+
+void ImportLogicalTypes(nb::module_& module) {
+#define CODELOOM_LOGICAL_TYPE_NAME(name, text) #name,
+    ImportFrom(module, "codeloom.logicalline", {CODELOOM_LOGICAL_TYPES(CODELOOM_LOGICAL_TYPE_NAME)});
+#undef CODELOOM_LOGICAL_TYPE_NAME
+    gLogicalTypes = {Kept(module, "kComment"), Kept(module, "kCommentedTypeHint"),
+                     Kept(module, "kStringifiedTypeHint"), Kept(module, "kMatch"), Kept(module, "kCase")};
+}
+
+void ImportVocabulary(nb::module_& module) {
+#define CODELOOM_KIND_NAMES(name, ...) "k" #name "Prefix", "k" #name "Kind",
+    ImportFrom(module, "codeloom.symbolinfo",
+               {CODELOOM_RECORD_KINDS(CODELOOM_KIND_NAMES) "kPlainEquivSpec", "kPlainEquivKind"});
+#undef CODELOOM_KIND_NAMES
+#define CODELOOM_KEPT_PREFIX(name, ...) Kept(module, "k" #name "Prefix"),
+    gPrefixes = {CODELOOM_RECORD_KINDS(CODELOOM_KEPT_PREFIX)};
+#undef CODELOOM_KEPT_PREFIX
+    ImportFrom(
+        module, "codeloom.symbolinfo",
+        {"kPrefixLen", "kIterationSubscript", "kClassInstanceSuffix", "kScopeIndexSep", "kModuleScopeName",
+         "kWildcardScope", "kDefLineScopeName", "_kDotLineScopeName", "kTypingModuleSymbol",
+         "kTypingModuleSymbolDot", "kTypingModuleSymbolDotAny", "kTypingModuleSymbolStr",
+         "kTypingModuleSymbolDotAnyStr", "kTypingModuleSymbolDotStr", "gInfoBytesBuilder"});
+}
+
+void ImportFunctions(nb::module_& module) {
+    ImportFrom(module, "codeloom._fastaccess", {"GetTokenType", "_FindStringEndNonNested"});
+    ImportFrom(module, "codeloom.strutils",
+               {"AsUtf8", "AsStr", "BytesForInteger", "Utf8Concat5", "Utf8Len", "IsUtf8LeadByte",
+                "_NonInlineUcs4CharAtUtf8Pos", "TextPosInfo"});
+    ImportFrom(module, "codeloom.symbolinfo",
+               {"BuildLiteralInfo", "BuildArgInfo", "EnsureScopeNameIndicies", "GetInstanceNameForClass",
+                "ObjectForStringLiteral", "EncodeStringLiteral", "JoinTokens",
+                "_NonInlineNextNonNestedUtf8PtrIndex"});
+}
+
 }  // namespace
 
 nb::object ParseErrorClass() {
@@ -31,16 +79,16 @@ nb::object ParseErrorClass() {
     return kParseError.Find();
 }
 
+void RequireNames(const char* module_name, std::initializer_list<const char*> names) {
+    const nb::module_ neighbour = nb::module_::import_(module_name);
+    for (const char* name : names) NameOf(neighbour, module_name, name);
+}
+
 void ImportNames(nb::module_& module) {
-    ImportFrom(module, "codeloom.optpgen", {"Parser"});
-    ImportFrom(module, "bytebuffer", {"CWritableByteBuffer", "CEncodedByteBufferReader"});
-    ImportFrom(module, "codeloom.logicalline", {"CLogicalLine"});
-    ImportFrom(module, "tarnbase.destroyable", {"_CHandlerRecord", "_CEmissionStackItem", "CDestroyable"});
-#define CODELOOM_LOGICAL_TYPE_NAME(name, text) #name,
-    ImportFrom(module, "codeloom.logicalline", {CODELOOM_LOGICAL_TYPES(CODELOOM_LOGICAL_TYPE_NAME)});
-#undef CODELOOM_LOGICAL_TYPE_NAME
-    gLogicalTypes = {Kept(module, "kComment"), Kept(module, "kCommentedTypeHint"),
-                     Kept(module, "kStringifiedTypeHint"), Kept(module, "kMatch"), Kept(module, "kCase")};
+    ImportClasses(module);
+    ImportLogicalTypes(module);
+    ImportVocabulary(module);
+    ImportFunctions(module);
 }
 
 }  // namespace codeloom

@@ -4,6 +4,7 @@
 #include <nanobind/nanobind.h>
 
 #include "neighbours/logicalline/logical_line.h"
+#include "symbolinfo/record_kinds.h"
 
 namespace codeloom {
 
@@ -22,10 +23,22 @@ inline bool IsOfType(const CLogicalLine& logical, nb::handle type) {
     return logical.fType.equal(type);
 }
 
+// The prefixes as the neighbour's byte strings, for records that are a prefix and no more. They live as long
+// as the process.
+struct CPrefixes {
+#define CODELOOM_PREFIX_FIELD(name, ...) nb::handle k##name##Prefix;
+    CODELOOM_RECORD_KINDS(CODELOOM_PREFIX_FIELD)
+#undef CODELOOM_PREFIX_FIELD
+};
+extern CPrefixes gPrefixes;
+
 // `optpgen.ParseError`, looked up on the module at the call.
 nb::object ParseErrorClass();
 
-// Binds every name into `module`; a neighbour that lacks one is an ImportError which names it.
+// An ImportError which names the neighbour and the name unless the neighbour has all of them.
+void RequireNames(const char* module_name, std::initializer_list<const char*> names);
+
+// Binds every name into `module`, under the same condition.
 void ImportNames(nb::module_& module);
 
 }  // namespace codeloom

@@ -8,4 +8,5 @@ NB_MODULE(_neighbours, module) {
     codeloom::BindOptpgen(module);
     codeloom::BindStrutils(module);
     codeloom::BindFastAccess(module);
+    codeloom::BindSymbolInfo(module);
 }

@@ -1,0 +1,150 @@
+#include "symbolinfo/bind.h"
+
+#include <string>
+#include <vector>
+
+#include "host/binding.h"
+#include "host/collections.h"
+#include "host/text.h"
+#include "neighbours/bind.h"
+#include "neighbours/symbolinfo/info_bytes.h"
+#include "neighbours/symbolinfo/join_tokens.h"
+#include "neighbours/symbolinfo/nested_text.h"
+#include "strutils/arguments.h"
+#include "symbolinfo/kind_filter.h"
+#include "symbolinfo/vocabulary.h"
+
+namespace codeloom {
+
+namespace {
+
+nb::object BytesOf(std::string_view text) {
+    return nb::bytes(text.data(), text.size());
+}
+
+nb::object IntegerOf(char byte) {
+    return nb::int_(static_cast<int>(static_cast<unsigned char>(byte)));
+}
+
+void SetConstant(nb::module_& module, const std::string& name, nb::handle value) {
+    module.attr(name.c_str()) = value;
+}
+
+// The table as a tuple of tuples, for those who read records.
+nb::tuple HostRecordKinds() {
+    return MakeTuple(kRecordKinds.size(), [](Py_ssize_t i) -> nb::object {
+        const CRecordKind& kind = kRecordKinds[static_cast<size_t>(i)];
+        return nb::make_tuple(TextFromUtf8(kind.name), BytesOf(kind.prefix), IntegerOf(kind.kind),
+                              TextFromUtf8(kind.word), TextFromUtf8(kind.payload), TextFromUtf8(kind.meaning),
+                              TextFromUtf8(kind.source), TextFromUtf8(kind.example));
+    });
+}
+
+void BindKindConstants(nb::module_& module) {
+    for (const CRecordKind& kind : kRecordKinds) {
+        const std::string name = "k" + std::string(kind.name);
+        const bool is_plain = kind.kind == kPlainEquivKind;
+        SetConstant(module, name + (is_plain ? "Spec" : "Prefix"), BytesOf(kind.prefix));
+        SetConstant(module, name + "Kind", IntegerOf(kind.kind));
+    }
+    module.attr("kPrefixLen") = kPrefixLen;
+    module.attr("_kRecordKinds") = HostRecordKinds();
+}
+
+void BindNameConstants(nb::module_& module) {
+    module.attr("kIterationSubscript") = BytesOf(kIterationSubscript);
+    module.attr("kClassInstanceSuffix") = BytesOf(kClassInstanceSuffix);
+    module.attr("kScopeIndexSep") = TextFromUtf8(kScopeIndexSep);
+    module.attr("kModuleScopeName") = TextFromUtf8(kModuleScopeName);
+    module.attr("kWildcardScope") = TextFromUtf8(kWildcardScope);
+    module.attr("kDefLineScopeName") = TextFromUtf8(kDefLineScopeName);
+    module.attr("_kDotLineScopeName") = TextFromUtf8(_kDotLineScopeName);
+    module.attr("kTypingModuleSymbol") = BytesOf(kTypingModuleSymbol);
+    module.attr("kTypingModuleSymbolDot") = BytesOf(kTypingModuleSymbolDot);
+    module.attr("kTypingModuleSymbolDotAny") = BytesOf(kTypingModuleSymbolDotAny);
+    module.attr("kTypingModuleSymbolStr") = TextFromUtf8(kTypingModuleSymbol);
+    module.attr("kTypingModuleSymbolDotStr") = TextFromUtf8(kTypingModuleSymbolDot);
+    module.attr("kTypingModuleSymbolDotAnyStr") = TextFromUtf8(kTypingModuleSymbolDotAny);
+}
+
+void BindKindFilter(nb::module_& module) {
+    nb::class_<CKindFilter>(module, "CKindFilter",
+                            "A set of kinds: CKindFilter(kinds), a byte string of them.")
+        .def(TInit<nb::bytes>(), "kinds"_a = nb::bytes(""))
+        .def(
+            "KindMatches",
+            [](const CKindFilter& filter, CByteArgument kind) { return filter.KindMatches(kind.byte); },
+            "kind"_a, "True when the kind is in the set.");
+}
+
+Py_ssize_t HostNextIndex(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize_t end_pos) {
+    utf8_ptr.Require("end_pos", end_pos);
+    if (pos < 0 || pos >= end_pos) throw nb::index_error("pos lies outside the buffer");
+    return _NonInlineNextNonNestedUtf8PtrIndex(utf8_ptr.Pointer(), pos, end_pos);
+}
+
+nb::object HostEncodeStringLiteral(const CUtf8Argument& text) {
+    std::string storage;
+    return BytesOf(EncodeStringLiteral(text.text.View(), storage));
+}
+
+nb::object HostJoinTokens(nb::handle tokens) {
+    const nb::list kept(nb::borrow(tokens));
+    std::vector<CUtf8Text> texts;
+    for (nb::handle token : kept) texts.emplace_back(token);
+    std::vector<std::string_view> pieces;
+    for (const CUtf8Text& text : texts) pieces.push_back(text.View());
+    return BytesOf(JoinTokens(pieces));
+}
+
+void BindRecordFunctions(nb::module_& module) {
+    module.def(
+        "BuildLiteralInfo",
+        [](const CUtf8Argument& type_name, nb::handle text) {
+            return BuildLiteralInfo(type_name.text.View(), text);
+        },
+        "type_name"_a, "text"_a.none(),
+        nb::sig("def BuildLiteralInfo(type_name: bytes | str, text: bytes | str | None) -> bytes"),
+        "The record of a literal of this type with this text; None when the text isn't known.");
+    module.def("EncodeStringLiteral", &HostEncodeStringLiteral, "text"_a,
+               nb::sig("def EncodeStringLiteral(text: bytes | str) -> bytes"),
+               "The text of a string literal with its prefix and quotes on one row: what ends rows is "
+               "written as an\n"
+               "escape, and a continued row is joined. The value is the same, but for raw strings.");
+    module.def("JoinTokens", &HostJoinTokens, "tokens"_a,
+               nb::sig("def JoinTokens(tokens: collections.abc.Iterable[bytes | str]) -> bytes"),
+               "Tokens, or texts of expressions, joined with blanks as a formatter would.");
+    module.def(
+        "_NonInlineNextNonNestedUtf8PtrIndex", &HostNextIndex, "utf8_ptr"_a, "pos"_a, "end_pos"_a,
+        "The byte index behind the bracket or string that begins at `pos`; `end_pos` when it doesn't end.\n"
+        "IndexError or ValueError when `pos` or `end_pos` lies outside the buffer.");
+}
+
+void BindScopeFunctions(nb::module_& module) {
+    module.def(
+        "EnsureScopeNameIndicies",
+        [](const CUtf8Argument& scope) { return TextFromUtf8(EnsureScopeNameIndicies(scope.text.View())); },
+        "scope"_a, nb::sig("def EnsureScopeNameIndicies(scope: bytes | str) -> str"),
+        "A scope with an index behind every name: \"A#1.f\" gives \"A#1.f#0\".");
+    module.def(
+        "GetInstanceNameForClass",
+        [](const CUtf8Argument& cls_name) {
+            return TextFromUtf8(GetInstanceNameForClass(cls_name.text.View()));
+        },
+        "cls_name"_a, nb::sig("def GetInstanceNameForClass(cls_name: bytes | str) -> str"),
+        "The name that stands for an instance of a class: \"list\" gives \"list:\". The index of a first\n"
+        "definition, \"#0\", is left out.");
+}
+
+}  // namespace
+
+void BindSymbolInfo(nb::module_& module) {
+    BindKindConstants(module);
+    BindNameConstants(module);
+    BindKindFilter(module);
+    BindSymbolPrimitives(module);
+    BindRecordFunctions(module);
+    BindScopeFunctions(module);
+}
+
+}  // namespace codeloom

@@ -1,0 +1,32 @@
+// Composing records: what the walkers ask for with each name and literal.
+//   in     texts, as UTF-8
+//   out    records, or pieces of them, as UTF-8
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include <nanobind/nanobind.h>
+
+namespace nb = nanobind;
+
+namespace codeloom {
+
+// The record of a literal: the prefix, the type, ":", and unless `text` is none a blank and the text.
+// TypeError when `text` is neither a string nor none.
+nb::object BuildLiteralInfo(std::string_view type_name, nb::handle text);
+
+// The text of a string literal with its prefix and quotes on one row: what ends rows is written as an escape,
+// and a continued row is joined. So the value is the same, but for raw strings, which have no escapes. The
+// result is `text` itself where nothing ends rows, otherwise it lies in `storage`.
+std::string_view EncodeStringLiteral(std::string_view text, std::string& storage);
+
+// A scope with an index behind every name: "A#1.f" gives "A#1.f#0". Wildcards and the names of def line
+// scopes have none, and neither has the module's scope.
+std::string EnsureScopeNameIndicies(std::string_view scope);
+
+// The name that stands for an instance of a class: `list` gives "list:". The index of a first definition is
+// left out, so that "A#0.B#1" gives "A.B#1:".
+std::string GetInstanceNameForClass(std::string_view cls_name);
+
+}  // namespace codeloom
