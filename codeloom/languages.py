@@ -1,0 +1,71 @@
+"""The versions of Python that can be analysed, and what the engine needs to know of each."""
+
+import sys
+from dataclasses import dataclass
+from functools import cache
+
+_OLDEST_PY3_MINOR = 0
+_NEWEST_PY3_MINOR = 14
+
+# fmt: off
+_KEYWORDS = frozenset({
+    "and", "as", "assert", "break", "class", "continue", "def", "del", "elif", "else", "except",
+    "finally", "for", "from", "global", "if", "import", "in", "is", "lambda", "not", "or", "pass",
+    "raise", "return", "try", "while", "with", "yield",
+})
+# fmt: on
+_PY2_KEYWORDS = _KEYWORDS | {"exec", "print"}
+_PY3_KEYWORDS = _KEYWORDS | {"False", "None", "True", "nonlocal"}
+_ASYNC_KEYWORDS = frozenset({"async", "await"})
+_FIRST_ASYNC_VERSION = (3, 7, 0)
+
+# The names that `LanguageNamed` takes, oldest first.
+LANGUAGE_NAMES = (
+    "2.7",
+    *(f"3.{minor}" for minor in range(_OLDEST_PY3_MINOR, _NEWEST_PY3_MINOR + 1)),
+)
+DEFAULT_LANGUAGE_NAME = f"{sys.version_info.major}.{sys.version_info.minor}"
+
+
+class UnknownLanguageError(ValueError):
+    """Raised for a version that isn't among `LANGUAGE_NAMES`; the message names the choices."""
+
+
+@dataclass(frozen=True)
+class Language:
+    """One version of Python, in the terms of the engine's constructor."""
+
+    name: str
+    version_triple: tuple[int, int, int]
+    grammar_file: str
+    keywords: tuple[str, ...]
+    is_py3: bool
+
+
+@cache
+def LanguageNamed(name: str = DEFAULT_LANGUAGE_NAME) -> Language:
+    """The language version called `name`, such as "2.7" or "3.12".
+
+    Without a name it is the version of the interpreter that runs this. An unknown name raises
+    UnknownLanguageError.
+    """
+    if name not in LANGUAGE_NAMES:
+        raise UnknownLanguageError(
+            f"unknown Python version {name!r}: choose 2.7, "
+            f"or one from 3.{_OLDEST_PY3_MINOR} to 3.{_NEWEST_PY3_MINOR}"
+        )
+    major, minor = map(int, name.split("."))
+    triple = (major, minor, 0)
+    return Language(
+        name=name,
+        version_triple=triple,
+        grammar_file="Python-Grammar-3.8" if major == 3 else "Python-Grammar-2.7",
+        keywords=tuple(sorted(_KeywordsOf(triple))),
+        is_py3=major == 3,
+    )
+
+
+def _KeywordsOf(triple: tuple[int, int, int]) -> frozenset[str]:
+    if triple[0] == 2:
+        return _PY2_KEYWORDS
+    return _PY3_KEYWORDS | _ASYNC_KEYWORDS if triple >= _FIRST_ASYNC_VERSION else _PY3_KEYWORDS
