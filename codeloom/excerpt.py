@@ -1,0 +1,75 @@
+"""A place in a row of source as a terminal shows it: the row, cut where it is long, and a caret."""
+
+import unicodedata
+from collections.abc import Iterator, Sequence
+
+_TAB_WIDTH = 4
+_CUT = "..."
+# What moves the cursor, turns the direction of writing or doesn't stand for a character.
+_UNPRINTABLE = frozenset({"Cc", "Cf", "Cs", "Cn", "Zl", "Zp"})
+_COMBINING = frozenset({"Mn", "Me"})
+_WIDE = frozenset({"W", "F"})
+
+
+def Excerpt(source_row: str, column: int, width: int = 100) -> tuple[str, str]:
+    """What to print of `source_row`, and the row with the caret to print below it.
+
+    `column` counts characters from 1 and may lie behind the row's end. `width` is in terminal
+    columns; a wider row is cut on either side of the place.
+    """
+    place_i = min(column - 1, len(source_row))
+    # No more than this can be shown, and a row may be as long as a file.
+    first_i = max(0, place_i - width)
+    cells = list(_Cells(source_row[first_i : place_i + width + 1]))
+    start, end = _Window(cells, place_i - first_i, width)
+    if first_i + start > 0 or first_i + end < len(source_row):
+        start, end = _Window(cells, place_i - first_i, width - 2 * len(_CUT))
+    cut_before = _CUT if first_i + start > 0 else ""
+    cut_behind = _CUT if first_i + end < len(source_row) else ""
+    shown = "".join(cell for cell, _ in cells[start:end])
+    blanks = len(cut_before) + sum(width for _, width in cells[start : place_i - first_i])
+    return cut_before + shown + cut_behind, " " * blanks + "^"
+
+
+def Printable(text: str) -> str:
+    """`text` with U+FFFD for each character that would do something to a terminal."""
+    if text.isprintable():
+        return text
+    return "".join(
+        "\N{REPLACEMENT CHARACTER}" if unicodedata.category(char) in _UNPRINTABLE else char
+        for char in text
+    )
+
+
+def _Cells(chars: str) -> Iterator[tuple[str, int]]:
+    """Each character as it is printed, and how many columns of the terminal it takes."""
+    col = 0
+    for char in chars:
+        cell = " " * (_TAB_WIDTH - col % _TAB_WIDTH) if char == "\t" else Printable(char)
+        cell_width = sum(map(_WidthOf, cell))
+        yield cell, cell_width
+        col += cell_width
+
+
+def _WidthOf(char: str) -> int:
+    if unicodedata.category(char) in _COMBINING:
+        return 0
+    return 2 if unicodedata.east_asian_width(char) in _WIDE else 1
+
+
+def _Window(cells: Sequence[tuple[str, int]], place_i: int, room: int) -> tuple[int, int]:
+    """The range of cells around `place_i` that fits into `room` columns, alike on both sides."""
+    start = end = place_i
+    used = 0
+    grown = True
+    while grown:
+        grown = False
+        if end < len(cells) and used + cells[end][1] <= room:
+            used += cells[end][1]
+            end += 1
+            grown = True
+        if start > 0 and used + cells[start - 1][1] <= room:
+            start -= 1
+            used += cells[start][1]
+            grown = True
+    return start, end

@@ -1,0 +1,161 @@
+"""Whole texts and files: which problems are found, and where in the file."""
+
+import threading
+
+import pytest
+
+from codeloom import check
+from codeloom.check import CheckFile, CheckText, Problem
+
+
+def Found(text, language="3.12"):
+    """Each problem as "row:column", with its message unless that is the plain one."""
+    return [
+        f"{problem.row}:{problem.column}"
+        + ("" if problem.message == "invalid syntax" else f" {problem.message}")
+        for problem in CheckText(text, language)
+    ]
+
+
+@pytest.mark.parametrize(
+    "text",
+    [
+        "",
+        "\n\n",
+        "# only a comment",
+        "\\\n",
+        "x = 1",
+        "x = [\n\n1,  # one\n\n]\r\ny = '''\r\n'''\rz = 3\n",
+        "if x: pass\nelif y: pass\nelse: pass\n",
+        "async def f():\n    await g(); return [x async for x in y]\n",
+        'print(f"{a!r:>{width}} {b=} {{}}")\n',
+        "def f(x: 'List[int]') -> 'Dict[str, int]': ...  # type: ignore\n",
+        "x = '\ufffd'\x0c\n\x0cy = '\u2028'\n",
+    ],
+)
+def test_sound_texts(text):
+    assert Found(text) == []
+
+
+@pytest.mark.parametrize(
+    ("text", "found"),
+    [
+        # In the first row and below it, counted in characters.
+        ("x = (1))", ["1:8"]),
+        ("\n\n  é = '日本' '\U0001d4b3' )\n", ["3:16"]),
+        ("\tx = 1 1\n", ["1:8"]),
+        ("f(a,\n  b,\n\tc d,\n)\n", ["3:4"]),
+        ("x = '''\né''' 1\n", ["2:6"]),
+        # Behind the last token, also when that has several rows.
+        ("x = (\n", ["1:6"]),
+        ("x =", ["1:4"]),
+        ("x = (é +  # why\n", ["1:16"]),
+        ("x = ('''a\r\nbé'''\r\n", ["2:6"]),
+        # One problem for each line, and several lines in one row.
+        ("x = )\ny = 1\nz = ]\n", ["1:5", "3:5"]),
+        ("x = ); y = 1; é = ]", ["1:5", "1:19"]),
+        # Every kind of row end, and what is none.
+        ("x = 1\ry = )\r\n\rz = )\n", ["2:5", "4:5"]),
+        ("x = '\u2028\x0b\x85'; y = )", ["1:16"]),
+        # Incomplete text is the fault of its own line only.
+        ("x = f(1,\ndef g():\n    return 2\n", ["1:9"]),
+        ("x = 'a\ny = 1\n", ["1:5"]),
+    ],
+)
+def test_places(text, found):
+    assert Found(text) == found
+
+
+HINT = "invalid syntax in stringified type hint"
+
+
+@pytest.mark.parametrize(
+    ("text", "found"),
+    [
+        ("x = f'{a b}'", ["1:10"]),
+        ("é = '日本', f'é{a} {{}} {b c}'", ["1:26"]),
+        ("\tf(f'''\n{a}\n\té {b c}\n''')", ["3:7"]),
+        ("f(\n  a, f'''{\n\né b}''')", ["4:3"]),
+        # Of equal expressions the first is at fault.
+        ("x = f'{a b} {a b}'", ["1:10"]),
+        ("x = f'{a b}', '{a b}', f'{a b}'", ["1:10"]),
+        # The field of a format, and a field behind a sound one of the same text.
+        ("x = f'{a:{b c}}'", ["1:13"]),
+        ("x = f'{é}' f'{é}' f'{é(}'", ["1:24"]),
+        # A walker's complaint, which counts rows in another way.
+        ("x = (1,\n f'{f(a for a in b, 1)}')", None),
+        ("x: 'List[int' = 1", [f"1:13 {HINT}"]),
+        ("def f(é: 'é é', b: 'c d'): pass", [f"1:13 {HINT}"]),
+        ("def f(\n    a: '日 b',\n): pass", [f"2:11 {HINT}"]),
+        ("x: '''A[\n  é b]''' = 1", [f"2:5 {HINT}"]),
+    ],
+)
+def test_places_within_strings(text, found):
+    if found is None:
+        message = "Generator expression must be parenthesized if not sole argument"
+        (problem,) = CheckText(text)
+        assert (problem.row, problem.message) == (2, message)
+        assert problem.column in (6, 7)
+        return
+    assert Found(text) == found
+
+
+def test_places_of_commented_hints():
+    assert Found("def f(a):\n    é = 1  # type: List[\n") == ["2:25"]
+
+
+@pytest.mark.parametrize(
+    ("text", "found"),
+    [
+        ("x = 1; é = '\udcff')\ny = )\n", ["1:13 the lone", "2:5"]),
+        ("'''\n\0\n''' )\ny = )", ["2:1 a NUL", "4:5"]),
+        ("é = \0\n", ["1:5 a NUL"]),
+        # A replacement character that the file itself holds spoils nothing.
+        ("x = '\ufffd')\n'\0'", ["1:8", "2:2 a NUL"]),
+    ],
+)
+def test_a_line_with_unreadable_characters_has_that_problem_alone(text, found):
+    assert [words[: len(want)] for words, want in zip(Found(text), found, strict=True)] == found
+
+
+def test_a_problem_tells_all_of_its_place(write_files):
+    folder = write_files({"a.py": "# coding: latin-1\r\n\té = )\r\n".encode("latin-1")})
+    path = folder / "a.py"
+    assert CheckFile(path) == [Problem(str(path), 2, 6, "invalid syntax", "\té = )")]
+    with pytest.raises(FileNotFoundError):
+        CheckFile(folder / "absent.py")
+
+
+def test_a_walk_that_hits_a_limit_prints_nothing(capfd):
+    assert CheckText("a" + ".a" * 20_000 + "\nx = " + "(" * 2_000 + ")" * 2_000) == []
+    assert capfd.readouterr() == ("", "")
+
+
+def test_a_line_that_is_too_long_is_told(monkeypatch):
+    monkeypatch.setattr(check, "MOST_TOKENS", 5)
+    (problem,) = CheckText("x = 1\n\ty = 1 + 1 + )\nz = 1")
+    assert (problem.row, problem.column) == (2, 2)
+    assert "7 tokens" in problem.message and "split it" in problem.message
+
+
+def test_threads_share_the_analyzers():
+    text = "x = f'{a b}'\ny = [i for i in range(9)]\nz = )\n" * 200
+    results = []
+    threads = [
+        threading.Thread(target=lambda name=name: results.append(Found(text, name)))
+        for name in ("3.11", "3.11", "3.12", "3.12")
+    ]
+    for thread in threads:
+        thread.start()
+    for thread in threads:
+        thread.join()
+    assert results == [Found(text)] * 4
+
+
+@pytest.mark.parametrize("seed", range(3))
+def test_a_broken_line_spoils_no_other(seed):
+    sound = ["def f(a):", "    return {'x': a}", "class C: x = 1", "if a: pass", "else: pass"]
+    broken = ["x = 1 1", "y = 'a", "import", "f(a b)", "z = ]", "x = f'{a b}'"]
+    rows = [sound[(i * 7 + seed) % 5] if i % 3 else broken[(i + seed) % 6] for i in range(60)]
+    faulty_rows = {problem.row for problem in CheckText("\n".join(rows))}
+    assert faulty_rows == {i + 1 for i, row in enumerate(rows) if row in broken}

@@ -1,0 +1,66 @@
+"""Rows of source as they are shown: tabs, wide characters, long rows, control characters."""
+
+import pytest
+
+from codeloom.check import Problem
+from codeloom.excerpt import Excerpt
+
+
+@pytest.mark.parametrize(
+    ("row", "column", "shown", "caret"),
+    [
+        ("x = (1))", 8, "x = (1))", "       ^"),
+        ("x = (", 6, "x = (", "     ^"),
+        ("", 1, "", "^"),
+        ("x", 99, "x", " ^"),
+        ("\tx\ty", 2, "    x   y", "    ^"),
+        ("\tx\ty", 4, "    x   y", "        ^"),
+        ("日本 = )", 6, "日本 = )", "       ^"),
+        ("\uff45 )", 3, "\uff45 )", "   ^"),
+        ("e\u0301 )", 4, "e\u0301 )", "  ^"),
+        ("🙂 )", 3, "🙂 )", "   ^"),
+        ("\x1b[2J\u202e)\x0c\0", 6, "\ufffd[2J\ufffd)\ufffd\ufffd", "     ^"),
+    ],
+)
+def test_rows_that_fit(row, column, shown, caret):
+    assert Excerpt(row, column) == (shown, caret)
+
+
+@pytest.mark.parametrize("column", [1, 2, 49, 50, 51, 97, 98, 100, 101])
+@pytest.mark.parametrize("unit", ["abcdefghij", "äöü日本\tghij", "日本語日本語日本語日"])
+def test_long_rows_are_cut_around_the_place(unit, column):
+    row = unit * 10
+    shown, caret = Excerpt(row, column, width=40)
+    assert _ShownWidth(shown) <= 40 and len(caret) <= 41
+    if column <= len(row):
+        at_caret = _AtColumn(shown, len(caret) - 1)
+        assert at_caret == row[column - 1].replace("\t", " ")
+    assert shown.startswith("...") == (column > 40)
+    assert shown.endswith("...") == (column < 80)
+
+
+def test_a_row_as_long_as_a_file():
+    shown, caret = Excerpt("x" * 10_000_000 + ")" + "y" * 10_000_000, 10_000_001, width=20)
+    assert shown == "...xxxxxxx)yyyyyy..."
+    assert caret == "          ^"
+
+
+def test_a_problem_renders_itself():
+    problem = Problem("a.py", 3, 5, "invalid syntax", "\tx y")
+    assert problem.Rendered() == "a.py:3:5: invalid syntax\n    x y\n       ^"
+
+
+def _Widths(shown):
+    return [2 if char in "日本語" else 1 for char in shown]
+
+
+def _ShownWidth(shown):
+    return sum(_Widths(shown))
+
+
+def _AtColumn(shown, col):
+    for char, width in zip(shown, _Widths(shown), strict=True):
+        if col < width:
+            return char
+        col -= width
+    return None
