@@ -1,0 +1,52 @@
+"""What several test files share."""
+
+import os
+import subprocess
+import sys
+from collections.abc import Callable
+from pathlib import Path
+
+import pytest
+
+
+@pytest.fixture
+def write_files(tmp_path: Path) -> Callable[[dict[str, str | bytes]], Path]:
+    """Writes files, path below the temporary folder to content, and gives that folder."""
+
+    def Write(files: dict[str, str | bytes]) -> Path:
+        for name, content in files.items():
+            path = tmp_path / name
+            path.parent.mkdir(parents=True, exist_ok=True)
+            path.write_bytes(content.encode() if isinstance(content, str) else content)
+        return tmp_path
+
+    return Write
+
+
+@pytest.fixture
+def cli_environment() -> dict[str, str]:
+    """The environment of a command line that writes UTF-8 and knows nothing of this terminal."""
+    terminal = ("COLUMNS", "LINES", "NO_COLOR", "TERM")
+    kept = {name: value for name, value in os.environ.items() if name not in terminal}
+    return {**kept, "PYTHONIOENCODING": "utf-8", "TERM": "xterm"}
+
+
+@pytest.fixture
+def run_cli(
+    tmp_path: Path, cli_environment: dict[str, str]
+) -> Callable[..., subprocess.CompletedProcess[str]]:
+    """Runs `python -m codeloom` in the temporary folder."""
+
+    def Run(*arguments: str | Path, stdin: bytes = b"") -> subprocess.CompletedProcess[str]:
+        done = subprocess.run(
+            [sys.executable, "-m", "codeloom", *map(str, arguments)],
+            input=stdin,
+            capture_output=True,
+            cwd=tmp_path,
+            env=cli_environment,
+            timeout=60,
+        )
+        stdout, stderr = done.stdout.decode(), done.stderr.decode()
+        return subprocess.CompletedProcess(done.args, done.returncode, stdout, stderr)
+
+    return Run

@@ -1,0 +1,258 @@
+"""The command line: exit statuses, output, how files are found, how it ends."""
+
+import os
+import signal
+import subprocess
+import sys
+from pathlib import Path
+
+import pytest
+
+EXAMPLES = Path(__file__).parent.parent / "examples"
+
+
+@pytest.mark.parametrize(
+    ("arguments", "status", "summary"),
+    [
+        (["sound.py"], 0, "0 problems in 1 file, 1 logical line"),
+        (["broken.py"], 1, "2 problems in 1 of 1 file, 3 logical lines"),
+        (["sound.py", "broken.py"], 1, "2 problems in 1 of 2 files, 4 logical lines"),
+        (
+            ["absent.py", "sound.py", "absent.py"],
+            2,
+            "0 problems in 1 file, 1 logical line; 1 not read",
+        ),
+        (["broken.py", "absent.py"], 2, "2 problems in 1 of 1 file, 3 logical lines; 1 not read"),
+        (["--python", "2.7", "old.py"], 0, "0 problems in 1 file, 1 logical line"),
+        (["--python=3.5", "old.py"], 1, "1 problem in 1 of 1 file, 1 logical line"),
+        (["empty"], 0, "0 problems in 0 files, 0 logical lines"),
+        (["many.py"], 0, "0 problems in 1 file, 12,345 logical lines"),
+    ],
+)
+def test_statuses_and_summaries(write_files, run_cli, arguments, status, summary):
+    folder = write_files(
+        {
+            "sound.py": "x = 1\n",
+            "broken.py": "x = 1 1\ny = 1\nz = )\n",
+            "old.py": "print 1\n",
+            "many.py": "x = 1\n" * 12_345,
+        }
+    )
+    (folder / "empty").mkdir()
+    done = run_cli("check", *arguments)
+    assert (done.returncode, done.stdout.splitlines()[-1]) == (status, summary)
+    assert done.stderr == (
+        "codeloom: can't read absent.py: No such file or directory\n" if status == 2 else ""
+    )
+
+
+def test_output(write_files, run_cli):
+    write_files(
+        {"a b.py": "x = 1\n\ty = '日本' )\r\n", "c.py": b"'\xe9'\n" + b"z = 1 ) " + b"+ 1 " * 60}
+    )
+    done = run_cli("check", "a b.py", "c.py")
+    assert done.stdout.splitlines() == [
+        "a b.py:2:11: invalid syntax",
+        "        y = '日本' )",
+        "                   ^",
+        "c.py:1:2: byte 0xE9 can't be read as utf-8: save the file as UTF-8, or name its encoding "
+        "in the first row, as in `# coding: latin-1`",
+        "    '\ufffd'",
+        "     ^",
+        "c.py:2:7: invalid syntax",
+        "    " + ("z = 1 ) " + "+ 1 " * 60)[:90] + "...",
+        " " * 10 + "^",
+        "3 problems in 2 of 2 files, 4 logical lines",
+    ]
+
+
+def test_the_examples(run_cli):
+    done = run_cli("check", "--python", "3.12", EXAMPLES / "sound")
+    assert done.returncode == 0
+    assert run_cli("check", "--python=2.7", EXAMPLES / "sound/inventory.py2").returncode == 0
+    done = run_cli("check", EXAMPLES / "broken")
+    places = [
+        row.removeprefix(f"{EXAMPLES}/broken/").rpartition(": ")[0]
+        for row in done.stdout.splitlines()
+        if row.startswith(str(EXAMPLES))
+    ]
+    assert places == [
+        "fstring_field.py:4:34",
+        "fstring_field.py:5:54",
+        "fstring_field.py:8:16",
+        "fstring_field.py:14:32",
+        "half_written.py:4:20",
+        "half_written.py:6:8",
+        "half_written.py:10:28",
+        "half_written.py:16:44",
+        "half_written.py:20:80",
+        "half_written.py:23:66",
+        "missing_quote.py:3:12",
+        "tabs_and_wide_text.py:6:34",
+        "tabs_and_wide_text.py:7:22",
+        "tabs_and_wide_text.py:8:45",
+        "unclosed_bracket.py:10:42",
+    ]
+
+
+@pytest.mark.parametrize(
+    ("arguments", "words"),
+    [
+        ([], "COMMAND"),
+        (["mend", "a.py"], "invalid choice: 'mend'"),
+        (["check"], "FILE-OR-FOLDER"),
+        (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.14"),
+        (["check", "--fast", "a.py"], "--fast"),
+    ],
+)
+def test_wrong_use(run_cli, arguments, words):
+    done = run_cli(*arguments)
+    assert (done.returncode, done.stdout) == (2, "")
+    assert words in done.stderr and "Traceback" not in done.stderr
+
+
+def test_version_and_help(run_cli):
+    assert run_cli("--version").stdout.startswith("codeloom ")
+    assert "check" in run_cli("--help").stdout
+    assert "--python" in run_cli("check", "--help").stdout
+
+
+class TestFiles:
+    """Which files are checked; each is broken, so that its path is printed."""
+
+    @pytest.fixture
+    def checked(self, run_cli):
+        def Checked(*arguments, **options):
+            done = run_cli("check", *arguments, **options)
+            return [
+                row.split(":")[0]
+                for row in done.stdout.splitlines()
+                if ":" in row and row[0] != " "
+            ]
+
+        return Checked
+
+    def test_folders(self, write_files, checked):
+        sources = ["c/d.pyi", "b.py", "a.py", "c/b.PYW", "c-d.py", "c/e/f.py"]
+        others = ["z.txt", "Makefile", "c/env/pyvenv.cfg", "c/env/lib/a.py", "__pycache__/a.py"]
+        hidden = [".git/a.py", ".hidden/a.py"]
+        write_files({name: ")" for name in sources + others + hidden})
+        found = ["a.py", "b.py", "c/b.PYW", "c/d.pyi", "c/e/f.py", "c-d.py"]
+        assert checked(".") == [f"./{name}" for name in found]
+        assert checked(".hidden", "c/env", "z.txt", "Makefile") == [
+            ".hidden/a.py",
+            "c/env/lib/a.py",
+            "z.txt",
+            "Makefile",
+        ]
+
+    def test_nothing_is_checked_twice(self, write_files, checked):
+        folder = write_files({"a.py": ")", "b/c.py": ")", "b/d.py": ")"})
+        assert checked("a.py", "./a.py", folder / "a.py", "b/../a.py") == ["a.py"]
+        assert checked("b/d.py", "b", "b/c.py", "b/") == ["b/d.py", "b/c.py"]
+        assert checked("b", ".") == ["b/c.py", "b/d.py", "./a.py"]
+        (folder / "b/link.py").symlink_to("../a.py")
+        assert checked("a.py", "b") == ["a.py", "b/c.py", "b/d.py"]
+
+    def test_links_of_folders(self, write_files, checked):
+        folder = write_files({"a/b.py": ")", "other/c.py": ")"})
+        (folder / "a/loop").symlink_to(".", target_is_directory=True)
+        (folder / "a/up").symlink_to("..", target_is_directory=True)
+        assert checked("a") == ["a/b.py", "a/up/other/c.py"]
+
+    def test_broken_links_and_pipes(self, write_files, run_cli):
+        folder = write_files({"a.py": "x = 1\n"})
+        (folder / "gone.py").symlink_to("nowhere.py")
+        (folder / "self.py").symlink_to("self.py")
+        (folder / ".#lock.py").symlink_to("user@host")
+        os.mkfifo(folder / "pipe.py")
+        done = run_cli("check", ".")
+        assert done.returncode == 2
+        assert done.stderr.splitlines() == [
+            "codeloom: can't read ./gone.py: No such file or directory",
+            "codeloom: can't read ./self.py: Too many levels of symbolic links",
+        ]
+
+    def test_deep_folders(self, tmp_path, checked):
+        folder = tmp_path
+        for _ in range(1_100):
+            folder /= "d"
+            folder.mkdir()
+        (folder / "a.py").write_text(")")
+        assert len(checked(".")) == 1
+        # Pytest can't remove what is nested deeper than its own stack.
+        (folder / "a.py").unlink()
+        while folder != tmp_path:
+            folder.rmdir()
+            folder = folder.parent
+
+    def test_paths_that_are_no_text(self, tmp_path, run_cli):
+        try:
+            (tmp_path / os.fsdecode(b"\xff\x1b.py")).write_text(")")
+        except OSError:
+            pytest.skip("this file system takes only text")
+        assert run_cli("check", ".").stdout.startswith("./\\xff\ufffd.py:1:1: invalid syntax")
+
+    def test_standard_input(self, checked, run_cli):
+        assert checked("-", "-", stdin=b")") == ["<stdin>"]
+        done = run_cli("check", "-", stdin=b"# coding: latin-1\r'\xe9' )\r")
+        assert done.stdout.splitlines()[:2] == ["<stdin>:2:5: invalid syntax", "    'é' )"]
+
+
+class TestEndings:
+    """What else may end a run, and what the streams are."""
+
+    @pytest.fixture
+    def start_cli(self, tmp_path, cli_environment):
+        def Start(*arguments, **options):
+            command = [sys.executable, "-m", "codeloom", "check", *arguments]
+            options = {"stdout": subprocess.PIPE, "stderr": subprocess.PIPE} | options
+            return subprocess.Popen(command, cwd=tmp_path, env=cli_environment, **options)
+
+        return Start
+
+    def test_a_reader_that_goes_away(self, write_files, start_cli):
+        write_files({"a.py": "x = )\n" * 20_000})
+        process = start_cli("a.py")
+        process.stdout.readline()
+        process.stdout.close()
+        assert process.stderr.read() == b""
+        assert process.wait(30) == 141
+        process.stderr.close()
+
+    def test_an_interrupt(self, write_files, start_cli):
+        write_files({"a.py": "x = )\n"})
+        process = start_cli("a.py", "-", stdin=subprocess.PIPE)
+        # The problems of a file are seen at once, before the next file is read.
+        assert b"a.py:1:5" in process.stdout.readline()
+        process.send_signal(signal.SIGINT)
+        _, stderr = process.communicate(timeout=30)
+        assert (process.returncode, stderr) == (130, b"")
+
+    @pytest.mark.skipif(not os.path.exists("/dev/full"), reason="needs a full device")
+    def test_a_full_disk(self, write_files, start_cli):
+        write_files({"a.py": "x = )\n"})
+        with open("/dev/full", "wb") as full:
+            process = start_cli("a.py", stdout=full)
+            _, stderr = process.communicate(timeout=30)
+        assert (process.returncode, stderr) == (
+            2,
+            b"codeloom: [Errno 28] No space left on device\n",
+        )
+
+    @pytest.mark.parametrize(("no_colour", "coloured"), [(None, True), ("", True), ("1", False)])
+    def test_colour_on_a_terminal(
+        self, write_files, start_cli, cli_environment, no_colour, coloured
+    ):
+        pty = pytest.importorskip("pty")
+        write_files({"a.py": "x = )\n"})
+        if no_colour is not None:
+            cli_environment["NO_COLOR"] = no_colour
+        terminal, terminal_of_process = pty.openpty()
+        process = start_cli("a.py", stdout=terminal_of_process)
+        os.close(terminal_of_process)
+        assert process.wait(30) == 1
+        output = os.read(terminal, 65_536)
+        os.close(terminal)
+        process.stderr.close()
+        assert (b"\033[" in output) == coloured
