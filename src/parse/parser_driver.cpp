@@ -6,6 +6,7 @@
 #include "neighbours/token_type.h"
 #include "parse/class_table.h"
 #include "parse/token_feed.h"
+#include "parse/token_search.h"
 
 namespace codeloom {
 
@@ -76,6 +77,7 @@ void CPGenParserImpl::Init(nb::object version_triple, nb::object grammar_file, n
     _fClsForStateList = _BuildClsForStateList();
     _fNodeFactory = MakeInstance<CNodeFactory>();
     _fNodeFactory->Init(_fGrammar, _fClsForStateList, _fKeywords, token_names, operator_types);
+    _fMatchCaseStatementParser = NewInstance<CMatchCaseStatementParser>(Self());
     __GetTime = HomeModule().attr("time").attr("time");
 }
 
@@ -146,17 +148,7 @@ Py_ssize_t CPGenParserImpl::_FindNextNonSkipIndex(nb::tuple toks, Py_ssize_t ind
 
 Py_ssize_t CPGenParserImpl::_NonNestedFindTokenIndex(nb::object target, nb::tuple toks, Py_ssize_t start,
                                                      Py_ssize_t end) {
-    const CUtf8 target_text(target);
-    int depth = 0;
-    for (Py_ssize_t i = start; i < end; ++i) {
-        const CUtf8 utf8(TupleItem(toks, i));
-        const std::string_view text = utf8;
-        if (depth == 0 && target_text == text) return i;
-        if (text.size() != 1) continue;
-        if (text[0] == '(' || text[0] == '[' || text[0] == '{') ++depth;
-        if (text[0] == ')' || text[0] == ']' || text[0] == '}') --depth;
-    }
-    return -1;
+    return FindOutsideBrackets(CUtf8(target), toks, start, end);
 }
 
 void CPGenParserImpl::_RaiseParseError(nb::handle tok_i) {
@@ -184,6 +176,7 @@ bool CPGenParserImpl::_ShouldSkipSlash(Py_ssize_t tok_i, CPositions positions) {
 }
 
 void BindParserDriver(nb::module_& module) {
+    BindMatchCaseParser(module);
     nb::class_<CPGenParserImpl, CPGenAnalyzer, TParserDriverOperations<CPGenParserImpl>> binding(
         module, "CPGenParserImpl", Collected<CPGenParserImpl>(),
         " Analyzes logical using a parser implemented via the pgen2 package ");
@@ -193,7 +186,9 @@ void BindParserDriver(nb::module_& module) {
              "py3_grammar"_a = true)
         .def_ro("_fVersionTriple", &CPGenParserImpl::_fVersionTriple, "The Python version analysed, a tuple.")
         .def_ro("_fAsyncAlwaysKeyword", &CPGenParserImpl::_fAsyncAlwaysKeyword,
-                "True when `async` and `await` are keywords everywhere (3.7 on, PEP 492).");
+                "True when `async` and `await` are keywords everywhere (3.7 on, PEP 492).")
+        .def_ro("_fMatchCaseStatementParser", &CPGenParserImpl::_fMatchCaseStatementParser,
+                "Parses `match` and `case` statements; a CMatchCaseStatementParser.");
     BindOperations(binding);
     binding.attr("kClsForState") = DirectClsForState();
 }

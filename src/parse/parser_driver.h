@@ -9,6 +9,7 @@
 
 #include "analysis/pgen_analyzer.h"
 #include "neighbours/optpgen/parser.h"
+#include "parse/match_case_parser.h"
 #include "tree/node_factory.h"
 
 namespace codeloom {
@@ -56,13 +57,16 @@ class CPGenParserImpl : public CPGenAnalyzer {
         visit(_fClsForStateList);
         visit(__GetTime);
         visit(_fVersionTriple);
+        visit(_fMatchCaseStatementParser);
     }
 
     nb::object _fVersionTriple = nb::none();  // the Python version analysed
     bool _fAsyncAlwaysKeyword = false;        // `async` and `await` are keywords everywhere
+    CRef<CMatchCaseStatementParser> _fMatchCaseStatementParser;
 
   private:
     friend class CTokenFeed;
+    friend class CMatchCaseStatementParser;  // works on the same factory and keywords
 
     CNodeRef _ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                          Py_ssize_t colon_i, Py_ssize_t end, bool raise_errors);
@@ -141,7 +145,8 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
     END_OPERATIONS
 };
 
-// Binds the class; its `kClsForState` is set here, after all node classes exist.
+// Binds the driver, and the parser of `match` and `case` that it owns. `kClsForState` is set here, after all
+// node classes exist.
 void BindParserDriver(nb::module_& module);
 
 }  // namespace codeloom

@@ -1,11 +1,12 @@
-// Statements beyond the grammar files: `with` in parentheses, `except*`, type parameters. The tokens in the
-// way are removed from a copy of the tuple, and the rest is parsed by the grammar; the indexes of all other
-// tokens stay.
+// Statements beyond the grammar files: `match` and `case`, which have a parser of their own, `with` in
+// parentheses, `except*`, type parameters. Of the latter three, the tokens in the way are removed from a copy
+// of the tuple, and the rest is parsed by the grammar; the indexes of all other tokens stay.
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/token_type.h"
 #include "parse/parser_driver.h"
+#include "parse/pseudo_node.h"
 #include "parse/token_copy.h"
 #include "tree/statement_nodes.h"
 
@@ -32,6 +33,9 @@ CNodeRef CPGenParserImpl::_ParseSpecialCases(nb::tuple toks, bool in_async_def, 
     if (i >= TupleSize(toks)) return CNodeRef();
     const CUtf8 text(TupleItem(toks, i));
     if (text == "with") return _ParseSpecialCaseParenthesizedWith(toks, in_async_def, positions, i);
+    if (text == "match")
+        return _fMatchCaseStatementParser->ParseMatchStmt(toks, nb::tuple(positions.AsHost()));
+    if (text == "case") return _fMatchCaseStatementParser->ParseCaseStmt(toks, nb::tuple(positions.AsHost()));
     if (text == "except") return _ParseSpecialCaseExceptStar(toks, in_async_def, positions, i);
     if (text == "type" || text == "def" || text == "class")
         return _ParseSpecialCaseWithTypeParameter(toks, in_async_def, positions, i);
@@ -48,7 +52,7 @@ CNodeRef CPGenParserImpl::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, boo
     const Py_ssize_t open_i = _FindNextNonSkipIndex(toks, i);
     if (!IsToken(toks, open_i, "(")) return CNodeRef();
     const Py_ssize_t close_i = _NonNestedFindTokenIndex(nb::str(")"), toks, open_i + 1, TupleSize(toks));
-    if (close_i <= open_i) return CNodeRef();
+    if (close_i <= open_i || close_i >= TupleSize(toks)) return CNodeRef();
     const nb::tuple rest = WithoutTokens(WithoutTokens(toks, open_i, open_i + 1), close_i, close_i + 1);
     return _ParseToksToNodeImpl(rest, in_async_def, positions);
 }
@@ -88,9 +92,7 @@ CNodeRef CPGenParserImpl::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, boo
     CNodeRef node = _ParseToksToNodeImpl(rest, in_async_def, positions);
     if (!has_parameters) return node;
     parameters.append(node.Release());
-    CRef<CWithTypeParameters> wrapper = NewInstance<CWithTypeParameters>();
-    wrapper->fChildren = std::move(parameters);
-    return CNodeRef(wrapper.get());
+    return NewPseudoNode<CWithTypeParameters>(std::move(parameters));
 }
 
 nb::list CPGenParserImpl::_NodesForTypeParameters(nb::tuple toks, bool in_async_def, CPositions positions,
@@ -136,16 +138,14 @@ CNodeRef CPGenParserImpl::_CreateSingleTypeParameterNode(nb::tuple toks, bool in
         children.append(colon_node.Release());
         children.append(bound.Release());
     }
-    CRef<CTypeParameter> parameter = NewInstance<CTypeParameter>();
-    parameter->fChildren = std::move(children);
-    return CNodeRef(parameter.get());
+    return NewPseudoNode<CTypeParameter>(std::move(children));
 }
 
 // The node of what stands behind the colon at `colon_i`; none when it is refused and errors aren't raised.
 CNodeRef CPGenParserImpl::_ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                                       Py_ssize_t colon_i, Py_ssize_t end, bool raise_errors) {
-    const nb::tuple bound_toks = WithoutTokens(FirstItems(toks, end), 0, colon_i + 1);
-    const CPositions bound_positions(FirstItems(positions.AsHost(), end));
+    const nb::tuple bound_toks = WithoutTokens(ItemsBetween(toks, 0, end), 0, colon_i + 1);
+    const CPositions bound_positions(ItemsBetween(positions.AsHost(), 0, end));
     try {
         return ParseToksToNode(bound_toks, in_async_def, bound_positions);
     } catch (const nb::python_error& error) {

@@ -1,5 +1,5 @@
-// Copies of a token tuple with some tokens removed. A removed token is none, so that the indexes of the
-// others stay.
+// Copies of a token tuple: a part of it, or all with some tokens removed. A removed token is none, so that
+// the indexes of the others stay.
 #pragma once
 
 #include "host/collections.h"
@@ -12,9 +12,9 @@ inline nb::tuple WithoutTokens(const nb::tuple& toks, Py_ssize_t start, Py_ssize
     });
 }
 
-// The first `count` items; none is the host's TypeError.
-inline nb::tuple FirstItems(const nb::object& items, Py_ssize_t count) {
-    return nb::tuple(nb::object(items[nb::slice(count)]));
+// The items in [start, end); none is the host's TypeError.
+inline nb::tuple ItemsBetween(const nb::object& items, Py_ssize_t start, Py_ssize_t end) {
+    return nb::tuple(nb::object(items[nb::slice(start, end)]));
 }
 
 }  // namespace codeloom

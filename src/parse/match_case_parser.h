@@ -1,0 +1,127 @@
+// `match` and `case` statements, which the grammar files don't know (PEP 634).
+//   in     the tokens and positions of a logical line whose first token is `match` or `case`
+//   out    a CMatchStmt or a CCaseStmt; none where the word is a plain name; ParseError at the exact token of
+//          a bad pattern
+//   keeps  the tokens of the line while it is parsed, nothing afterwards
+//   start  at ParseMatchStmt and ParseCaseStmt here; patterns are in case_patterns.cpp
+#pragma once
+
+#include <nanobind/nanobind.h>
+
+#include "tree/node_factory.h"
+
+namespace codeloom {
+
+class CPGenParserImpl;
+
+// Subject, guard and body go to the grammar, patterns are parsed here by recursive descent. It is no full
+// checker of patterns: it decides by the first token and by separators outside brackets.
+//
+// Comments and continuation backslashes are taken out first, so that the tokens have other indexes here than
+// in the logical line. Hence the leaves made here and the ParseErrors raised here have the token's position,
+// a (row, column) tuple, where others have its index.
+class CMatchCaseStatementParser : public CHosted {
+  public:
+    ~CMatchCaseStatementParser() override;
+
+    // `pgen_parser` parses what isn't a pattern, and its factory makes the leaves.
+    void Init(CRef<CPGenParserImpl> pgen_parser);
+
+    virtual Py_ssize_t _NonNestedFindTokenIndex(nb::str tok, Py_ssize_t start, Py_ssize_t end);
+    virtual nb::tuple _RemoveSkipToks(nb::tuple toks, nb::tuple positions);
+    virtual CNodeRef ParseMatchStmt(nb::tuple toks, nb::tuple positions);
+    virtual CNodeRef _ParseMatchStmtImpl();
+    virtual CNodeRef ParseCaseStmt(nb::tuple toks, nb::tuple positions);
+    virtual CNodeRef _ParseCaseStmtImpl();
+    virtual CNodeRef _NodeForPattern(Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as = true);
+    virtual CNodeRef _NodeForClassPattern(Py_ssize_t start_i, Py_ssize_t end_i);
+    virtual CNodeRef _NodeForDottedNameValue(Py_ssize_t start_i, Py_ssize_t end_i);
+    virtual CNodeRef _NodeForNumberPattern(Py_ssize_t start_i, Py_ssize_t end_i);
+    virtual CNodeRef _TokNode(Py_ssize_t tok_i);
+    virtual CNodeRef _NodeForSequencePattern(Py_ssize_t start_i, Py_ssize_t end_i);
+    virtual CNodeRef _NodeForMappingPattern(Py_ssize_t start_i, Py_ssize_t end_i);
+    virtual nb::object _ParseExceptionAt(Py_ssize_t error_i);
+
+    template <class Visitor>
+    void References(Visitor&& visit) {
+        visit(_fPGenParser);
+        visit(_fNodeFactory);
+        visit(_fToks);
+        visit(_fPositions);
+    }
+
+  private:
+    void _SetLine(const nb::tuple& toks_and_positions);
+    void _ForgetLine();
+    bool _IsStatementOfType(nb::handle logical_type) const;
+    CNodeRef _ParseRange(Py_ssize_t start_i, Py_ssize_t end_i);
+
+    CNodeRef _NodeForCapture(Py_ssize_t start_i, Py_ssize_t end_i);
+    CNodeRef _NodeForAlternatives(Py_ssize_t start_i, Py_ssize_t end_i);
+    CNodeRef _NodeForGroup(Py_ssize_t start_i, Py_ssize_t end_i);
+    CNodeRef _NodeForSingleToken(Py_ssize_t tok_i, int tok_type);
+    CNodeRef _NodeForStar(Py_ssize_t start_i, Py_ssize_t end_i);
+    CNodeRef _NodeForClassArgument(Py_ssize_t start_i, Py_ssize_t end_i);
+
+    // Tokens of the line; IndexError outside it, TypeError while there is none.
+    Py_ssize_t _TokCount() const;
+    nb::object _Tok(Py_ssize_t tok_i) const;
+    nb::object _Position(Py_ssize_t tok_i) const;
+    int _TokType(Py_ssize_t tok_i) const;
+    bool _IsTok(Py_ssize_t tok_i, std::string_view text) const;
+    bool _IsSign(Py_ssize_t tok_i) const;
+
+    // -1 where `tok` isn't found; or the end of the range.
+    Py_ssize_t _Find(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
+    Py_ssize_t _FindOrEnd(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
+
+    [[noreturn]] void _FailAt(Py_ssize_t error_i);
+
+    CRef<CPGenParserImpl> _fPGenParser;
+    CRef<CNodeFactory> _fNodeFactory;
+    nb::object _fToks = nb::none();       // tuple of the line's token texts; none between two parses
+    nb::object _fPositions = nb::none();  // tuple of their positions; none between two parses
+};
+
+template <class Class>
+class TMatchCaseParserOperations : public Class {
+    FIRST_OPERATIONS
+    OPERATION(_NonNestedFindTokenIndex,
+              "The index in [start, end) of the token text `tok` outside brackets; -1 when there is none.",
+              "tok"_a, "start"_a, "end"_a)
+    OPERATION(_RemoveSkipToks,
+              "The tokens without comments and line continuations, and their positions: a pair of tuples.",
+              "toks"_a, "positions"_a)
+    OPERATION(ParseMatchStmt,
+              "The CMatchStmt of a logical line, given as tuples of token texts and (row, column) positions; "
+              "None when it is no `match` statement (PEP 634). ParseError on a bad subject.",
+              "toks"_a, "positions"_a)
+    OPERATION(_ParseMatchStmtImpl, "ParseMatchStmt for the tokens of the line under way.")
+    OPERATION(ParseCaseStmt,
+              "The CCaseStmt of a logical line, given as tuples of token texts and (row, column) positions; "
+              "None when it is no `case` statement (PEP 634). ParseError on a bad pattern, guard or body.",
+              "toks"_a, "positions"_a)
+    OPERATION(_ParseCaseStmtImpl, "ParseCaseStmt for the tokens of the line under way.")
+    OPERATION(_NodeForPattern,
+              "The node of the pattern in [start_i, end_i). `allow_as`: the range may end in `as name`.",
+              "start_i"_a, "end_i"_a, "allow_as"_a = true)
+    OPERATION(_NodeForClassPattern, "The CClassPatternNode of `Name(pattern, name=pattern)`.", "start_i"_a,
+              "end_i"_a)
+    OPERATION(_NodeForDottedNameValue, "The CExpression of `name.name`; its text and context are None.",
+              "start_i"_a, "end_i"_a)
+    OPERATION(_NodeForNumberPattern, "The CPatternNode of a number with a sign or an imaginary part.",
+              "start_i"_a, "end_i"_a)
+    OPERATION(_TokNode, "A leaf for the token at `tok_i`, with the token's position as context.", "tok_i"_a)
+    OPERATION(_NodeForSequencePattern, "The CSequencePatternNode of a sequence in brackets or parentheses.",
+              "start_i"_a, "end_i"_a)
+    OPERATION(_NodeForMappingPattern, "The CSequencePatternNode of a mapping in braces.", "start_i"_a,
+              "end_i"_a)
+    OPERATION(_ParseExceptionAt,
+              "A ParseError at the token `error_i`, with the token's position as context; not raised here.",
+              "error_i"_a)
+    END_OPERATIONS
+};
+
+void BindMatchCaseParser(nb::module_& module);
+
+}  // namespace codeloom
