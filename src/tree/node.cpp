@@ -25,11 +25,11 @@ Py_ssize_t CNode::_GetChildCount() {
     return fChildren.is_none() ? 0 : ListSize(fChildren);
 }
 
-nb::object CNode::GetChildText(Py_ssize_t child_i) {
+CTextOrNone CNode::GetChildText(Py_ssize_t child_i) {
     return _GetChildText(child_i);
 }
 
-nb::object CNode::_GetChildText(Py_ssize_t i) {
+CTextOrNone CNode::_GetChildText(Py_ssize_t i) {
     return ChildText(i);
 }
 
@@ -37,8 +37,8 @@ CNodeRef CNode::GetChild(Py_ssize_t child_i) {
     return _HasItem(child_i) ? CNodeRef(&ChildAt(child_i)) : CNodeRef();
 }
 
-nb::object CNode::GetStateName() {
-    return fClsInfo ? fClsInfo->fName : Self().type().attr("__name__");
+CTextOrNone CNode::GetStateName() {
+    return fClsInfo ? CTextOrNone(fClsInfo->fName) : CTextOrNone(Self().type().attr("__name__"));
 }
 
 bool CNode::_DoesChildTextMatch(nb::str text) {

@@ -11,12 +11,14 @@
 
 #include "host/binding.h"
 #include "host/collections.h"
+#include "host/or_none.h"
 #include "host/text_match.h"
 
 namespace codeloom {
 
 class CNode;
 using CNodeRef = CRef<CNode>;
+using CNodeList = nb::typed<nb::list, CNode>;
 
 // One record for each grammar state and token type of a factory, and one for keywords. A node goes back to
 // the free list of the record that made it.
@@ -55,14 +57,20 @@ class CNode : public CHosted {
 
     virtual Py_ssize_t GetChildCount();
     virtual Py_ssize_t _GetChildCount();
-    virtual nb::object GetChildText(Py_ssize_t child_i);
-    virtual nb::object _GetChildText(Py_ssize_t i);
+    virtual CTextOrNone GetChildText(Py_ssize_t child_i);
+    virtual CTextOrNone _GetChildText(Py_ssize_t i);
     virtual CNodeRef GetChild(Py_ssize_t child_i);
-    virtual nb::object GetStateName();
+    virtual CTextOrNone GetStateName();
     virtual bool _DoesChildTextMatch(nb::str text);
 
     // Reading by position, for native code. A borrowed child belongs to the tree: whoever runs host code
     // while holding one holds a CNodeRef.
+
+    // This node as a T; null when it is of another class.
+    template <class T>
+    T* As() const {
+        return TryInstance<T>(Self());
+    }
 
     // The child at `i`, borrowed. TypeError for a leaf, IndexError outside the list.
     CNode& ChildAt(Py_ssize_t i) const { return *Instance<CNode>(_ItemAt(i)); }
@@ -80,7 +88,9 @@ class CNode : public CHosted {
     }
 
     // The text of the child at `i`; none past the end, and for a child without text.
-    nb::object ChildText(Py_ssize_t i) const { return _HasItem(i) ? ChildAt(i).fText : nb::none(); }
+    CTextOrNone ChildText(Py_ssize_t i) const {
+        return _HasItem(i) ? CTextOrNone(ChildAt(i).fText) : CTextOrNone();
+    }
 
     // True when the child at `i` has the text `token`; false past the end.
     bool IsToken(Py_ssize_t i, std::string_view token) const {

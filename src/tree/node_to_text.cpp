@@ -1,0 +1,241 @@
+#include "tree/node_to_text.h"
+
+#include <vector>
+
+#include "host/errors.h"
+#include "host/text.h"
+#include "neighbours/symbolinfo/info_bytes.h"
+#include "neighbours/symbolinfo/join_tokens.h"
+#include "strutils/utf8.h"
+#include "tree/node_helpers.h"
+
+namespace codeloom {
+
+namespace {
+
+nb::bytes HostBytes(std::string_view utf8) {
+    return nb::bytes(utf8.data(), utf8.size());
+}
+
+bool IsTrue(nb::handle value) {
+    return nb::cast<bool>(nb::bool_(nb::borrow(value)));
+}
+
+bool IsName(const CNode& leaf) {
+    return leaf.As<CNameLiteral>() != nullptr;
+}
+
+bool IsKeywordLiteral(nb::handle text) {
+    return TextIsOneOf(text, "None", "True", "False");
+}
+
+// Characters that can't be mistaken for anything but the contents of a string.
+bool AreAllSafe(std::string_view text) {
+    const auto end_pos = static_cast<Py_ssize_t>(text.size());
+    for (Py_ssize_t pos = 0; pos < end_pos; pos = AdjustUtf8Pos(text.data(), pos, 1, end_pos)) {
+        const bool is_safe =
+            IsAlnumAtUtf8Pos(text.data(), pos, end_pos) != 0 ||
+            std::string_view(" \"',._").find(text[static_cast<size_t>(pos)]) != std::string_view::npos;
+        if (!is_safe) return false;
+    }
+    return true;
+}
+
+bool AreAllStrings(CNode& node) {
+    for (Py_ssize_t i = 0; i < node._GetChildCount(); ++i)
+        if (node.TryChild<CStringLiteral>(i) == nullptr) return false;
+    return true;
+}
+
+}  // namespace
+
+bool AppendHostText(std::string& text, const nb::object& host_text) {
+    if (host_text.is_none()) return false;
+    text += CUtf8(host_text);
+    return true;
+}
+
+CBytesOrNone CNodeToTextConverter::TextForNode(CNode&, bool, bool, bool, bool) {
+    return CBytesOrNone();
+}
+
+void CNodeToTextConverterImpl::Init(nb::handle include_bracket_text, nb::handle include_string_contents,
+                                    nb::handle include_arg_text) {
+    _fIncludeBracketText = IsTrue(include_bracket_text);
+    _fIncludeStringContents = IsTrue(include_string_contents);
+    _fIncludeArgText = IsTrue(include_arg_text);
+}
+
+// The operations as the host calls them. Each works in a buffer of its own.
+
+CBytesOrNone CNodeToTextConverterImpl::TextForNode(CNode& node, bool dotted_name_only,
+                                                   bool discard_simple_parens, bool literal_only,
+                                                   bool add_parens_if_operator) {
+    std::string text;
+    const CNodeTextOptions options{dotted_name_only, discard_simple_parens, literal_only,
+                                   add_parens_if_operator};
+    const bool has_text = CNodeToTextConverterImpl::AppendTextForNode(text, node, options);
+    return has_text ? CBytesOrNone(HostBytes(text)) : CBytesOrNone();
+}
+
+nb::bytes CNodeToTextConverterImpl::_TextForStringLiteral(CStringLiteral& node) {
+    std::string text;
+    CNodeToTextConverterImpl::AppendTextForStringLiteral(text, node);
+    return HostBytes(text);
+}
+
+CBytesOrNone CNodeToTextConverterImpl::TextForAtomPlusTrailers(CNode& atom, CNodeList trailers,
+                                                               bool dotted_name_only,
+                                                               bool discard_simple_parens,
+                                                               bool literal_only) {
+    std::string text;
+    const CNodeTextOptions options{dotted_name_only, discard_simple_parens, literal_only};
+    const bool has_text =
+        CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(text, atom, std::move(trailers), options);
+    return has_text ? CBytesOrNone(HostBytes(text)) : CBytesOrNone();
+}
+
+// Nodes
+
+bool CNodeToTextConverterImpl::AppendTextForNode(std::string& text, CNode& node,
+                                                 const CNodeTextOptions& options) {
+    const CRecursionScope recursion;
+    const CNodeRef shown = options.discard_simple_parens ? DropSimpleParens(node) : CNodeRef(&node);
+    if (!shown->fText.is_none()) return _AppendLeaf(text, *shown, options);
+    if (CAtomExpr* const chain = shown->As<CAtomExpr>())
+        return AppendTextForAtomPlusTrailers(text, *chain->GetAtom(), chain->GetTrailers(), options);
+    if (CPower* const power = shown->As<CPower>())
+        return AppendTextForAtomPlusTrailers(text, *power->GetAtom(), power->GetTrailers(), options);
+    CAtom* const atom = options.dotted_name_only ? nullptr : shown->As<CAtom>();
+    return atom == nullptr ? _AppendJoinedChildren(text, *shown, options) : _AppendAtom(text, *atom, options);
+}
+
+bool CNodeToTextConverterImpl::_AppendLeaf(std::string& text, CNode& leaf, const CNodeTextOptions& options) {
+    if (options.dotted_name_only && !IsName(leaf)) return false;
+    if (options.literal_only && IsName(leaf) && !IsKeywordLiteral(leaf.fText)) return false;
+    if (CStringLiteral* const literal = leaf.As<CStringLiteral>()) {
+        AppendTextForStringLiteral(text, *literal);
+        return true;
+    }
+    return AppendHostText(text, leaf.fText);
+}
+
+bool CNodeToTextConverterImpl::_AppendAtom(std::string& text, CAtom& atom, const CNodeTextOptions& options) {
+    const nb::object bracket = atom.GetInitialBracket();
+    if (!_fIncludeBracketText && TextIsOneOf(bracket, "{", "[")) {
+        text += TextIs(bracket, "{") ? "{}" : "[]";
+    } else if (AreAllStrings(atom)) {
+        AppendTextForStringLiteral(text, *atom.ChildAs<CStringLiteral>(0));  // the first piece stands for all
+    } else if (_fIncludeBracketText && TextIs(bracket, "(") && atom._GetChildCount() == 2 &&
+               atom.IsToken(1, ")")) {
+        text += "( )";
+    } else {
+        return _AppendJoinedChildren(text, atom, options);
+    }
+    return true;
+}
+
+// Whatever has no form of its own: the texts of its children, joined as tokens are.
+bool CNodeToTextConverterImpl::_AppendJoinedChildren(std::string& text, CNode& node,
+                                                     const CNodeTextOptions& options) {
+    if (!_fIncludeBracketText || options.dotted_name_only || node.fChildren.is_none()) return false;
+    std::string children;
+    std::vector<size_t> ends;
+    for (Py_ssize_t i = 0; i < node._GetChildCount(); ++i) {
+        const CNodeRef child = node.ChildAs<CNode>(i);
+        if (!AppendTextForNode(children, *child)) return false;
+        ends.push_back(children.size());
+    }
+    std::vector<std::string_view> pieces;
+    size_t start = 0;
+    for (const size_t end : ends) {
+        pieces.push_back(std::string_view(children).substr(start, end - start));
+        start = end;
+    }
+    const bool has_parens = options.add_parens_if_operator && pieces.size() != 1;
+    if (has_parens) text += '(';
+    text += JoinTokens(pieces);
+    if (has_parens) text += ')';
+    return true;
+}
+
+// Chains
+
+bool CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(std::string& text, CNode& atom,
+                                                             CNodeList trailers,
+                                                             const CNodeTextOptions& options) {
+    // The brackets of `(a).b` are no longer simple.
+    const bool discard_simple_parens = options.discard_simple_parens && ListSize(trailers) == 0;
+    const CNodeTextOptions atom_options{options.dotted_name_only, discard_simple_parens,
+                                        options.literal_only};
+    if (!AppendTextForNode(text, atom, atom_options)) return false;
+    for (Py_ssize_t i = 0; i < ListSize(trailers); ++i) {
+        const CRef<CTrailer> trailer(Instance<CTrailer>(ListItem(trailers, i)));
+        if (!_AppendTrailer(text, *trailer, options)) break;
+    }
+    return true;
+}
+
+// False for a trailer that ends a dotted name.
+bool CNodeToTextConverterImpl::_AppendTrailer(std::string& text, CTrailer& trailer,
+                                              const CNodeTextOptions& options) {
+    const nb::object token = trailer.GetInitialToken();
+    if (TextIs(token, ".")) {
+        const nb::object name = trailer.GetDotName();
+        if (!name.is_none()) AppendHostText(text += '.', name);
+    } else if (options.dotted_name_only) {
+        return false;
+    } else if (TextIs(token, "(")) {
+        _AppendNested(text, trailer, "()", _fIncludeArgText);
+    } else if (TextIs(token, "[")) {
+        _AppendNested(text, trailer, "[]", _fIncludeBracketText);
+    } else {
+        throw nb::value_error("Bad trailer node");
+    }
+    return true;
+}
+
+void CNodeToTextConverterImpl::_AppendNested(std::string& text, CTrailer& trailer, std::string_view brackets,
+                                             bool with_contents) {
+    text += brackets.front();
+    const CNodeRef nested = with_contents ? trailer.GetNestedNode() : CNodeRef();
+    const size_t start = text.size();
+    if (nested && !AppendTextForNode(text, *nested)) text.resize(start);
+    text += brackets.back();
+}
+
+// Strings
+
+void CNodeToTextConverterImpl::AppendTextForStringLiteral(std::string& text, CStringLiteral& node) {
+    const nb::object literal = node.fText;
+    if (_fIncludeStringContents) {
+        const CUtf8 utf8(literal);
+        std::string storage;
+        if (AreAllSafe(utf8)) {
+            text += EncodeStringLiteral(utf8, storage);
+            return;
+        }
+    }
+    const bool is_bytes = _fIncludeStringContents && node.IsBytes();
+    text += is_bytes ? "b''" : node.IsUnicode() ? "u''" : "''";
+}
+
+void BindNodeToText(nb::module_& module) {
+    nb::class_<CNodeToTextConverter, TNodeToTextConverterOperations<CNodeToTextConverter>> interface(
+        module, "CNodeToTextConverter", "What turns nodes into short texts; a host may derive its own.");
+    interface.def(TInit<>());
+    BindOperations(interface);
+
+    nb::class_<CNodeToTextConverterImpl, CNodeToTextConverter,
+               TNodeToTextConverterImplOperations<CNodeToTextConverterImpl>>
+        converter(module, "CNodeToTextConverterImpl", "Turns nodes into short texts, as names are recorded.");
+    converter
+        .def(TInit<nb::handle, nb::handle, nb::handle>(), "include_bracket_text"_a.none() = false,
+             "include_string_contents"_a.none() = false, "include_arg_text"_a.none() = false,
+             "Each a truth value: whether what stands in brackets, in strings and in calls is shown.")
+        .def_ro("_fIncludeArgText", &CNodeToTextConverterImpl::_fIncludeArgText,
+                "True when the arguments of calls are shown.");
+    BindOperations(converter);
+}
+
+}  // namespace codeloom

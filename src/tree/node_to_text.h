@@ -1,0 +1,113 @@
+// Nodes into short texts, as names are recorded with them: `a.b.c`, `f(x)`.
+//   in     a node, and options that say how much of brackets, strings and arguments is shown
+//   out    UTF-8; none for what can't be rendered
+//   keeps  its three options, so that one converter serves any number of nodes
+//   start  at CNodeToTextConverterImpl::AppendTextForNode
+#pragma once
+
+#include <string>
+
+#include "host/or_none.h"
+#include "tree/atom_nodes.h"
+
+namespace codeloom {
+
+// What a text is wanted for.
+struct CNodeTextOptions {
+    bool dotted_name_only = false;        // `a.b` alone: cut at the first call or subscript
+    bool discard_simple_parens = true;    // `a` for `(a)`
+    bool literal_only = false;            // no names but None, True and False
+    bool add_parens_if_operator = false;  // `(a + b)`
+};
+
+// The interface; the base renders nothing.
+class CNodeToTextConverter : public CHosted {
+  public:
+    void Init() {}
+
+    virtual CBytesOrNone TextForNode(CNode& node, bool dotted_name_only = false,
+                                     bool discard_simple_parens = true, bool literal_only = false,
+                                     bool add_parens_if_operator = false);
+};
+
+template <class Class>
+class TNodeToTextConverterOperations : public Class {
+    FIRST_OPERATIONS
+    OPERATION(TextForNode,
+              "The text of a node as UTF-8; None for what can't be rendered. With `dotted_name_only` a chain "
+              "ends before its first call or subscript, and what isn't a name or a chain gives None. With "
+              "`literal_only` a plain name gives None.",
+              "node"_a, "dotted_name_only"_a = false, "discard_simple_parens"_a = true,
+              "literal_only"_a = false, "add_parens_if_operator"_a = false)
+    END_OPERATIONS
+};
+
+class CNodeToTextConverterImpl : public CNodeToTextConverter {
+  public:
+    // Truth values of the host.
+    void Init(nb::handle include_bracket_text, nb::handle include_string_contents,
+              nb::handle include_arg_text);
+
+    CBytesOrNone TextForNode(CNode& node, bool dotted_name_only = false, bool discard_simple_parens = true,
+                             bool literal_only = false, bool add_parens_if_operator = false) override;
+    virtual nb::bytes _TextForStringLiteral(CStringLiteral& node);
+    virtual CBytesOrNone TextForAtomPlusTrailers(CNode& atom, CNodeList trailers,
+                                                 bool dotted_name_only = false,
+                                                 bool discard_simple_parens = true,
+                                                 bool literal_only = false);
+
+    // The operations as native code calls them: they append to `text`, and answer false for none, which
+    // leaves `text` with an unfinished piece. A converter of a host subclass goes through its overrides.
+    virtual bool AppendTextForNode(std::string& text, CNode& node, const CNodeTextOptions& options = {});
+    virtual void AppendTextForStringLiteral(std::string& text, CStringLiteral& node);
+    virtual bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, CNodeList trailers,
+                                               const CNodeTextOptions& options = {});
+
+    bool _fIncludeBracketText = false;     // what stands in `[...]`, `{...}` and `(...)`
+    bool _fIncludeStringContents = false;  // strings of harmless characters as they stand
+    bool _fIncludeArgText = false;         // the arguments of a call
+
+  private:
+    bool _AppendLeaf(std::string& text, CNode& leaf, const CNodeTextOptions& options);
+    bool _AppendAtom(std::string& text, CAtom& atom, const CNodeTextOptions& options);
+    bool _AppendJoinedChildren(std::string& text, CNode& node, const CNodeTextOptions& options);
+    bool _AppendTrailer(std::string& text, CTrailer& trailer, const CNodeTextOptions& options);
+    void _AppendNested(std::string& text, CTrailer& trailer, std::string_view brackets, bool with_contents);
+};
+
+// Appends what an operation of a host gave; false for none, TypeError for what is no text.
+bool AppendHostText(std::string& text, const nb::object& host_text);
+
+template <class Class>
+class TNodeToTextConverterImplOperations : public TNodeToTextConverterOperations<Class> {
+    OPERATIONS_BEYOND(TNodeToTextConverterOperations<Class>)
+    OPERATION(_TextForStringLiteral,
+              "The text of a string literal as UTF-8: its own where that is wanted and harmless, else a "
+              "pair of quotes with the mark of its kind.",
+              "node"_a)
+    OPERATION(TextForAtomPlusTrailers,
+              "The text of an atom and the trailers behind it as UTF-8; None when the atom has none. "
+              "ValueError for a trailer that begins with none of `.`, `(` and `[`.",
+              "atom"_a, "trailers"_a, "dotted_name_only"_a = false, "discard_simple_parens"_a = true,
+              "literal_only"_a = false)
+    END_OPERATIONS
+
+    bool AppendTextForNode(std::string& text, CNode& node, const CNodeTextOptions& options) override {
+        return AppendHostText(text,
+                              this->TextForNode(node, options.dotted_name_only, options.discard_simple_parens,
+                                                options.literal_only, options.add_parens_if_operator));
+    }
+    void AppendTextForStringLiteral(std::string& text, CStringLiteral& node) override {
+        AppendHostText(text, this->_TextForStringLiteral(node));
+    }
+    bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, CNodeList trailers,
+                                       const CNodeTextOptions& options) override {
+        return AppendHostText(
+            text, this->TextForAtomPlusTrailers(atom, trailers, options.dotted_name_only,
+                                                options.discard_simple_parens, options.literal_only));
+    }
+};
+
+void BindNodeToText(nb::module_& module);
+
+}  // namespace codeloom
