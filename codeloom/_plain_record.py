@@ -6,17 +6,13 @@ all of the engine.
 
 
 class CPlainRecord:
-    """A record whose fields are its slots."""
-
-    __slots__: tuple[str, ...] = ()
+    """A record with the fields that its constructor sets."""
 
     def __eq__(self, other: object) -> bool:
-        if type(self) is not type(other):
-            return NotImplemented
-        return all(getattr(self, name) == getattr(other, name) for name in self.__slots__)
+        return vars(self) == vars(other) if type(self) is type(other) else NotImplemented
 
     __hash__ = None  # type: ignore[assignment]
 
     def __repr__(self) -> str:
-        fields = ", ".join(f"{name}={getattr(self, name)!r}" for name in self.__slots__)
+        fields = ", ".join(f"{name}={value!r}" for name, value in vars(self).items())
         return f"{type(self).__name__}({fields})"

@@ -62,7 +62,9 @@ class _CTextPosInfo(CPlainRecord):
     isn't known, and `utf8_col` the column in its row, in UTF-8 bytes from zero.
     """
 
-    __slots__ = ("lineno", "pos", "utf8_col")
+    lineno: int
+    pos: int
+    utf8_col: int
 
     def __init__(self, lineno: int, pos: int, utf8_col: int) -> None:
         self.lineno = lineno

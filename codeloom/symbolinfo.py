@@ -7,7 +7,6 @@ stands for. Kinds are integers from 0 to 255, as a byte string gives them by ind
 `codeloom.records` turns records into something to read.
 """
 
-from codeloom import _neighbours
 from codeloom._neighbours import (
     BuildLiteralInfo,
     CKindFilter,
@@ -21,11 +20,11 @@ from codeloom._neighbours import (
     IsTopLevelModuleScope,
     JoinTokens,
     NextNonNestedUtf8PtrIndex,
-    _kRecordKinds,
     _NonInlineNextNonNestedUtf8PtrIndex,
+    _SymbolConstants,
 )
 from codeloom._plain_record import CPlainRecord
-from codeloom.strutils import AsStr, BytesForInteger, Utf8Concat5
+from codeloom.strutils import AsStr, AsUtf8, BytesForInteger
 
 __all__ = [
     "BuildArgInfo",
@@ -52,29 +51,9 @@ __all__ = [
     "gInfoBytesBuilder",
 ]
 
-_CONSTANT_NAMES = [
-    "kPrefixLen",
-    "kIterationSubscript",
-    "kClassInstanceSuffix",
-    "kScopeIndexSep",
-    "kModuleScopeName",
-    "kWildcardScope",
-    "kDefLineScopeName",
-    "_kDotLineScopeName",
-    "kTypingModuleSymbol",
-    "kTypingModuleSymbolDot",
-    "kTypingModuleSymbolDotAny",
-    "kTypingModuleSymbolStr",
-    "kTypingModuleSymbolDotStr",
-    "kTypingModuleSymbolDotAnyStr",
-]
-for _name, *_ in _kRecordKinds:
-    _CONSTANT_NAMES += [
-        f"k{_name}Spec" if _name == "PlainEquiv" else f"k{_name}Prefix",
-        f"k{_name}Kind",
-    ]
-globals().update({_name: getattr(_neighbours, _name) for _name in _CONSTANT_NAMES})
-__all__ += _CONSTANT_NAMES
+_CONSTANTS = _SymbolConstants()
+globals().update(_CONSTANTS)
+__all__ += _CONSTANTS
 
 
 class CInfoBytesBuilder:
@@ -82,10 +61,7 @@ class CInfoBytesBuilder:
 
     def Build(self, prefix: bytes, *pieces: bytes | str | None) -> bytes:
         """The prefix and the pieces, joined as UTF-8; None contributes nothing."""
-        record = prefix
-        for piece in pieces:
-            record = Utf8Concat5(record, piece, None, None, None)
-        return record
+        return b"".join([prefix, *(AsUtf8(piece) for piece in pieces if piece is not None)])
 
 
 gInfoBytesBuilder = CInfoBytesBuilder()
@@ -93,9 +69,9 @@ gInfoBytesBuilder = CInfoBytesBuilder()
 
 
 def BuildArgInfo(i: int, name: bytes | str | None) -> bytes:
-    """The record that stands for an argument by its index from zero, with its name if that is known."""
+    """The record that stands for an argument by its index from zero, with its name if known."""
     blank = None if name is None else b" "
-    return gInfoBytesBuilder.Build(_neighbours.kArgPrefix, BytesForInteger(i), blank, name)
+    return gInfoBytesBuilder.Build(_CONSTANTS["kArgPrefix"], BytesForInteger(i), blank, name)
 
 
 def ObjectForStringLiteral(text: bytes | str) -> str | bytes | None:
@@ -112,7 +88,9 @@ def ObjectForStringLiteral(text: bytes | str) -> str | bytes | None:
 class CFullyScopedName(CPlainRecord):
     """The name of a definition: the module, the scope in it, and the name in that scope."""
 
-    __slots__ = ("module_name", "scope", "name")
+    module_name: str
+    scope: str
+    name: str
 
     def __init__(self, module_name: str, scope: str, name: str) -> None:
         self.module_name = module_name
@@ -123,7 +101,9 @@ class CFullyScopedName(CPlainRecord):
 class CDefInfo(CPlainRecord):
     """A definition: its name, its kind, and the row from zero on which it stands."""
 
-    __slots__ = ("name", "kind", "first_line")
+    name: CFullyScopedName
+    kind: int
+    first_line: int
 
     def __init__(self, name: CFullyScopedName, kind: int, first_line: int) -> None:
         self.name = name
@@ -134,7 +114,10 @@ class CDefInfo(CPlainRecord):
 class CArgTextInfo(CPlainRecord):
     """The texts of one argument: prefix, name, hint and default, each None when there is none."""
 
-    __slots__ = ("prefix", "name", "type_text", "value_text")
+    prefix: str | None
+    name: str | None
+    type_text: str | None
+    value_text: str | None
 
     def __init__(
         self,
@@ -152,7 +135,8 @@ class CArgTextInfo(CPlainRecord):
 class CSingleResolvedInfo(CPlainRecord):
     """What one record was found to mean: the record, and the location that it leads to."""
 
-    __slots__ = ("ibytes", "loc")
+    ibytes: bytes
+    loc: object
 
     def __init__(self, ibytes: bytes, loc: object) -> None:
         self.ibytes = ibytes

@@ -26,12 +26,8 @@ nb::object IntegerOf(char byte) {
     return nb::int_(static_cast<int>(static_cast<unsigned char>(byte)));
 }
 
-void SetConstant(nb::module_& module, const std::string& name, nb::handle value) {
-    module.attr(name.c_str()) = value;
-}
-
 // The table as a tuple of tuples, for those who read records.
-nb::tuple HostRecordKinds() {
+nb::tuple RecordKinds() {
     return MakeTuple(kRecordKinds.size(), [](Py_ssize_t i) -> nb::object {
         const CRecordKind& kind = kRecordKinds[static_cast<size_t>(i)];
         return nb::make_tuple(TextFromUtf8(kind.name), BytesOf(kind.prefix), IntegerOf(kind.kind),
@@ -40,31 +36,41 @@ nb::tuple HostRecordKinds() {
     });
 }
 
-void BindKindConstants(nb::module_& module) {
+// The constants by name: the prefixes and kinds, then all others.
+nb::dict SymbolConstants() {
+    nb::dict constants;
     for (const CRecordKind& kind : kRecordKinds) {
         const std::string name = "k" + std::string(kind.name);
         const bool is_plain = kind.kind == kPlainEquivKind;
-        SetConstant(module, name + (is_plain ? "Spec" : "Prefix"), BytesOf(kind.prefix));
-        SetConstant(module, name + "Kind", IntegerOf(kind.kind));
+        constants[(name + (is_plain ? "Spec" : "Prefix")).c_str()] = BytesOf(kind.prefix);
+        constants[(name + "Kind").c_str()] = IntegerOf(kind.kind);
     }
-    module.attr("kPrefixLen") = kPrefixLen;
-    module.attr("_kRecordKinds") = HostRecordKinds();
+    constants["kPrefixLen"] = kPrefixLen;
+    constants["kIterationSubscript"] = BytesOf(kIterationSubscript);
+    constants["kClassInstanceSuffix"] = BytesOf(kClassInstanceSuffix);
+    constants["kScopeIndexSep"] = TextFromUtf8(kScopeIndexSep);
+    constants["kModuleScopeName"] = TextFromUtf8(kModuleScopeName);
+    constants["kWildcardScope"] = TextFromUtf8(kWildcardScope);
+    constants["kDefLineScopeName"] = TextFromUtf8(kDefLineScopeName);
+    constants["_kDotLineScopeName"] = TextFromUtf8(_kDotLineScopeName);
+    constants["kTypingModuleSymbol"] = BytesOf(kTypingModuleSymbol);
+    constants["kTypingModuleSymbolDot"] = BytesOf(kTypingModuleSymbolDot);
+    constants["kTypingModuleSymbolDotAny"] = BytesOf(kTypingModuleSymbolDotAny);
+    constants["kTypingModuleSymbolStr"] = TextFromUtf8(kTypingModuleSymbol);
+    constants["kTypingModuleSymbolDotStr"] = TextFromUtf8(kTypingModuleSymbolDot);
+    constants["kTypingModuleSymbolDotAnyStr"] = TextFromUtf8(kTypingModuleSymbolDotAny);
+    return constants;
 }
 
-void BindNameConstants(nb::module_& module) {
-    module.attr("kIterationSubscript") = BytesOf(kIterationSubscript);
-    module.attr("kClassInstanceSuffix") = BytesOf(kClassInstanceSuffix);
-    module.attr("kScopeIndexSep") = TextFromUtf8(kScopeIndexSep);
-    module.attr("kModuleScopeName") = TextFromUtf8(kModuleScopeName);
-    module.attr("kWildcardScope") = TextFromUtf8(kWildcardScope);
-    module.attr("kDefLineScopeName") = TextFromUtf8(kDefLineScopeName);
-    module.attr("_kDotLineScopeName") = TextFromUtf8(_kDotLineScopeName);
-    module.attr("kTypingModuleSymbol") = BytesOf(kTypingModuleSymbol);
-    module.attr("kTypingModuleSymbolDot") = BytesOf(kTypingModuleSymbolDot);
-    module.attr("kTypingModuleSymbolDotAny") = BytesOf(kTypingModuleSymbolDotAny);
-    module.attr("kTypingModuleSymbolStr") = TextFromUtf8(kTypingModuleSymbol);
-    module.attr("kTypingModuleSymbolDotStr") = TextFromUtf8(kTypingModuleSymbolDot);
-    module.attr("kTypingModuleSymbolDotAnyStr") = TextFromUtf8(kTypingModuleSymbolDotAny);
+void BindVocabulary(nb::module_& module) {
+    module.def(
+        "_RecordKinds", &RecordKinds,
+        nb::sig("def _RecordKinds() -> tuple[tuple[str, bytes, int, str, str, str, str, str], ...]"),
+        "The kinds of records: name, prefix, kind, word, form of the payload, meaning, a line of source\n"
+        "and the record that it yields.");
+    module.def("_SymbolConstants", &SymbolConstants,
+               nb::sig("def _SymbolConstants() -> dict[str, typing.Any]"),
+               "The constants of the vocabulary by name.");
 }
 
 void BindKindFilter(nb::module_& module) {
@@ -139,8 +145,7 @@ void BindScopeFunctions(nb::module_& module) {
 }  // namespace
 
 void BindSymbolInfo(nb::module_& module) {
-    BindKindConstants(module);
-    BindNameConstants(module);
+    BindVocabulary(module);
     BindKindFilter(module);
     BindSymbolPrimitives(module);
     BindRecordFunctions(module);

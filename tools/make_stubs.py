@@ -1,0 +1,116 @@
+"""Write the type stubs of the package from an installed build of it.
+
+    python tools/make_stubs.py
+
+The native modules have stubs, and so have the modules that compute names of theirs while they are
+imported. All others are typed where they stand.
+"""
+
+import ast
+import importlib
+import inspect
+import pathlib
+from types import ModuleType
+
+from nanobind.stubgen import StubGen
+
+PACKAGE = pathlib.Path(__file__).parent.parent / "codeloom"
+NATIVE_MODULES = ("_neighbours", "treesift")
+COMPUTING_MODULES = ("_fastaccess", "logicalline", "symbolinfo")
+HEADER = "# Made by tools/make_stubs.py; don't edit.\n"
+# What a container of the host holds where a signature doesn't say.
+UNTOLD = {"list": "typing.Any", "tuple": "typing.Any, ...", "dict": "typing.Any, typing.Any"}
+ANYTHING = ast.parse("typing.Any", mode="eval").body
+
+
+class _ItemTypes(ast.NodeTransformer):
+    """Gives the containers of annotations the types of their items."""
+
+    def visit_Subscript(self, node: ast.Subscript) -> ast.AST:
+        node.slice = self.visit(node.slice)
+        return node
+
+    def visit_Name(self, node: ast.Name) -> ast.AST:
+        items = UNTOLD.get(node.id)
+        return node if items is None else ast.parse(f"{node.id}[{items}]", mode="eval").body
+
+
+class _AnnotationsOnly(ast.NodeTransformer):
+    """Does so in annotations, and leaves it open what a host object that comes out can do."""
+
+    def visit_arg(self, node: ast.arg) -> ast.AST:
+        if node.arg != "self":
+            node.annotation = _ItemTypes().visit(node.annotation or ANYTHING)
+        return node
+
+    def visit_AnnAssign(self, node: ast.AnnAssign) -> ast.AST:
+        node.annotation = self._ResultType(node.annotation)
+        return node
+
+    def visit_FunctionDef(self, node: ast.FunctionDef) -> ast.AST:
+        self.generic_visit(node)
+        if node.name != "__init__":
+            node.returns = self._ResultType(node.returns)
+        return node
+
+    def _ResultType(self, node: ast.expr | None) -> ast.AST:
+        is_told = node is not None and ast.unparse(node) != "object"
+        return _ItemTypes().visit(node) if is_told else ANYTHING
+
+
+def native_stub(module: ModuleType) -> str:
+    generator = StubGen(module=module, include_private=True)
+    generator.put(module)
+    tree = _AnnotationsOnly().visit(ast.parse(generator.get()))
+    return HEADER + "import typing\n" + ast.unparse(tree) + "\n"
+
+
+def reduced(statement: ast.stmt) -> ast.stmt:
+    """A definition with its documentation, and with no more of a function than its signature."""
+    if isinstance(statement, ast.ClassDef):
+        statement.body = [reduced(part) for part in statement.body]
+    if isinstance(statement, ast.FunctionDef):
+        documentation = statement.body[: ast.get_docstring(statement) is not None]
+        statement.body = [*documentation, ast.Expr(ast.Constant(...))]
+    return statement
+
+
+def computing_stub(module: ModuleType) -> str:
+    """The definitions as in the source, and for each value that is computed its type."""
+    parts = ast.parse(inspect.getsource(module)).body
+    imports = [part for part in parts if isinstance(part, ast.Import | ast.ImportFrom)]
+    definitions = [
+        reduced(part) for part in parts if isinstance(part, ast.FunctionDef | ast.ClassDef)
+    ]
+    known = {alias.name for part in imports for alias in part.names}
+    known |= {part.name for part in definitions}
+    values = [
+        f"{name}: {type(getattr(module, name)).__name__}"
+        for name in module.__all__
+        if name not in known
+    ]
+    return "\n".join(
+        [
+            HEADER.rstrip(),
+            *map(ast.unparse, imports),
+            f"__all__ = {module.__all__!r}",
+            *values,
+            *map(ast.unparse, definitions),
+            "",
+        ]
+    )
+
+
+def all_stubs() -> dict[str, str]:
+    """The text of each stub by the name of its file."""
+    makers = {name: native_stub for name in NATIVE_MODULES}
+    makers |= {name: computing_stub for name in COMPUTING_MODULES}
+    return {
+        f"{name}.pyi": make(importlib.import_module(f"codeloom.{name}"))
+        for name, make in makers.items()
+    }
+
+
+if __name__ == "__main__":
+    for file_name, text in all_stubs().items():
+        (PACKAGE / file_name).write_text(text, encoding="utf-8")
