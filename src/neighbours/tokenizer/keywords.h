@@ -34,7 +34,7 @@ inline constexpr auto kBehindOperand = std::to_array<std::string_view>({"and", "
 
 // Further words that are no operands, or not surely.
 inline constexpr auto kNoOperand =
-    std::to_array<std::string_view>({"lambda", "yield", "from", "await", "print", "exec"});
+    std::to_array<std::string_view>({"lambda", "yield", "from", "await", "print", "exec", "nonlocal"});
 
 // Begin the header of a compound statement, the soft ones perhaps.
 inline constexpr auto kCompound =
@@ -54,6 +54,11 @@ constexpr std::string_view WordAt(std::string_view text, size_t pos) {
 constexpr bool IsOperandWord(std::string_view word) {
     return !keywords::IsOneOf(word, keywords::kBinary) && !keywords::IsOneOf(word, keywords::kNoOperand) &&
            !keywords::IsOneOf(word, keywords::kStatementOnly);
+}
+
+// The word can begin a statement in front of an operand, and be a name.
+constexpr bool IsSoftKeyword(std::string_view word) {
+    return word == "match" || word == "case" || word == "type";
 }
 
 constexpr bool IsCompoundWord(std::string_view word) {

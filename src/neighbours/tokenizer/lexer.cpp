@@ -6,6 +6,7 @@
 #include "neighbours/tokenizer/fstring_scanner.h"
 #include "neighbours/tokenizer/number_lexer.h"
 #include "neighbours/tokenizer/operators.h"
+#include "neighbours/tokenizer/quote_recovery.h"
 #include "neighbours/tokenizer/unicode_names.h"
 
 namespace codeloom {
@@ -21,6 +22,7 @@ constexpr size_t kLeastWaste = 4096;
 CLexer::CLexer(std::string_view text)
     : _fText(text),
       _fWasteLeft(text.size() * kWastePerByte + kLeastWaste),
+      _fDoubtLeft(_fWasteLeft),
       _fNoTripleFrom{text.size(), text.size()} {}
 
 CLexedToken CLexer::Lex(size_t pos, int depth) {
@@ -59,6 +61,7 @@ CLexedToken CLexer::_LexString(size_t pos, const CStringStart& start, int depth)
     if (start.has_fields) found = _FindFieldStringEnd(content, start, depth);
     if (!found.is_closed && depth > 0 && start.has_fields) return {found.end, kTokenId_ERRORTOKEN, true};
     if (!found.is_closed) found = _FindPlainStringEnd(content, start);
+    if (start.IsTriple() && depth == 0) found = _JudgeTriple(pos, start, found);
     const int16_t type = found.is_closed ? kTokenId_STRING : kTokenId_ERRORTOKEN;
     return {found.end, type, found.may_span_rows, start.has_fields};
 }
@@ -79,6 +82,18 @@ CStringEnd CLexer::_FindPlainStringEnd(size_t pos, const CStringStart& start) {
     const CStringEnd found = FindStringEnd(_fText, pos, start.quote, true);
     if (!found.is_closed) no_triple_from = pos;
     return found;
+}
+
+// What the rows say about the end of a string with triple quotes.
+CStringEnd CLexer::_JudgeTriple(size_t pos, const CStringStart& start, const CStringEnd& found) {
+    if (!_fDoubts) return found;
+    if (_fDoubtLeft == 0) return found.is_closed ? found : CStringEnd{FindRowEnd(_fText, pos), false, false};
+    _fDoubts = false;
+    size_t looked_at = pos;
+    const size_t spoilt_end = FindUnclosedTripleEnd(*this, pos, start, found, looked_at);
+    _fDoubts = true;
+    _fDoubtLeft -= std::min(_fDoubtLeft, looked_at - pos);
+    return spoilt_end ? CStringEnd{spoilt_end, false, true} : found;
 }
 
 // A backslash continues a row only as its very last character. One with nothing but blanks behind it takes

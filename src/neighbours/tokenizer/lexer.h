@@ -34,6 +34,7 @@ class CLexer {
     CLexedToken _LexString(size_t pos, const CStringStart& start, int depth);
     CStringEnd _FindFieldStringEnd(size_t pos, const CStringStart& start, int depth);
     CStringEnd _FindPlainStringEnd(size_t pos, const CStringStart& start);
+    CStringEnd _JudgeTriple(size_t pos, const CStringStart& start, const CStringEnd& found);
     CLexedToken _LexBackslash(size_t pos) const;
     CLexedToken _LexOperator(size_t pos) const;
 
@@ -41,6 +42,9 @@ class CLexer {
     // Bytes that may still be scanned in vain for the end of broken f-strings: a share of the text's length,
     // so that hostile text takes linear time too. Sound text wastes nothing.
     size_t _fWasteLeft;
+    // Likewise for doubts about triple quotes.
+    size_t _fDoubtLeft;
+    bool _fDoubts = true;  // not while a doubt is looked into
     // From where on no triple quotes are left, for each of the two quotes.
     std::array<size_t, 2> _fNoTripleFrom;
 };

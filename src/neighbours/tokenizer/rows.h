@@ -14,6 +14,7 @@ namespace codeloom {
 // What one row says about itself. Rows that a string or a backslash joins are one.
 struct CTokenRow {
     size_t start = 0;
+    size_t text_end = 0;
     size_t end = 0;  // behind its row end
     int32_t indent = 0;
     bool is_comment = false;
@@ -29,9 +30,12 @@ struct CTokenRow {
     bool ends_in_colon = false;
     bool ends_open = false;  // in an opener, a comma or an operator, so that an operand must follow
     bool ends_in_opener = false;
-    bool has_open_quote = false;  // holds a one-line string that isn't closed
-    bool is_entry = false;        // ends open, but outside the row's own brackets
-    size_t stray_closer_end = 0;  // behind the first closer that stands where no bracket is open; or zero
+    bool is_broken = false;          // surely no row of sound code, as far as the first triple quotes
+    bool is_prose = false;           // hardly a row of code, but perhaps
+    bool has_triple_quotes = false;  // begins a string with them
+    bool has_open_quote = false;     // holds a one-line string that isn't closed
+    bool is_entry = false;           // ends open, but outside the row's own brackets
+    size_t stray_closer_end = 0;     // behind the first closer that stands where no bracket is open; or zero
 };
 
 class CRowReader {
@@ -47,7 +51,9 @@ class CRowReader {
 
   private:
     void _BeginRow(CTokenRow& row);
+    bool _LooksLikeProse(const CTokenRow& row) const;
     void _ReadToken(CTokenRow& row);
+    void _NoteFaults(CTokenRow& row, const CLexedToken& token) const;
     void _NoteEnd(CTokenRow& row) const;
     void _TrackBracket(CTokenRow& row, char c);
 
@@ -56,7 +62,8 @@ class CRowReader {
     std::vector<char> _fBrackets;
     size_t _fOuterBrackets = 0;  // open before the row
     bool _fIsBehindOpener = false;
-    CRawToken _fLast;  // neither comment nor backslash
+    CRawToken _fLast;         // neither comment nor backslash
+    size_t _fTokenCount = 0;  // of the row, likewise
 };
 
 }  // namespace codeloom
