@@ -11,11 +11,21 @@ namespace codeloom {
 // operation requires of its arguments; what the system requires of itself is an assert().
 void HostAssert(bool condition);
 
+// The same with `make_value()` as the argument of the exception.
+template <class MakeValue>
+void HostAssert(bool condition, MakeValue make_value);
+
 // True when the host runs with assertions on.
 bool HostAssertionsOn();
 
 // Raises an exception of the host class `type` with `message`.
 [[noreturn]] void RaiseHost(nb::handle type, const char* message);
+[[noreturn]] void RaiseHost(nb::handle type, nb::handle value);
+
+template <class MakeValue>
+void HostAssert(bool condition, MakeValue make_value) {
+    if (!condition && HostAssertionsOn()) RaiseHost(PyExc_AssertionError, make_value());
+}
 
 // Counts one level of native recursion against the host's limit, whose RecursionError it raises.
 class CRecursionScope {

@@ -80,6 +80,13 @@ void RaiseHost(nb::handle type, const char* message) {
     throw nb::python_error();
 }
 
+// As `raise type(value)`: the host takes a tuple for several arguments otherwise.
+void RaiseHost(nb::handle type, nb::handle value) {
+    const nb::object error = nb::borrow(type)(value);
+    PyErr_SetObject(type.ptr(), error.ptr());
+    throw nb::python_error();
+}
+
 CRecursionScope::CRecursionScope() {
     if (Py_EnterRecursiveCall(" in codeloom") != 0) throw nb::python_error();
 }

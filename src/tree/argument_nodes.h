@@ -1,23 +1,91 @@
-// Arguments of calls and of definitions.
+// Arguments of calls and of definitions. A lone argument stands without its list, as a node of this file
+// where it has parts, or else as the name or expression itself: argument_info.h tells of all shapes alike.
 #pragma once
 
 #include "tree/node.h"
 
 namespace codeloom {
 
-// `name=a`, `*a`, `**a`, or a comprehension, in a call
-class CSingleUsedArgumentNode : public CNode {};
+template <class Class>
+class TSingleUsedArgumentOperations;
+template <class Class>
+class TFunctionParameterOperations;
 
-// `name: annotation`
-class CFunctionParameterDef : public CNode {};
+// One argument of a call that isn't a plain expression
+//   child    name  '='  value
+//   child    name  ':='  value
+//   child    '*' or '**'  value
+//   child    value  comprehension
+//   index      0      1        2
+class CSingleUsedArgumentNode : public CNode {
+  public:
+    template <class Class>
+    using TOperations = TSingleUsedArgumentOperations<Class>;
 
-// `a, b=1, *c` in a definition
+    virtual CTextOrNone GetPrefix();
+    virtual CNodeRef GetName();
+    virtual CNodeRef GetValue();
+    virtual bool IsUnparenthesizedGenExpr();
+    virtual CNodeRef GetNameAssigned();
+    virtual CNodeRef GetNamedRightHandExpression();
+
+  private:
+    static constexpr Py_ssize_t kNameIndex = 0, kOperatorIndex = 1, kValueIndex = 2;
+};
+
+// `name: annotation`, and in the 2.7 grammar `(a, b)`
+//   child    name  ':'  annotation
+//   child    '('  parameters  ')'
+//   index     0        1       2
+class CFunctionParameterDef : public CNode {
+  public:
+    template <class Class>
+    using TOperations = TFunctionParameterOperations<Class>;
+
+    virtual CNodeRef GetNestedListNode();
+    virtual CNodeRef GetName();
+    virtual CNodeRef GetTypeExpr();
+
+  private:
+    static constexpr Py_ssize_t kCount = 3;
+    static constexpr Py_ssize_t kNameIndex = 0, kNestedIndex = 1, kAnnotationIndex = 2;
+};
+
+// `a, b=1, *c` in a definition or a lambda
+//   child    ['*' or '**']  parameter  ['='  default]  ','  parameter ...
+// The parameter is a name or a CFunctionParameterDef; a bare `*` and a `/` stand without one.
 class CDefiningArglistNode : public CNode {};
 
 // `a, b=1, *c` in a call
+//   child    argument  ','  argument ...
+// In the 2.7 grammar `*` and `**` are children too, in front of their argument.
 class CUsedArglistNode : public CNode {};
 
 // `( ... )` behind the name of a function
+//   child    '('  [parameters]  ')'
+//   index     0        1
 class CParametersNode : public CNode {};
+
+template <class Class>
+class TSingleUsedArgumentOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
+    OPERATION(GetPrefix, "\"*\" or \"**\"; None without such.")
+    OPERATION(GetName, "What stands in front of `=`; None when there is no `=`.")
+    OPERATION(GetValue, "The value behind `=`; the node itself when there is no `=`.")
+    OPERATION(IsUnparenthesizedGenExpr, "True for a comprehension without brackets of its own.")
+    OPERATION(GetNameAssigned, "What stands in front of `:=`; None when there is no `:=`.")
+    OPERATION(GetNamedRightHandExpression, "The value behind `:=`; None when there is no `:=`.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TFunctionParameterOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
+    OPERATION(GetNestedListNode,
+              "The parameters in brackets of the old tuple form; None for an ordinary parameter.")
+    OPERATION(GetName, "The name; None for the tuple form.")
+    OPERATION(GetTypeExpr, "The annotation; None when there is none.")
+    END_OPERATIONS
+};
 
 }  // namespace codeloom

@@ -3,6 +3,8 @@
 #include <initializer_list>
 
 #include "tree/node_factory.h"
+#include "tree/node_helpers.h"
+#include "tree/node_to_text.h"
 #include "tree/recycling.h"
 
 namespace codeloom {
@@ -129,8 +131,11 @@ void BindStatements(nb::module_& module) {
     Bind<CGlobalStmt, CStmt>(module, "CGlobalStmt", "Global statement.");
     Bind<CNonlocalStmt, CStmt>(module, "CNonlocalStmt", "Nonlocal statement.");
     Bind<CForStmt, CStmt>(module, "CForStmt", "For statement.");
+    Bind<CWithItem, CNode>(module, "CWithItem", "One item of a with statement.");
     Bind<CWithStmt, CStmt>(module, "CWithStmt", "With statement.");
     Bind<CPassStmt, CStmt>(module, "CPassStmt", "Pass statement.");
+    Bind<CAnnotatedAssignNode, CNode>(module, "CAnnotatedAssignNode", "Tail of an annotated assignment.",
+                                      {"annassign: ':' test ['=' test]"});
     Bind<CExprStmt, CStmt>(module, "CExprStmt", "Expression, assignment and annotated assignment.");
     Bind<CReturnStmt, CStmt>(module, "CReturnStmt", "Return statement.");
     Bind<CWithTypeParameters, CStmt>(module, "CWithTypeParameters",
@@ -142,12 +147,9 @@ void BindStatements(nb::module_& module) {
                                   {"decorator: '@' dotted_name [ '(' [arglist] ')' ] NEWLINE"});
     Bind<CMultipleDecorators, CNode>(module, "CMultipleDecorators", "A decorator list.",
                                      {"decorators: decorator+"});
-    Bind<CWithItem, CNode>(module, "CWithItem", "One item of a with statement.");
     Bind<CExceptClause, CNode>(
         module, "CExceptClause", "Except clause.",
         {"except_clause: 'except' [test [('as' | ',') test]]", "except_clause: 'except' [test ['as' NAME]]"});
-    Bind<CAnnotatedAssignNode, CNode>(module, "CAnnotatedAssignNode", "Tail of an annotated assignment.",
-                                      {"annassign: ':' test ['=' test]"});
     Bind<CTypeParameter, CNode>(module, "CTypeParameter",
                                 " Pseudo node used with CWithTypeParameters class -- stores one\n    type "
                                 "parameter that is defined. Prefix is "
@@ -183,10 +185,14 @@ void BindNodeClasses(nb::module_& module) {
     BindNode(module);
     BindExpressions(module);
     BindAtoms(module);
+    BindArgumentInfo(module);
+    BindAsNames(module);
+    BindImportsAndArguments(module);
     BindStatements(module);
     BindPatterns(module);
-    BindImportsAndArguments(module);
     BindFactory(module);
+    BindNodeHelpers(module);
+    BindNodeToText(module);
     module.def("FinishedWithNode", &FinishedWithNode, "node"_a.none(),
                "Give the tree under `node` back to the free lists. Nobody may hold a node of it afterwards.");
     module.def(

@@ -1,0 +1,189 @@
+// Compound statements other than definitions: `if`, `for`, `with`, `except`, `match`, `case`.
+#pragma once
+
+#include "tree/expression_nodes.h"
+#include "tree/statement.h"
+
+namespace codeloom {
+
+template <class Class>
+class TIfStmtOperations;
+template <class Class>
+class TForStmtOperations;
+template <class Class>
+class TWithStmtOperations;
+template <class Class>
+class TWithItemOperations;
+template <class Class>
+class TExceptClauseOperations;
+template <class Class>
+class TMatchStmtOperations;
+template <class Class>
+class TCaseStmtOperations;
+
+// `if test: suite`; an `elif` is read as `if`, and an `else` stands behind an invented `if 0: pass`
+//   child    'if'  test  ':'  suite  ['elif'  test  ':'  suite] ...  ['else'  ':'  suite]
+//   index      0     1    2     3
+class CIfStmt : public CStmt {
+  public:
+    template <class Class>
+    using TOperations = TIfStmtOperations<Class>;
+
+    virtual CExpressionRef GetTestExpression();
+
+  private:
+    static constexpr Py_ssize_t kTestIndex = 1;
+};
+
+// `for target in iterable: suite`
+//   child    'for'  target  'in'  iterable  ':'  suite  ['else'  ':'  suite]
+//   index      0      1       2      3       4     5                   last
+class CForStmt : public CStmt {
+  public:
+    template <class Class>
+    using TOperations = TForStmtOperations<Class>;
+
+    virtual CNodeRef GetTarget();
+    virtual CNodeRef GetInExpression();
+    virtual CNodeRef GetBody();
+    virtual CNodeRef GetElseBody();
+
+  private:
+    static constexpr Py_ssize_t kTargetIndex = 1, kIterableIndex = 3, kBodyIndex = 5;
+    static constexpr Py_ssize_t kCountWithElse = 8;
+};
+
+// `a as b` in a `with`; an item without `as` is the expression itself
+//   child    expression  'as'  target
+//   index        0         1     2
+class CWithItem : public CNode {
+  public:
+    template <class Class>
+    using TOperations = TWithItemOperations<Class>;
+
+    virtual CNodeRef GetExpression();
+    virtual CNodeRef GetTarget();
+
+  private:
+    static constexpr Py_ssize_t kExpressionIndex = 0, kTargetIndex = 2;
+};
+
+using CWithItemList = nb::typed<nb::list, CWithItem>;
+
+// `with item, item: suite`
+//   child    'with'  item  ','  item ...  ':'  suite
+class CWithStmt : public CStmt {
+  public:
+    template <class Class>
+    using TOperations = TWithStmtOperations<Class>;
+
+    virtual CWithItemList GetWithItems();
+};
+
+// `except a as b`, and in the 2.7 grammar `except a, b`; an `except` alone is a keyword leaf
+//   child    'except'  type  ['as' or ','  target]
+//   index       0       1
+class CExceptClause : public CNode {
+  public:
+    template <class Class>
+    using TOperations = TExceptClauseOperations<Class>;
+
+    virtual CNodeRef GetExceptionType();
+    virtual CNodeRef GetTarget();
+
+  private:
+    static constexpr Py_ssize_t kTypeIndex = 1;
+};
+
+// `match subject:`. Made by hand, by no grammar state.
+//   child    'match'  subject  ':'
+//   index       0        1      2
+class CMatchStmt : public CStmt {
+  public:
+    template <class Class>
+    using TOperations = TMatchStmtOperations<Class>;
+
+    virtual CExpressionRef GetTestExpression();
+
+  private:
+    static constexpr Py_ssize_t kSubjectIndex = 1;
+};
+
+// `case pattern if guard: body`. Made by hand, by no grammar state.
+//   child    'case'  pattern  [guard]  ':'  [body]
+//   index       0       1        2            last
+// The guard is the `if` statement of its condition.
+class CCaseStmt : public CStmt {
+  public:
+    template <class Class>
+    using TOperations = TCaseStmtOperations<Class>;
+
+    virtual CNodeRef GetPattern();
+    virtual CNodeRef GetGuard();
+    virtual CNodeRef GetBody();
+
+  private:
+    static constexpr Py_ssize_t kPatternIndex = 1, kGuardIndex = 2;
+    static constexpr Py_ssize_t kLeastCountWithGuard = 4;
+};
+
+template <class Class>
+class TIfStmtOperations : public CStmt::TOperations<Class> {
+    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
+    OPERATION(GetTestExpression, "The condition of the first branch.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TForStmtOperations : public CStmt::TOperations<Class> {
+    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
+    OPERATION(GetTarget, "What is bound in each round.")
+    OPERATION(GetInExpression, "What is iterated over.")
+    OPERATION(GetBody, "The body.")
+    OPERATION(GetElseBody, "The body behind `else`; None when there is none.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TWithItemOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
+    OPERATION(GetExpression, "The expression in front of `as`.")
+    OPERATION(GetTarget, "The target behind `as`.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TWithStmtOperations : public CStmt::TOperations<Class> {
+    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
+    OPERATION(GetWithItems, "A new list of the items with `as`; those without are no CWithItem.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TExceptClauseOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
+    OPERATION(GetExceptionType, "The expression behind `except`.")
+    OPERATION(GetTarget, "What the exception is bound to; None when it isn't.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TMatchStmtOperations : public CStmt::TOperations<Class> {
+    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
+    OPERATION(GetTestExpression, "The subject.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TCaseStmtOperations : public CStmt::TOperations<Class> {
+    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
+    OPERATION(GetPattern, "The pattern.")
+    OPERATION(
+        GetGuard,
+        "The guard; None with fewer than four children. A case without a guard but with a body has four "
+        "as well, and answers its `:`.")
+    OPERATION(GetBody, "The body on the same logical line; None when there is none.")
+    END_OPERATIONS
+};
+
+}  // namespace codeloom
