@@ -11,7 +11,7 @@ namespace codeloom {
 namespace {
 
 // As far as the fields of an f-string are looked at: broken ones are scanned in vain, once for each quote.
-constexpr size_t kMaxFieldScan = 4096;
+constexpr size_t kMaxFieldScan = 512;
 
 // Where the literal with its opening quote at `quote_pos` begins, its prefix included.
 size_t PrefixStart(std::string_view text, size_t quote_pos) {
