@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "neighbours/token_type.h"
+#include "neighbours/tokenizer/fstring_scanner.h"
 #include "neighbours/tokenizer/lexer.h"
 #include "neighbours/tokenizer/string_lexer.h"
 
@@ -28,8 +28,9 @@ size_t FindStringLiteralEnd(std::string_view text, size_t quote_pos) {
     CStringStart start = ReadStringStart(text, prefix_start);
     if (start.has_fields) {
         CLexer lexer(text.substr(0, std::min(text.size(), quote_pos + kMaxFieldScan)));
-        const CLexedToken token = lexer.Lex(prefix_start);
-        if (token.type == kTokenId_STRING) return token.end;
+        const CStringEnd found =
+            CFstringScanner(lexer, nullptr, 0).Scan(quote_pos + start.quote_length, start);
+        if (found.is_closed) return found.end;
     }
     if (start.quote_length == 0) start = ReadStringStart(text, quote_pos);
     return FindStringEnd(text, quote_pos + start.quote_length, start.quote, start.IsTriple()).end;
