@@ -144,10 +144,10 @@ CNodeRef CMatchCaseStatementParser::_NodeForMappingPattern(Py_ssize_t start_i, P
     if (start_i + 1 >= end_i) _FailAt(start_i);
     const Py_ssize_t close_i = end_i - 1;
     std::vector<CNodeRef> children = {_TokNode(start_i)};
+    Py_ssize_t colon_i = start_i;
     for (Py_ssize_t i = start_i + 1; i < close_i;) {
         const Py_ssize_t comma_i = _FindOrEnd(",", i, close_i);
-        const Py_ssize_t colon_i =
-            _Find(":", i, close_i);  // may lie beyond the comma: `**rest` ends the keys
+        if (colon_i != -1) colon_i = _Find(":", i, close_i);  // not stopped by the comma: keys come first
         if (colon_i == -1 && !_IsTok(i, "**")) _FailAt(i);
         if (colon_i != -1) children.push_back(_NodeForPattern(i, colon_i));
         const Py_ssize_t mark_i = colon_i == -1 ? i : colon_i;

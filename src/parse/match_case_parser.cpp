@@ -9,7 +9,6 @@
 #include "parse/parser_driver.h"
 #include "parse/pseudo_node.h"
 #include "parse/token_copy.h"
-#include "parse/token_search.h"
 #include "tree/recycling.h"
 #include "tree/statement_nodes.h"
 
@@ -69,7 +68,7 @@ void CMatchCaseStatementParser::Init(CRef<CPGenParserImpl> pgen_parser) {
 
 Py_ssize_t CMatchCaseStatementParser::_NonNestedFindTokenIndex(nb::str tok, Py_ssize_t start,
                                                                Py_ssize_t end) {
-    return start < end ? FindOutsideBrackets(CUtf8(tok), OfLine(_fToks), start, end) : -1;
+    return start < end ? _fBracketSteps.Find(CUtf8(tok), OfLine(_fToks), start, end) : -1;
 }
 
 nb::tuple CMatchCaseStatementParser::_RemoveSkipToks(nb::tuple toks, nb::tuple positions) {
@@ -145,8 +144,9 @@ void CMatchCaseStatementParser::_SetLine(const nb::tuple& toks_and_positions) {
         RaiseHost(PyExc_ValueError, "expected a pair of tuples, of tokens and of positions");
     for (nb::handle items : toks_and_positions)
         if (!nb::isinstance<nb::tuple>(items)) RaiseWrongType("tuple", items);
-    _fToks = toks_and_positions[0];
-    _fPositions = toks_and_positions[1];
+    _fBracketSteps = CBracketSteps(TupleItem(toks_and_positions, 0));
+    _fToks = nb::borrow(TupleItem(toks_and_positions, 0));
+    _fPositions = nb::borrow(TupleItem(toks_and_positions, 1));
 }
 
 void CMatchCaseStatementParser::_ForgetLine() {

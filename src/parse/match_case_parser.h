@@ -8,6 +8,7 @@
 
 #include <nanobind/nanobind.h>
 
+#include "parse/token_search.h"
 #include "tree/node_factory.h"
 
 namespace codeloom {
@@ -81,6 +82,7 @@ class CMatchCaseStatementParser : public CHosted {
     CRef<CNodeFactory> _fNodeFactory;
     nb::object _fToks = nb::none();       // tuple of the line's token texts; none between two parses
     nb::object _fPositions = nb::none();  // tuple of their positions; none between two parses
+    CBracketSteps _fBracketSteps;         // those of _fToks
 };
 
 template <class Class>

@@ -1,28 +1,33 @@
-// Searches among the tokens of a logical line.
+// Searches outside brackets among the tokens of a logical line. Kinds of brackets aren't told apart. The
+// depth may fall below zero, where nothing is found.
 #pragma once
 
 #include <string_view>
+#include <vector>
 
-#include "host/collections.h"
-#include "host/text.h"
+#include <nanobind/nanobind.h>
+
+namespace nb = nanobind;
 
 namespace codeloom {
 
 // The index in [start, end) of the token `target` outside brackets; -1 when there is none. The target may be
-// a bracket itself. Kinds of brackets aren't told apart, and the depth may fall below zero, where nothing is
-// found.
-inline Py_ssize_t FindOutsideBrackets(std::string_view target, nb::handle toks, Py_ssize_t start,
-                                      Py_ssize_t end) {
-    int depth = 0;
-    for (Py_ssize_t i = start; i < end; ++i) {
-        const CUtf8 utf8(TupleItem(toks, i));
-        const std::string_view text = utf8;
-        if (depth == 0 && target == text) return i;
-        if (text.size() != 1) continue;
-        if (text[0] == '(' || text[0] == '[' || text[0] == '{') ++depth;
-        if (text[0] == ')' || text[0] == ']' || text[0] == '}') --depth;
-    }
-    return -1;
-}
+// a bracket itself. `depth` is that of `start`.
+Py_ssize_t FindOutsideBrackets(std::string_view target, nb::handle toks, Py_ssize_t start, Py_ssize_t end,
+                               int depth = 0);
+
+// The same for many searches in one tuple of tokens: each takes one step over a whole bracket, so that nested
+// brackets cost no more than flat ones.
+class CBracketSteps {
+  public:
+    CBracketSteps() = default;
+    explicit CBracketSteps(nb::handle toks);
+
+    // `toks` is the tuple that this was made of.
+    Py_ssize_t Find(std::string_view target, nb::handle toks, Py_ssize_t start, Py_ssize_t end) const;
+
+  private:
+    std::vector<Py_ssize_t> _fNext;  // for each token the next one outside of what it opens
+};
 
 }  // namespace codeloom

@@ -1,0 +1,65 @@
+#include "parse/token_search.h"
+
+#include "host/collections.h"
+#include "host/text.h"
+
+namespace codeloom {
+
+namespace {
+
+// 1 for an opening bracket, -1 for a closing one, 0 for any other token.
+int DepthStep(std::string_view token) {
+    if (token.size() != 1) return 0;
+    switch (token[0]) {
+        case '(':
+        case '[':
+        case '{':
+            return 1;
+        case ')':
+        case ']':
+        case '}':
+            return -1;
+        default:
+            return 0;
+    }
+}
+
+}  // namespace
+
+Py_ssize_t FindOutsideBrackets(std::string_view target, nb::handle toks, Py_ssize_t start, Py_ssize_t end,
+                               int depth) {
+    for (Py_ssize_t i = start; i < end; ++i) {
+        const CUtf8 token(TupleItem(toks, i));
+        if (depth == 0 && token == target) return i;
+        depth += DepthStep(token);
+    }
+    return -1;
+}
+
+CBracketSteps::CBracketSteps(nb::handle toks) {
+    const Py_ssize_t count = TupleSize(toks);
+    _fNext.resize(static_cast<size_t>(count), count);
+    std::vector<size_t> open;
+    for (Py_ssize_t i = 0; i < count; ++i) {
+        const int step = DepthStep(CUtf8(TupleItem(toks, i)));
+        if (step < 0 && !open.empty()) {
+            _fNext[open.back()] = i + 1;
+            open.pop_back();
+        }
+        if (step > 0) open.push_back(static_cast<size_t>(i));
+        if (step <= 0) _fNext[static_cast<size_t>(i)] = i + 1;
+    }
+}
+
+Py_ssize_t CBracketSteps::Find(std::string_view target, nb::handle toks, Py_ssize_t start,
+                               Py_ssize_t end) const {
+    if (start < 0) return FindOutsideBrackets(target, toks, start, end);
+    for (Py_ssize_t i = start; i < end; i = _fNext[static_cast<size_t>(i)]) {
+        const CUtf8 token(TupleItem(toks, i));
+        if (token == target) return i;
+        if (DepthStep(token) < 0) return FindOutsideBrackets(target, toks, i + 1, end, -1);
+    }
+    return -1;
+}
+
+}  // namespace codeloom
