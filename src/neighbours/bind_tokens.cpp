@@ -1,3 +1,4 @@
+#include <deque>
 #include <string>
 #include <vector>
 
@@ -16,7 +17,9 @@ namespace {
 
 nb::object HostFindMatchOrCaseType(nb::tuple toks, Py_ssize_t first, Py_ssize_t end) {
     std::vector<std::string_view> texts;
-    for (nb::handle tok : toks) texts.push_back(tok.is_none() ? std::string_view() : Utf8View(tok));
+    std::deque<std::string> storage;  // of tokens with lone surrogates
+    for (nb::handle tok : toks)
+        texts.push_back(tok.is_none() ? std::string_view() : Utf8OfText(tok, storage.emplace_back()));
     return HostText(FindMatchOrCaseType(texts, first, end));
 }
 

@@ -30,10 +30,6 @@ class CTokenReader {
     size_t _fToken_i = 0;
 };
 
-bool IsLong(std::string_view token) {
-    return token.size() > 1;
-}
-
 // A subject or a pattern can begin with `token`, `next` being the token behind it. Brackets, stars and signs
 // can also go on with an expression that begins with a name; the header's end tells.
 bool CanBeginSubject(std::string_view token, std::string_view next) {
@@ -41,34 +37,63 @@ bool CanBeginSubject(std::string_view token, std::string_view next) {
     switch (ByteKind(token[0])) {
         case EByteKind::kNameStart:
             if (token == "not") return next != "in";
-            return !keywords::IsOneOf(token, keywords::kBinary) ||
-                   string_lexer::IsQuoteAt(token, token.size() - 1);
+            return !keywords::IsOneOf(token, keywords::kBinary);
         case EByteKind::kDigit:
         case EByteKind::kQuote:
         case EByteKind::kOpener:
             return true;
         case EByteKind::kDot:
-            return IsLong(token);
+            return token != ".";
         default:
-            return token == "-" || token == "+" || token == "~" || token == "*" || token == "`";
+            return token == "-" || token == "+" || token == "~" || token == "*";
     }
 }
 
-// Goes on to the ":" of the header; false when an assignment or the last token comes first.
-bool SkipToHeaderEnd(CTokenReader& reader, std::string_view token) {
+// Reads the header as if the word were a name, to tell whether the ":" could begin an annotation of it:
+//   match.a[b]: int      match(a).b: int      two trailers each, and the last is no call
+//   match (a): ...       match [a], b: ...    no target of an annotation
+class CTargetReader {
+  public:
+    // Takes a token outside brackets.
+    void Read(std::string_view token) {
+        const bool completes_attribute = _fEnd == EEnd::kDot && ByteKind(token[0]) == EByteKind::kNameStart;
+        const bool may_go_on = _fEnd != EEnd::kDot && _fEnd != EEnd::kNoTarget;
+        if (completes_attribute || (may_go_on && token == "[")) {
+            _fEnd = EEnd::kAssignable;
+        } else if (may_go_on && (token == "(" || token == ".")) {
+            _fEnd = token == "." ? EEnd::kDot : EEnd::kCall;
+        } else {
+            _fEnd = EEnd::kNoTarget;
+        }
+        if (_fEnd != EEnd::kDot) ++_fTrailerCount;
+    }
+
+    bool IsTarget() const { return _fEnd == EEnd::kAssignable; }
+    int GetTrailerCount() const { return _fTrailerCount; }
+
+  private:
+    enum class EEnd { kCall, kDot, kAssignable, kNoTarget };
+
+    EEnd _fEnd = EEnd::kCall;  // a name goes on like a call
+    int _fTrailerCount = 0;
+};
+
+// Goes on to the ":" of the header, from its first token on; false when an assignment or the last token comes
+// first.
+bool SkipToHeaderEnd(CTokenReader& reader, std::string_view token, CTargetReader& target) {
     int depth = 0;
     int open_lambdas = 0;
     for (; !token.empty(); token = reader.Next()) {
-        if (token == "lambda" && depth == 0) ++open_lambdas;
         const EByteKind kind = ByteKind(token[0]);
-        if (kind == EByteKind::kOpener) ++depth;
         if (kind == EByteKind::kCloser) --depth;
-        if (depth != 0 || open_lambdas > 0) {
-            if (token == ":" && depth == 0) --open_lambdas;
-            continue;
-        }
-        if (token == ":") return true;
-        if (token == "=" || token == ";") return false;
+        const bool is_outside = depth == 0 && kind != EByteKind::kCloser;
+        if (kind == EByteKind::kOpener) ++depth;
+        if (!is_outside) continue;
+        if (token == "lambda") ++open_lambdas;
+        if (open_lambdas == 0 && token == ":") return true;
+        if (open_lambdas == 0 && (token == "=" || token == ";")) return false;
+        if (token == ":") --open_lambdas;
+        target.Read(token);
     }
     return false;
 }
@@ -86,12 +111,13 @@ ELogicalType FindMatchOrCaseType(std::span<const std::string_view> tokens, size_
     const std::string_view subject = reader.Next();
     CTokenReader behind_subject = reader;
     if (!CanBeginSubject(subject, behind_subject.Next())) return ELogicalType::kUnknown;
-    if (!SkipToHeaderEnd(reader, subject)) return ELogicalType::kUnknown;
+    CTargetReader target;
+    if (!SkipToHeaderEnd(reader, subject, target)) return ELogicalType::kUnknown;
 
-    const bool may_be_target = subject[0] == '(' || subject[0] == '[';
     const bool has_body = !reader.Next().empty();
-    if (is_match && may_be_target && has_body) return ELogicalType::kUnknown;
-    return is_match ? ELogicalType::kMatch : ELogicalType::kCase;
+    const bool may_be_annotated = has_body && target.IsTarget();
+    if (is_match) return may_be_annotated ? ELogicalType::kUnknown : ELogicalType::kMatch;
+    return may_be_annotated && target.GetTrailerCount() > 1 ? ELogicalType::kUnknown : ELogicalType::kCase;
 }
 
 }  // namespace codeloom

@@ -14,8 +14,9 @@ namespace codeloom {
 // the tokens; a body on the same row may follow the header.
 //
 // What decides is the token behind the word, and the ":" that ends the header: outside brackets and not that
-// of a lambda. A few lines read both ways; `match [x]: y` is then an annotation, since a match has no body on
-// its row, and `case [x]: y` a case.
+// of a lambda. Where more follows, the ":" may as well begin an annotation. A `match` has no body on its row,
+// so `match [x]: y` is an annotation, `match x: y` a broken statement. A `case` may have one: `case [x]: y`
+// is a case, and `case.x: y`, `case[x][0]: y`, which are no patterns, are annotations.
 ELogicalType FindMatchOrCaseType(std::span<const std::string_view> tokens, size_t first, size_t end);
 
 }  // namespace codeloom
