@@ -9,6 +9,16 @@ from pathlib import Path
 import pytest
 
 
+def pytest_addoption(parser: pytest.Parser) -> None:
+    parser.addoption("--rewrite", action="store_true", help="write what comes out into the golden files")
+
+
+@pytest.fixture
+def rewrite(request: pytest.FixtureRequest) -> bool:
+    """True when golden files are to be rewritten, not compared."""
+    return request.config.getoption("--rewrite")
+
+
 @pytest.fixture
 def write_files(tmp_path: Path) -> Callable[[dict[str, str | bytes]], Path]:
     """Writes files, path below the temporary folder to content, and gives that folder."""
