@@ -1,0 +1,228 @@
+"""Parameters and arguments as records, whatever shape the grammar gave them."""
+
+import gc
+from contextlib import suppress
+
+import pytest
+
+from codeloom.treesift import (
+    CArgInfo,
+    CDefiningArglistNode,
+    CFunctionParameterDef,
+    CLambdaExpr,
+    CNameLiteral,
+    CNode,
+    CParametersNode,
+    CSingleUsedArgumentNode,
+    CUsedArglistNode,
+    GetDefiningArgInfoList,
+    GetTokenEndIndex,
+    GetUsedArgInfoList,
+)
+from hand_made import Leaf, Node, Parse, Tokens
+from run_python import RunPython
+
+
+def Written(arguments):
+    """Records as one would write them; the value of an argument without a name stands behind "="."""
+    return [
+        Written(argument)
+        if isinstance(argument, list)
+        else f"{argument.prefix or ''}{Tokens(argument.name)}"
+        f"{': ' + Tokens(argument.type_expr) if argument.type_expr else ''}"
+        f"{'=' + Tokens(argument.value) if argument.value else ''}"
+        for argument in arguments
+    ]
+
+
+def Parameters(source, version="3.8"):
+    node = Parse(source, version)
+    return node.GetArgumentsNode() if isinstance(node, CLambdaExpr) else node.GetParameters()
+
+
+@pytest.mark.parametrize(
+    ("source", "version", "written"),
+    [
+        ("def f(): pass", "3.8", []),
+        ("def f(a): pass", "3.8", ["a"]),
+        ("def f(a: int): pass", "3.8", ["a: int"]),
+        ("def f(a: ... = ...): pass", "3.8", ["a: ...=..."]),
+        (
+            "def f(a, b=1, *c, d: int = 2, **e): pass",
+            "3.8",
+            ["a", "b=1", "*c", "d: int=2", "**e"],
+        ),
+        ("def f(a, /, b): pass", "3.8", ["a", "b"]),
+        ("def f(*, a): pass", "3.8", ["*", "a"]),
+        ("def f(*a): pass", "3.8", ["*a"]),
+        ("def f(*a: int, **b: str,): pass", "3.8", ["*a: int", "**b: str"]),
+        ("def f(a=b == c, d=lambda: 0): pass", "3.8", ["a=b == c", "d=lambda : 0"]),
+        ("lambda a, b=1: 0", "3.8", ["a", "b=1"]),
+        ("lambda a: 0", "3.8", ["a"]),
+        ("lambda *, a: 0", "3.8", ["*", "a"]),
+        ("def f(a, (b, c)): pass", "2.7", ["a", ["b", "c"]]),
+        ("def f(a, (b, (c, d))=e, *g): pass", "2.7", ["a", ["b", ["c", "d"]], "*g"]),
+        ("def f((a)): pass", "2.7", [["a"]]),
+        ("def f(((a,),)): pass", "2.7", [[["a"]]]),
+        ("lambda (a, b): 0", "2.7", [["a", "b"]]),
+        ("lambda a, b=1, *c, **d: 0", "2.7", ["a", "b=1", "*c", "**d"]),
+    ],
+)
+def test_parameters(source, version, written):
+    assert Written(GetDefiningArgInfoList(Parameters(source, version))) == written
+
+
+@pytest.mark.parametrize(
+    ("source", "version", "written"),
+    [
+        ("f(1)", "3.8", ["=1"]),
+        ("f(1,)", "3.8", ["=1"]),
+        ("f(1, x=2, *y)", "3.8", ["=1", "x=2", "*=* y"]),
+        ("f(1, x=2, *y, **z)", "2.7", ["=1", "x=2", "*=y", "**=z"]),
+        ("f(x=2)", "3.8", ["x=2"]),
+        ("f(*y)", "3.8", ["=* y"]),  # the prefix of a lone argument isn't told
+        ("f(*y)", "2.7", ["*=y"]),  # where it stands in a list
+        ("f(...)", "3.8", ["=..."]),
+        ("f(a := 1, b)", "3.8", ["=a := 1", "=b"]),
+        ("f(a for a in b)", "3.8", ["=a for a in b"]),
+        ("f(a == b, c[d:e])", "3.8", ["=a == b", "=c [ d : e ]"]),
+    ],
+)
+def test_arguments(source, version, written):
+    (call,) = Parse(source, version).GetTrailers()
+    assert Written(GetUsedArgInfoList(call.GetNestedNode())) == written
+
+
+def test_bases():
+    assert Written(Parse("class A(B, *C, d=E): pass").GetBaseClassList()) == ["=B", "*=* C", "d=E"]
+    assert Written(Parse("class A(B, C): pass", "2.7").GetBaseClassList()) == ["=B", "=C"]
+
+
+def test_records():
+    info = CArgInfo()
+    for field in ("name", "value", "prefix", "type_expr"):
+        assert getattr(info, field) is None
+        with pytest.raises(AttributeError):
+            setattr(info, field, None)
+    node = Parameters("def f(a): pass")
+    first, second = GetDefiningArgInfoList(node), GetDefiningArgInfoList(node)
+    assert first is not second and first[0] is not second[0]
+    assert first[0].name is second[0].name is node.GetChild(1)
+
+
+def test_records_are_collected():
+    before = len(gc.get_objects())
+    for _ in range(1000):
+        arguments = GetDefiningArgInfoList(Parameters("def f(a, *b): pass"))
+        arguments.append(arguments)
+    del arguments
+    gc.collect()
+    assert len(gc.get_objects()) - before < 500
+
+
+def test_other_shapes():
+    name, comma = Leaf("a", cls=CNameLiteral), Leaf(",")
+    assert Written(GetDefiningArgInfoList(Node(CDefiningArglistNode, comma, name, comma))) == ["a"]
+    brackets = Leaf("("), name, Leaf(")")
+    assert Written(GetDefiningArgInfoList(Node(CDefiningArglistNode, *brackets))) == ["a"]
+    plain = name, Leaf(":"), Leaf("int"), Leaf("="), Leaf("1")
+    assert Written(GetDefiningArgInfoList(Node(CDefiningArglistNode, *plain))) == ["a: int=1"]
+    nested = Node(CFunctionParameterDef, Leaf("("), Node(CParametersNode, comma, comma), Leaf(")"))
+    assert GetDefiningArgInfoList(nested) == [[]]
+    # Between commas of a call a record is made all the same.
+    assert Written(GetUsedArgInfoList(Node(CUsedArglistNode, comma, name, comma))) == ["", "=a"]
+    assert GetUsedArgInfoList(Node(CUsedArglistNode)) == []
+    assert GetUsedArgInfoList(None)[0].value is None
+
+
+def test_a_child_that_is_no_parameter():
+    strange = Leaf("@")
+    with pytest.raises(AssertionError) as caught:
+        GetDefiningArgInfoList(Node(CDefiningArglistNode, strange))
+    assert str(caught.value) == (
+        "Text is not ( or ): text = '@', type(child) = <class 'codeloom.treesift.CNode'>"
+    )
+    with pytest.raises(AssertionError) as caught:
+        GetDefiningArgInfoList(strange)
+    assert caught.value.args == ((strange, "@"),)
+
+
+def test_without_assertions_it_is_skipped():
+    code = """if True:
+        from codeloom.treesift import *
+        class Grammar: number2symbol = {}
+        factory = CNodeFactory(Grammar, [], {}, {}, {})
+        def New(cls, text, children): return factory.NewNode(CNodeClassInfo(cls, 0, ""), 0, text, 0, children)
+        strange = New(CNode, "@", None)
+        name = New(CNameLiteral, "a", None)
+        arguments = GetDefiningArgInfoList(New(CDefiningArglistNode, None, [strange, name]))
+        print([argument.name.fText for argument in arguments])
+        print(GetDefiningArgInfoList(strange)[0].name is strange)
+    """
+    assert RunPython(code, "-O") == "['a']\nTrue\n"
+
+
+@pytest.mark.parametrize("ask", [GetDefiningArgInfoList, GetUsedArgInfoList, GetTokenEndIndex])
+def test_odd_trees_end(ask):
+    for cls in (CDefiningArglistNode, CUsedArglistNode, CParametersNode, CFunctionParameterDef):
+        for children in ([], [1], [None], [1, 2, 3], [Leaf("("), Leaf("("), Leaf(")")]):
+            with suppress(TypeError, IndexError, AttributeError, AssertionError):
+                ask(Node(cls, *children))
+    with pytest.raises(TypeError):
+        ask(1)
+
+
+def test_a_bottomless_tree():
+    node = Node(CFunctionParameterDef, Leaf("("), None, Leaf(")"))
+    node.fChildren[1] = node
+    with pytest.raises(RecursionError):
+        GetDefiningArgInfoList(node)
+
+
+def test_where_a_node_ends():
+    assert GetTokenEndIndex(Leaf("x", context=4)) == 5
+    assert GetTokenEndIndex(Parse("f(a, b)")) == 6
+    assert GetTokenEndIndex(Parse("def f(a): pass")) == 7
+    assert GetTokenEndIndex(Node(CNode, Leaf("x", 1), Node(CNode, context=7))) == 8
+    for context in ((0, 4), None, "4", 2**80):
+        with pytest.raises(TypeError):
+            GetTokenEndIndex(Leaf("x", context=context))
+    for length in (1, 2, 3):
+        nodes = [Node(CNode, Leaf("x"), Leaf("y")) for _ in range(length)]
+        for node, child in zip(nodes, nodes[1:] + nodes[:1], strict=True):
+            node.fChildren[-1] = child
+        with pytest.raises(ValueError, match="contains itself"):
+            GetTokenEndIndex(Node(CNode, nodes[0]))
+
+
+def test_overrides_are_asked():
+    class Argument(CSingleUsedArgumentNode):
+        def GetValue(self):
+            return self.GetChild(0)
+
+        def GetPrefix(self):
+            return "***"
+
+    single = Node(Argument, Leaf("a"), Leaf("="), Leaf("b"))
+    assert Written(GetUsedArgInfoList(single)) == ["a=a"]
+    assert Written(GetUsedArgInfoList(Node(CUsedArglistNode, single, Leaf(",")))) == ["***a=a"]
+
+    class Parameter(CFunctionParameterDef):
+        def GetNestedListNode(self):
+            return None
+
+    parameter = Node(Parameter, Leaf("("), Leaf("a", cls=CNameLiteral), Leaf(")"))
+    assert Written(GetDefiningArgInfoList(parameter)) == ["("]
+    Parameter.GetNestedListNode = lambda self: "text"
+    with pytest.raises(TypeError):
+        GetDefiningArgInfoList(parameter)
+
+
+def test_an_override_that_empties_the_list():
+    class Argument(CSingleUsedArgumentNode):
+        def GetValue(self):
+            arguments.fChildren.clear()
+            return self
+
+    arguments = Node(CUsedArglistNode, Node(Argument), Leaf(","), Leaf("b"))
+    assert len(GetUsedArgInfoList(arguments)) == 1
