@@ -21,7 +21,7 @@ CNodeRef CAnnotatedAssignNode::GetTypeHintNode() {
 }
 
 CNodeRef CAnnotatedAssignNode::GetPostEqualsTestExpr() {
-    return ListedCount(*this) > kValueIndex ? ChildAs<CNode>(kValueIndex) : CNodeRef();
+    return _GetChildCount() > kValueIndex ? ChildAs<CNode>(kValueIndex) : CNodeRef();
 }
 
 Py_ssize_t CExprStmt::GetEqualCount() {
