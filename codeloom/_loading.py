@@ -8,7 +8,7 @@ from contextlib import contextmanager
 from types import ModuleType
 
 # The modules that a host product supplies under top-level names, with the names that must be in them.
-_HOST_MODULES = {
+_HOST_MODULES: dict[str, dict[str, tuple[str, ...]]] = {
     "config": {"config": ("GetTarnFilename",)},
     "bytebuffer": {"bytebuffer": ("CWritableByteBuffer", "CEncodedByteBufferReader")},
     "tarnutils": {
