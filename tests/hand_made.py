@@ -1,15 +1,13 @@
 """Trees that no parser makes, and the parsers that make the others."""
 
+from types import SimpleNamespace
+
 from codeloom.languages import LanguageNamed
 from codeloom.treesift import CNode, CNodeClassInfo, CNodeFactory, CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
 
 
-class _Grammar:
-    number2symbol: dict = {}
-
-
-_FACTORY = CNodeFactory(_Grammar, [], {}, {}, {})
+_FACTORY = CNodeFactory(SimpleNamespace(number2symbol={}), [], {}, {}, {})
 
 
 def Node(cls, *children, text=None, context=None):

@@ -24,7 +24,7 @@ from run_python import RunPython
 
 
 def Written(arguments):
-    """Records as one would write them; the value of an argument without a name stands behind "="."""
+    """Records as one would write them; a value without a name stands behind "=" too."""
     return [
         Written(argument)
         if isinstance(argument, list)
@@ -152,10 +152,10 @@ def test_without_assertions_it_is_skipped():
         from codeloom.treesift import *
         class Grammar: number2symbol = {}
         factory = CNodeFactory(Grammar, [], {}, {}, {})
-        def New(cls, text, children): return factory.NewNode(CNodeClassInfo(cls, 0, ""), 0, text, 0, children)
-        strange = New(CNode, "@", None)
-        name = New(CNameLiteral, "a", None)
-        arguments = GetDefiningArgInfoList(New(CDefiningArglistNode, None, [strange, name]))
+        def New(cls, *rest): return factory.NewNode(CNodeClassInfo(cls, 0, ""), 0, *rest)
+        strange = New(CNode, "@", 0, None)
+        name = New(CNameLiteral, "a", 1, None)
+        arguments = GetDefiningArgInfoList(New(CDefiningArglistNode, None, 0, [strange, name]))
         print([argument.name.fText for argument in arguments])
         print(GetDefiningArgInfoList(strange)[0].name is strange)
     """
