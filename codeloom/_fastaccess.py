@@ -40,9 +40,7 @@ __all__ = [
     "_FindStringEndNonNested",
 ]
 
-_TOKEN_IDS = {
-    name: value for name, value in vars(_neighbours).items() if name.startswith("kTokenId_")
-}
+_TOKEN_IDS = {name: value for name, value in vars(_neighbours).items() if name.startswith("kTokenId_")}
 globals().update(_TOKEN_IDS)
 __all__ += _TOKEN_IDS
 

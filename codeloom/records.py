@@ -137,7 +137,7 @@ def FormatRecords(records: Iterable[CRecord]) -> str:
 
 _QUOTED = r"""b'(?:[^'\\]|\\.)*'|b"(?:[^"\\]|\\.)*\""""
 _LINE = re.compile(
-    rf"(?P<arg>arg )?(?P<word>\S+) +(?P<name>{_QUOTED}|\S+(?: \S+)*)(?:  (?P<payload>.+))?",
+    rf"(?P<arg>arg )?(?P<word>\S+) +(?P<name>{_QUOTED}|\S+(?: \S+)*)(?:  (?P<payload>\S.*))?",
     re.DOTALL,
 )
 

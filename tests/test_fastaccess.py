@@ -201,9 +201,7 @@ def test_the_end_of_a_string(literal, end):
     search = CNonNestedSearch()
     search.InitWith(literal, b"z", 0, len(literal))
     assert (
-        _FindStringEndNonNested(
-            search, min(literal.index(quote) for quote in "'\"" if quote in literal)
-        )
+        _FindStringEndNonNested(search, min(literal.index(quote) for quote in "'\"" if quote in literal))
         == end
     )
     for outside in (-1, len(literal)):
@@ -313,11 +311,7 @@ def test_bits_out_of_range(module):
 
 
 def test_a_text_in_another_ends_at_a_zero_byte(module):
-    assert (
-        module.StrInStr(b"b", b"abc")
-        and module.StrInStr(b"", b"")
-        and not module.StrInStr(b"d", b"abc")
-    )
+    assert module.StrInStr(b"b", b"abc") and module.StrInStr(b"", b"") and not module.StrInStr(b"d", b"abc")
     assert not module.StrInStr(b"c", b"ab\0c") and module.StrInStr(b"a\0z", b"abc")
     for sub, whole in [
         ("a", b"a"),
@@ -341,9 +335,7 @@ def test_the_clock_can_be_replaced(module, monkeypatch):
     monkeypatch.setattr(_fastaccess, "__TimeFunc", lambda: 12.5)
     assert module.GetNowTime() == 12.5
     assert [module.OutOfTime(end_time) for end_time in (12.4, 12.5, 12.6)] == [True, True, False]
-    monkeypatch.setattr(
-        _fastaccess, "__TimeFunc", lambda: -1
-    )  # no failure, though it looks like one
+    monkeypatch.setattr(_fastaccess, "__TimeFunc", lambda: -1)  # no failure, though it looks like one
     assert module.GetNowTime() == -1 and module.OutOfTime(-2)
     monkeypatch.setattr(_fastaccess, "__TimeFunc", lambda: 1 / 0)
     for operation in (module.GetNowTime, lambda: module.OutOfTime(0)):

@@ -21,9 +21,7 @@ ANY_TEXT = st.text(st.characters(exclude_categories=()))  # lone surrogates incl
 SHORT_CODES = st.sampled_from("aZ_0 \t\x1c\x85é߿ࠀ퟿￿٣²Ⅷ𝟘\u0301\u3000𐀀\U0010ffff\0")
 TEXT = st.text(SHORT_CODES | st.characters())
 BYTES = st.binary(max_size=12) | st.lists(
-    st.sampled_from(
-        [b"a", b"\xc3", b"\xa9", b"\xe2", b"\x82", b"\xed", b"\xa0", b"\xf0", b"\xf4", b"\x90"]
-    ),
+    st.sampled_from([b"a", b"\xc3", b"\xa9", b"\xe2", b"\x82", b"\xed", b"\xa0", b"\xf0", b"\xf4", b"\x90"]),
     max_size=8,
 ).map(b"".join)
 
@@ -223,9 +221,7 @@ def test_every_byte_but_a_continuation_byte_counts_as_a_character(utf8):
 
 @given(st.lists(st.none() | ANY_TEXT | st.binary(), min_size=5, max_size=5))
 def test_joining_is_joining_of_utf8(pieces):
-    joined = [
-        b"".join(AsUtf8(piece) for piece in pieces[:n] if piece is not None) for n in range(6)
-    ]
+    joined = [b"".join(AsUtf8(piece) for piece in pieces[:n] if piece is not None) for n in range(6)]
     assert Utf8Concat5(*pieces) == joined[5]
     for count in (2, 3, 4):
         assert getattr(strutils, f"Utf8Concat{count}")(*pieces[:count]) == joined[count]

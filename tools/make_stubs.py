@@ -79,15 +79,11 @@ def computing_stub(module: ModuleType) -> str:
     """The definitions as in the source, and for each value that is computed its type."""
     parts = ast.parse(inspect.getsource(module)).body
     imports = [part for part in parts if isinstance(part, ast.Import | ast.ImportFrom)]
-    definitions = [
-        reduced(part) for part in parts if isinstance(part, ast.FunctionDef | ast.ClassDef)
-    ]
+    definitions = [reduced(part) for part in parts if isinstance(part, ast.FunctionDef | ast.ClassDef)]
     known = {alias.name for part in imports for alias in part.names}
     known |= {part.name for part in definitions}
     values = [
-        f"{name}: {type(getattr(module, name)).__name__}"
-        for name in module.__all__
-        if name not in known
+        f"{name}: {type(getattr(module, name)).__name__}" for name in module.__all__ if name not in known
     ]
     return "\n".join(
         [
@@ -105,10 +101,7 @@ def all_stubs() -> dict[str, str]:
     """The text of each stub by the name of its file."""
     makers = {name: native_stub for name in NATIVE_MODULES}
     makers |= {name: computing_stub for name in COMPUTING_MODULES}
-    return {
-        f"{name}.pyi": make(importlib.import_module(f"codeloom.{name}"))
-        for name, make in makers.items()
-    }
+    return {f"{name}.pyi": make(importlib.import_module(f"codeloom.{name}")) for name, make in makers.items()}
 
 
 if __name__ == "__main__":

@@ -7,6 +7,7 @@
 #include "analysis/analyzer.h"
 #include "analysis/syntax_error.h"
 #include "hints/dispatch_walker.h"
+#include "host/module_entry.h"
 #include "host/neighbour_call.h"
 #include "host/restore.h"
 #include "neighbours/imported_names.h"
@@ -111,6 +112,6 @@ void Load(nb::module_& module) {
 
 }  // namespace codeloom
 
-NB_MODULE(treesift, module) {
+CODELOOM_MODULE(treesift, module) {
     codeloom::Load(module);
 }

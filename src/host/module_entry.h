@@ -1,0 +1,30 @@
+// The entry of a native module whose load fails with the exception that was raised.
+#pragma once
+
+#include <nanobind/nanobind.h>
+
+// CODELOOM_MODULE(name, variable) { body }: as NB_MODULE, which would wrap the exception into an ImportError
+// that says nothing.
+#define CODELOOM_MODULE(name, variable)                                                                      \
+    static void _Load_##name(nanobind::module_ variable);                                                    \
+    static int _Execute_##name(PyObject* made) {                                                             \
+        nanobind::detail::internals = NB_CALL(nb_module_init)(NB_DOMAIN_STR, made);                          \
+        if (nanobind::detail::internals == nullptr) return -1;                                               \
+        try {                                                                                                \
+            _Load_##name(nanobind::borrow<nanobind::module_>(made));                                         \
+            return 0;                                                                                        \
+        } catch (nanobind::python_error & error) {                                                           \
+            error.restore();                                                                                 \
+        } catch (const std::exception& error) {                                                              \
+            PyErr_SetString(PyExc_ImportError, error.what());                                                \
+        }                                                                                                    \
+        return -1;                                                                                           \
+    }                                                                                                        \
+    extern "C" NB_EXPORT PyObject* PyInit_##name() {                                                         \
+        nanobind::detail::init_singletons();                                                                 \
+        if (!nanobind::detail::nb_backend_init(#name)) return nullptr;                                       \
+        static PyObject* const definition =                                                                  \
+            NB_CALL(module_new)(#name, nullptr, reinterpret_cast<void*>(_Execute_##name), NB_ABI_MINOR_TAG); \
+        return definition;                                                                                   \
+    }                                                                                                        \
+    static void _Load_##name(nanobind::module_ variable)

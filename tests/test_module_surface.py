@@ -1,0 +1,260 @@
+"""What the host sees of the engine, the order in which it loads, and how it fails to."""
+
+import ast
+import importlib.util
+import inspect
+import types
+from pathlib import Path
+
+import pytest
+from run_python import RunPython
+
+from codeloom import _fastaccess, _neighbours, logicalline, strutils, symbolinfo, treesift
+
+ROOT = Path(__file__).parent.parent
+
+
+def Names(text: str) -> list[str]:
+    return text.split()
+
+
+INSTANCE_CONSTANTS = {
+    "kListInstanceName": b"list",
+    "kDictInstanceName": b"dict",
+    "kSetInstanceName": b"set",
+    "kTupleInstanceName": b"tuple",
+    "kStringInstanceName": b"str",
+    "kUnicodeInstanceName": b"unicode",
+    "kBytesInstanceName": b"bytes",
+    "kIntLiteralName": b"int",
+    "kFloatLiteralName": b"float",
+}
+CONSTANTS = ["kPy2DefaultGrammar", "kPy3DefaultGrammar", "kLiteralPrefix", *INSTANCE_CONSTANTS]
+MODULES = Names("""
+    keyword re sys token os time pgen _fastaccess strutils config logicalline symbolinfo
+    logicalinspect reflect optpgen utils
+""")
+IMPORTED_CLASSES = Names("""
+    Parser CWritableByteBuffer CEncodedByteBufferReader _CTextPosInfo CLogger CStringTokenizer
+    CNonNestedSearch CLogicalLine _CHandlerRecord _CEmissionStackItem CDestroyable
+    CSingleResolvedInfo CLocationCache CFullyScopedName CDefInfo CArgTextInfo CInfoBytesBuilder
+""")
+FUNCTIONS = Names("""
+    CreateSyntaxError DropSimpleParens FinishedWithNode NotCompiledFinishedWithNode
+    GetDefiningArgInfoList GetUsedArgInfoList GetTokenEndIndex IsGenExpression IsSetLiteral
+    IsTupleLiteralNode _GetBuiltinInstanceName _GetMatchingChildToken _ProcessAsNamesList
+    _ProcessSingleModuleNameAs _TextForImportName
+""")
+PRIMITIVES = Names("""
+    OrdAt Utf8Concat2 Utf8Concat3 Utf8Concat4 GetUtf8Ptr AdjustUtf8Pos Ucs4CharAtUtf8Pos
+    IsSpaceAtUtf8Pos IsDigitAtUtf8Pos IsAlnumAtUtf8Pos IsIdentifierCharAtUtf8Pos PtrFindByte
+    BytesFindByte StrInStr IsAlnum IsDigit ULongLongValueForDoubleBits DoubleValueForULongLongBits
+    DoubleValueForPyIntBits GetNowTime OutOfTime LocationsEqual IsDefKind GetInfoBytesKind
+    IsTopLevelModuleScope IsDefLineScope IsParentOfDefLineScope NextNonNestedUtf8PtrIndex
+""")
+NEIGHBOUR_FUNCTIONS = Names("""
+    AsUtf8 AsStr BytesForInteger Utf8Concat5 Utf8Len IsUtf8LeadByte _NonInlineUcs4CharAtUtf8Pos
+    TextPosInfo GetTokenType _FindStringEndNonNested BuildLiteralInfo BuildArgInfo
+    EnsureScopeNameIndicies GetInstanceNameForClass ObjectForStringLiteral EncodeStringLiteral
+    JoinTokens _NonInlineNextNonNestedUtf8PtrIndex
+""")
+VOCABULARY = [*symbolinfo._SymbolConstants(), "gInfoBytesBuilder", "CKindFilter"]
+LOGICAL_TYPES = [name for name in logicalline.__all__ if name.startswith("k")]
+
+
+def Visible() -> dict[str, object]:
+    return {name: value for name, value in vars(treesift).items() if not name.startswith("__")}
+
+
+# What is there
+
+
+def test_exactly_the_listed_names_are_visible():
+    own_classes = {
+        name
+        for name, value in Visible().items()
+        if isinstance(value, type) and value.__module__ == "codeloom.treesift"
+    }
+    listed = {
+        *(CONSTANTS + MODULES + IMPORTED_CLASSES + FUNCTIONS + PRIMITIVES + NEIGHBOUR_FUNCTIONS),
+        *(VOCABULARY + LOGICAL_TYPES),
+    }
+    assert set(Visible()) <= listed | own_classes
+    assert {name for name in own_classes if not name.startswith("C")} == set()
+
+
+@pytest.mark.parametrize(
+    ("neighbour", "names"),
+    [
+        (symbolinfo, VOCABULARY),
+        (logicalline, [*LOGICAL_TYPES, "CLogicalLine"]),
+        (strutils, ["AsUtf8", "TextPosInfo", "_CTextPosInfo"]),
+        (_fastaccess, ["CLogger", "CNonNestedSearch", "CStringTokenizer", "GetTokenType"]),
+    ],
+    ids=lambda value: getattr(value, "__name__", ""),
+)
+def test_imported_names_are_the_neighbours(neighbour, names):
+    for name in names:
+        assert getattr(treesift, name) is getattr(neighbour, name)
+
+
+def test_primitives_and_modules_are_there():
+    for name in PRIMITIVES + NEIGHBOUR_FUNCTIONS:
+        assert callable(getattr(treesift, name))
+    for name in MODULES:
+        assert isinstance(getattr(treesift, name), types.ModuleType)
+
+
+def test_internal_helpers_are_not():
+    for name in (
+        "ExpandSeqLiteral",
+        "NextNonRemovedTokenInTuple",
+        "CNodeToText",
+        "kKeywordLiterals",
+    ):
+        assert not hasattr(treesift, name)
+    assert frozenset({"None", "True", "False"}) not in [
+        value for value in Visible().values() if isinstance(value, frozenset)
+    ]
+
+
+def test_constants_are_set_in_their_order():
+    names = [name for name in Visible() if name in CONSTANTS]
+    assert names == CONSTANTS
+    assert treesift.kPy2DefaultGrammar == "Python-Grammar-2.7"
+    assert treesift.kPy3DefaultGrammar == "Python-Grammar-3.8"
+    assert treesift.kLiteralPrefix == symbolinfo.kTypedLiteralPrefix
+    for name, cls_name in INSTANCE_CONSTANTS.items():
+        equiv = symbolinfo.kTypedLiteralPrefix + cls_name + symbolinfo.kClassInstanceSuffix
+        assert getattr(treesift, name) == equiv
+        assert treesift._GetBuiltinInstanceName(cls_name.decode()) == equiv
+
+
+def test_class_attributes_are_made_while_loading():
+    classes = treesift.CPGenParserImpl.kClsForState
+    assert classes["funcdef"] is treesift.CFuncdefStmt
+    assert all(isinstance(cls.kSupportedRules, list) for cls in classes.values())
+    assert treesift.CStarExpression.kSupportedRules != treesift.CFuncdefStmt.kSupportedRules
+    for cls in (treesift.CPGenParserImpl, treesift.CPGenAnalyzerImpl):
+        assert "Python-Grammar-3.8" in cls.__init__.__doc__
+
+
+def test_everything_that_can_be_called_is_documented():
+    for module in (treesift, _neighbours):
+        routines = [value for value in vars(module).values() if inspect.isroutine(value)]
+        assert [value.__name__ for value in routines if not value.__doc__] == []
+        native = [value for value in routines if not inspect.isfunction(value)]
+        assert [value.__name__ for value in native if "\n" not in value.__doc__] == []
+    wanted = (
+        " Create a SyntaxError exception instance for an error occuring at the\n"
+        "    given token index of the logical "
+    )
+    assert treesift.CreateSyntaxError.__doc__.endswith(wanted)
+
+
+# Loading
+
+LACKING = [
+    ("codeloom.optpgen", "NodeConverter"),
+    ("codeloom.optpgen", "Parser"),
+    ("codeloom.optpgen", "ParseError"),
+    ("codeloom.optpgen", "CreateParser"),
+    ("bytebuffer", "CEncodedByteBufferReader"),
+    ("codeloom.strutils", "_CTextPosInfo"),
+    ("codeloom.strutils", "Utf8Concat5"),
+    ("codeloom._fastaccess", "CStringTokenizer"),
+    ("codeloom._fastaccess", "_FindStringEndNonNested"),
+    ("codeloom.logicalline", "kErrorTokenPrefix"),
+    ("codeloom.logicalline", "IsScopeStartLogical"),
+    ("codeloom.logicalinspect", "TextFromTokens"),
+    ("codeloom.utils", "GetLogicalsFromText"),
+    ("codeloom.symbolinfo", "kNonlocalPrefix"),
+    ("codeloom.symbolinfo", "gInfoBytesBuilder"),
+    ("codeloom.symbolinfo", "JoinTokens"),
+    ("tarnbase.destroyable", "CDestroyable"),
+    ("tarnutils.reflect", "RaiseWithTraceback"),
+    ("config", "GetTarnFilename"),
+]
+
+
+@pytest.mark.parametrize(("module_name", "name"), LACKING, ids=lambda value: value)
+def test_a_neighbour_that_lacks_a_name_stops_the_load(module_name, name):
+    standin = module_name if module_name.startswith("codeloom.") else f"codeloom._standins.{module_name}"
+    code = f"""
+import importlib, sys
+del importlib.import_module({standin!r}).{name}
+try:
+    import codeloom.treesift
+except ImportError as error:
+    print(error)
+print("codeloom.treesift" in sys.modules, "config" in sys.modules)
+"""
+    assert RunPython(code) == f"cannot import name '{name}' from '{module_name}'\nFalse False\n"
+
+
+def test_a_neighbour_that_is_missing_stops_the_load():
+    code = """
+import sys
+sys.modules["codeloom.utils"] = None
+try:
+    import codeloom.treesift
+except ImportError as error:
+    print(type(error).__name__, error.name)
+"""
+    assert RunPython(code) == "ModuleNotFoundError codeloom.utils\n"
+
+
+def test_a_failing_constant_stops_the_load():
+    code = """
+import codeloom.symbolinfo
+def GetInstanceNameForClass(cls_name):
+    raise LookupError(cls_name)
+codeloom.symbolinfo.GetInstanceNameForClass = GetInstanceNameForClass
+try:
+    import codeloom.treesift
+except LookupError as error:
+    print(error)
+"""
+    assert RunPython(code) == "list#0\n"
+
+
+def test_loading_leaves_no_traces():
+    code = """
+import sys
+path = list(sys.path)
+import codeloom.treesift
+print([name for name in ("config", "bytebuffer", "tarnutils", "tarnbase") if name in sys.modules])
+print(sys.path == path, "dataclasses" in sys.modules)
+"""
+    assert RunPython(code, "-S") == "[]\nTrue False\n"
+
+
+# Stubs
+
+
+def test_the_stubs_are_up_to_date():
+    pytest.importorskip("nanobind")
+    path = ROOT / "tools/make_stubs.py"
+    spec = importlib.util.spec_from_file_location("make_stubs", path)
+    tool = importlib.util.module_from_spec(spec)
+    spec.loader.exec_module(tool)
+    for file_name, text in tool.all_stubs().items():
+        written = (ROOT / "codeloom" / file_name).read_text(encoding="utf-8")
+        assert ast.dump(ast.parse(written)) == ast.dump(ast.parse(text)), (
+            f"{file_name} is behind; run: python tools/make_stubs.py"
+        )
+
+
+def test_the_stubs_name_everything_that_is_visible():
+    text = (ROOT / "codeloom/treesift.pyi").read_text(encoding="utf-8")
+    named = {
+        name
+        for node in ast.walk(ast.parse(text))
+        for name in (
+            getattr(node, "name", None),
+            getattr(node, "asname", None),
+            getattr(getattr(node, "target", None), "id", None),
+        )
+    }
+    standard = {"keyword", "re", "sys", "token", "os", "time", "pgen"}
+    assert set(Visible()) - standard - {"config", "reflect"} <= named
