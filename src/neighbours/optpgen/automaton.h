@@ -3,6 +3,7 @@
 //   out    the smallest deterministic one of the same language
 #pragma once
 
+#include <compare>
 #include <vector>
 
 namespace codeloom {

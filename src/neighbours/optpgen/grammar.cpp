@@ -41,6 +41,7 @@ const CParseTables& CGrammar::Tables(bool promotes_single_child) {
 }
 
 int CGrammar::RuleOfNumber(nb::handle number) const {
+    if (number.is_none()) return 0;
     const int rule = ResultFromHost<int>(nb::borrow<nb::object>(number)) - CGrammarRules::kFirstRuleNumber;
     if (rule >= 0 && rule < static_cast<int>(_fRules.Rules().size())) return rule;
     PyErr_Format(PyExc_ValueError, "the grammar has no rule with the number %R", number.ptr());

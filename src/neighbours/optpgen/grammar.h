@@ -20,7 +20,8 @@ class CGrammar : public CHosted {
     // Tables for a parser that replaces a rule with a single child by that child, or that keeps it; the
     // second ones are made when they are first asked for.
     const CParseTables& Tables(bool promotes_single_child);
-    // The index of the rule with this number; the host's ValueError when there is none.
+    // The index of the rule with this number; none stands for the start symbol. The host's ValueError when
+    // there is no such rule.
     int RuleOfNumber(nb::handle number) const;
 
     const CTokenLabels& TokenLabels() const { return _fTokenLabels; }

@@ -33,7 +33,7 @@ void ParserImpl::Init(CGrammar& grammar, CRef<NodeConverter> node_converter, boo
 
 void ParserImpl::setup(nb::handle start) {
     if (_fPhase == EPhase::kBusy) _RaiseMisused();
-    const int rule = start.is_none() ? 0 : _fGrammar->RuleOfNumber(start);
+    const int rule = _fGrammar->RuleOfNumber(start);
     CBusyScope busy(*this);
     _DropAll();
     _fFrames.push_back({_fTables->StartRow(rule), 0, 0});

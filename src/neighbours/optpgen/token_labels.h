@@ -68,8 +68,8 @@ class CTokenLabels {
     }
 
   private:
-    static constexpr int kTextDecides =
-        1 << 14;  // added to a label that a token has unless its text says otherwise
+    // Added to the label of a type where the text may say otherwise.
+    static constexpr int kTextDecides = 1 << 14;
 
     struct COperator {
         int type;
