@@ -35,9 +35,7 @@ def _NamesOf(module, prefix=""):
 
 
 # As the engine's driver composes them; two pairs of operators share a number.
-ENGINE = TokenTables(
-    _NamesOf(_fastaccess, "kTokenId_"), {**grammar.opmap, "...": 52, "->": 51, ":=": 53}
-)
+ENGINE = TokenTables(_NamesOf(_fastaccess, "kTokenId_"), {**grammar.opmap, "...": 52, "->": 51, ":=": 53})
 ORACLE = TokenTables(_NamesOf(token), {**grammar.opmap, "...": 61})
 
 OPERATORS = sorted(ORACLE.operators, key=len, reverse=True)
@@ -75,9 +73,7 @@ def Tokens(text, version="3.8", tables=ENGINE):
             continue
         if kind == "OPERATOR":
             split = value == "..." and version == "2.7"
-            found += (
-                [(tables.operators["."], ".")] * 3 if split else [(tables.operators[value], value)]
-            )
+            found += [(tables.operators["."], ".")] * 3 if split else [(tables.operators[value], value)]
             continue
         if kind == "NAME" and value in ("async", "await") and version == "3.8":
             kind = value.upper()

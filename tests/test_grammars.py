@@ -338,9 +338,7 @@ def Mutated(tokens, all_tokens, choice):
     mutated = list(tokens)
     for _ in range(choice.randrange(3)):
         place = choice.randrange(len(mutated))
-        mutated[place : place + choice.randrange(2)] = choice.sample(
-            all_tokens, choice.randrange(2)
-        )
+        mutated[place : place + choice.randrange(2)] = choice.sample(all_tokens, choice.randrange(2))
     return mutated
 
 
@@ -356,9 +354,7 @@ def test_same_as_oracle_on_lines(version):
     for promotes in (True, False):
         for line in lines * 10:
             tokens = Mutated(line, all_tokens, choice)
-            assert ParseWithOurs(ours, tokens, promotes) == ParseWithOracle(
-                oracle, tokens, promotes
-            ), tokens
+            assert ParseWithOurs(ours, tokens, promotes) == ParseWithOracle(oracle, tokens, promotes), tokens
 
 
 def test_the_interpreters_library():
