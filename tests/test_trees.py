@@ -11,21 +11,19 @@ from itertools import groupby
 from pathlib import Path
 
 import pytest
+from golden import Cases, Check
 
 from codeloom.languages import LanguageNamed
 from codeloom.optpgen import ParseError
 from codeloom.treesift import CExpression, CNode, CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
-from golden import Cases, Check
 
 GRAMMARS = ("3.8", "2.7")
 
 
 def Driver(name):
     language = LanguageNamed(name)
-    return CPGenParserImpl(
-        language.version_triple, language.grammar_file, language.keywords, language.is_py3
-    )
+    return CPGenParserImpl(language.version_triple, language.grammar_file, language.keywords, language.is_py3)
 
 
 DRIVERS = {name: Driver(name) for name in GRAMMARS}

@@ -14,7 +14,7 @@ class CDescent {
     }
 
   private:
-    static constexpr int kMaxDepth = 10'000'000;
+    static constexpr int kMaxDepth = 1'000'000;
     int _fDepth = 0;
 };
 

@@ -1,0 +1,284 @@
+"""Accessors of expressions beyond the golden trees: other shapes, failures, overrides."""
+
+import inspect
+from contextlib import suppress
+
+import pytest
+from hand_made import Leaf, Node, Parse, Tokens
+
+from codeloom import treesift
+from codeloom.treesift import (
+    CAtom,
+    CAtomExpr,
+    CCompForNode,
+    CKeywordLiteral,
+    CListmakerNode,
+    CNameLiteral,
+    CNode,
+    COperatorExpression,
+    CPower,
+    CTestListStarExpr,
+    CTrailer,
+    CYieldArg,
+    CYieldExpr,
+)
+
+# What each accessor answers, or raises, for a leaf, an empty list of children, and eight foreign ones.
+ODD_NODES = """
+CExpression.GetSubExpr                  None       None        None
+CExpression.GetSubExprCount             0          0           0
+COperatorExpression.GetOperatorStr      None       None        TypeError
+COperatorExpression.GetTermCount        0          0           5
+COperatorExpression.GetTerm             None       None        TypeError
+CStarExpression.GetStarredExpression    TypeError  IndexError  TypeError
+CLambdaExpr.GetArgumentsNode            TypeError  IndexError  TypeError
+CLambdaExpr.GetBodyExpr                 TypeError  IndexError  TypeError
+CYieldExpr.GetValue                     None       None        TypeError
+CYieldExpr.IsYieldFrom                  False      False       False
+CYieldArg.GetValue                      TypeError  IndexError  TypeError
+CYieldArg.IsYieldFrom                   False      False       False
+CTestListStarExpr.GetSubExpr            ValueError ValueError  ValueError
+CTestListStarExpr.GetSubExprCount       0          0           4
+CTestListStarExpr.IsTuple               False      False       TypeError
+CTestListStarExpr.IsGenExpr             False      False       False
+CAtomExpr.GetPrefix                     None       None        None
+CAtomExpr.GetAtom                       None       IndexError  TypeError
+CAtomExpr.GetTrailers                   []         []          TypeError
+CPower.GetAtom                          TypeError  IndexError  TypeError
+CPower.GetTrailers                      TypeError  IndexError  TypeError
+CPower.GetExponentNode                  None       None        TypeError
+CFactorExpr.GetUnaryOperator            None       None        TypeError
+CNamedExpr.GetAssignedName              TypeError  IndexError  TypeError
+CNamedExpr.GetRightHandExpression       TypeError  IndexError  TypeError
+CCompForNode.IsAsync                    False      False       TypeError
+CCompForNode.GetTargetNode              TypeError  IndexError  TypeError
+CCompForNode.GetInNode                  TypeError  IndexError  TypeError
+CCompForNode.GetCompIterNode            None       None        TypeError
+CListmakerNode.GetSubExprCount          TypeError  IndexError  TypeError
+CListmakerNode.GetSubExpr               TypeError  IndexError  TypeError
+CTrailer.GetDotName                     None       None        None
+CTrailer.GetNestedNode                  None       None        None
+CTrailer.GetInitialToken                ValueError ValueError  TypeError
+CNumberLiteral.IsFloat                  TypeError  TypeError   TypeError
+CNumberLiteral.GetNumericValue          TypeError  TypeError   TypeError
+CStringLiteral.IsUnicode                False      False       False
+CStringLiteral.IsBytes                  False      False       False
+CStringLiteral.GetStringContents        TypeError  TypeError   TypeError
+CStringLiteral.GetStringValue           TypeError  TypeError   TypeError
+CAtom.GetSubExpr                        ValueError ValueError  TypeError
+CAtom.GetSubExprCount                   ValueError ValueError  TypeError
+CAtom.GetInitialBracket                 ValueError ValueError  TypeError
+CAtom.IsLiteral                         True       True        True
+CAtom.IsComprehension                   False      False       False
+CAtom.IsTwoPlusStringLiterals           False      False       False
+"""
+ROWS = [row.split() for row in ODD_NODES.strip().splitlines()]
+INDEXED = {"GetSubExpr", "GetTerm", "GetOperatorStr"}
+
+
+def Name(text):
+    return Leaf(text, cls=CNameLiteral)
+
+
+def Keyword(text):
+    return Leaf(text, cls=CKeywordLiteral)
+
+
+def Chain(depth, cls, *first_children, last):
+    """A node in a node in a node, each behind the same first children."""
+    node = last
+    for _ in range(depth):
+        node = Node(cls, *first_children, node)
+    return node
+
+
+def Ask(node, accessor):
+    return getattr(node, accessor)(*[0] * (accessor in INDEXED))
+
+
+@pytest.mark.parametrize("row", ROWS, ids=[row[0] for row in ROWS])
+def test_odd_nodes(row):
+    class_name, _, accessor = row[0].partition(".")
+    cls = getattr(treesift, class_name)
+    nodes = Leaf(cls=cls), Node(cls), Node(cls, *range(8))
+    for node, answer in zip(nodes, map(eval, row[1:]), strict=True):
+        if inspect.isclass(answer):
+            with pytest.raises(answer):
+                Ask(node, accessor)
+        else:
+            assert Ask(node, accessor) == answer
+
+
+def test_the_rows_are_complete():
+    told = {tuple(row[0].split(".")) for row in ROWS}
+    for class_name in {class_name for class_name, _ in told}:
+        for name, value in vars(getattr(treesift, class_name)).items():
+            assert name.startswith("__") or not callable(value) or (class_name, name) in told
+
+
+@pytest.mark.parametrize("row", ROWS, ids=[row[0] for row in ROWS])
+def test_short_lists_never_crash(row):
+    class_name, _, accessor = row[0].partition(".")
+    for child in (None, 1, Name("x"), Keyword("async"), Node(CCompForNode)):
+        for count in range(1, 5):
+            with suppress(TypeError, IndexError, ValueError, AttributeError):
+                Ask(Node(getattr(treesift, class_name), *[child] * count), accessor)
+
+
+def test_operators():
+    node = Parse("a < b not in c")
+    assert [node.GetOperatorStr(i) for i in (-1, 0, 1, 2, 2**31 - 1)] == [
+        None,
+        "<",
+        "not in",
+        None,
+        None,
+    ]
+    assert node.GetTerm(3) is None and node.GetTerm(2**31 - 1) is None
+    assert node.GetTerm(-1).GetStateName() == "comp_op"  # a double step from the end of five children
+    prefix = Parse("not x")
+    assert Tokens(prefix.GetTerm(7)) == "x"
+    assert (prefix.GetOperatorStr(0), prefix.GetOperatorStr(1)) == ("not", None)
+    for words in (["not"], ["not", "in", "x"], ["not", None]):
+        operator = Node(CNode, *map(Leaf, words))
+        assert Node(COperatorExpression, Name("a"), operator, Name("b")).GetOperatorStr(0) is None
+
+
+def test_lists_of_expressions():
+    pair = Parse("a, b")
+    with pytest.raises(ValueError, match=r"^Not enough expressions in list$"):
+        pair.GetSubExpr(2)
+    ellipsis = Parse("a, ...")
+    with pytest.raises(ValueError) as caught:
+        ellipsis.GetSubExpr(1)
+    assert str(caught.value) == (
+        f"Elenment 2 of {ellipsis!r} needs to be a CExpression; fChildren = {ellipsis.fChildren!r}"
+    )
+    generator = Parse("(x for x in y)").GetChild(1)
+    assert [generator.GetSubExpr(i) for i in (0, 5, -9)] == [None] * 3
+
+
+def test_an_index_of_a_list_display_is_doubled_by_the_host():
+    items = Parse("[a, b]", "2.7").GetChild(1)
+    assert type(items) is CListmakerNode
+    assert [Tokens(items.GetSubExpr(i)) for i in (0, 1, True, 2)] == ["a", "b", "b", ""]
+    for no_index in (1.0, "1", None, [1], 2**70):
+        with pytest.raises(TypeError):
+            items.GetSubExpr(no_index)
+    with pytest.raises(TypeError, match="CExpression"):
+        Node(CListmakerNode, Leaf("..."), Leaf(",")).GetSubExpr(0)
+
+
+def test_a_result_of_another_class_is_a_type_error():
+    with pytest.raises(TypeError, match=r"CExpression, .*CNode"):
+        Parse("*..., a").GetSubExpr(0).GetStarredExpression()
+
+
+def test_yields():
+    lone = Node(CYieldArg, Name("a"))
+    assert Tokens(lone.GetValue()) == "a" and not lone.IsYieldFrom()
+    assert not Node(CYieldArg, Leaf("from"), Name("a")).IsYieldFrom()  # no keyword
+
+    class Argument(CYieldArg):
+        def GetValue(self):
+            return Name("overridden")
+
+        def IsYieldFrom(self):
+            return True
+
+    node = Node(CYieldExpr, Keyword("yield"), Node(Argument))
+    assert Tokens(node.GetValue()) == "overridden" and node.IsYieldFrom()
+
+
+def test_await_is_a_prefix_before_anything_but_a_trailer():
+    trailer = Node(CTrailer, Leaf("("), Leaf(")"))
+    for children, prefix, atom, count in [
+        ([Keyword("await"), Name("x"), trailer], "await", "x", 1),
+        ([Keyword("await"), trailer], "", "await", 1),
+        ([Name("await"), Name("x")], "", "await", 1),
+        ([Keyword("await")], "", "await", 0),
+    ]:
+        node = Node(CAtomExpr, *children)
+        assert Tokens(node.GetPrefix()) == prefix and Tokens(node.GetAtom()) == atom
+        assert len(node.GetTrailers()) == count
+
+
+def test_trailers_are_a_new_list():
+    for version in ("3.8", "2.7"):
+        node = Parse("a.b[0]", version)
+        trailers = node.GetTrailers()
+        trailers.clear()
+        assert len(node.GetTrailers()) == 2 and node.GetChildCount() == 3
+
+
+def test_a_power_asks_the_chain_in_it():
+    class Chain(CAtomExpr):
+        def GetAtom(self):
+            return Name("overridden")
+
+        def GetTrailers(self):
+            return []
+
+    chain = Node(Chain, Name("a"), Node(CTrailer, Leaf("."), Name("b")))
+    power = Node(CPower, chain, Leaf("**"), Name("c"))
+    assert Tokens(power.GetAtom()) == "overridden" and power.GetTrailers() == []
+
+
+def test_clauses_in_both_asynchronous_shapes():
+    words = ["for", "x", "in", "y", "if"]
+    clause = [Keyword(words[0]), Name("x"), Keyword("in"), Name("y"), Name("next")]
+    flat = Node(CCompForNode, Keyword("async"), *clause)
+    wrapped = Node(CCompForNode, Keyword("async"), Node(CCompForNode, *clause))
+    for node in (Node(CCompForNode, *clause), flat, wrapped):
+        answers = node.GetTargetNode(), node.GetInNode(), node.GetCompIterNode()
+        assert [*map(Tokens, answers)] == ["x", "y", "next"]
+    assert flat.IsAsync() and wrapped.IsAsync()
+    assert Node(CCompForNode, Keyword("async"), *clause[:4]).GetCompIterNode() is None
+
+
+def test_trailers():
+    for children, dot_name, nested in [
+        (".a", "a", ""),
+        ("()", None, ""),
+        ("(x)", None, "x"),
+        ("[x]", None, "x"),
+        ("{x}", None, ""),
+        (".ab", None, ""),
+        ("!a", None, ""),
+    ]:
+        node = Node(CTrailer, *map(Name, children))
+        assert node.GetDotName() == dot_name and Tokens(node.GetNestedNode()) == nested
+        assert node.GetInitialToken() == children[0]
+    assert Node(CTrailer, Leaf("."), Leaf("a")).GetDotName() is None
+    assert Node(CTrailer, None, Name("a")).GetDotName() is None
+    with pytest.raises(ValueError, match=r"^Trailer node with no children$"):
+        Leaf(cls=CTrailer).GetInitialToken()
+
+
+def test_bottomless_trees_end():
+    clause = Node(CCompForNode, *[Keyword(word) for word in ["for", "x", "in", "y"]])
+    deep = Chain(10_000, CCompForNode, Keyword("async"), last=clause)
+    brackets = Name("x")
+    for _ in range(10_000):
+        brackets = Node(CAtom, Leaf("["), brackets, Leaf("]"))
+    asks = [deep.GetTargetNode, deep.GetInNode, deep.GetCompIterNode, brackets.GetSubExprCount]
+    for ask in [*asks, lambda: brackets.GetSubExpr(0)]:
+        with pytest.raises(RecursionError):
+            ask()
+
+
+def test_overrides_answer_for_their_node_wherever_it_stands():
+    class List(CTestListStarExpr):
+        def GetSubExprCount(self):
+            return 7
+
+        def GetSubExpr(self, i):
+            return Name(f"item {i}")
+
+    atom = Node(CAtom, Leaf("("), Node(List), Leaf(")"))
+    assert atom.GetSubExprCount() == 7 and atom.GetSubExpr(3).fText == "item 3"
+    List.GetSubExpr = lambda self, i: 5
+    with pytest.raises(TypeError, match="CExpression, int found"):
+        atom.GetSubExpr(3)
+    del List.GetSubExprCount
+    assert atom.GetSubExprCount() == 0 and atom.GetSubExpr(3) is None
