@@ -53,9 +53,10 @@ size_t SkipPrefixBack(std::string_view text, size_t pos) {
     return pos;
 }
 
-// The text before the quotes at `end` ends like code that a string follows: in a sign, a header or a keyword.
-bool EndsBeforeString(std::string_view text, size_t end) {
-    end = SkipPrefixBack(text, end);
+// The text before the quote that it ends with is like code that a string follows: ends in a sign, a header or
+// a keyword.
+bool EndsBeforeString(std::string_view text) {
+    const size_t end = SkipPrefixBack(text, text.size() - 1);
     const size_t last = SkipBack(text, end);
     if (last == 0) return false;
     const char c = text[last - 1];
@@ -100,7 +101,7 @@ bool IsTurnedInsideOut(CLexer& lexer, size_t pos, const CStringStart& start, siz
     const std::string_view text = lexer.Text();
     const size_t closing = end - start.quote_length;
     const bool is_before_operand = BeginsBehindString(text, SkipBlanks(text, end));
-    const bool is_behind_code = EndsBeforeString(text, closing);
+    const bool is_behind_code = EndsBeforeString(text.substr(pos, closing - pos + 1));
     if (!is_before_operand && !is_behind_code) return false;
     if (is_before_operand && is_behind_code) return true;
 
@@ -150,7 +151,7 @@ size_t FindProseEnd(CLexer& lexer, size_t pos, size_t end, size_t& looked_at) {
     std::optional<CRowReader> reader(std::in_place, lexer, WithinRow(last_end));
     CTokenRow row;
     bool is_in_session = false;  // of the interpreter, up to a blank row
-    while (reader->Next(row) && row.start < end) {
+    while (reader->Next(row) && row.text_end <= end) {
         looked_at = std::max(looked_at, row.end);
         if (row.begins_statement && row.indent < indent) break;
         is_in_session &= row.start == last_end;
@@ -172,8 +173,8 @@ size_t FindUnclosedTripleEnd(CLexer& lexer, size_t pos, const CStringStart& star
                              size_t& looked_at) {
     const std::string_view text = lexer.Text();
     if (!found.is_closed) return FindProseEnd(lexer, pos, text.size(), looked_at);
-    const size_t closing_row = RowStart(text, found.end);
-    if (closing_row <= pos || !IsTurnedInsideOut(lexer, pos, start, found.end, looked_at)) return 0;
+    const size_t closing_row = pos + RowStart(text.substr(pos), found.end - pos);
+    if (closing_row == pos || !IsTurnedInsideOut(lexer, pos, start, found.end, looked_at)) return 0;
     return FindProseEnd(lexer, pos, closing_row, looked_at);
 }
 

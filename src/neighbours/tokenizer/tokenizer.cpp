@@ -14,14 +14,6 @@ namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
-// The last token that is neither a comment nor a backslash; none when there is none.
-const CRawToken* FindLastSignificant(const std::vector<CRawToken>& tokens) {
-    for (auto token = tokens.rbegin(); token != tokens.rend(); ++token) {
-        if (token->type != kTokenId_COMMENT && token->type != kTokenId_BACKSLASH) return &*token;
-    }
-    return nullptr;
-}
-
 bool EndsInBackslash(const std::vector<CRawToken>& tokens) {
     return !tokens.empty() && tokens.back().type == kTokenId_BACKSLASH;
 }
@@ -33,9 +25,8 @@ CTokenizer::CTokenizer(std::string_view text) : _fLexer(text), _fEmbedded(text) 
 }
 
 bool CTokenizer::NextLogical(CRawLogical& logical) {
-    logical.tokens.clear();
     _fEmbedded.Clear(logical);
-    _fEmbedding = {};
+    _Restart(logical);
     const bool is_mid_row = _fMidRow;
     if (!_SkipToLogical()) return false;
 
@@ -49,6 +40,12 @@ bool CTokenizer::NextLogical(CRawLogical& logical) {
     _fScopes.Visit(logical, _fIndent, is_mid_row);
     _fEmbedded.Find(logical, _fEmbedding);
     return true;
+}
+
+void CTokenizer::_Restart(CRawLogical& logical) {
+    logical.tokens.clear();
+    _fLast = {};
+    _fEmbedding = {};
 }
 
 bool CTokenizer::_SkipToLogical() {
@@ -75,7 +72,7 @@ void CTokenizer::_CollectStatement(CRawLogical& logical) {
         if (_CollectTokens(logical, reach) == EEnd::kUnclosed) {
             _RememberUnclosed();
             _fPlace = start;
-            logical.tokens.clear();
+            _Restart(logical);
             _CollectTokens(logical, {FindRecoveredEnd(_fLexer, start), true});
             break;
         }
@@ -95,8 +92,7 @@ size_t CTokenizer::_FindStrayCloserBehind(const CRawLogical& logical) {
         const bool is_closer = ByteKind(text[next.pos]) == EByteKind::kCloser;
         if (!is_closer || !_EndsDeeper(logical)) return 0;
     }
-    const CRawToken* last = FindLastSignificant(logical.tokens);
-    if (last && last->text == ":" && IsCompoundWord(logical.tokens[0].text)) return 0;
+    if (_fLast.text == ":" && IsCompoundWord(logical.tokens[0].text)) return 0;
     return FindStrayCloser(_fLexer, next, _fIndent, _fNoStrayCloserBefore);
 }
 
@@ -134,11 +130,11 @@ CTokenizer::EEnd CTokenizer::_CollectTokens(CRawLogical& logical, const CReach& 
             at_row_start = true;
             continue;
         }
-        if (at_row_start && !reach.ends_there && !_fBrackets.empty() && _ProvesUnclosed(logical)) {
+        if (at_row_start && !reach.ends_there && !_fBrackets.empty() && _ProvesUnclosed()) {
             return EEnd::kUnclosed;
         }
         at_row_start = false;
-        if (c == ';' && _IsSeparator(logical) && (_fBrackets.empty() || reach.ends_there)) {
+        if (c == ';' && (_fBrackets.empty() || reach.ends_there) && _IsSeparator(logical)) {
             _EndAtSeparator(logical);
             return EEnd::kSound;
         }
@@ -157,6 +153,7 @@ void CTokenizer::_AddToken(CRawLogical& logical) {
     _fEmbedding.has_fields |= token.has_fields;
     _fEmbedding.has_strings |= token.type == kTokenId_STRING;
     _fEmbedding.has_comments |= token.type == kTokenId_COMMENT;
+    if (token.type != kTokenId_COMMENT && token.type != kTokenId_BACKSLASH) _fLast = logical.tokens.back();
     if (token.may_span_rows) SkipRows(text, token.end, _fPlace);
     _fPlace.pos = token.end;
 }
@@ -179,9 +176,9 @@ bool CTokenizer::_TrackBracket() {
 // The ";" at the place parts two logical lines. One that parts nothing is a token, and a fault. One in a row
 // whose quotes don't match may as well stand in a string, and parts nothing either.
 bool CTokenizer::_IsSeparator(const CRawLogical& logical) {
-    if (_fIsCompound || FindLastSignificant(logical.tokens) == nullptr) return false;
+    if (_fIsCompound || _fLast.text.empty() || _HasOpenQuote()) return false;
     _fIsCompound = IsCompound(logical.tokens);
-    return !_fIsCompound && !_HasOpenQuote();
+    return !_fIsCompound;
 }
 
 // The row of the place ends with a string that isn't closed. Looks at each row once.
@@ -204,14 +201,16 @@ void CTokenizer::_EndAtSeparator(CRawLogical& logical) {
 
 // The row that begins at the place can't lie inside the brackets that are open: it begins with a statement,
 // or, no deeper than the logical line, with an operand although the row before ends with one.
-bool CTokenizer::_ProvesUnclosed(const CRawLogical& logical) const {
+bool CTokenizer::_ProvesUnclosed() const {
     if (StartsStatement(_fLexer.Text(), _fPlace.pos)) return true;
     if (_fPlace.indent > _fIndent) return false;
-    const CRawToken* last = FindLastSignificant(logical.tokens);
-    return last && AreOperandsSideBySide(*last, _fLexer.Text(), _fPlace.pos);
+    return AreOperandsSideBySide(_fLast, _fLexer.Text(), _fPlace.pos);
 }
 
+// What proves one bracket to be unclosed proves it for those around it, so that no later logical line needs
+// to look as far again.
 void CTokenizer::_RememberUnclosed() {
+    if (_IsKnownUnclosed(_fBrackets.back().pos)) return;
     _fUnclosed.clear();
     _fUnclosed_i = 0;
     for (const COpenBracket& bracket : _fBrackets) _fUnclosed.push_back(bracket.pos);

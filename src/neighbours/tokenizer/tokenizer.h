@@ -41,6 +41,7 @@ class CTokenizer {
     enum class EEnd { kSound, kUnclosed };
 
     bool _SkipToLogical();
+    void _Restart(CRawLogical& logical);
     void _CollectComment(CRawLogical& logical);
     void _CollectStatement(CRawLogical& logical);
     EEnd _CollectTokens(CRawLogical& logical, const CReach& reach);
@@ -49,7 +50,7 @@ class CTokenizer {
     bool _IsSeparator(const CRawLogical& logical);
     bool _HasOpenQuote();
     void _EndAtSeparator(CRawLogical& logical);
-    bool _ProvesUnclosed(const CRawLogical& logical) const;
+    bool _ProvesUnclosed() const;
     size_t _FindStrayCloserBehind(const CRawLogical& logical);
     bool _EndsDeeper(const CRawLogical& logical) const;
     void _RememberUnclosed();
@@ -59,6 +60,7 @@ class CTokenizer {
     CPlace _fPlace;
     CScopes _fScopes;
     CEmbeddedFinder _fEmbedded;
+    CRawToken _fLast;              // of the logical line, comments and backslashes apart
     CEmbeddingTokens _fEmbedding;  // what the logical line holds
     bool _fMidRow = false;         // behind a separator
     int32_t _fIndent = 0;          // of the first row of the logical line
