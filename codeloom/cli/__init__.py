@@ -11,8 +11,9 @@ from collections.abc import Sequence
 from codeloom import __version__
 from codeloom.cli.check import CheckCommand
 from codeloom.cli.command import Command, ExitStatus
+from codeloom.cli.tree import TreeCommand
 
-COMMANDS: Sequence[type[Command]] = (CheckCommand,)
+COMMANDS: Sequence[type[Command]] = (CheckCommand, TreeCommand)
 
 # What a shell reports for a program that SIGINT or SIGPIPE ended.
 _INTERRUPTED = 130
@@ -48,9 +49,7 @@ def _ArgumentParser() -> argparse.ArgumentParser:
     parser.add_argument("--version", action="version", version=f"codeloom {__version__}")
     commands = parser.add_subparsers(metavar="COMMAND", required=True)
     for command in COMMANDS:
-        command_parser = commands.add_parser(
-            command.NAME, help=command.HELP, description=command.DESCRIPTION
-        )
+        command_parser = commands.add_parser(command.NAME, help=command.HELP, description=command.DESCRIPTION)
         command.AddArguments(command_parser)
         command_parser.set_defaults(command=command)
     return parser

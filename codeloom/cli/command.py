@@ -46,6 +46,11 @@ def AddSourceArguments(parser: argparse.ArgumentParser) -> None:
         metavar="FILE-OR-FOLDER",
         help="a file; a folder, with all that is below it; or - for the standard input",
     )
+    AddLanguageArgument(parser)
+
+
+def AddLanguageArgument(parser: argparse.ArgumentParser) -> None:
+    """Add `language`."""
     parser.add_argument(
         "--python",
         dest="language",

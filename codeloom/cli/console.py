@@ -4,6 +4,7 @@ import io
 import os
 import shutil
 import sys
+from enum import StrEnum
 
 from codeloom.check import Problem
 from codeloom.excerpt import Excerpt, Printable
@@ -12,9 +13,17 @@ _INDENT = "    "
 _WIDTH_WITHOUT_TERMINAL = 100
 _LEAST_WIDTH = 20
 
-_BOLD = "\033[1m"
-_RED = "\033[31m"
 _PLAIN = "\033[0m"
+
+
+class Colour(StrEnum):
+    """How a piece of output is set off, in the codes of a terminal."""
+
+    BOLD = "\033[1m"
+    DIM = "\033[2m"
+    RED = "\033[31m"
+    GREEN = "\033[32m"
+    CYAN = "\033[36m"
 
 
 class Console:
@@ -31,27 +40,35 @@ class Console:
         """The problem's place and message, its row of source and a caret under the place."""
         place = f"{PrintablePath(problem.path)}:{problem.row}:{problem.column}:"
         row, caret = Excerpt(problem.source_row, problem.column, self._fWidth)
-        print(self._Coloured(_BOLD, place), Printable(problem.message))
+        print(self.Coloured(Colour.BOLD, place), Printable(problem.message))
         print(_INDENT + row)
-        print(_INDENT + self._Coloured(_RED, caret))
+        print(_INDENT + self.Coloured(Colour.RED, caret))
 
     def PrintFailure(self, path: str, error: OSError) -> None:
         """What can't be read, and why."""
-        # What was found before stands before it, if both go to one place.
-        self.Flush()
         reason = error.strerror or str(error)
-        print(f"codeloom: can't read {PrintablePath(path)}: {reason}", file=sys.stderr)
+        self.PrintError(f"codeloom: can't read {PrintablePath(path)}: {reason}")
 
     def PrintSummary(self, text: str) -> None:
         """The last row of a command's output."""
         print(text)
+
+    def PrintRow(self, row: str) -> None:
+        """A row of a command's result."""
+        print(row)
+
+    def PrintError(self, text: str) -> None:
+        """What is no part of the result, behind what was printed before."""
+        self.Flush()
+        print(text, file=sys.stderr)
 
     def Flush(self) -> None:
         """Bring what was printed to its reader."""
         if sys.stdout is not None:
             sys.stdout.flush()
 
-    def _Coloured(self, colour: str, text: str) -> str:
+    def Coloured(self, colour: Colour, text: str) -> str:
+        """`text` in a colour, where the output is a terminal that takes it."""
         return f"{colour}{text}{_PLAIN}" if self._fHasColour else text
 
 
