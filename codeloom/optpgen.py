@@ -2,10 +2,12 @@
 
 from codeloom._neighbours import (
     CreateParser,
+    Grammar,
     NodeConverter,
     ParseError,
     Parser,
     ParserGenerator,
+    ParserImpl,
 )
 
-__all__ = ["CreateParser", "NodeConverter", "ParseError", "Parser", "ParserGenerator"]
+__all__ = ["CreateParser", "Grammar", "NodeConverter", "ParseError", "Parser", "ParserGenerator", "ParserImpl"]
