@@ -1,0 +1,493 @@
+"""Match and case statements: patterns against the interpreter's, bad patterns, quirks, overrides, limits.
+
+The node layouts are in trees/statements_match.tree; which words are keywords is in test_soft_keywords.py.
+"""
+
+import ast
+import gc
+import weakref
+
+import pytest
+from hypothesis import given, settings
+from hypothesis import strategies as st
+
+from codeloom import treesift
+from codeloom.logicalline import CLogicalLine, kCase, kMatch, kUnknown
+from codeloom.optpgen import ParseError
+from codeloom.treesift import (
+    CAtomExpr,
+    CClassArgumentPatternNode,
+    CClassPatternNode,
+    CExpression,
+    CMatchCaseStatementParser,
+    CPatternNode,
+    CPGenAnalyzerImpl,
+    CPGenParserImpl,
+    CSequencePatternNode,
+)
+from codeloom.utils import GetLogicalsFromText
+from hand_made import Parse, Tokens
+
+VERSION = (3, 11, 0)
+ANALYZER = CPGenAnalyzerImpl(VERSION)
+DRIVER = CPGenParserImpl(VERSION)
+
+
+def Analyze(text):
+    (logical,) = GetLogicalsFromText(text)
+    return ANALYZER.AnalyzeSingleLogical(logical, False, False)
+
+
+def Place(text):
+    error = Analyze(text)
+    return error and (error.lineno, error.offset)
+
+
+def Tuples(text):
+    (logical,) = GetLogicalsFromText(text)
+    return logical.fToks, logical.fPositions
+
+
+def ByHand(text):
+    """Tokens with blanks between them, brackets of any kind among them; each has its index as column."""
+    toks = tuple(text.split())
+    return toks, tuple((0, i) for i in range(len(toks)))
+
+
+# Patterns against those of the interpreter
+
+
+def Form(node):
+    """A pattern of ours as nested tuples."""
+    parts = node.fChildren or []
+    texts = [part.fText for part in parts]
+    if isinstance(node, CSequencePatternNode) and texts[0] == "{":
+        pairs = [Form(part) for part, text in zip(parts, texts, strict=True) if text not in ("{", ":", "}")]
+        return ("mapping", *pairs)
+    if isinstance(node, CSequencePatternNode):
+        return (
+            "sequence",
+            *(Form(p) for p, text in zip(parts[1:-1], texts[1:-1], strict=True) if text != ","),
+        )
+    if isinstance(node, CClassPatternNode):
+        return ("class", Tokens(parts[0]), *(Form(part) for part in parts[2:] if part.fText != ","))
+    if isinstance(node, CClassArgumentPatternNode):
+        return ("argument", texts[0], Form(parts[2]))
+    if type(node) is not CPatternNode:
+        return Tokens(node)
+    if "as" in texts:
+        return ("as", Form(parts[0]), texts[2])
+    if "|" in texts:
+        return ("or", *map(Form, parts[::2]))
+    return Form(parts[1]) if texts[0] == "(" else Tokens(node)
+
+
+def ExpectedForm(pattern):
+    """The same of a pattern of the interpreter's."""
+    match pattern:
+        case ast.MatchAs(pattern=None, name=name):
+            return name or "_"
+        case ast.MatchAs(pattern=inner, name=name):
+            return ("as", ExpectedForm(inner), name)
+        case ast.MatchOr(patterns=patterns):
+            return ("or", *map(ExpectedForm, patterns))
+        case ast.MatchStar(name=name):
+            return f"* {name or '_'}"
+        case ast.MatchSequence(patterns=patterns):
+            return ("sequence", *map(ExpectedForm, patterns))
+        case ast.MatchMapping(keys=keys, patterns=patterns, rest=rest):
+            pairs = [x for key, p in zip(keys, patterns, strict=True) for x in (Spaced(key), ExpectedForm(p))]
+            return ("mapping", *pairs, *(["**", rest] if rest else []))
+        case ast.MatchClass(cls=cls, patterns=patterns, kwd_attrs=names, kwd_patterns=named):
+            arguments = [("argument", n, ExpectedForm(p)) for n, p in zip(names, named, strict=True)]
+            return ("class", Spaced(cls), *map(ExpectedForm, patterns), *arguments)
+        case ast.MatchValue(value=value) | ast.MatchSingleton(value=value):
+            return Spaced(value)
+
+
+def Spaced(value):
+    text = ast.unparse(value) if isinstance(value, ast.AST) else repr(value)
+    return text.replace(".", " . ").replace("-", "- ").replace("  ", " ")
+
+
+def Joined(parts, open, close, least=0):
+    return st.lists(parts, min_size=least, max_size=3).map(lambda some: f"{open}{', '.join(some)}{close}")
+
+
+NAMES = st.sampled_from(["a", "b", "match", "case", "_x"])
+VALUES = st.sampled_from(["1", "-1", "2j", "1 + 2j", "-1 - 2j", "'s'", "a.b", "a.case.b", "None", "True"])
+SINGLE = st.one_of(NAMES, VALUES, st.just("_"), NAMES.map("{}()".format))
+
+
+def Larger(patterns):
+    """Patterns made of smaller ones."""
+    arguments = st.one_of(patterns, st.tuples(NAMES, patterns).map("=".join))
+    pairs = st.tuples(VALUES, patterns).map(": ".join)
+    return st.one_of(
+        Joined(st.one_of(patterns, NAMES.map("*{}".format)), "[", "]"),
+        Joined(patterns, "(", ",)", least=1),
+        patterns.map("({})".format),
+        Joined(arguments, "a.b(", ")"),
+        Joined(pairs, "{", "}"),
+        st.tuples(Joined(pairs, "{", ", **", least=1), NAMES).map(lambda both: f"{''.join(both)}}}"),
+        st.tuples(patterns.map("({})".format), patterns.map("({})".format)).map(" | ".join),
+        st.tuples(patterns.map("({})".format), NAMES).map(" as ".join),
+    )
+
+
+@settings(max_examples=500, deadline=None)
+@given(st.recursive(SINGLE, Larger, max_leaves=8))
+def test_patterns_have_the_structure_that_the_interpreter_sees(pattern):
+    try:
+        tree = ast.parse(f"match x:\n case {pattern}: pass")
+    except SyntaxError:
+        return  # such as a positional argument behind a named one
+    expected = tree.body[0].cases[0].pattern
+    assert Form(Parse(f"case {pattern}:").GetPattern()) == ExpectedForm(expected)
+
+
+# Bad patterns, each with the place of its fault
+
+BAD_PATTERNS = """
+case a as 1:
+          ^
+case a as b.c:
+       ^
+case a as b as c:
+       ^
+case ():
+      ^
+case a, b:
+      ^
+case *a, b:
+     ^
+case "a" "b":
+     ^
+case é b:
+       ^
+case a b:
+       ^
+case a.b.:
+        ^
+case a..b:
+       ^
+case a.1:
+      ^
+case a[0]:
+      ^
+case a := 1:
+       ^
+case not a:
+         ^
+case ...:
+     ^
+case ~1:
+     ^
+case -:
+     ^
+case -a:
+      ^
+case 1 * 2:
+       ^
+case 1 2:
+       ^
+case 1 + a:
+         ^
+case 1 + 2 + 3:
+           ^
+case a | | b:
+         ^
+case (a | 1 b):
+            ^
+case [a, , b]:
+         ^
+case [a b]:
+        ^
+case [*1]:
+      ^
+case [*a.b]:
+      ^
+case [a for a in b]:
+        ^
+case {"a"}:
+      ^
+case {"a": 1, "b"}:
+              ^
+case {"a": }:
+           ^
+case {: 1}:
+      ^
+case {a, b: 1}:
+       ^
+case {**a, "b": 1}:
+      ^
+case {**}:
+        ^
+case A(a.b=0):
+          ^
+case A(=0):
+       ^
+case A(a=):
+         ^
+case A(,):
+       ^
+case A(a)(b):
+        ^
+case A(a=1) b:
+          ^
+case A(a).b:
+        ^
+"""
+BAD_ROWS = BAD_PATTERNS.strip("\n").split("\n")
+
+
+@pytest.mark.parametrize(
+    ("text", "caret"), zip(BAD_ROWS[::2], BAD_ROWS[1::2], strict=True), ids=BAD_ROWS[::2]
+)
+def test_the_place_of_the_fault(text, caret):
+    assert Place(text) == (1, len(text[: caret.index("^")].encode()) + 1)
+
+
+def test_places_in_lines_of_several_rows():
+    """Comments and backslashes are taken out first; the places are still those of the text."""
+    assert Place("case [a,  # one\n      # two\n  b 1]:") == (3, 5)
+    assert Place("case \\\n  a \\\n  b:") == (3, 3)
+    assert Place("case é, b:") == (1, 8)  # columns are bytes
+
+
+def test_brackets_of_unlike_kinds():
+    lines = {"case [ a ) :": 3, "case ( a , b ] :": 5, "case ( a ] :": 3, "case { 1 : a ] :": 5}
+    for line, error_i in lines.items():
+        toks, positions = ByHand(line)
+        with pytest.raises(ParseError, match="Invalid syntax") as caught:
+            DRIVER.ParseToksToNode(toks, False, positions)
+        error = caught.value
+        assert (error.type, error.value, error.context) == (0, toks[error_i], positions[error_i])
+
+
+def test_places_beside_the_pattern():
+    assert Place("match a b:") == (1, 9)
+    assert Place("match a: pass") == (1, 8)
+    assert Place("match a") == (1, 7) and Place("case 1") == (1, 6)  # taken for names
+    # Guard and body are parsed as slices of the line, and their tokens are counted from the slice's first.
+    assert Place("case a if b c:") == (1, 8)
+    assert Place("case a: b c") == (1, 6)
+
+
+def test_what_the_interpreter_refuses_is_taken():
+    for text in ["a |", "+1", "*a", "def", "A(a=0, b)", "A(1=0)", "{**1}", "[*a, *b]", "a | b"]:
+        assert Place(f"case {text}:") is None, text
+
+
+# Statements
+
+
+def test_the_subject():
+    for text, subject in [
+        ("match a:", "a"),
+        ("match a, b:", "a , b"),
+        ("match *a, b:", "* a , b"),
+        ("match (a, b):", "( a , b )"),
+        ("match (a)[0]:  # one", "( a ) [ 0 ]"),
+        ("match (a,\n  # one\n  b) \\\n :", "( a , b )"),
+        ("match lambda: 0:", "lambda : 0"),
+        ("match await a:", "await a"),
+        ("match a := 1:", "a := 1"),
+        ("match (a).b + (c):", "( a ) . b + ( c )"),
+    ]:
+        assert Tokens(Parse(text).GetTestExpression()) == subject
+
+
+def test_a_subject_in_two_brackets_stays_whole():
+    toks, positions = ByHand("match a ) + ( b :")
+    node = DRIVER.ParseToksToNode(toks, False, positions)
+    assert Tokens(node.GetTestExpression()) == "( a ) + ( b )"
+
+
+def test_comments_are_no_body():
+    assert Parse("case 1:  # c").GetBody() is None
+    assert Tokens(Parse("case a if b: c  # d").GetBody()) == "c"
+
+
+def test_names_take_the_ordinary_road():
+    for text in ["match = 3", "match(x)", "case.x", "match[x]: y"]:
+        (logical,) = GetLogicalsFromText(text)
+        parser = DRIVER._fMatchCaseStatementParser
+        for parse in (parser.ParseMatchStmt, parser.ParseCaseStmt):
+            assert parse(logical.fToks, logical.fPositions) is None
+        assert Place(text) is None
+    assert type(Parse("match(x)")) is CAtomExpr
+
+
+def test_the_decision_is_looked_up_at_the_call(monkeypatch):
+    calls = []
+
+    def Decide(toks, start, end):
+        calls.append((toks, start, end))
+        return kMatch
+
+    monkeypatch.setattr(treesift.logicalline, "FindMatchOrCaseType", Decide)
+    assert Tokens(Parse("match(  # one\n x):").GetTestExpression()) == "( x )"
+    assert calls == [(("match", "(", "x", ")", ":"), 0, 5)]
+    assert type(Parse("match(x)")) is CAtomExpr  # there is no colon
+    monkeypatch.setattr(treesift.logicalline, "FindMatchOrCaseType", lambda *_: kCase)
+    assert Place("case if b:") == (1, 1)  # a pattern of no tokens
+    monkeypatch.setattr(treesift.logicalline, "FindMatchOrCaseType", lambda *_: kUnknown)
+    assert Place("case a:") == (1, 6)
+
+
+# The parser as the host sees it
+
+
+class Recording(CMatchCaseStatementParser):
+    def __init__(self, driver=DRIVER):
+        super().__init__(driver)
+        self.calls = []
+
+
+def _Recorded(name):
+    def Operation(self, *arguments):
+        self.calls.append((name, *arguments))
+        return getattr(CMatchCaseStatementParser, name)(self, *arguments)
+
+    return Operation
+
+
+for _name in [name for name in vars(CMatchCaseStatementParser) if "__" not in name]:
+    setattr(Recording, _name, _Recorded(_name))
+
+
+def test_overrides_at_every_depth():
+    parser = Recording()
+    parser.ParseCaseStmt(*Tuples("case A(a.b, c=-1) | [d, {'e': _}]:"))
+    assert [call for call in parser.calls if call[0].startswith("_NodeFor")] == [
+        ("_NodeForPattern", 1, 22, True),
+        ("_NodeForPattern", 1, 12, False),
+        ("_NodeForClassPattern", 1, 12),
+        ("_NodeForDottedNameValue", 1, 2),
+        ("_NodeForPattern", 3, 6, True),
+        ("_NodeForDottedNameValue", 3, 6),
+        ("_NodeForPattern", 9, 11, True),
+        ("_NodeForNumberPattern", 9, 11),
+        ("_NodeForPattern", 13, 22, False),
+        ("_NodeForSequencePattern", 13, 22),
+        ("_NodeForPattern", 14, 15, True),
+        ("_NodeForPattern", 16, 21, True),
+        ("_NodeForMappingPattern", 16, 21),
+        ("_NodeForPattern", 17, 18, True),
+        ("_NodeForPattern", 19, 20, True),
+    ]
+    with pytest.raises(ParseError):
+        parser.ParseCaseStmt(*Tuples("case 1 2:"))
+    parser.ParseMatchStmt(*Tuples("match a:"))
+    assert {name for name, *_ in parser.calls} == {name for name in vars(Recording) if "__" not in name}
+
+
+def test_what_overrides_may_answer():
+    class Parser(CMatchCaseStatementParser):
+        def _RemoveSkipToks(self, toks, positions):
+            return self.answer
+
+        def _ParseExceptionAt(self, error_i):
+            return self.error
+
+    parser = Parser(DRIVER)
+    for answer, failure in [(None, TypeError), (((),), ValueError), (([], ()), TypeError), (((), ()), None)]:
+        parser.answer = answer
+        if failure is None:
+            assert parser.ParseCaseStmt((), ()) is None
+        else:
+            with pytest.raises(failure):
+                parser.ParseCaseStmt((), ())
+    parser.answer = Tuples("case ...:")
+    for error, failure in [(KeyError("odd"), KeyError), (None, TypeError), (KeyError, TypeError)]:
+        parser.error = error
+        with pytest.raises(failure):
+            parser.ParseCaseStmt((), ())
+
+
+def test_tokens_are_kept_during_a_parse_only():
+    class Parser(CMatchCaseStatementParser):
+        def _NodeForPattern(self, start_i, end_i, allow_as=True):
+            self.ParseMatchStmt(*Tuples("match a:"))
+            return super()._NodeForPattern(start_i, end_i, allow_as)
+
+    with pytest.raises(TypeError, match="no match or case statement"):
+        Parser(DRIVER).ParseCaseStmt(*Tuples("case a:"))
+    parser = DRIVER._fMatchCaseStatementParser
+    for text in ("case a:", "case a b:"):
+        Place(text)
+        for ask in (parser._TokNode, parser._ParseExceptionAt, lambda i: parser._NodeForPattern(i, 1)):
+            with pytest.raises(TypeError):
+                ask(0)
+        with pytest.raises(TypeError):
+            parser._NonNestedFindTokenIndex("a", 0, 1)
+
+
+def test_skipped_tokens():
+    remove = CMatchCaseStatementParser(None)._RemoveSkipToks
+    toks, rows = ("case", "# a", "\\", "1", "\\", ":", "\\"), (0, 0, 1, 2, 2, 2, 2)
+    positions = tuple((row, i) for i, row in enumerate(rows))
+    assert remove(toks, positions) == (
+        ("case", "1", "\\", ":", "\\"),
+        ((0, 0), (2, 3), (2, 4), (2, 5), (2, 6)),
+    )
+    for toks, failure in [((None,), TypeError), (("",), IndexError), (("a", "b"), IndexError)]:
+        with pytest.raises(failure):
+            remove(toks, ((0, 0),))
+
+
+def test_searches_outside_brackets():
+    class Parser(CMatchCaseStatementParser):
+        def _ParseCaseStmtImpl(self):
+            self.found = [self._NonNestedFindTokenIndex(*search) for search in self.searches]
+
+    toks, positions = ByHand("x ( x [ x } x ) , ) x ( , ) (")
+    parser = Parser(DRIVER)
+    parser.searches = [(tok, start, 15) for tok in "x(),[" for start in range(15)] + [("x", 3, 3)]
+    parser.ParseCaseStmt(toks, positions)
+    found = [DRIVER._NonNestedFindTokenIndex(tok, toks, *ends) for tok, *ends in parser.searches]
+    assert parser.found == found and {-1, 10, 14} < set(found)
+
+
+def test_a_parser_without_a_driver():
+    with pytest.raises(AttributeError):
+        CMatchCaseStatementParser(None).ParseCaseStmt(*Tuples("case a:"))
+    with pytest.raises(TypeError):
+        CMatchCaseStatementParser("driver")
+    with pytest.raises(AttributeError):
+        DRIVER._fMatchCaseStatementParser = None
+
+
+def test_driver_and_parser_are_collected():
+    class Driver(CPGenParserImpl):
+        pass
+
+    driver = Driver(VERSION)
+    assert type(driver._fMatchCaseStatementParser) is CMatchCaseStatementParser
+    gone = weakref.ref(driver)
+    del driver
+    gc.collect()
+    assert gone() is None
+
+
+@pytest.mark.parametrize("open_, close", [("[", "]"), ("(", ")"), ("A(", ")"), ("A(a=", ")"), ("{1:", "}")])
+def test_deep_patterns_end_in_an_exception(open_, close):
+    text = f"case {open_ * 10_000}1{close * 10_000}:"
+    with pytest.raises(RecursionError):
+        Parse(text)
+    assert Form(Parse("case a | b:").GetPattern()) == ("or", "a", "b")
+
+
+def test_removed_tokens_are_no_tokens_of_these_statements():
+    logical = CLogicalLine(kCase, ("case", None, "1", ":"), ((0, 0), (0, 5), (0, 6), (0, 7)))
+    with pytest.raises(TypeError):
+        DRIVER.ParseToNode(logical)
+    with pytest.raises(TypeError):
+        DRIVER.ParseToksToNode(("case", "1", ":"), False, None)
+
+
+def test_a_dotted_value_has_neither_text_nor_context():
+    value = Parse("case a.b:").GetPattern()
+    assert type(value) is CExpression and (value.fText, value.fContext) == (None, None)
+    assert [name.fContext for name in value.fChildren] == [(0, 5), (0, 6), (0, 7)]
