@@ -43,7 +43,7 @@ CTestListStarExpr.IsTuple               False      False       TypeError
 CTestListStarExpr.IsGenExpr             False      False       False
 CAtomExpr.GetPrefix                     None       None        None
 CAtomExpr.GetAtom                       None       IndexError  TypeError
-CAtomExpr.GetTrailers                   []         []          TypeError
+CAtomExpr.GetTrailers                   []         []          [1,2,3,4,5,6,7]
 CPower.GetAtom                          TypeError  IndexError  TypeError
 CPower.GetTrailers                      TypeError  IndexError  TypeError
 CPower.GetExponentNode                  None       None        TypeError

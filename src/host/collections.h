@@ -28,6 +28,13 @@ inline nb::handle ListItem(nb::handle list, Py_ssize_t i) {
     return PyList_GET_ITEM(list.ptr(), i);
 }
 
+// The items in [start, end) as a new list; the range is cut to the list.
+inline nb::list ListSlice(nb::handle list, Py_ssize_t start, Py_ssize_t end) {
+    nb::list slice = nb::steal<nb::list>(PyList_GetSlice(list.ptr(), start, end));
+    if (!slice.is_valid()) throw nb::python_error();
+    return slice;
+}
+
 // Removes the item at `i`; IndexError outside the list.
 void DeleteListItem(nb::handle list, Py_ssize_t i);
 

@@ -1,23 +1,9 @@
 #include "tree/expression_nodes.h"
 
-#include <string>
-
 #include "host/errors.h"
-#include "host/text.h"
 #include "tree/atom_nodes.h"
 
 namespace codeloom {
-
-namespace {
-
-// The children in [start, end), as a new list.
-CNodeList ListOfChildren(CNode& node, Py_ssize_t start, Py_ssize_t end) {
-    nb::list children;
-    for (Py_ssize_t i = start; i < end; ++i) children.append(node.ChildAt(i).Self());
-    return CNodeList(children);
-}
-
-}  // namespace
 
 // CExpression
 
@@ -45,7 +31,7 @@ CTextOrNone COperatorExpression::_TextOfTwoWords(const CNode& node) {
     if (node.fChildren.is_none() || ListSize(node.fChildren) != 2) return CTextOrNone();
     const nb::object first = node.ChildAt(0).fText, second = node.ChildAt(1).fText;
     if (first.is_none() || second.is_none()) return CTextOrNone();
-    return nb::str("{} {}").format(first, second);
+    return first + nb::str(" ") + second;
 }
 
 int COperatorExpression::GetTermCount() {
@@ -135,8 +121,8 @@ CNodeRef CAtomExpr::GetAtom() {
 }
 
 CNodeList CAtomExpr::GetTrailers() {
-    if (fChildren.is_none()) return CNodeList(nb::list());
-    return ListOfChildren(*this, _AtomIndex() + 1, _GetChildCount());
+    if (fChildren.is_none()) return nb::list();
+    return ListSlice(fChildren, _AtomIndex() + 1, _GetChildCount());
 }
 
 Py_ssize_t CAtomExpr::_AtomIndex() {
@@ -156,7 +142,7 @@ CNodeList CPower::GetTrailers() {
     const Py_ssize_t child_count = _GetChildCount();
     Py_ssize_t end = 1;
     while (end < child_count && !IsToken(end, "**")) ++end;
-    return ListOfChildren(*this, 1, end);
+    return ListSlice(fChildren, 1, end);
 }
 
 CNodeRef CPower::GetExponentNode() {
