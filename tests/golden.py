@@ -38,7 +38,7 @@ def Cases(folder: Path, suffix: str) -> list:
 
 def _CasesOf(path: Path) -> Iterator[Case]:
     titles = set()
-    for text in path.read_text("utf-8").split(f"\n{_TITLE_MARK}")[1:]:
+    for text in f"\n{path.read_text('utf-8')}".split(f"\n{_TITLE_MARK}")[1:]:
         title, _, body = text.partition("\n")
         source, mark, output = body.partition(f"\n{_OUTPUT_MARK}")
         assert title not in titles, f"{path.name} has two cases called {title!r}"
@@ -60,9 +60,9 @@ def Check(case: Case, output: str, rewrite: bool) -> None:
 
 
 def _Rewrite(case: Case, output: str) -> None:
-    text = case.path.read_text("utf-8")
+    text = f"\n{case.path.read_text('utf-8')}"
     head = f"\n{_TITLE_MARK}{case.title}\n{case.source}\n"
     before, found, rest = text.partition(head)
     assert found, f"{case.path.name} has changed meanwhile"
     _, mark, after = rest.partition(f"\n{_TITLE_MARK}")
-    case.path.write_text(f"{before}{head}{output}\n{mark}{after}", "utf-8")
+    case.path.write_text(f"{before}{head}{output}\n{mark}{after}"[1:], "utf-8")
