@@ -7,11 +7,35 @@
 
 namespace codeloom {
 
-class CExpression;
-using CExpressionRef = CRef<CExpression>;
-
 template <class Class>
 class TExpressionOperations;
+template <class Class>
+class TOperatorExpressionOperations;
+template <class Class>
+class TStarExpressionOperations;
+template <class Class>
+class TLambdaExprOperations;
+template <class Class, class Base>
+class TYieldOperations;
+template <class Class>
+class TTestListStarExprOperations;
+template <class Class>
+class TAtomExprOperations;
+template <class Class>
+class TPowerOperations;
+template <class Class>
+class TFactorExprOperations;
+template <class Class>
+class TNamedExprOperations;
+template <class Class>
+class TCompForOperations;
+template <class Class>
+class TListmakerOperations;
+template <class Class>
+class TTrailerOperations;
+
+class CExpression;
+using CExpressionRef = CRef<CExpression>;
 
 // Base of all expressions, and the class of a state whose class isn't known. It stands for a list of
 // sub-expressions, which has none in a plain expression.
@@ -24,24 +48,8 @@ class CExpression : public CNode {
     virtual int GetSubExprCount();
 };
 
-template <class Class>
-class TExpressionOperations : public TNodeOperations<Class> {
-    OPERATIONS_BEYOND(TNodeOperations<Class>)
-    OPERATION(GetSubExpr,
-              "The sub-expression at index `i`: None in a plain expression and in a comprehension. "
-              "ValueError past the end of a comma list, and where an item isn't a CExpression.",
-              "i"_a)
-    OPERATION(GetSubExprCount,
-              "The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a "
-              "comprehension that stands without its brackets.")
-    END_OPERATIONS
-};
-
 // `a if condition else b`
 class CIfElseExpression : public CExpression {};
-
-template <class Class>
-class TOperatorExpressionOperations;
 
 // `not a`, `a or b`, `a + b - c`, `a < b`
 //   child    term  operator  term  operator  term ...
@@ -60,23 +68,6 @@ class COperatorExpression : public CExpression {
     static CTextOrNone _TextOfTwoWords(const CNode& node);
 };
 
-template <class Class>
-class TOperatorExpressionOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(GetOperatorStr,
-              "The text of the operator at `operator_i`, two words with one blank between them; None below "
-              "the first and past the last.",
-              "operator_i"_a)
-    OPERATION(GetTermCount, "The number of operands; 1 for `not a`, 0 for a leaf.")
-    OPERATION(GetTerm,
-              "The operand at `term_index`; None past the end. For `not a` it is `a`, whatever the index.",
-              "term_index"_a)
-    END_OPERATIONS
-};
-
-template <class Class>
-class TStarExpressionOperations;
-
 // `*a` as an expression, not in a declaration of arguments
 //   child    '*'  expression
 class CStarExpression : public CExpression {
@@ -90,18 +81,8 @@ class CStarExpression : public CExpression {
     static constexpr Py_ssize_t kExpressionIndex = 1;
 };
 
-template <class Class>
-class TStarExpressionOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(GetStarredExpression, "The expression behind the star.")
-    END_OPERATIONS
-};
-
 // `a.b.c` in decorators and imports
 class CDottedName : public CExpression {};
-
-template <class Class>
-class TLambdaExprOperations;
 
 // `lambda x: y`
 //   child    'lambda'  [arguments]  ':'  body
@@ -118,26 +99,15 @@ class CLambdaExpr : public CExpression {
     static constexpr Py_ssize_t kArgumentsIndex = 1;
 };
 
-template <class Class>
-class TLambdaExprOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(GetArgumentsNode, "The one parameter, or the list of parameters; None without parameters.")
-    OPERATION(GetBodyExpr, "The expression behind the colon.")
-    END_OPERATIONS
-};
-
 // Declared for hosts; no rule makes one.
 class CTestExpr : public CExpression {};
-
-template <class Class, class Base>
-class TYieldOperations;
 
 // `yield a`, `yield from a`; a `yield` alone is a keyword leaf
 //   child    'yield'  argument
 class CYieldExpr : public CExpression {
   public:
     template <class Class>
-    using TOperations = TYieldOperations<Class, TExpressionOperations<Class>>;
+    using TOperations = TYieldOperations<Class, CExpression::TOperations<Class>>;
 
     virtual CNodeRef GetValue();
     virtual bool IsYieldFrom();
@@ -145,9 +115,6 @@ class CYieldExpr : public CExpression {
   private:
     static constexpr Py_ssize_t kArgumentIndex = 1;
 };
-
-template <class Class>
-class TTestListStarExprOperations;
 
 // `a, b` and `a,`: comma lists of expressions; `a for b in c` within brackets
 //   child    item  ','  item  ',' ...
@@ -162,17 +129,6 @@ class CTestListStarExpr : public CExpression {
     virtual bool IsTuple();
     virtual bool IsGenExpr();
 };
-
-template <class Class>
-class TTestListStarExprOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(IsTuple, "True for a comma list; False for a comprehension.")
-    OPERATION(IsGenExpr, "True for a comprehension, which stands here without its brackets.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TAtomExprOperations;
 
 // `await a`, `a.b`, `a(1)[2]`: an atom and its trailers
 //   child    ['await']  atom  trailer  trailer ...
@@ -189,20 +145,6 @@ class CAtomExpr : public CExpression {
     Py_ssize_t _AtomIndex();
 };
 
-template <class Class>
-class TAtomExprOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(GetPrefix,
-              "The leaf of `await` before the atom; None without one, and where `await` is itself the name "
-              "that the trailers belong to.")
-    OPERATION(GetAtom, "The atom in front of the trailers; None for a leaf.")
-    OPERATION(GetTrailers, "The trailers behind the atom, as a new list.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TPowerOperations;
-
 // `a ** b`, and in the 2.7 grammar an atom with its trailers
 //   child    atom with its trailers  '**'  exponent
 //   child    atom  trailer  trailer ...  ['**'  exponent]
@@ -216,18 +158,6 @@ class CPower : public CExpression {
     virtual CNodeRef GetExponentNode();
 };
 
-template <class Class>
-class TPowerOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(GetAtom, "The atom in front of the trailers, under either grammar.")
-    OPERATION(GetTrailers, "The trailers between the atom and `**`, as a new list.")
-    OPERATION(GetExponentNode, "The exponent; None without `**`.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TFactorExprOperations;
-
 // `-a`, `+a`, `~a`
 //   child    operator  factor
 class CFactorExpr : public CExpression {
@@ -237,16 +167,6 @@ class CFactorExpr : public CExpression {
 
     virtual CTextOrNone GetUnaryOperator();
 };
-
-template <class Class>
-class TFactorExprOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(GetUnaryOperator, "\"+\", \"-\" or \"~\"; None for any other text.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TNamedExprOperations;
 
 // `a := b`
 //   child    name  ':='  expression
@@ -263,14 +183,6 @@ class CNamedExpr : public CExpression {
     static constexpr Py_ssize_t kNameIndex = 0, kExpressionIndex = 2;
 };
 
-template <class Class>
-class TNamedExprOperations : public TExpressionOperations<Class> {
-    OPERATIONS_BEYOND(TExpressionOperations<Class>)
-    OPERATION(GetAssignedName, "The name in front of `:=`.")
-    OPERATION(GetRightHandExpression, "The expression behind `:=`.")
-    END_OPERATIONS
-};
-
 // Declared for hosts; no rule makes one.
 class CBinaryOp : public CNode {};
 
@@ -279,23 +191,11 @@ class CBinaryOp : public CNode {};
 class CYieldArg : public CNode {
   public:
     template <class Class>
-    using TOperations = TYieldOperations<Class, TNodeOperations<Class>>;
+    using TOperations = TYieldOperations<Class, CNode::TOperations<Class>>;
 
     virtual CNodeRef GetValue();
     virtual bool IsYieldFrom();
 };
-
-// Of a `yield`, and of what stands behind it.
-template <class Class, class Base>
-class TYieldOperations : public Base {
-    OPERATIONS_BEYOND(Base)
-    OPERATION(GetValue, "What is yielded; None for a bare `yield`.")
-    OPERATION(IsYieldFrom, "True for `yield from`.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TCompForOperations;
 
 // `for x in y` within a comprehension, with the next `for` or `if`
 //   child    ['async']  'for'  target  'in'  iterable  [next]
@@ -320,19 +220,6 @@ class CCompForNode : public CNode {
     CNodeRef _Read(Py_ssize_t i, CNodeRef (CCompForNode::*accessor)());
 };
 
-template <class Class>
-class TCompForOperations : public TNodeOperations<Class> {
-    OPERATIONS_BEYOND(TNodeOperations<Class>)
-    OPERATION(IsAsync, "True for `async for`.")
-    OPERATION(GetTargetNode, "The target between `for` and `in`.")
-    OPERATION(GetInNode, "The iterable behind `in`.")
-    OPERATION(GetCompIterNode, "The `for` or `if` that follows; None for the last one.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TListmakerOperations;
-
 // The contents of a list display in the 2.7 grammar
 //   child    item  ','  item  ',' ...
 //   child    item  comprehension
@@ -347,20 +234,6 @@ class CListmakerNode : public CNode {
   private:
     bool _IsComprehension();
 };
-
-template <class Class>
-class TListmakerOperations : public TNodeOperations<Class> {
-    OPERATIONS_BEYOND(TNodeOperations<Class>)
-    OPERATION(GetSubExprCount, "The number of items; 1 for a comprehension.")
-    OPERATION(GetSubExpr,
-              "The item at index `i`; None past the end, and for a comprehension. TypeError when it isn't a "
-              "CExpression.",
-              "i"_a)
-    END_OPERATIONS
-};
-
-template <class Class>
-class TTrailerOperations;
 
 // `(...)`, `[...]` or `.name` behind an atom
 //   child    '.'  name
@@ -379,8 +252,123 @@ class CTrailer : public CNode {
 };
 
 template <class Class>
-class TTrailerOperations : public TNodeOperations<Class> {
-    OPERATIONS_BEYOND(TNodeOperations<Class>)
+class TExpressionOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
+    OPERATION(GetSubExpr,
+              "The sub-expression at index `i`: None in a plain expression and in a comprehension. "
+              "ValueError past the end of a comma list, and where an item isn't a CExpression.",
+              "i"_a)
+    OPERATION(GetSubExprCount,
+              "The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a "
+              "comprehension that stands without its brackets.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TOperatorExpressionOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(GetOperatorStr,
+              "The text of the operator at `operator_i`, two words with one blank between them; None below "
+              "the first and past the last.",
+              "operator_i"_a)
+    OPERATION(GetTermCount, "The number of operands; 1 for `not a`, 0 for a leaf.")
+    OPERATION(GetTerm,
+              "The operand at `term_index`; None past the end. For `not a` it is `a`, whatever the index.",
+              "term_index"_a)
+    END_OPERATIONS
+};
+
+template <class Class>
+class TStarExpressionOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(GetStarredExpression, "The expression behind the star.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TLambdaExprOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(GetArgumentsNode, "The one parameter, or the list of parameters; None without parameters.")
+    OPERATION(GetBodyExpr, "The expression behind the colon.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TTestListStarExprOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(IsTuple, "True for a comma list; False for a comprehension.")
+    OPERATION(IsGenExpr, "True for a comprehension, which stands here without its brackets.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TAtomExprOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(GetPrefix,
+              "The leaf of `await` before the atom; None without one, and where `await` is itself the name "
+              "that the trailers belong to.")
+    OPERATION(GetAtom, "The atom in front of the trailers; None for a leaf.")
+    OPERATION(GetTrailers, "The trailers behind the atom, as a new list.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TPowerOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(GetAtom, "The atom in front of the trailers, under either grammar.")
+    OPERATION(GetTrailers, "The trailers between the atom and `**`, as a new list.")
+    OPERATION(GetExponentNode, "The exponent; None without `**`.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TFactorExprOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(GetUnaryOperator, "\"+\", \"-\" or \"~\"; None for any other text.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TNamedExprOperations : public CExpression::TOperations<Class> {
+    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
+    OPERATION(GetAssignedName, "The name in front of `:=`.")
+    OPERATION(GetRightHandExpression, "The expression behind `:=`.")
+    END_OPERATIONS
+};
+
+// Of a `yield`, and of what stands behind it.
+template <class Class, class Base>
+class TYieldOperations : public Base {
+    OPERATIONS_BEYOND(Base)
+    OPERATION(GetValue, "What is yielded; None for a bare `yield`.")
+    OPERATION(IsYieldFrom, "True for `yield from`.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TCompForOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
+    OPERATION(IsAsync, "True for `async for`.")
+    OPERATION(GetTargetNode, "The target between `for` and `in`.")
+    OPERATION(GetInNode, "The iterable behind `in`.")
+    OPERATION(GetCompIterNode, "The `for` or `if` that follows; None for the last one.")
+    END_OPERATIONS
+};
+
+template <class Class>
+class TListmakerOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
+    OPERATION(GetSubExprCount, "The number of items; 1 for a comprehension.")
+    OPERATION(GetSubExpr,
+              "The item at index `i`; None past the end, and for a comprehension. TypeError when it isn't a "
+              "CExpression.",
+              "i"_a)
+    END_OPERATIONS
+};
+
+template <class Class>
+class TTrailerOperations : public CNode::TOperations<Class> {
+    OPERATIONS_BEYOND(CNode::TOperations<Class>)
     OPERATION(GetDotName, "The name of `.name`; None for other trailers.")
     OPERATION(GetNestedNode, "The contents of `(...)` or `[...]`; None for empty brackets and for `.name`.")
     OPERATION(GetInitialToken, "The text of the first token. ValueError for a trailer without children.")
