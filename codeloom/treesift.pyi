@@ -629,7 +629,7 @@ class CAtom(CExpression):
 
     def GetInitialBracket(self) -> str | None:
         """
-        "(", "[" or "{"; None for adjacent strings. ValueError for an atom without children.
+        "(", "[" or "{"; None for other atoms. ValueError for an atom without children.
         """
 
     def IsLiteral(self) -> bool:
