@@ -20,7 +20,7 @@ $(BIN)/python:
 	$(BIN)/pip install --quiet --upgrade pip
 
 $(VENV)/.tools: pyproject.toml | $(BIN)/python
-	$(BIN)/pip install --quiet 'scikit-build-core>=1.1' 'nanobind>=3.1,<4' 'cmake>=3.26' 'ninja>=1.11'
+	$(BIN)/pip install --quiet 'scikit-build-core>=1.1' 'nanobind>=3.1,<3.2' 'cmake>=3.26' 'ninja>=1.11'
 	touch $@
 
 $(STAMP): $(SOURCES) $(VENV)/.tools

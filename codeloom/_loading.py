@@ -49,7 +49,7 @@ def StandinsOffered() -> Iterator[None]:
         yield
     finally:
         for name in offered:
-            del sys.modules[name]
+            sys.modules.pop(name, None)
         sys.modules.update(hidden)
 
 
