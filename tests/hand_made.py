@@ -6,7 +6,6 @@ from codeloom.languages import LanguageNamed
 from codeloom.treesift import CNode, CNodeClassInfo, CNodeFactory, CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
 
-
 _FACTORY = CNodeFactory(SimpleNamespace(number2symbol={}), [], {}, {}, {})
 
 
@@ -21,9 +20,7 @@ def Leaf(text=None, context=0, cls=CNode):
 
 def Driver(version):
     language = LanguageNamed(version)
-    return CPGenParserImpl(
-        language.version_triple, language.grammar_file, language.keywords, language.is_py3
-    )
+    return CPGenParserImpl(language.version_triple, language.grammar_file, language.keywords, language.is_py3)
 
 
 DRIVERS = {version: Driver(version) for version in ("3.8", "2.7")}

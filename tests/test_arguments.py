@@ -4,6 +4,8 @@ import gc
 from contextlib import suppress
 
 import pytest
+from hand_made import Leaf, Node, Parse, Tokens
+from run_python import RunPython
 
 from codeloom.treesift import (
     CArgInfo,
@@ -19,8 +21,6 @@ from codeloom.treesift import (
     GetTokenEndIndex,
     GetUsedArgInfoList,
 )
-from hand_made import Leaf, Node, Parse, Tokens
-from run_python import RunPython
 
 
 def Written(arguments):

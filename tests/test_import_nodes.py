@@ -1,10 +1,10 @@
 """Import statements as records."""
 
 import pytest
+from hand_made import Leaf, Node, Parse
 
 from codeloom import treesift
 from codeloom.treesift import CAsName, CFromImportStmt, CImportNamesStmt, CNameLiteral, CNode
-from hand_made import Leaf, Node, Parse
 
 
 def Names(node):

@@ -4,6 +4,7 @@ import inspect
 from contextlib import suppress
 
 import pytest
+from hand_made import Leaf, Node, Parse, Tokens
 
 from codeloom import treesift
 from codeloom.treesift import (
@@ -22,7 +23,6 @@ from codeloom.treesift import (
     CWithItem,
     CWithTypeParameters,
 )
-from hand_made import Leaf, Node, Parse, Tokens
 
 ITSELF = object()
 
@@ -160,9 +160,7 @@ def test_what_is_deleted():
     assert Deleted(Node(CTestListStarExpr, a, Leaf(","), b)) == ["a", "b"]
     with pytest.raises(ValueError) as caught:
         Deleted(Node(CTestListStarExpr, Leaf("..."), Leaf(",")))
-    assert str(caught.value).startswith(
-        "Elenment 0 of <class 'codeloom.treesift.CTestListStarExpr'>"
-    )
+    assert str(caught.value).startswith("Elenment 0 of <class 'codeloom.treesift.CTestListStarExpr'>")
 
     class List(CTestListStarExpr):
         def GetSubExprCount(self):
