@@ -1,5 +1,10 @@
-// Pairs of brackets.
+// Pairs of brackets, and which brackets are known to lack their partner.
 #pragma once
+
+#include <cstddef>
+#include <vector>
+
+#include "neighbours/tokenizer/char_class.h"
 
 namespace codeloom {
 
@@ -7,5 +12,51 @@ constexpr char CloserOf(char opener) {
     if (opener == '(') return ')';
     return opener == '[' ? ']' : '}';
 }
+
+// The brackets open in a logical line.
+class CBrackets {
+  public:
+    bool AreOpen() const { return !_fOpen.empty(); }
+    void Clear() { _fOpen.clear(); }
+
+    // Takes account of the byte `c` at `pos`, a bracket or not. False when it proves that the brackets aren't
+    // closed as they should be: a closer of the wrong kind, or an opener that is known to be never closed.
+    bool Visit(char c, size_t pos) {
+        if (ByteKind(c) == EByteKind::kOpener) {
+            _fOpen.push_back({pos, CloserOf(c)});
+            return !_IsKnownUnclosed(pos);
+        }
+        if (ByteKind(c) == EByteKind::kCloser && AreOpen()) {
+            if (_fOpen.back().closer != c) return false;
+            _fOpen.pop_back();
+        }
+        return true;
+    }
+
+    // The open brackets will not be closed. What proves that for the innermost one proves it for those around
+    // it, so that no later logical line needs to look as far again.
+    void RememberUnclosed() {
+        if (_IsKnownUnclosed(_fOpen.back().pos)) return;
+        _fUnclosed.clear();
+        _fUnclosed_i = 0;
+        for (const COpenBracket& bracket : _fOpen) _fUnclosed.push_back(bracket.pos);
+    }
+
+  private:
+    struct COpenBracket {
+        size_t pos;
+        char closer;
+    };
+
+    // Asked for rising positions.
+    bool _IsKnownUnclosed(size_t pos) {
+        while (_fUnclosed_i < _fUnclosed.size() && _fUnclosed[_fUnclosed_i] < pos) ++_fUnclosed_i;
+        return _fUnclosed_i < _fUnclosed.size() && _fUnclosed[_fUnclosed_i] == pos;
+    }
+
+    std::vector<COpenBracket> _fOpen;
+    std::vector<size_t> _fUnclosed;
+    size_t _fUnclosed_i = 0;
+};
 
 }  // namespace codeloom

@@ -36,10 +36,9 @@ inline constexpr auto kBehindOperand = std::to_array<std::string_view>({"and", "
 inline constexpr auto kNoOperand =
     std::to_array<std::string_view>({"lambda", "yield", "from", "await", "print", "exec", "nonlocal"});
 
-// Begin the header of a compound statement, the soft ones perhaps.
-inline constexpr auto kCompound =
-    std::to_array<std::string_view>({"def", "class", "if", "elif", "else", "for", "while", "with", "try",
-                                     "except", "finally", "async", "match", "case"});
+// Begin the header of a compound statement, `if`, `else` and `for` if they don't continue an expression.
+inline constexpr auto kHeader = std::to_array<std::string_view>(
+    {"def", "class", "if", "elif", "else", "for", "while", "with", "try", "except", "finally"});
 
 }  // namespace keywords
 
@@ -61,8 +60,13 @@ constexpr bool IsSoftKeyword(std::string_view word) {
     return word == "match" || word == "case" || word == "type";
 }
 
+constexpr bool IsHeaderKeyword(std::string_view word) {
+    return keywords::IsOneOf(word, keywords::kHeader);
+}
+
+// The word may begin a compound statement.
 constexpr bool IsCompoundWord(std::string_view word) {
-    return keywords::IsOneOf(word, keywords::kCompound);
+    return IsHeaderKeyword(word) || word == "async" || word == "match" || word == "case";
 }
 
 // A row inside brackets that begins like this at `pos` proves that the brackets should have been closed

@@ -1,11 +1,10 @@
 #include "neighbours/tokenizer/quote_recovery.h"
 
 #include <algorithm>
-#include <optional>
 
 #include "neighbours/tokenizer/keywords.h"
 #include "neighbours/tokenizer/operands.h"
-#include "neighbours/tokenizer/rows.h"
+#include "neighbours/tokenizer/row_facts.h"
 
 namespace codeloom {
 
@@ -88,8 +87,8 @@ int CountBrokenRows(CLexer& lexer, size_t pos, bool in_brackets, size_t& looked_
     int count = 0;
     while (count < kEnoughBroken && reader.Next(row)) {
         looked_at = std::max(looked_at, row.end);
-        count += row.is_broken || (in_brackets && row.begins_statement);
-        if (row.has_triple_quotes) break;
+        count += IsBroken(row) || (in_brackets && BeginsStatement(row));
+        if (HasTripleQuotes(row)) break;
         in_brackets &= row.stray_closer_end == 0;
     }
     return count;
@@ -148,19 +147,19 @@ size_t FindProseEnd(CLexer& lexer, size_t pos, size_t end, size_t& looked_at) {
     const int32_t indent = place.pos == pos ? place.indent : 0;
     size_t last_end = FindRowEnd(text, pos);
     CProseEnd prose(last_end);
-    std::optional<CRowReader> reader(std::in_place, lexer, WithinRow(last_end));
+    CRowReader reader(lexer, WithinRow(last_end));
     CTokenRow row;
     bool is_in_session = false;  // of the interpreter, up to a blank row
-    while (reader->Next(row) && row.text_end <= end) {
+    while (reader.Next(row) && row.end <= end) {
         looked_at = std::max(looked_at, row.end);
-        if (row.begins_statement && row.indent < indent) break;
+        if (row.indent < indent && BeginsStatement(row)) break;
         is_in_session &= row.start == last_end;
-        is_in_session |= text.substr(SkipBlanks(text, row.start)).starts_with(">>>");
+        is_in_session |= row.text.starts_with(">>>");
         last_end = row.end;
-        if (row.is_broken || row.is_prose || is_in_session) {
-            prose.AddProse(row.text_end);
-            reader.emplace(lexer, WithinRow(row.text_end));  // brackets in prose mean nothing
-        } else if (!row.is_comment) {
+        if (IsBroken(row) || LooksLikeProse(row) || is_in_session) {
+            prose.AddProse(static_cast<size_t>(row.text.data() - text.data()) + row.text.size());
+            reader.ForgetBrackets();  // in prose they mean nothing
+        } else if (!IsComment(row)) {
             prose.AddCode();
         }
     }

@@ -3,7 +3,7 @@
 #include <algorithm>
 
 #include "neighbours/tokenizer/keywords.h"
-#include "neighbours/tokenizer/rows.h"
+#include "neighbours/tokenizer/row_facts.h"
 
 namespace codeloom {
 
@@ -20,7 +20,7 @@ class CStatementRows {
     // Rows indented deeper belong to the statement, those that nothing can begin with, and the entries of a
     // display that isn't indented.
     bool Continue(const CTokenRow& row) {
-        if (row.indent <= _fIndent && !row.continues) {
+        if (row.indent <= _fIndent && !ContinuesExpression(row)) {
             if (!_IsEntry(row)) return false;
             _fIsInDisplay = true;
         }
@@ -29,12 +29,11 @@ class CStatementRows {
     }
 
   private:
-    void _Note(const CTokenRow& row) { _fMayEnter = row.ends_open; }
+    void _Note(const CTokenRow& row) { _fMayEnter = EndsOpen(row); }
 
     bool _IsEntry(const CTokenRow& row) const {
-        if (!_fMayEnter || row.begins_statement || (row.begins_with_word && row.goes_on_with_operand))
-            return false;
-        return row.is_entry || row.closes_outer || (_fIsInDisplay && !row.has_assignment);
+        if (!_fMayEnter || BeginsStatement(row) || BeginsWithTwoOperands(row)) return false;
+        return EndsOpenByItself(row) || ClosesOuterBracket(row) || (_fIsInDisplay && !HasAssignment(row));
     }
 
     int32_t _fIndent;
@@ -52,7 +51,7 @@ size_t FindStatementEnd(CLexer& lexer, const CPlace& place) {
     size_t end = row.end;
     bool is_behind_comment = false;  // one that may stay outside
     while (reader.Next(row)) {
-        if (row.is_comment) {
+        if (IsComment(row)) {
             is_behind_comment |= row.indent <= place.indent;
             if (!is_behind_comment) end = row.end;
         } else {
@@ -71,19 +70,18 @@ size_t FindHeaderEnd(CLexer& lexer, const CPlace& place) {
     CRowReader reader(lexer, place);
     CTokenRow row;
     reader.Next(row);
-    row.begins_statement = false;  // but the header itself
     size_t body_start = row.end;
     size_t comments_start = 0;
     int32_t body_indent = INT32_MAX;
     for (int row_count = 0; row_count < kMostHeaderRows; ++row_count) {
-        if (row.begins_statement || row.follows_operand) break;
-        if (row.ends_in_colon) return row.end;
+        if (row_count > 0 && (BeginsStatement(row) || FollowsOperand(row))) break;
+        if (EndsInColon(row)) return row.end;
         if (!reader.Next(row)) break;
-        if (row.is_comment) {
+        if (IsComment(row)) {
             if (comments_start == 0) comments_start = row.start;
             continue;
         }
-        if (row.indent <= place.indent && !row.continues) break;
+        if (row.indent <= place.indent && !ContinuesExpression(row)) break;
         if (row.indent < body_indent) {
             body_indent = row.indent;
             body_start = comments_start ? comments_start : row.start;
@@ -93,35 +91,34 @@ size_t FindHeaderEnd(CLexer& lexer, const CPlace& place) {
     return body_start;
 }
 
-// The row at `place` ends as headers do, although it doesn't begin with a keyword: that may be lost. A
-// dictionary may end a row so too.
-bool IsSpoiltHeader(CLexer& lexer, const CPlace& place) {
-    CRowReader reader(lexer, place);
-    CTokenRow row;
-    if (!reader.Next(row) || !row.ends_in_colon) return false;
-    const bool begins_with_bracket = ByteKind(lexer.Text()[place.pos]) == EByteKind::kOpener;
-    return begins_with_bracket || reader.OpenBrackets().empty() || reader.OpenBrackets().back() != '}';
+// A row that ends as headers do, although it doesn't begin with a keyword: that may be lost. A dictionary may
+// end a row so too. `open_brackets` are those behind the row.
+bool IsSpoiltHeader(const CTokenRow& row, const std::vector<char>& open_brackets) {
+    if (!EndsInColon(row)) return false;
+    const bool begins_with_bracket = ByteKind(row.text.front()) == EByteKind::kOpener;
+    return begins_with_bracket || open_brackets.empty() || open_brackets.back() != '}';
 }
 
 }  // namespace
 
 size_t FindRecoveredEnd(CLexer& lexer, const CPlace& place) {
-    if (IsCompoundWord(WordAt(lexer.Text(), place.pos))) return FindHeaderEnd(lexer, place);
-    return IsSpoiltHeader(lexer, place) ? FindHeaderEnd(lexer, place) : FindStatementEnd(lexer, place);
+    CRowReader reader(lexer, place);
+    CTokenRow row;
+    reader.Next(row);
+    const bool is_header =
+        IsCompoundWord(WordAt(row.text, 0)) ? !HasBody(row) : IsSpoiltHeader(row, reader.OpenBrackets());
+    return is_header ? FindHeaderEnd(lexer, place) : FindStatementEnd(lexer, place);
 }
 
 size_t FindStrayCloser(CLexer& lexer, const CPlace& place, int32_t indent, size_t& looked_at) {
     CRowReader reader(lexer, place);
     CTokenRow row;
-    bool is_inside = false;
     while (reader.Next(row)) {
         looked_at = row.start;
         const bool is_deeper = row.indent > indent;
-        if (!is_deeper && !is_inside && !row.begins_with_closer) return 0;
-        if (row.begins_statement || (row.begins_with_closer && !is_deeper && row.goes_on_with_operand))
-            return 0;
+        if (!is_deeper && !row.is_in_brackets && !BeginsWithCloser(row)) return 0;
+        if (BeginsStatement(row) || (!is_deeper && BeginsWithTwoOperands(row))) return 0;
         if (row.stray_closer_end) return row.stray_closer_end;
-        is_inside = !reader.OpenBrackets().empty();
     }
     looked_at = lexer.Text().size();
     return 0;

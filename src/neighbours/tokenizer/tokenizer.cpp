@@ -1,22 +1,17 @@
 #include "neighbours/tokenizer/tokenizer.h"
 
 #include "neighbours/token_type.h"
-#include "neighbours/tokenizer/brackets.h"
 #include "neighbours/tokenizer/keywords.h"
 #include "neighbours/tokenizer/logical_type.h"
 #include "neighbours/tokenizer/operands.h"
 #include "neighbours/tokenizer/recovery.h"
-#include "neighbours/tokenizer/rows.h"
+#include "neighbours/tokenizer/row_facts.h"
 
 namespace codeloom {
 
 namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
-
-bool EndsInBackslash(const std::vector<CRawToken>& tokens) {
-    return !tokens.empty() && tokens.back().type == kTokenId_BACKSLASH;
-}
 
 }  // namespace
 
@@ -69,8 +64,8 @@ void CTokenizer::_CollectStatement(CRawLogical& logical) {
     _fIsCompound = false;
     CReach reach;
     do {
-        if (_CollectTokens(logical, reach) == EEnd::kUnclosed) {
-            _RememberUnclosed();
+        if (!_CollectTokens(logical, reach)) {
+            _fBrackets.RememberUnclosed();
             _fPlace = start;
             _Restart(logical);
             _CollectTokens(logical, {FindRecoveredEnd(_fLexer, start), true});
@@ -107,41 +102,42 @@ bool CTokenizer::_EndsDeeper(const CRawLogical& logical) const {
     return row.indent > _fIndent;
 }
 
-// Adds tokens up to the end of the logical line, and moves behind it.
-CTokenizer::EEnd CTokenizer::_CollectTokens(CRawLogical& logical, const CReach& reach) {
+// Adds tokens up to the end of the logical line, and moves behind it; false when its brackets prove to be
+// unclosed.
+bool CTokenizer::_CollectTokens(CRawLogical& logical, const CReach& reach) {
     const std::string_view text = _fLexer.Text();
-    _fBrackets.clear();
-    bool at_row_start = false;
+    _fBrackets.Clear();
+    for (;;) {
+        const EStep step = _SkipToToken(reach);
+        if (step != EStep::kToken) return step == EStep::kEnd;
+        const char c = text[_fPlace.pos];
+        if (c == ';' && !_IsOpen(reach) && _IsSeparator(logical)) {
+            _EndAtSeparator(logical);
+            return true;
+        }
+        if (!_fBrackets.Visit(c, _fPlace.pos) && !reach.ends_there) return false;
+        _AddToken(logical);
+        if (logical.tokens.back().type == kTokenId_BACKSLASH) SkipRowEnd(text, _fPlace);
+    }
+}
+
+// Moves to the next token of the logical line, or behind the row that ends it.
+CTokenizer::EStep CTokenizer::_SkipToToken(const CReach& reach) {
+    const std::string_view text = _fLexer.Text();
+    bool is_row_start = false;
     for (;;) {
         _fPlace.pos = SkipBlanks(text, _fPlace.pos);
-        if (_fPlace.pos >= text.size()) {
-            return _fBrackets.empty() || reach.ends_there ? EEnd::kSound : EEnd::kUnclosed;
+        if (_fPlace.pos >= text.size()) return _IsOpen(reach) ? EStep::kUnclosed : EStep::kEnd;
+        if (!SkipRowEnd(text, _fPlace)) break;
+        if (!_IsOpen(reach) && _fPlace.pos >= reach.until) return EStep::kEnd;
+        SkipBlankRows(text, _fPlace);
+        if (reach.ends_there && _fPlace.row_start >= reach.until) {
+            _fPlace.pos = _fPlace.row_start;
+            return EStep::kEnd;
         }
-        const char c = text[_fPlace.pos];
-        if (IsRowEnd(c)) {
-            SkipRowEnd(text, _fPlace);
-            const bool may_end = _fPlace.pos >= reach.until;
-            if (may_end && (_fBrackets.empty() || reach.ends_there)) return EEnd::kSound;
-            SkipBlankRows(text, _fPlace);
-            if (reach.ends_there && _fPlace.row_start >= reach.until) {
-                _fPlace.pos = _fPlace.row_start;
-                return EEnd::kSound;
-            }
-            at_row_start = true;
-            continue;
-        }
-        if (at_row_start && !reach.ends_there && !_fBrackets.empty() && _ProvesUnclosed()) {
-            return EEnd::kUnclosed;
-        }
-        at_row_start = false;
-        if (c == ';' && (_fBrackets.empty() || reach.ends_there) && _IsSeparator(logical)) {
-            _EndAtSeparator(logical);
-            return EEnd::kSound;
-        }
-        if (!reach.ends_there && !_TrackBracket()) return EEnd::kUnclosed;
-        _AddToken(logical);
-        if (EndsInBackslash(logical.tokens)) SkipRowEnd(text, _fPlace);
+        is_row_start = true;
     }
+    return is_row_start && _IsOpen(reach) && _ProvesUnclosed() ? EStep::kUnclosed : EStep::kToken;
 }
 
 void CTokenizer::_AddToken(CRawLogical& logical) {
@@ -158,21 +154,6 @@ void CTokenizer::_AddToken(CRawLogical& logical) {
     _fPlace.pos = token.end;
 }
 
-// Takes account of the bracket at the place, if there is one; false when it proves that the brackets aren't
-// closed as they should be.
-bool CTokenizer::_TrackBracket() {
-    const char c = _fLexer.Text()[_fPlace.pos];
-    if (ByteKind(c) == EByteKind::kOpener) {
-        _fBrackets.push_back({_fPlace.pos, CloserOf(c)});
-        return !_IsKnownUnclosed(_fPlace.pos);
-    }
-    if (ByteKind(c) == EByteKind::kCloser && !_fBrackets.empty()) {
-        if (_fBrackets.back().closer != c) return false;
-        _fBrackets.pop_back();
-    }
-    return true;
-}
-
 // The ";" at the place parts two logical lines. One that parts nothing is a token, and a fault. One in a row
 // whose quotes don't match may as well stand in a string, and parts nothing either.
 bool CTokenizer::_IsSeparator(const CRawLogical& logical) {
@@ -184,12 +165,10 @@ bool CTokenizer::_IsSeparator(const CRawLogical& logical) {
 // The row of the place ends with a string that isn't closed. Looks at each row once.
 bool CTokenizer::_HasOpenQuote() {
     if (_fPlace.pos < _fQuotesKnownUpTo) return _fHasOpenQuote;
-    CPlace row = _fPlace;
-    CRowReader reader(_fLexer, row);
-    CTokenRow found;
-    reader.Next(found);
-    _fQuotesKnownUpTo = found.end;
-    return _fHasOpenQuote = found.has_open_quote;
+    CTokenRow row;
+    CRowReader(_fLexer, _fPlace).Next(row);
+    _fQuotesKnownUpTo = row.end;
+    return _fHasOpenQuote = HasOpenQuote(row);
 }
 
 void CTokenizer::_EndAtSeparator(CRawLogical& logical) {
@@ -205,20 +184,6 @@ bool CTokenizer::_ProvesUnclosed() const {
     if (StartsStatement(_fLexer.Text(), _fPlace.pos)) return true;
     if (_fPlace.indent > _fIndent) return false;
     return AreOperandsSideBySide(_fLast, _fLexer.Text(), _fPlace.pos);
-}
-
-// What proves one bracket to be unclosed proves it for those around it, so that no later logical line needs
-// to look as far again.
-void CTokenizer::_RememberUnclosed() {
-    if (_IsKnownUnclosed(_fBrackets.back().pos)) return;
-    _fUnclosed.clear();
-    _fUnclosed_i = 0;
-    for (const COpenBracket& bracket : _fBrackets) _fUnclosed.push_back(bracket.pos);
-}
-
-bool CTokenizer::_IsKnownUnclosed(size_t pos) {
-    while (_fUnclosed_i < _fUnclosed.size() && _fUnclosed[_fUnclosed_i] < pos) ++_fUnclosed_i;
-    return _fUnclosed_i < _fUnclosed.size() && _fUnclosed[_fUnclosed_i] == pos;
 }
 
 }  // namespace codeloom

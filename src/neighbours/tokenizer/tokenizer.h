@@ -9,8 +9,8 @@
 #include <cstddef>
 #include <cstdint>
 #include <string_view>
-#include <vector>
 
+#include "neighbours/tokenizer/brackets.h"
 #include "neighbours/tokenizer/embedded.h"
 #include "neighbours/tokenizer/lexer.h"
 #include "neighbours/tokenizer/place.h"
@@ -34,27 +34,22 @@ class CTokenizer {
         size_t until = 0;
         bool ends_there = false;
     };
-    struct COpenBracket {
-        size_t pos;
-        char closer;
-    };
-    enum class EEnd { kSound, kUnclosed };
+    enum class EStep { kToken, kEnd, kUnclosed };
 
     bool _SkipToLogical();
     void _Restart(CRawLogical& logical);
     void _CollectComment(CRawLogical& logical);
     void _CollectStatement(CRawLogical& logical);
-    EEnd _CollectTokens(CRawLogical& logical, const CReach& reach);
+    bool _CollectTokens(CRawLogical& logical, const CReach& reach);
+    EStep _SkipToToken(const CReach& reach);
     void _AddToken(CRawLogical& logical);
-    bool _TrackBracket();
     bool _IsSeparator(const CRawLogical& logical);
     bool _HasOpenQuote();
     void _EndAtSeparator(CRawLogical& logical);
     bool _ProvesUnclosed() const;
     size_t _FindStrayCloserBehind(const CRawLogical& logical);
     bool _EndsDeeper(const CRawLogical& logical) const;
-    void _RememberUnclosed();
-    bool _IsKnownUnclosed(size_t pos);
+    bool _IsOpen(const CReach& reach) const { return _fBrackets.AreOpen() && !reach.ends_there; }
 
     CLexer _fLexer;
     CPlace _fPlace;
@@ -65,10 +60,7 @@ class CTokenizer {
     bool _fMidRow = false;         // behind a separator
     int32_t _fIndent = 0;          // of the first row of the logical line
     bool _fIsCompound = false;
-    std::vector<COpenBracket> _fBrackets;
-    // Brackets that an earlier look ahead has proven to be unclosed, in source order.
-    std::vector<size_t> _fUnclosed;
-    size_t _fUnclosed_i = 0;
+    CBrackets _fBrackets;
     size_t _fQuotesKnownUpTo = 0;  // as far as _fHasOpenQuote is known
     bool _fHasOpenQuote = false;
     size_t _fNoStrayCloserBefore = 0;  // as far as an earlier look ahead has seen
