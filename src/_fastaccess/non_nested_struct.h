@@ -5,7 +5,7 @@
 
 namespace codeloom {
 
-struct tNonNestedStruct {
+struct tNonNestedStruct {             // NOLINT(readability-identifier-naming)
     const char* to_search = nullptr;  // null: the search is finished, or was never set up
     const char* to_find = nullptr;    // borrowed from the byte string given at initialisation
     Py_ssize_t to_find_len = 0;

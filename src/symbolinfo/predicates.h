@@ -39,7 +39,7 @@ inline int IsDefLineScope(nb::handle scope) {
     const auto suffix_length = static_cast<Py_ssize_t>(_kDotLineScopeName.size());
     if (length < suffix_length) return false;
     for (Py_ssize_t i = 0; i < suffix_length; ++i) {
-        const auto wanted = static_cast<Py_UCS4>(_kDotLineScopeName[static_cast<size_t>(i)]);
+        const auto wanted = static_cast<unsigned char>(_kDotLineScopeName[static_cast<size_t>(i)]);
         if (PyUnicode_READ_CHAR(scope.ptr(), length - suffix_length + i) != wanted) return false;
     }
     return true;

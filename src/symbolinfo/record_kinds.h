@@ -96,9 +96,11 @@ inline constexpr auto kRecordKinds = std::to_array<CRecordKind>(
 #undef CODELOOM_KIND_ENTRY
 
 // `kSetPrefix`, `kSetKind` and so on.
+// NOLINTBEGIN(bugprone-macro-parentheses): the byte is a literal, joined with others
 #define CODELOOM_KIND_CONSTANTS(name, byte, ...)                      \
     inline constexpr std::string_view k##name##Prefix = ":" byte ":"; \
     inline constexpr char k##name##Kind = byte[0];
+// NOLINTEND(bugprone-macro-parentheses)
 CODELOOM_RECORD_KINDS(CODELOOM_KIND_CONSTANTS)
 #undef CODELOOM_KIND_CONSTANTS
 inline constexpr char kPlainEquivKind = kRecordKinds.back().kind;

@@ -20,7 +20,7 @@ inline constexpr std::string_view kClassInstanceSuffix = ":";
 // Scopes are dotted names; the module's own is empty. Behind a name the separator and a number say which
 // definition of that name in its scope is meant, counted from zero.
 inline constexpr std::string_view kScopeIndexSep = "#";
-inline constexpr std::string_view kModuleScopeName = "";
+inline constexpr std::string_view kModuleScopeName;
 inline constexpr std::string_view kWildcardScope = "*";
 inline constexpr std::string_view kDefLineScopeName = "<def>";  // the scope of a def line itself
 inline constexpr std::string_view _kDotLineScopeName = ".<def>";

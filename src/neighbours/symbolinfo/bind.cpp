@@ -99,6 +99,7 @@ nb::object HostJoinTokens(nb::handle tokens) {
     std::vector<CUtf8Text> texts;
     for (nb::handle token : kept) texts.emplace_back(token);
     std::vector<std::string_view> pieces;
+    pieces.reserve(texts.size());
     for (const CUtf8Text& text : texts) pieces.push_back(text.View());
     return BytesOf(JoinTokens(pieces));
 }
