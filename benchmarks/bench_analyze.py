@@ -63,7 +63,9 @@ def ImportMilliseconds(statement: str) -> float:
     """The median time of `statement` in a fresh interpreter, its own start subtracted."""
     script = f"import time; t = time.perf_counter(); {statement}; print(time.perf_counter() - t)"
     times = [
-        float(subprocess.run([sys.executable, "-c", script], capture_output=True, text=True, check=True).stdout)
+        float(
+            subprocess.run([sys.executable, "-c", script], capture_output=True, text=True, check=True).stdout
+        )
         for _ in range(5)
     ]
     return statistics.median(times) * 1000
@@ -112,7 +114,9 @@ def main() -> None:
 
         return Run
 
-    Ratio("text to analysed logicals, against ast.parse", ParseAll, Quietly(ReadAndAnalyzeAll), options.rounds)
+    Ratio(
+        "text to analysed logicals, against ast.parse", ParseAll, Quietly(ReadAndAnalyzeAll), options.rounds
+    )
     Ratio("text to logicals alone, against ast.parse", ParseAll, ReadAll, options.rounds)
     ratios = []
     for _ in range(options.rounds):

@@ -37,10 +37,7 @@ def StandinsOffered() -> Iterator[None]:
     afterwards as it was.
     """
     offered = [
-        name
-        for modules in _HOST_MODULES.values()
-        if not _IsSuppliedByHost(modules)
-        for name in modules
+        name for modules in _HOST_MODULES.values() if not _IsSuppliedByHost(modules) for name in modules
     ]
     standins = {name: importlib.import_module(f"codeloom._standins.{name}") for name in offered}
     hidden = {name: sys.modules[name] for name in offered if name in sys.modules}

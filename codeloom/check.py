@@ -57,9 +57,7 @@ class Report:
     logical_count: int
 
 
-def CheckFile(
-    path: str | PathLike[str], language: Language | str = DEFAULT_LANGUAGE_NAME
-) -> list[Problem]:
+def CheckFile(path: str | PathLike[str], language: Language | str = DEFAULT_LANGUAGE_NAME) -> list[Problem]:
     """The problems of a file, in the order of the file; OSError when it can't be read.
 
     `language` is the version of Python that it is written in, such as "3.12".
@@ -92,8 +90,7 @@ def _Check(source: Source, language: Language | str, path: str) -> Report:
         row, col = rows.Place(error.row, error.utf8_col)
         found.append((row + 1, col + 1, error.message))
     problems = tuple(
-        Problem(path, row, column, message, rows.Text(row - 1))
-        for row, column, message in sorted(found)
+        Problem(path, row, column, message, rows.Text(row - 1)) for row, column, message in sorted(found)
     )
     return Report(problems, len(logicals))
 
@@ -117,9 +114,7 @@ def _AnalyzerOf(language: Language) -> CPGenAnalyzerImpl:
 _gAnalysisLock = threading.Lock()
 
 
-def _Errors(
-    logicals: Iterable[CLogicalLine], source: Source, analyzer: CPGenAnalyzerImpl
-) -> list[_Error]:
+def _Errors(logicals: Iterable[CLogicalLine], source: Source, analyzer: CPGenAnalyzerImpl) -> list[_Error]:
     """What is wrong with logical lines, false hints and unreadable places apart."""
     analyze = analyzer.AnalyzeSingleLogical
     false_hints = FalseHintRemover(source.text)
@@ -186,15 +181,12 @@ def _EmbeddedAtFault(error: SyntaxError, logical: CLogicalLine) -> CLogicalLine 
 
     Expressions are analysed in order, so that of equal ones the first is at fault.
     """
-    exp_logicals = logical.GetExpLogicals()
+    exp_logicals: tuple[CLogicalLine, ...] = logical.GetExpLogicals()
     if not exp_logicals:
         return None
     if error.filename == _LINE_FILENAME and error.text == TextFromTokens(logical):
         return None
     for embedded in exp_logicals:
-        if (
-            embedded.fType != logicalline.kCommentedTypeHint
-            and TextFromTokens(embedded) == error.text
-        ):
+        if embedded.fType != logicalline.kCommentedTypeHint and TextFromTokens(embedded) == error.text:
             return embedded
     return None

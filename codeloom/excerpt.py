@@ -36,8 +36,7 @@ def Printable(text: str) -> str:
     if text.isprintable():
         return text
     return "".join(
-        "\N{REPLACEMENT CHARACTER}" if unicodedata.category(char) in _UNPRINTABLE else char
-        for char in text
+        "\N{REPLACEMENT CHARACTER}" if unicodedata.category(char) in _UNPRINTABLE else char for char in text
     )
 
 

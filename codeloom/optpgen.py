@@ -10,4 +10,12 @@ from codeloom._neighbours import (
     ParserImpl,
 )
 
-__all__ = ["CreateParser", "Grammar", "NodeConverter", "ParseError", "Parser", "ParserGenerator", "ParserImpl"]
+__all__ = [
+    "CreateParser",
+    "Grammar",
+    "NodeConverter",
+    "ParseError",
+    "Parser",
+    "ParserGenerator",
+    "ParserImpl",
+]

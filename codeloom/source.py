@@ -27,9 +27,7 @@ _FOREIGN_MARKS = {
     codecs.BOM_UTF16_LE: "UTF-16",
     codecs.BOM_UTF16_BE: "UTF-16",
 }
-_DEFAULT_REMEDY = (
-    "save the file as UTF-8, or name its encoding in the first row, as in `# coding: latin-1`"
-)
+_DEFAULT_REMEDY = "save the file as UTF-8, or name its encoding in the first row, as in `# coding: latin-1`"
 
 
 @dataclass(frozen=True, slots=True)
@@ -166,9 +164,7 @@ def _WithoutUnusable(text: str, encoding: _Encoding | None) -> Source:
         if match:
             message = _FaultMessage(match[0], encoding)
             faults[row] = SourceFault(row + 1, match.start() + 1, message)
-    return Source(
-        _UNUSABLE.sub(REPLACEMENT, text), _Shortened(list(faults.values())), frozenset(faults)
-    )
+    return Source(_UNUSABLE.sub(REPLACEMENT, text), _Shortened(list(faults.values())), frozenset(faults))
 
 
 def _FaultMessage(char: str, encoding: _Encoding | None) -> str:

@@ -135,9 +135,7 @@ class Breaker:
     def Break(self) -> Case | None:
         """A case, or None when what was done broke nothing."""
         logical = self.random.choice(self.logicals)
-        token_i = self.random.choice(
-            [i for i, token in enumerate(logical.fToks) if token[0] not in "#\\"]
-        )
+        token_i = self.random.choice([i for i, token in enumerate(logical.fToks) if token[0] not in "#\\"])
         token = logical.fToks[token_i]
         deed = self.random.choice(["delete", "double", "replace"])
         new = {"delete": "", "double": f"{token} {token}", "replace": self.random.choice(self.words)}[deed]

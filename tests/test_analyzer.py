@@ -100,7 +100,10 @@ def test_an_analyzed_logical_is_left_alone():
 
 
 def test_logicals_of_nothing():
-    for logical in (CLogicalLine(kAssignment, (), ()), CLogicalLine(kAssignment, (None, None), ((0, 0), (0, 1)))):
+    for logical in (
+        CLogicalLine(kAssignment, (), ()),
+        CLogicalLine(kAssignment, (None, None), ((0, 0), (0, 1))),
+    ):
         assert Analyze(logical) is None
 
 
@@ -203,7 +206,9 @@ def test_commented_hints_are_left_to_the_hint_walker():
 
 def test_equivs_are_lifted_in_order():
     class Analyzer(CPGenAnalyzerImpl):
-        def _InspectSingleLogical(self, logical, in_async_def, in_embedded_expression=False, first_in_def=False):
+        def _InspectSingleLogical(
+            self, logical, in_async_def, in_embedded_expression=False, first_in_def=False
+        ):
             if in_embedded_expression:
                 logical.AppendTypeEquiv(logical.fToks[0].encode(), b"seen")
                 logical.AppendArgTypeEquiv(b"not", b"lifted")
@@ -284,11 +289,17 @@ def test_broken_places(logical, context, failure):
 
 
 def test_limits_end_a_walk_with_a_printed_line(capsys):
-    walker_limits = [("x = " + "(" * 60 + "1,1" + ",)" * 60, "recurse count"), ("f(" + "1, " * 10_000 + ")", "number of calls")]
+    walker_limits = [
+        ("x = " + "(" * 60 + "1,1" + ",)" * 60, "recurse count"),
+        ("f(" + "1, " * 10_000 + ")", "number of calls"),
+    ]
     for text, limit in walker_limits:
         logical = Logical(text)
         assert Analyze(logical) is None
-        assert f"RuntimeError raised in CNodeWalker.Walk: RuntimeError('Maximum {limit}" in capsys.readouterr().out
+        assert (
+            f"RuntimeError raised in CNodeWalker.Walk: RuntimeError('Maximum {limit}"
+            in capsys.readouterr().out
+        )
         assert Analyze(Logical("x = 1")) is None and capsys.readouterr().out == ""
 
 

@@ -47,9 +47,7 @@ def test_statuses_and_summaries(write_files, run_cli, arguments, status, summary
 
 
 def test_output(write_files, run_cli):
-    write_files(
-        {"a b.py": "if x:\n\ty = '日本' )\r\n", "c.py": b"'\xe9'\n" + b"z = 1 ) " + b"+ 1 " * 60}
-    )
+    write_files({"a b.py": "if x:\n\ty = '日本' )\r\n", "c.py": b"'\xe9'\n" + b"z = 1 ) " + b"+ 1 " * 60})
     done = run_cli("check", "a b.py", "c.py")
     assert done.stdout.splitlines() == [
         "a b.py:2:11: invalid syntax",
@@ -123,11 +121,7 @@ class TestFiles:
     def checked(self, run_cli):
         def Checked(*arguments, **options):
             done = run_cli("check", *arguments, **options)
-            return [
-                row.split(":")[0]
-                for row in done.stdout.splitlines()
-                if ":" in row and row[0] != " "
-            ]
+            return [row.split(":")[0] for row in done.stdout.splitlines() if ":" in row and row[0] != " "]
 
         return Checked
 
@@ -240,9 +234,7 @@ class TestEndings:
         )
 
     @pytest.mark.parametrize(("no_colour", "coloured"), [(None, True), ("", True), ("1", False)])
-    def test_colour_on_a_terminal(
-        self, write_files, start_cli, cli_environment, no_colour, coloured
-    ):
+    def test_colour_on_a_terminal(self, write_files, start_cli, cli_environment, no_colour, coloured):
         pty = pytest.importorskip("pty")
         write_files({"a.py": "x = )\n"})
         if no_colour is not None:

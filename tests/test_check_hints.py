@@ -52,9 +52,7 @@ def test_other_comments_are_left_alone(comment):
 
 
 @pytest.mark.parametrize("comment", FALSE_COMMENTS)
-@pytest.mark.parametrize(
-    "line", ["def f(a, b):  {}\n    {}", "x = 1  {}", "def f(a,  {}\n  b): pass"]
-)
+@pytest.mark.parametrize("line", ["def f(a, b):  {}\n    {}", "x = 1  {}", "def f(a,  {}\n  b): pass"])
 def test_false_hints_are_no_problems(line, comment):
     assert CheckText(line.replace("{}", comment)) == []
 

@@ -45,4 +45,6 @@ def test_what_everybody_may_include_depends_on_little():
 def test_references_are_counted_in_the_host_layer_only():
     for path in SOURCES.rglob("*.[hc]*"):
         if path.relative_to(SOURCES).parts[0] != "host":
-            assert not re.search(r"\bPy_(X?INCREF|X?DECREF|CLEAR)\b|\.(inc|dec)_ref\(", path.read_text()), path
+            assert not re.search(r"\bPy_(X?INCREF|X?DECREF|CLEAR)\b|\.(inc|dec)_ref\(", path.read_text()), (
+                path
+            )

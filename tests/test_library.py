@@ -18,16 +18,22 @@ from codeloom.utils import GetLogicalsFromText
 
 # The forms newer than the grammar file that the library and its tests use.
 NEWER_FORMS = {
-    "walrus in a subscript": lambda node: isinstance(node, ast.Subscript)
-    and any(isinstance(part, ast.NamedExpr) for part in _Parts(node.slice)),
-    "starred in a subscript": lambda node: isinstance(node, ast.Subscript)
-    and any(isinstance(part, ast.Starred) for part in _Parts(node.slice)),
-    "starred annotation of *args": lambda node: isinstance(node, ast.arg)
-    and isinstance(node.annotation, ast.Starred),
-    "walrus in a set": lambda node: isinstance(node, ast.Set)
-    and any(isinstance(part, ast.NamedExpr) for part in node.elts),
-    "starred in the iterable of a for": lambda node: isinstance(node, ast.For)
-    and any(isinstance(part, ast.Starred) for part in _Parts(node.iter)),
+    "walrus in a subscript": lambda node: (
+        isinstance(node, ast.Subscript)
+        and any(isinstance(part, ast.NamedExpr) for part in _Parts(node.slice))
+    ),
+    "starred in a subscript": lambda node: (
+        isinstance(node, ast.Subscript) and any(isinstance(part, ast.Starred) for part in _Parts(node.slice))
+    ),
+    "starred annotation of *args": lambda node: (
+        isinstance(node, ast.arg) and isinstance(node.annotation, ast.Starred)
+    ),
+    "walrus in a set": lambda node: (
+        isinstance(node, ast.Set) and any(isinstance(part, ast.NamedExpr) for part in node.elts)
+    ),
+    "starred in the iterable of a for": lambda node: (
+        isinstance(node, ast.For) and any(isinstance(part, ast.Starred) for part in _Parts(node.iter))
+    ),
 }
 
 # Lines that the engine parses by hand, with nodes of their own, or can't parse yet.

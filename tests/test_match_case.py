@@ -8,6 +8,7 @@ import gc
 import weakref
 
 import pytest
+from hand_made import Parse, Tokens
 from hypothesis import given, settings
 from hypothesis import strategies as st
 
@@ -26,7 +27,6 @@ from codeloom.treesift import (
     CSequencePatternNode,
 )
 from codeloom.utils import GetLogicalsFromText
-from hand_made import Parse, Tokens
 
 VERSION = (3, 11, 0)
 ANALYZER = CPGenAnalyzerImpl(VERSION)

@@ -212,7 +212,12 @@ def test_odd_trees_of_the_host_end():
 
 def test_recursive_convert():
     factory = MakeFactory()
-    raw = (EXPR, None, 0, [(NAME, "a", 0, None), (EXPR, None, 1, [(NAME, "b", 1, None), (NEWLINE, "\n", 2, None)])])
+    raw = (
+        EXPR,
+        None,
+        0,
+        [(NAME, "a", 0, None), (EXPR, None, 1, [(NAME, "b", 1, None), (NEWLINE, "\n", 2, None)])],
+    )
     node = factory.RecursiveConvert(raw)
     assert [child.fText for child in node.fChildren] == ["a", "b"]
     for broken, error in [

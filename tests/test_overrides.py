@@ -1,12 +1,21 @@
-"""Host subclasses: overrides are honoured wherever native code calls an operation, and super() is the base."""
+"""Host subclasses: overrides are honoured wherever native code calls an operation; super() is the base."""
 
 import gc
 import weakref
+from types import SimpleNamespace
 
 import pytest
 
 from codeloom.logicalline import CLogicalLine, kAssignment, kComment
-from codeloom.treesift import CNameLiteral, CNode, CNodeFactory, CNodeWalker, CPGenAnalyzer, CPGenAnalyzerImpl, CPGenParserImpl
+from codeloom.treesift import (
+    CNameLiteral,
+    CNode,
+    CNodeFactory,
+    CNodeWalker,
+    CPGenAnalyzer,
+    CPGenAnalyzerImpl,
+    CPGenParserImpl,
+)
 from codeloom.utils import GetLogicalsFromText
 
 VERSION = (3, 8, 0)
@@ -152,11 +161,8 @@ def test_factory_overrides_reach_native_callers():
             seen.append(text)
             return super().NewNode(clsinfo, type, text, context, children)
 
-    class Gram:
-        number2symbol = {}
-
     seen = []
-    factory = Factory(Gram, [CNode, CNameLiteral], {"if": None}, {}, {"+": 0})
+    factory = Factory(SimpleNamespace(number2symbol={}), [CNode, CNameLiteral], {"if": None}, {}, {"+": 0})
     factory.NewNameNode("a", 0)
     factory.NewKeywordNode("if", 0)
     factory.CreateOperatorNode("+", 0)

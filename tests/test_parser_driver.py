@@ -9,8 +9,8 @@ from codeloom.treesift import (
     CClassdefStmt,
     CDottedName,
     CExceptClause,
-    CExprStmt,
     CExpression,
+    CExprStmt,
     CFuncdefStmt,
     CIfElseExpression,
     CIfStmt,
@@ -111,7 +111,11 @@ def test_token_indexes_are_those_of_the_logical():
 
 
 def test_async_and_await():
-    assert Shape(Parse("async def f(): pass")) == ["async_stmt", "async", ["funcdef", "def", "f", ["parameters", "(", ")"], ":", "pass"]]
+    assert Shape(Parse("async def f(): pass")) == [
+        "async_stmt",
+        "async",
+        ["funcdef", "def", "f", ["parameters", "(", ")"], ":", "pass"],
+    ]
     assert Shape(Parse("async def f(): pass", PY35))[1] == "async"
     assert Shape(Parse("await x")) == ["atom_expr", "await", "x"]
     assert Refused("await x", PY35) == 1
@@ -130,7 +134,13 @@ def test_an_ellipsis_in_the_older_grammar():
 
 def test_backslashes():
     assert Refused("x = 1 \\ y") == 3
-    for positions, skipped in [(None, True), ((), False), (((0, 0),), True), (((0, 0), (0, 1)), False), (((0, 0), (1, 0)), True)]:
+    for positions, skipped in [
+        (None, True),
+        ((), False),
+        (((0, 0),), True),
+        (((0, 0), (0, 1)), False),
+        (((0, 0), (1, 0)), True),
+    ]:
         assert PY38._ShouldSkipSlash(0, positions) is skipped
     logical = CLogicalLine(kUnknown, ("x", "\\"), ((0, 0), (0, 2)))
     assert PY38.ParseToNode(logical, False).fText == "x"
@@ -177,7 +187,9 @@ def test_type_parameters():
     assert Parse("def f[](): pass").GetChildCount() == 1
     assert Refused("def f[T(x):") == 2
     assert Refused("class C[1]:") == 3
-    assert [node.GetChildText(0) for node in PY38.GetTypeParameterNodes(("def", "f", "[", "1", ",", "T", "]"))] == ["T"]
+    assert [
+        node.GetChildText(0) for node in PY38.GetTypeParameterNodes(("def", "f", "[", "1", ",", "T", "]"))
+    ] == ["T"]
     assert PY38.GetTypeParameterNodes(("x", "=", "1")) == []
     with pytest.raises(ParseError):
         PY38.GetTypeParameterNodes(("def", "f", "[", "T"))

@@ -12,7 +12,7 @@ import unicodedata
 TARGET = pathlib.Path(__file__).parent.parent / "src/neighbours/tokenizer/unicode_ranges.h"
 HEADER = """\
 // Made by tools/make_unicode_ranges.py from Unicode {version}; don't edit.
-// Where the role of characters in names changes: the first code point of each range, shifted left by two, plus
+// Where the role of characters in names changes: the first code point of a range, shifted left by two, plus
 // 0 for no part of a name, 1 for a character that continues names, 2 for one that begins them too.
 #pragma once
 

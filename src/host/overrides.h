@@ -125,17 +125,17 @@ struct TOperationLine {};
     }
 
 // OPERATION(Name, doc, "argument"_a, "optional_argument"_a = value...): one nb::arg for each parameter.
-#define OPERATION(Name, doc, ...)                                                            \
-    _CODELOOM_OVERRIDE(Name, _CODELOOM_COUNT(__VA_ARGS__))                                   \
-    template <class Visitor>                                                                 \
-    static void _Operation(Visitor&& visit, codeloom::TOperationLine<__LINE__>) {            \
-        using Traits = codeloom::TOperationTraits<decltype(&Class::Name)>;                   \
-        constexpr auto call = [](Class& self, auto&&... arguments) -> decltype(auto) {       \
-            return self.Class::Name(std::forward<decltype(arguments)>(arguments)...);        \
-        };                                                                                   \
-        visit(#Name, static_cast<typename Traits::DeclaringClass*>(nullptr),                 \
+#define OPERATION(Name, doc, ...)                                                             \
+    _CODELOOM_OVERRIDE(Name, _CODELOOM_COUNT(__VA_ARGS__))                                    \
+    template <class Visitor>                                                                  \
+    static void _Operation(Visitor&& visit, codeloom::TOperationLine<__LINE__>) {             \
+        using Traits = codeloom::TOperationTraits<decltype(&Class::Name)>;                    \
+        constexpr auto call = [](Class& self, auto&&... arguments) -> decltype(auto) {        \
+            return self.Class::Name(std::forward<decltype(arguments)>(arguments)...);         \
+        };                                                                                    \
+        visit(#Name, static_cast<typename Traits::DeclaringClass*>(nullptr),                  \
               typename Traits::template CBound<Class, std::remove_const_t<decltype(call)>>{}, \
-              doc __VA_OPT__(, ) __VA_ARGS__);                                               \
+              doc __VA_OPT__(, ) __VA_ARGS__);                                                \
     }
 
 #define _CODELOOM_COUNT(...) _CODELOOM_COUNT_OF(0 __VA_OPT__(, ) __VA_ARGS__, 6, 5, 4, 3, 2, 1, 0)
