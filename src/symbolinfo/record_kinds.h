@@ -89,6 +89,7 @@ struct CRecordKind {
     std::string_view example;
 };
 
+// NOLINTBEGIN(bugprone-macro-parentheses): the byte is a literal, joined with others
 #define CODELOOM_KIND_ENTRY(name, byte, word, payload, meaning, source, example) \
     CRecordKind{#name, ":" byte ":", byte[0], word, payload, meaning, source, example},
 inline constexpr auto kRecordKinds = std::to_array<CRecordKind>(
@@ -96,7 +97,6 @@ inline constexpr auto kRecordKinds = std::to_array<CRecordKind>(
 #undef CODELOOM_KIND_ENTRY
 
 // `kSetPrefix`, `kSetKind` and so on.
-// NOLINTBEGIN(bugprone-macro-parentheses): the byte is a literal, joined with others
 #define CODELOOM_KIND_CONSTANTS(name, byte, ...)                      \
     inline constexpr std::string_view k##name##Prefix = ":" byte ":"; \
     inline constexpr char k##name##Kind = byte[0];
