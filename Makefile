@@ -7,7 +7,7 @@ VENV   := .venv
 BIN    := $(VENV)/bin
 STAMP  := $(VENV)/.installed
 
-SOURCES   := $(shell find src resources -type f) CMakeLists.txt pyproject.toml
+SOURCES   := $(shell find src resources codeloom -type f -not -name '*.pyc') CMakeLists.txt pyproject.toml README.md
 CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
 STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
 
@@ -24,12 +24,12 @@ $(VENV)/.tools: pyproject.toml | $(BIN)/python
 	touch $@
 
 $(STAMP): $(SOURCES) $(VENV)/.tools
-	$(BIN)/pip install --quiet --no-build-isolation --editable '.[test,lint]'
+	$(BIN)/pip install --quiet --no-build-isolation '.[test,lint]'
 	touch $@
 
 run: build
-	-$(BIN)/codeloom check examples
-	-$(BIN)/codeloom check $(STDLIB) | tail -n 1
+	@$(BIN)/codeloom check examples || true
+	@$(BIN)/codeloom check $(STDLIB) | tail -n 1
 
 test: build
 	$(BIN)/pytest
@@ -54,7 +54,7 @@ ASAN := build/asan
 ASAN_RUN = LD_PRELOAD="$$(g++ -print-file-name=libasan.so) $$(g++ -print-file-name=libubsan.so)" \
 	ASAN_OPTIONS=detect_leaks=0 PYTHONMALLOC=malloc PYTHONPATH=$(ASAN)/site $(BIN)/python -P
 
-$(ASAN)/.built: $(SOURCES) $(shell find codeloom -name '*.py') $(STAMP)
+$(ASAN)/.built: $(SOURCES) $(STAMP)
 	$(BIN)/cmake -S . -B $(ASAN) -G Ninja -DCODELOOM_SANITIZE=ON -DCMAKE_BUILD_TYPE=Debug \
 		-DCMAKE_MAKE_PROGRAM=$(abspath $(BIN)/ninja) -DPython_EXECUTABLE=$(abspath $(BIN)/python)
 	$(BIN)/cmake --build $(ASAN)
