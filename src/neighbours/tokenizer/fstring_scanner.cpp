@@ -137,11 +137,11 @@ size_t CFstringScanner::_ScanTail(size_t pos) {
 // `!r` and the blanks behind it. The letter must follow directly.
 size_t CFstringScanner::_ScanConversion(size_t pos, bool& is_sound) {
     const std::string_view text = _fLexer.Text();
-    size_t end = pos + 1;
-    while (IsNameByte(ByteAt(text, end))) ++end;
-    const std::string_view name = text.substr(pos + 1, end - pos - 1);
+    const size_t name_start = SkipBlanks(text, pos + 1);
+    const size_t name_end = NameEnd(text, name_start);
+    const std::string_view name = text.substr(pos + 1, name_end - pos - 1);
     is_sound = name == "r" || name == "s" || name == "a";
-    return _SkipToToken(end);
+    return _SkipToToken(name_end);
 }
 
 // The sign that ends the expression, where the "=" at `pos` stands before one as in `{x = !r}`; `pos`
