@@ -1,8 +1,8 @@
 """How texts are cut into logical lines, against golden files in tokens/.
 
-A row shows a logical line: the row of the text that it begins on, its type, and its tokens. `/` is before a token
-that stands on a later row than the one before it, and ERROR(...) around what is no token of the language. Beneath
-it stand the lines embedded in it, with the row and column where each begins.
+A row shows a logical line: the row of the text that it begins on, its type, and its tokens. `/` is before a
+token that stands on a later row than the one before it, and ERROR(...) around what is no token of the
+language. Beneath it stand the lines embedded in it, with the row and column where each begins.
 """
 
 from itertools import pairwise
