@@ -27,13 +27,16 @@ nb::object HostFindMatchOrCaseType(nb::tuple toks, Py_ssize_t first, Py_ssize_t 
 
 void BindTokenTypes(nb::module_& module) {
     for (const CTokenTypeName& type : kTokenTypeNames)
-        module.attr((std::string("kTokenId_") + std::string(type.name)).c_str()) = static_cast<int>(type.number);
+        module.attr((std::string("kTokenId_") + std::string(type.name)).c_str()) =
+            static_cast<int>(type.number);
     module.def(
         "GetTokenType", [](nb::object token, nb::handle) { return GetTokenType(CUtf8(token)); }, "token"_a,
         "unused"_a.none() = nb::none(),
-        "The token type, an integer, of a token text (text or byte string): 1 for a name, 54 for what is no token.");
+        "The token type, an integer, of a token text (text or byte string): 1 for a name, 54 for what is no "
+        "token.");
     module.def("FindMatchOrCaseType", &HostFindMatchOrCaseType, "toks"_a, "first"_a, "end"_a,
-               "The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form the header of\n"
+               "The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form the "
+               "header of\n"
                "such a statement (PEP 634), kUnknown when the word is a name.");
 }
 

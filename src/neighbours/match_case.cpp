@@ -50,31 +50,32 @@ bool CanBeginSubject(std::string_view token, std::string_view next) {
 }
 
 // Reads the header as if the word were a name, to tell whether the ":" could begin an annotation of it:
-//   match.a[b]: int      match(a).b: int      two trailers each, and the last is no call
+//   match(a).b: int      match[a][b]: int     two trailers each, and the last is no call
 //   match (a): ...       match [a], b: ...    no target of an annotation
 class CTargetReader {
   public:
     // Takes a token outside brackets.
     void Read(std::string_view token) {
-        const bool completes_attribute = _fEnd == EEnd::kDot && ByteKind(token[0]) == EByteKind::kNameStart;
-        const bool may_go_on = _fEnd != EEnd::kDot && _fEnd != EEnd::kNoTarget;
-        if (completes_attribute || (may_go_on && token == "[")) {
-            _fEnd = EEnd::kAssignable;
-        } else if (may_go_on && (token == "(" || token == ".")) {
-            _fEnd = token == "." ? EEnd::kDot : EEnd::kCall;
-        } else {
-            _fEnd = EEnd::kNoTarget;
-        }
+        _fEnd = _EndWith(token);
         if (_fEnd != EEnd::kDot) ++_fTrailerCount;
     }
 
-    bool IsTarget() const { return _fEnd == EEnd::kAssignable; }
+    bool IsTarget() const { return _fEnd == EEnd::kAttribute || _fEnd == EEnd::kSubscript; }
     int GetTrailerCount() const { return _fTrailerCount; }
 
   private:
-    enum class EEnd { kCall, kDot, kAssignable, kNoTarget };
+    enum class EEnd { kName, kDot, kAttribute, kSubscript, kCall, kNoTarget };
 
-    EEnd _fEnd = EEnd::kCall;  // a name goes on like a call
+    EEnd _EndWith(std::string_view token) const {
+        if (_fEnd == EEnd::kNoTarget) return EEnd::kNoTarget;
+        if (_fEnd == EEnd::kDot)
+            return ByteKind(token[0]) == EByteKind::kNameStart ? EEnd::kAttribute : EEnd::kNoTarget;
+        if (token == ".") return EEnd::kDot;
+        if (token == "[") return EEnd::kSubscript;
+        return token == "(" ? EEnd::kCall : EEnd::kNoTarget;
+    }
+
+    EEnd _fEnd = EEnd::kName;
     int _fTrailerCount = 0;
 };
 
