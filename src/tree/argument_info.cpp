@@ -9,9 +9,15 @@ namespace codeloom {
 
 namespace {
 
+// The node as a Class, borrowed; null when it is of another class, or none.
+template <class Class>
+Class* As(const CNodeRef& node) {
+    return node ? TryInstance<Class>(node->Self()) : nullptr;
+}
+
 template <class Class>
 bool IsA(const CNodeRef& node) {
-    return node && TryInstance<Class>(node->Self()) != nullptr;
+    return As<Class>(node) != nullptr;
 }
 
 CArgument TupleParameter(CNodeRef nested) {
@@ -23,12 +29,11 @@ CArgument TupleParameter(CNodeRef nested) {
 
 CArgument LoneParameter(const CNodeRef& node) {
     CArgument parameter;
-    if (IsA<CFunctionParameterDef>(node)) {
-        CFunctionParameterDef& definition = *Instance<CFunctionParameterDef>(node->Self());
-        CNodeRef nested = definition.GetNestedListNode();
+    if (CFunctionParameterDef* const definition = As<CFunctionParameterDef>(node)) {
+        CNodeRef nested = definition->GetNestedListNode();
         if (nested) return TupleParameter(std::move(nested));
-        parameter.name = definition.GetName();
-        parameter.type_expr = definition.GetTypeExpr();
+        parameter.name = definition->GetName();
+        parameter.type_expr = definition->GetTypeExpr();
         return parameter;
     }
     HostAssert(IsA<CNameLiteral>(node), [&] { return nb::make_tuple(node, node->fText); });
@@ -102,10 +107,9 @@ class CParameterReader {
 
 CArgument LoneArgument(const CNodeRef& node) {
     CArgument argument;
-    if (IsA<CSingleUsedArgumentNode>(node)) {
-        CSingleUsedArgumentNode& single = *Instance<CSingleUsedArgumentNode>(node->Self());
-        argument.name = single.GetName();
-        argument.value = single.GetValue();
+    if (CSingleUsedArgumentNode* const single = As<CSingleUsedArgumentNode>(node)) {
+        argument.name = single->GetName();
+        argument.value = single->GetValue();
     } else {
         argument.value = node;
     }
@@ -152,9 +156,9 @@ CArgumentList GetUsedArgInfoList(CNodeRef node) {
             arguments.push_back(std::exchange(current, CArgument()));
         } else if (TextIsOneOf(child->fText, "*", "**")) {
             current.prefix = child->fText;
-        } else if (IsA<CSingleUsedArgumentNode>(child)) {
+        } else if (CSingleUsedArgumentNode* const single = As<CSingleUsedArgumentNode>(child)) {
             current = LoneArgument(child);
-            current.prefix = Instance<CSingleUsedArgumentNode>(child->Self())->GetPrefix();
+            current.prefix = single->GetPrefix();
         } else {
             current.value = child;
         }
