@@ -53,6 +53,7 @@ constexpr bool ContinuesExpression(std::string_view text, size_t pos) {
         case EByteKind::kDot:
             return !IsDigit(ByteAt(text, pos + 1)) && ByteAt(text, pos + 1) != '.';
         case EByteKind::kOperator:
+            if (c == '-' && ByteAt(text, pos + 1) == '>') return true;
             return std::string_view("+-~*@`!;").find(c) == std::string_view::npos;
         default:
             return false;

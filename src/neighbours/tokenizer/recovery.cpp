@@ -63,6 +63,11 @@ size_t FindStatementEnd(CLexer& lexer, const CPlace& place) {
     return end;
 }
 
+// The row begins behind the last parameter: `) -> int: pass`, the bracket perhaps missing.
+bool EndsParameters(const CTokenRow& row) {
+    return BeginsWithCloser(row) || row.text.starts_with("->");
+}
+
 // The end of a compound header whose rows begin at `place`: behind the first row that ends in ":", or else
 // before the body, that is before the first of the least indented rows among those that are deeper than the
 // header.
@@ -75,7 +80,7 @@ size_t FindHeaderEnd(CLexer& lexer, const CPlace& place) {
     int32_t body_indent = INT32_MAX;
     for (int row_count = 0; row_count < kMostHeaderRows; ++row_count) {
         if (row_count > 0 && (BeginsStatement(row) || FollowsOperand(row))) break;
-        if (EndsInColon(row)) return row.end;
+        if (EndsInColon(row) || (row_count > 0 && EndsParameters(row) && HasBody(row))) return row.end;
         if (!reader.Next(row)) break;
         if (IsComment(row)) {
             if (comments_start == 0) comments_start = row.start;

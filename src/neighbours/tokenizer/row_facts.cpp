@@ -83,8 +83,8 @@ bool EndsInColon(const CTokenRow& row) {
 }
 
 bool HasBody(const CTokenRow& row) {
-    return AnyToken(row, [](const CRawToken& token, int depth) { return depth == 0 && token.text == ":"; }) &&
-           !EndsInColon(row);
+    return !EndsInColon(row) &&
+           AnyToken(row, [](const CRawToken& token, int depth) { return depth <= 0 && token.text == ":"; });
 }
 
 bool EndsOpen(const CTokenRow& row) {
