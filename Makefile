@@ -76,6 +76,7 @@ fuzz: build
 	$(BIN)/python tests/fuzz.py --seconds $(or $(SECONDS),60)
 
 bench: build
+	$(BIN)/python benchmarks/bench_accessors.py
 	$(BIN)/python benchmarks/bench_analyze.py
 
 clean:

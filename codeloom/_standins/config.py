@@ -1,6 +1,6 @@
 """Where the engine's own files are."""
 
-from pathlib import Path
+import os.path
 
 import codeloom
 
@@ -8,8 +8,8 @@ import codeloom
 def GetTarnFilename(relative_path: str) -> str:
     """The absolute path of a file of the installation, such as "resources/pgen-grammars/NAME".
 
-    A package in editable mode lies in two folders. A file that is in neither is named as it would
-    be in the first, so that the failure to open it tells where it should be.
+    A package may lie in several folders, as in editable mode. A file that is in none of them is named
+    as it would be in the first, so that the failure to open it tells where it should be.
     """
-    places = [Path(folder, relative_path) for folder in codeloom.__path__]
-    return str(next((place for place in places if place.exists()), places[0]).absolute())
+    places = [os.path.abspath(os.path.join(folder, relative_path)) for folder in codeloom.__path__]
+    return next((place for place in places if os.path.exists(place)), places[0])

@@ -1,10 +1,14 @@
-"""Reporting and raising of exceptions."""
+"""Reporting and raising of exceptions.
 
-import logging
-from types import TracebackType
-from typing import NoReturn
+It is a part of the engine's start, so what costs time to import waits until it is needed.
+"""
 
-_logger = logging.getLogger("codeloom")
+from __future__ import annotations
+
+TYPE_CHECKING = False
+if TYPE_CHECKING:
+    from types import TracebackType
+    from typing import NoReturn
 
 
 def ReportCurrentException(suppress_gui: bool = False) -> None:
@@ -12,7 +16,9 @@ def ReportCurrentException(suppress_gui: bool = False) -> None:
 
     `suppress_gui` says that no dialog is to be shown; there is none here.
     """
-    _logger.exception("Exception in codeloom")
+    import logging
+
+    logging.getLogger("codeloom").exception("Exception in codeloom")
 
 
 def RaiseWithTraceback(exc: BaseException, traceback: TracebackType | None) -> NoReturn:
