@@ -64,7 +64,9 @@ def ImportMilliseconds(statement: str) -> float:
     script = f"import time; t = time.perf_counter(); {statement}; print(time.perf_counter() - t)"
     times = [
         float(
-            subprocess.run([sys.executable, "-P", "-c", script], capture_output=True, text=True, check=True).stdout
+            subprocess.run(
+                [sys.executable, "-P", "-c", script], capture_output=True, text=True, check=True
+            ).stdout
         )
         for _ in range(5)
     ]
