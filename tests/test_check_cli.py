@@ -200,7 +200,12 @@ class TestEndings:
         def Start(*arguments, **options):
             command = [sys.executable, "-m", "codeloom", "check", *arguments]
             options = {"stdout": subprocess.PIPE, "stderr": subprocess.PIPE} | options
-            return subprocess.Popen(command, cwd=tmp_path, env=cli_environment, **options)
+            # Whoever runs the tests in the background has SIGINT ignored, which a child inherits.
+            inherited = signal.signal(signal.SIGINT, signal.SIG_DFL)
+            try:
+                return subprocess.Popen(command, cwd=tmp_path, env=cli_environment, **options)
+            finally:
+                signal.signal(signal.SIGINT, inherited)
 
         return Start
 

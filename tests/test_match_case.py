@@ -242,7 +242,7 @@ BAD_ROWS = BAD_PATTERNS.strip("\n").split("\n")
 
 
 @pytest.mark.parametrize(
-    ("text", "caret"), zip(BAD_ROWS[::2], BAD_ROWS[1::2], strict=True), ids=BAD_ROWS[::2]
+    ("text", "caret"), list(zip(BAD_ROWS[::2], BAD_ROWS[1::2], strict=True)), ids=BAD_ROWS[::2]
 )
 def test_the_place_of_the_fault(text, caret):
     assert Place(text) == (1, len(text[: caret.index("^")].encode()) + 1)
