@@ -70,8 +70,8 @@ def GetTokenType(token: object, unused: object | None=None) -> int:
 
 def FindMatchOrCaseType(toks: tuple[typing.Any, ...], first: int, end: int) -> typing.Any:
     """
-    The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form the header of
-    such a statement (PEP 634), kUnknown when the word is a name.
+    The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form
+    the header of such a statement (PEP 634), kUnknown when the word is a name.
     """
 kUnknown: str = 'unknown'
 kClassDef: str = 'class'
@@ -242,8 +242,8 @@ class ParserGenerator:
     Reads a grammar file.
 
     ParserGenerator(grammar_file, tok_number2name, op_text2number): the path of a grammar text in pgen
-    notation, a dict from token type (int) to its name (str), and one from operator text (str) to
-    token type. The first rule is the start symbol. Raises OSError when the file can't be read, and ValueError
+    notation, a dict from token type (int) to its name (str), and one from operator text (str) to token
+    type. The first rule is the start symbol. Raises OSError when the file can't be read, and ValueError
     with file, row and reason when it is no grammar.
     """
 
@@ -254,8 +254,8 @@ class ParserGenerator:
         """
         The Grammar that the file defines.
 
-        Raises ValueError with file, row and reason on an unknown name or operator, a rule that is defined twice,
-        can be empty or begins with itself, and a choice that the next token alone doesn't decide.
+        Raises ValueError with file, row and reason on an unknown name or operator, a rule that is defined
+        twice, can be empty or begins with itself, and a choice that the next token alone doesn't decide.
         """
 
 class NodeConverter:
@@ -268,10 +268,10 @@ class NodeConverter:
         """
         Make the node of a token or of a rule; what it returns is what the rule above gets as a child.
 
-        Called once for each token that the grammar takes, with its type (int), text (str) and context (any
-        object) and None as children, and once for each rule that is complete, with the rule's number, None
-        as value, the context of its first token and the list of its children. This one returns the tuple
-        (type, value, context, children).
+        Called once for each token that the grammar takes, with its type (int), text (str) and context
+        (any object) and None as children, and once for each rule that is complete, with the rule's
+        number, None as value, the context of its first token and the list of its children. This one
+        returns the tuple (type, value, context, children).
         """
 
 class Parser:
@@ -292,9 +292,9 @@ class Parser:
         """
         Feed one token; True when the start symbol is complete.
 
-        `type` (int) is the token type, `value` (str or None) the token's text and `context` any object: it
-        goes into the nodes, and into the ParseError that is raised on a token which the grammar refuses.
-        Raises RuntimeError when no parse is going on.
+        `type` (int) is the token type, `value` (str or None) the token's text and `context` any object:
+        it goes into the nodes, and into the ParseError that is raised on a token which the grammar
+        refuses. Raises RuntimeError when no parse is going on.
         """
 
     def finish(self) -> typing.Any:
@@ -308,10 +308,11 @@ class ParserImpl(Parser):
     """
     The parser that runs on a grammar's tables.
 
-    ParserImpl(grammar, node_converter=None, promotesinglechild=True): a NodeConverter makes the nodes; None
-    stands for one that gives tuples (type, value, context, children). With promotesinglechild a rule that has a
-    single child is replaced by that child. Each parse is setup, addtoken for each token, finish; after an
-    exception the next setup begins anew. The operations can't be called from within one another.
+    ParserImpl(grammar, node_converter=None, promotesinglechild=True): a NodeConverter makes the nodes;
+    None stands for one that gives tuples (type, value, context, children). With promotesinglechild a
+    rule that has a single child is replaced by that child. Each parse is setup, addtoken for each
+    token, finish; after an exception the next setup begins anew. The operations can't be called from
+    within one another.
     """
 
     def __init__(self, grammar: Grammar, node_converter: NodeConverter | None | None=None, promotesinglechild: bool=True) -> None:
@@ -329,9 +330,9 @@ class ParserImpl(Parser):
         """
         Feed one token; True when the start symbol is complete.
 
-        `type` (int) is the token type, `value` (str or None) the token's text and `context` any object: it
-        goes into the nodes, and into the ParseError that is raised on a token which the grammar refuses.
-        Raises RuntimeError when no parse is going on.
+        `type` (int) is the token type, `value` (str or None) the token's text and `context` any object:
+        it goes into the nodes, and into the ParseError that is raised on a token which the grammar
+        refuses. Raises RuntimeError when no parse is going on.
         """
 
     def finish(self) -> typing.Any:
@@ -348,8 +349,8 @@ def CreateParser(grammar: Grammar, node_converter: NodeConverter | None | None=N
 
 def OrdAt(s: bytes | str, i: int) -> int:
     """
-    The byte of a byte string or the code point of a text string at index `i`, from the end if negative.
-    IndexError outside the string, TypeError for anything else.
+    The byte of a byte string or the code point of a text string at index `i`, from the end if
+    negative. IndexError outside the string, TypeError for anything else.
     """
 
 def Utf8Concat2(s0: bytes | str | None, s1: bytes | str | None) -> bytes:
@@ -419,8 +420,8 @@ def BytesFindByte(b: bytes, c: int | bytes | str, start: int=0) -> int:
 
 def AsUtf8(text: bytes | str) -> bytes:
     """
-    The UTF-8 bytes of a text string, lone surrogates in three bytes; a byte string as it is. TypeError
-    for anything else.
+    The UTF-8 bytes of a text string, lone surrogates in three bytes; a byte string as it is.
+    TypeError for anything else.
     """
 
 def AsStr(text: bytes | str) -> str:
@@ -439,8 +440,8 @@ def Utf8Concat5(s0: bytes | str | None, s1: bytes | str | None, s2: bytes | str 
 
 def Utf8Len(text: bytes | str) -> int:
     """
-    Of a UTF-8 byte string the number of its characters, each byte but a continuation byte counting as one;
-    of a text string the number of its UTF-8 bytes.
+    Of a UTF-8 byte string the number of its characters, each byte but a continuation byte counting
+    as one; of a text string the number of its UTF-8 bytes.
     """
 
 def IsUtf8LeadByte(byte: int | bytes | str) -> bool:
@@ -456,8 +457,8 @@ def _NonInlineUcs4CharAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int) -
 
 def StrInStr(sub: bytes, whole: bytes) -> bool:
     """
-    True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both are
-    byte strings.
+    True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both
+    are byte strings.
     """
 
 def IsAlnum(c: int | bytes | str) -> bool:
@@ -491,8 +492,8 @@ class CStringTokenizer:
     """
     The tokens of a piece of Python text, one after the other.
 
-    CStringTokenizer(utf8) stands on the first token of a byte or text string; comments and blanks, row ends
-    among them, are no tokens.
+    CStringTokenizer(utf8) stands on the first token of a byte or text string; comments and blanks, row
+    ends among them, are no tokens.
     """
 
     def __init__(self, utf8: bytes | str) -> None:
@@ -532,9 +533,10 @@ class CNonNestedSearch:
 
     def InitWith(self, to_search: object, to_find_bytes: bytes, start: int, end: int) -> int:
         """
-        Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything else, None
-        included, leaves the search idle. Returns 0. TypeError for a subclass of either or when
-        `to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside the text.
+        Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything
+        else, None included, leaves the search idle. Returns 0. TypeError for a subclass of either
+        or when `to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside
+        the text.
         """
 
     def FindNext(self) -> int:
@@ -611,8 +613,9 @@ def BuildLiteralInfo(type_name: bytes | str, text: bytes | str | None) -> bytes:
 
 def EncodeStringLiteral(text: bytes | str) -> bytes:
     """
-    The text of a string literal with its prefix and quotes on one row: what ends rows is written as an
-    escape, and a continued row is joined. The value is the same, but for raw strings.
+    The text of a string literal with its prefix and quotes on one row: what ends rows is
+    written as an escape, and a continued row is joined. The value is the same, but for raw
+    strings.
     """
 
 def JoinTokens(tokens: Iterable[bytes | str]) -> bytes:

@@ -129,8 +129,8 @@ gInfoBytesBuilder: codeloom.symbolinfo.CInfoBytesBuilder = ...
 
 def OrdAt(s: bytes | str, i: int) -> int:
     """
-    The byte of a byte string or the code point of a text string at index `i`, from the end if negative.
-    IndexError outside the string, TypeError for anything else.
+    The byte of a byte string or the code point of a text string at index `i`, from the end if
+    negative. IndexError outside the string, TypeError for anything else.
     """
 
 def Utf8Concat2(s0: bytes | str | None, s1: bytes | str | None) -> bytes:
@@ -200,8 +200,8 @@ def BytesFindByte(b: bytes, c: int | bytes | str, start: int=0) -> int:
 
 def StrInStr(sub: bytes, whole: bytes) -> bool:
     """
-    True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both are
-    byte strings.
+    True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both
+    are byte strings.
     """
 
 def IsAlnum(c: int | bytes | str) -> bool:
@@ -1360,10 +1360,10 @@ class CPGenParserImpl(CPGenAnalyzer):
         """
         Make the node of a token or of a rule; what it returns is what the rule above gets as a child.
 
-        Called once for each token that the grammar takes, with its type (int), text (str) and context (any
-        object) and None as children, and once for each rule that is complete, with the rule's number, None
-        as value, the context of its first token and the list of its children. This one returns the tuple
-        (type, value, context, children).
+        Called once for each token that the grammar takes, with its type (int), text (str) and context
+        (any object) and None as children, and once for each rule that is complete, with the rule's
+        number, None as value, the context of its first token and the list of its children. This one
+        returns the tuple (type, value, context, children).
         """
 
     def _BuildClsForStateList(self) -> list[typing.Any]:

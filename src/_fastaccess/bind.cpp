@@ -23,9 +23,8 @@ void BindFastAccessPrimitives(nb::module_& module) {
         "StrInStr",
         [](nb::handle sub, nb::handle whole) { return CheckedResult(StrInStr(sub, whole), -1) != 0; },
         "sub"_a.none(), "whole"_a.none(), nb::sig("def StrInStr(sub: bytes, whole: bytes) -> bool"),
-        "True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both "
-        "are\n"
-        "byte strings.");
+        "True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both\n"
+        "are byte strings.");
     module.def(
         "IsAlnum", [](CByteArgument c) { return IsAlnum(c.byte); }, "c"_a,
         "True for the byte of an ASCII letter or digit.");

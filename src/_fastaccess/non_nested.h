@@ -17,12 +17,9 @@ namespace codeloom {
 // text, TypeError when `to_find_bytes` is no byte string.
 inline int InitNonNestedStruct(tNonNestedStruct& search, const char* search_ptr, nb::handle to_find_bytes,
                                Py_ssize_t start, Py_ssize_t end) {
-    if (search_ptr != nullptr && HostAssertionsOn()) {
+    if (search_ptr != nullptr) {
         const auto length = static_cast<Py_ssize_t>(std::strlen(search_ptr));
-        if (start < 0 || start > length || end < 0 || end > length) {
-            PyErr_SetNone(PyExc_AssertionError);
-            return -1;
-        }
+        if (!HostAssertHolds(start >= 0 && start <= length && end >= 0 && end <= length)) return -1;
     }
     if (!PyBytes_Check(to_find_bytes.ptr())) {
         PyErr_Format(PyExc_TypeError, "expected bytes, %s found", Py_TYPE(to_find_bytes.ptr())->tp_name);

@@ -5,7 +5,7 @@
 
 #include "_fastaccess/non_nested.h"
 #include "host/hosted.h"
-#include "neighbours/strutils/text.h"
+#include "host/text.h"
 
 namespace codeloom {
 
@@ -42,7 +42,7 @@ class CNonNestedSearch : public CHosted {
     tNonNestedStruct _fSearch;
     nb::object _fSearched = nb::none();  // the string searched; none when idle
     nb::object _fToFind = nb::none();
-    CUtf8Text _fText;
+    CUtf8 _fText;
 };
 
 inline int CNonNestedSearch::InitWith(nb::handle to_search, nb::handle to_find_bytes, Py_ssize_t start,
@@ -61,10 +61,10 @@ inline int CNonNestedSearch::InitWith(nb::handle to_search, nb::handle to_find_b
 
 inline int CNonNestedSearch::_InitWithText(nb::handle to_search, nb::handle to_find_bytes, Py_ssize_t start,
                                            Py_ssize_t end) {
-    CUtf8Text text(to_search);
+    CUtf8 text(to_search);
     tNonNestedStruct search;
-    if (InitNonNestedStruct(search, text.View().data(), to_find_bytes, start, end) != 0) return -1;
-    if (start < 0 || end > static_cast<Py_ssize_t>(text.View().size())) {
+    if (InitNonNestedStruct(search, text->data(), to_find_bytes, start, end) != 0) return -1;
+    if (start < 0 || end > static_cast<Py_ssize_t>(text->size())) {
         PyErr_SetString(PyExc_ValueError, "start and end must lie within the text searched");
         return -1;
     }

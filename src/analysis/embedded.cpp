@@ -1,6 +1,7 @@
 #include "analysis/embedded.h"
 
 #include "analysis/syntax_error.h"
+#include "host/errors.h"
 #include "neighbours/imported_names.h"
 
 namespace codeloom {
@@ -22,11 +23,9 @@ void RaiseEmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_log
     const nb::object inner = CreateSyntaxError(message, exp_logical.Self(), context, nb::none());
     const nb::int_ rows_down(exp_logical.fFirstLine - logical.fFirstLine);
     // The message stands in the place of the file name too.
-    const nb::object error = nb::borrow(PyExc_SyntaxError)(
+    RaiseHostError(nb::borrow(PyExc_SyntaxError)(
         message,
-        nb::make_tuple(message, rows_down + inner.attr("lineno"), inner.attr("offset"), inner.attr("text")));
-    PyErr_SetObject(PyExc_SyntaxError, error.ptr());
-    throw nb::python_error();
+        nb::make_tuple(message, rows_down + inner.attr("lineno"), inner.attr("offset"), inner.attr("text"))));
 }
 
 void LiftTypeEquivs(const CLogicalLine& exp_logical, CLogicalLine& logical) {

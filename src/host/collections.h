@@ -69,9 +69,6 @@ inline bool DictContains(nb::handle dict, nb::handle key) {
 // The value of `key`; an invalid object when there is none, or no dictionary at all.
 nb::object FindInDict(nb::handle dict_or_none, nb::handle key);
 
-// The UTF-8 bytes of a text string or a byte string, borrowed from it; anything else is the host's TypeError.
-std::string_view Utf8View(nb::handle text);
-
 // True when `candidate` is a class derived from `base`, or `base` itself.
 bool IsSubclass(nb::handle candidate, nb::handle base);
 

@@ -15,12 +15,18 @@ void HostAssert(bool condition);
 template <class MakeValue>
 void HostAssert(bool condition, MakeValue make_value);
 
+// The same for an operation that reports failure by a reserved value: false, with the exception pending.
+bool HostAssertHolds(bool condition);
+
 // True when the host runs with assertions on.
 bool HostAssertionsOn();
 
 // Raises an exception of the host class `type` with `message`.
 [[noreturn]] void RaiseHost(nb::handle type, const char* message);
 [[noreturn]] void RaiseHost(nb::handle type, nb::handle value);
+
+// Raises an exception that is made already; TypeError for what is no exception.
+[[noreturn]] void RaiseHostError(nb::handle error);
 
 template <class MakeValue>
 void HostAssert(bool condition, MakeValue make_value) {

@@ -69,10 +69,14 @@ bool HostAssertionsOn() {
     return on;
 }
 
-void HostAssert(bool condition) {
-    if (condition || !HostAssertionsOn()) return;
+bool HostAssertHolds(bool condition) {
+    if (condition || !HostAssertionsOn()) return true;
     PyErr_SetNone(PyExc_AssertionError);
-    throw nb::python_error();
+    return false;
+}
+
+void HostAssert(bool condition) {
+    if (!HostAssertHolds(condition)) throw nb::python_error();
 }
 
 void RaiseHost(nb::handle type, const char* message) {
@@ -82,8 +86,12 @@ void RaiseHost(nb::handle type, const char* message) {
 
 // As `raise type(value)`: the host takes a tuple for several arguments otherwise.
 void RaiseHost(nb::handle type, nb::handle value) {
-    const nb::object error = nb::borrow(type)(value);
-    PyErr_SetObject(type.ptr(), error.ptr());
+    RaiseHostError(nb::borrow(type)(value));
+}
+
+void RaiseHostError(nb::handle error) {
+    if (!PyExceptionInstance_Check(error.ptr())) RaiseWrongType("an exception", error);
+    PyErr_SetObject(error.type().ptr(), error.ptr());
     throw nb::python_error();
 }
 
@@ -116,8 +124,7 @@ bool CHostError::Is(nb::handle type) const {
 }
 
 void CHostError::Raise() const {
-    PyErr_SetObject(reinterpret_cast<PyObject*>(Py_TYPE(_fValue.ptr())), _fValue.ptr());
-    throw nb::python_error();
+    RaiseHostError(_fValue);
 }
 
 CHandlingScope::CHandlingScope(const CHostError& error)
@@ -170,18 +177,6 @@ nb::object FindInDict(nb::handle dict_or_none, nb::handle key) {
     return nb::borrow(value);
 }
 
-std::string_view Utf8View(nb::handle text) {
-    Py_ssize_t size = 0;
-    if (PyUnicode_Check(text.ptr())) {
-        const char* const utf8 = PyUnicode_AsUTF8AndSize(text.ptr(), &size);
-        if (utf8 == nullptr) throw nb::python_error();
-        return {utf8, static_cast<size_t>(size)};
-    }
-    if (PyBytes_Check(text.ptr()))
-        return {PyBytes_AS_STRING(text.ptr()), static_cast<size_t>(PyBytes_GET_SIZE(text.ptr()))};
-    RaiseWrongType("str or bytes", text);
-}
-
 // text.h
 
 nb::object TextFromUtf8(std::string_view utf8) {
@@ -197,20 +192,35 @@ nb::object InternedText(std::string_view utf8) {
     return nb::steal<nb::object>(text);
 }
 
-std::string_view Utf8OfText(nb::handle text, std::string& storage) {
-    Py_ssize_t size = 0;
-    if (const char* const utf8 = PyUnicode_AsUTF8AndSize(text.ptr(), &size))
-        return {utf8, static_cast<size_t>(size)};
-    PyErr_Clear();
-    const nb::object bytes =
-        nb::steal<nb::object>(PyUnicode_AsEncodedString(text.ptr(), "utf-8", "surrogatepass"));
-    if (!bytes.is_valid()) throw nb::python_error();
-    storage = Utf8View(bytes);
-    return storage;
+namespace {
+
+std::string_view BytesView(nb::handle bytes) {
+    return {PyBytes_AS_STRING(bytes.ptr()), static_cast<size_t>(PyBytes_GET_SIZE(bytes.ptr()))};
 }
 
-std::string_view CUtf8::_ViewOf(nb::handle text) {
-    return PyUnicode_Check(text.ptr()) ? Utf8OfText(text, _fStorage) : Utf8View(text);
+nb::object BytesWithSurrogates(nb::handle text) {
+    if (!PyErr_ExceptionMatches(PyExc_UnicodeEncodeError)) throw nb::python_error();
+    PyErr_Clear();
+    PyObject* const bytes = PyUnicode_AsEncodedString(text.ptr(), "utf-8", "surrogatepass");
+    if (bytes == nullptr) throw nb::python_error();
+    return nb::steal<nb::object>(bytes);
+}
+
+}  // namespace
+
+CUtf8::CUtf8(nb::handle text) {
+    if (PyBytes_Check(text.ptr())) {
+        _fView = BytesView(text);
+        return;
+    }
+    if (!PyUnicode_Check(text.ptr())) RaiseWrongType("str or bytes", text);
+    Py_ssize_t size = 0;
+    if (const char* const utf8 = PyUnicode_AsUTF8AndSize(text.ptr(), &size)) {
+        _fView = {utf8, static_cast<size_t>(size)};
+        return;
+    }
+    _fMade = BytesWithSurrogates(text);
+    _fView = BytesView(_fMade);
 }
 
 // neighbour_call.h

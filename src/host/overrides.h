@@ -1,8 +1,7 @@
 // Operations that a host subclass may override.
 //   in     a class with virtual operations, and beside it a mixin that lists them
 //   out    native code that calls an operation reaches the override of a host subclass, at every depth; the
-//   bound
-//          operation is the class's own, so that super() reaches the base exactly once
+//          bound operation is the class's own, so that super() reaches the base exactly once
 //
 // A mixin reads
 //     template <class Class>

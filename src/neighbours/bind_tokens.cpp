@@ -1,5 +1,3 @@
-#include <deque>
-#include <string>
 #include <vector>
 
 #include "host/collections.h"
@@ -16,11 +14,10 @@ using namespace nb::literals;
 namespace {
 
 nb::object HostFindMatchOrCaseType(nb::tuple toks, Py_ssize_t first, Py_ssize_t end) {
-    std::vector<std::string_view> texts;
-    std::deque<std::string> storage;  // of tokens with lone surrogates
-    for (nb::handle tok : toks)
-        texts.push_back(tok.is_none() ? std::string_view() : Utf8OfText(tok, storage.emplace_back()));
-    return HostText(FindMatchOrCaseType(texts, first, end));
+    std::vector<CUtf8> texts;
+    for (nb::handle tok : toks) texts.push_back(tok.is_none() ? CUtf8() : CUtf8(tok));
+    const std::vector<std::string_view> views(texts.begin(), texts.end());
+    return HostText(FindMatchOrCaseType(views, first, end));
 }
 
 }  // namespace
@@ -35,9 +32,8 @@ void BindTokenTypes(nb::module_& module) {
         "The token type, an integer, of a token text (text or byte string): 1 for a name, 54 for what is no "
         "token.");
     module.def("FindMatchOrCaseType", &HostFindMatchOrCaseType, "toks"_a, "first"_a, "end"_a,
-               "The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form the "
-               "header of\n"
-               "such a statement (PEP 634), kUnknown when the word is a name.");
+               "The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form\n"
+               "the header of such a statement (PEP 634), kUnknown when the word is a name.");
 }
 
 }  // namespace codeloom

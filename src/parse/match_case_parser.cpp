@@ -198,10 +198,7 @@ Py_ssize_t CMatchCaseStatementParser::_FindOrEnd(const char* tok, Py_ssize_t sta
 }
 
 void CMatchCaseStatementParser::_FailAt(Py_ssize_t error_i) {
-    const nb::object error = _ParseExceptionAt(error_i);
-    if (!PyExceptionInstance_Check(error.ptr())) RaiseWrongType("an exception", error);
-    PyErr_SetObject(error.type().ptr(), error.ptr());
-    throw nb::python_error();
+    RaiseHostError(_ParseExceptionAt(error_i));
 }
 
 void BindMatchCaseParser(nb::module_& module) {

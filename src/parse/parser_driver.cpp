@@ -23,9 +23,9 @@ nb::dict TokenNames() {
     nb::dict names;
     const nb::dict constants = nb::borrow<nb::dict>(HomeModule().attr("_fastaccess").attr("__dict__"));
     for (auto [name, value] : constants) {
-        const std::string_view text = Utf8View(name);
-        if (text.starts_with(kNamePrefix) && nb::isinstance<nb::int_>(value))
-            names[value] = TextFromUtf8(text.substr(kNamePrefix.size()));
+        const CUtf8 text(name);
+        if (text->starts_with(kNamePrefix) && nb::isinstance<nb::int_>(value))
+            names[value] = TextFromUtf8(text->substr(kNamePrefix.size()));
     }
     return names;
 }
@@ -48,7 +48,7 @@ nb::object PathOfGrammar(nb::object grammar_file) {
 nb::dict KeywordsOf(nb::object keyword_seq) {
     if (keyword_seq.is_none()) keyword_seq = HomeModule().attr("keyword").attr("kwlist");
     nb::dict keywords;
-    for (nb::handle keyword : keyword_seq) keywords[InternedText(Utf8View(keyword))] = nb::none();
+    for (nb::handle keyword : keyword_seq) keywords[InternedText(CUtf8(keyword))] = nb::none();
     return keywords;
 }
 
@@ -152,9 +152,7 @@ Py_ssize_t CPGenParserImpl::_NonNestedFindTokenIndex(nb::object target, nb::tupl
 }
 
 void CPGenParserImpl::_RaiseParseError(nb::handle tok_i) {
-    const nb::object error = kParseError("syntax error", nb::none(), nb::none(), tok_i);
-    PyErr_SetObject(error.type().ptr(), error.ptr());
-    throw nb::python_error();
+    RaiseHostError(kParseError("syntax error", nb::none(), nb::none(), tok_i));
 }
 
 void CPGenParserImpl::_AddTokenList(nb::list toks, Py_ssize_t tok_i) {

@@ -5,7 +5,7 @@
 
 #include <nanobind/nanobind.h>
 
-#include "neighbours/strutils/text.h"
+#include "host/text.h"
 
 namespace codeloom {
 
@@ -13,13 +13,13 @@ using namespace nb::literals;
 
 // A pointer argument, given as a byte or text string.
 struct CUtf8Argument {
-    CUtf8Text text;
+    CUtf8 text;
 
-    const char* Pointer() const { return text.View().data(); }
+    const char* Pointer() const { return text->data(); }
 
     // ValueError, which names the argument, unless `size` bytes are there.
     void Require(const char* name, Py_ssize_t size) const {
-        const auto available = static_cast<Py_ssize_t>(text.View().size());
+        const auto available = static_cast<Py_ssize_t>(text->size());
         if (size >= 0 && size <= available) return;
         PyErr_Format(PyExc_ValueError, "%s %zd lies outside the buffer of %zd bytes", name, size, available);
         throw nb::python_error();
@@ -49,7 +49,7 @@ struct type_caster<codeloom::CUtf8Argument> {
     bool from_python(handle source, uint32_t, cleanup_list*) noexcept {
         if (!PyBytes_Check(source.ptr()) && !PyUnicode_Check(source.ptr())) return false;
         try {
-            value.text = codeloom::CUtf8Text(source);
+            value.text = codeloom::CUtf8(source);
             return true;
         } catch (const std::exception&) {
             PyErr_Clear();

@@ -49,9 +49,8 @@ void BindStringPrimitives(nb::module_& module) {
     module.def(
         "OrdAt", [](nb::handle s, Py_ssize_t i) { return CheckedResult(OrdAt(s, i), -1L); }, "s"_a.none(),
         "i"_a, nb::sig("def OrdAt(s: bytes | str, i: int) -> int"),
-        "The byte of a byte string or the code point of a text string at index `i`, from the end if "
-        "negative.\n"
-        "IndexError outside the string, TypeError for anything else.");
+        "The byte of a byte string or the code point of a text string at index `i`, from the end if\n"
+        "negative. IndexError outside the string, TypeError for anything else.");
     module.def(
         "Utf8Concat2", [](nb::handle s0, nb::handle s1) { return Utf8Concat2(s0, s1); }, "s0"_a.none(),
         "s1"_a.none(), nb::sig("def Utf8Concat2(s0: bytes | str | None, s1: bytes | str | None) -> bytes"),

@@ -7,6 +7,7 @@
 #include "host/binding.h"
 #include "neighbours/bind.h"
 #include "neighbours/fastaccess/string_tokens.h"
+#include "neighbours/strutils/text.h"
 #include "strutils/arguments.h"
 
 namespace codeloom {
@@ -17,7 +18,7 @@ namespace {
 class CStringTokenizer : public CHosted {
   public:
     void Init(CUtf8Argument utf8) {
-        _fText.assign(utf8.text.View());
+        _fText.assign(utf8.text);
         _fTokens.emplace(_fText);
     }
 
@@ -30,9 +31,8 @@ class CStringTokenizer : public CHosted {
 
 constexpr const char* kStringTokenizerDoc =
     "The tokens of a piece of Python text, one after the other.\n\n"
-    "CStringTokenizer(utf8) stands on the first token of a byte or text string; comments and blanks, row "
-    "ends\n"
-    "among them, are no tokens.";
+    "CStringTokenizer(utf8) stands on the first token of a byte or text string; comments and blanks, row\n"
+    "ends among them, are no tokens.";
 
 constexpr const char* kNonNestedSearchDoc =
     "A search for bytes that lie outside brackets and string literals of Python source.\n\n"
@@ -78,10 +78,10 @@ void BindNonNestedSearch(nb::module_& module) {
             "to_search"_a.none(), "to_find_bytes"_a.none(), "start"_a, "end"_a,
             nb::sig(
                 "def InitWith(self, to_search: object, to_find_bytes: bytes, start: int, end: int) -> int"),
-            "Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything else, "
-            "None\n"
-            "included, leaves the search idle. Returns 0. TypeError for a subclass of either or when\n"
-            "`to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside the text.")
+            "Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything\n"
+            "else, None included, leaves the search idle. Returns 0. TypeError for a subclass of either\n"
+            "or when `to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside\n"
+            "the text.")
         .def(
             "FindNext",
             [](CNonNestedSearch& search) { return CheckedResult(search.FindNext(), Py_ssize_t{-2}); },

@@ -1,12 +1,11 @@
 #include "neighbours/logicalline/logical_builder.h"
 
-#include <string>
-
 #include "host/text.h"
 #include "neighbours/logicalline/logical_line.h"
 #include "neighbours/logicalline/logical_types_host.h"
 #include "neighbours/logicalline/token_texts.h"
 #include "neighbours/token_type.h"
+#include "neighbours/tokenizer/tokenizer.h"
 
 namespace codeloom {
 
@@ -45,8 +44,8 @@ nb::object BuildLogical(const CRawLogical& raw) {
 }  // namespace
 
 nb::list GetLogicalsFromText(nb::str text) {
-    std::string storage;
-    CTokenizer tokenizer(Utf8OfText(text, storage));
+    const CUtf8 utf8(text);
+    CTokenizer tokenizer(utf8);
     nb::list logicals;
     CRawLogical raw;
     while (tokenizer.NextLogical(raw)) logicals.append(BuildLogical(raw));

@@ -11,7 +11,7 @@
 
 #include "host/binding.h"
 #include "host/collections.h"
-#include "neighbours/tokenizer/tokenizer.h"
+#include "neighbours/tokenizer/raw_logical.h"
 
 namespace codeloom {
 

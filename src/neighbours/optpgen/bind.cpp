@@ -16,29 +16,25 @@ namespace {
 constexpr const char* kParserGeneratorDoc =
     "Reads a grammar file.\n\n"
     "ParserGenerator(grammar_file, tok_number2name, op_text2number): the path of a grammar text in pgen\n"
-    "notation, a dict from token type (int) to its name (str), and one from operator text "
-    "(str) to\n"
-    "token type. The first rule is the start symbol. Raises OSError when the file can't be read, and "
-    "ValueError\n"
+    "notation, a dict from token type (int) to its name (str), and one from operator text (str) to token\n"
+    "type. The first rule is the start symbol. Raises OSError when the file can't be read, and ValueError\n"
     "with file, row and reason when it is no grammar.";
 
 constexpr const char* kMakeGrammarDoc =
     "The Grammar that the file defines.\n\n"
-    "Raises ValueError with file, row and reason on an unknown name or operator, a rule that is defined "
-    "twice,\n"
-    "can be empty or begins with itself, and a choice that the next token alone doesn't decide.";
+    "Raises ValueError with file, row and reason on an unknown name or operator, a rule that is defined\n"
+    "twice, can be empty or begins with itself, and a choice that the next token alone doesn't decide.";
 
 constexpr const char* kGrammarDoc =
     "The rules of a grammar, as tables that a parser runs on. ParserGenerator.make_grammar makes it.";
 
 constexpr const char* kParserImplDoc =
     "The parser that runs on a grammar's tables.\n\n"
-    "ParserImpl(grammar, node_converter=None, promotesinglechild=True): a NodeConverter makes the nodes; "
-    "None\n"
-    "stands for one that gives tuples (type, value, context, children). With promotesinglechild a rule that "
-    "has a\n"
-    "single child is replaced by that child. Each parse is setup, addtoken for each token, finish; after an\n"
-    "exception the next setup begins anew. The operations can't be called from within one another.";
+    "ParserImpl(grammar, node_converter=None, promotesinglechild=True): a NodeConverter makes the nodes;\n"
+    "None stands for one that gives tuples (type, value, context, children). With promotesinglechild a\n"
+    "rule that has a single child is replaced by that child. Each parse is setup, addtoken for each\n"
+    "token, finish; after an exception the next setup begins anew. The operations can't be called from\n"
+    "within one another.";
 
 void BindGrammar(nb::module_& module) {
     nb::class_<CGrammar>(module, "Grammar", Collected<CGrammar>(), kGrammarDoc)

@@ -55,13 +55,13 @@ std::string CGrammar::Repr() const {
 
 void ParserGenerator::Init(nb::object grammar_file, nb::dict tok_number2name, nb::dict op_text2number) {
     for (auto [number, name] : tok_number2name)
-        _fTokenTypes.type_of_name.insert_or_assign(std::string(Utf8View(name)),
+        _fTokenTypes.type_of_name.insert_or_assign(std::string(CUtf8(name)),
                                                    ResultFromHost<int>(nb::borrow<nb::object>(number)));
     for (auto [text, number] : op_text2number)
-        _fTokenTypes.type_of_operator.insert_or_assign(std::string(Utf8View(text)),
+        _fTokenTypes.type_of_operator.insert_or_assign(std::string(CUtf8(text)),
                                                        ResultFromHost<int>(nb::borrow<nb::object>(number)));
     const nb::bytes text = ReadFile(grammar_file);
-    _fText = ReadGrammarText(std::string(Utf8View(nb::str(grammar_file))), {text.c_str(), text.size()});
+    _fText = ReadGrammarText(std::string(CUtf8(nb::str(grammar_file))), {text.c_str(), text.size()});
 }
 
 CRef<CGrammar> ParserGenerator::make_grammar() const {

@@ -27,12 +27,10 @@ class TNodeConverterOperations : public Class {
     OPERATION(
         convert,
         "Make the node of a token or of a rule; what it returns is what the rule above gets as a child.\n\n"
-        "Called once for each token that the grammar takes, with its type (int), text (str) and context "
-        "(any\n"
-        "object) and None as children, and once for each rule that is complete, with the rule's number, "
-        "None\n"
-        "as value, the context of its first token and the list of its children. This one returns the tuple\n"
-        "(type, value, context, children).",
+        "Called once for each token that the grammar takes, with its type (int), text (str) and context\n"
+        "(any object) and None as children, and once for each rule that is complete, with the rule's\n"
+        "number, None as value, the context of its first token and the list of its children. This one\n"
+        "returns the tuple (type, value, context, children).",
         "grammar"_a.none(), "type"_a, "value"_a.none(), "context"_a.none(), "children"_a.none())
     END_OPERATIONS
 };

@@ -2,6 +2,8 @@
 
 #include <nanobind/eval.h>
 
+#include "host/errors.h"
+
 namespace codeloom {
 
 namespace {
@@ -41,9 +43,7 @@ void BindParseError(nb::module_& module) {
 }
 
 void RaiseParseError(const char* msg, nb::handle type, nb::handle value, nb::handle context) {
-    const nb::object error = nb::handle(gParseError)(msg, type, value, context);
-    PyErr_SetObject(gParseError, error.ptr());
-    throw nb::python_error();
+    RaiseHostError(nb::handle(gParseError)(msg, type, value, context));
 }
 
 }  // namespace codeloom

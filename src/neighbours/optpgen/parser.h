@@ -35,10 +35,9 @@ class TParserOperations : public Class {
     OPERATION(
         addtoken,
         "Feed one token; True when the start symbol is complete.\n\n"
-        "`type` (int) is the token type, `value` (str or None) the token's text and `context` any object: "
-        "it\n"
-        "goes into the nodes, and into the ParseError that is raised on a token which the grammar refuses.\n"
-        "Raises RuntimeError when no parse is going on.",
+        "`type` (int) is the token type, `value` (str or None) the token's text and `context` any object:\n"
+        "it goes into the nodes, and into the ParseError that is raised on a token which the grammar\n"
+        "refuses. Raises RuntimeError when no parse is going on.",
         "type"_a, "value"_a.none(), "context"_a.none())
     OPERATION(
         finish,

@@ -22,9 +22,8 @@ void BindStrutils(nb::module_& module) {
     module.def(
         "AsUtf8", [](nb::handle text) { return AsUtf8(text); }, "text"_a.none(),
         nb::sig("def AsUtf8(text: bytes | str) -> bytes"),
-        "The UTF-8 bytes of a text string, lone surrogates in three bytes; a byte string as it is. "
-        "TypeError\n"
-        "for anything else.");
+        "The UTF-8 bytes of a text string, lone surrogates in three bytes; a byte string as it is.\n"
+        "TypeError for anything else.");
     module.def(
         "AsStr", [](nb::handle text) { return AsStr(text); }, "text"_a.none(),
         nb::sig("def AsStr(text: bytes | str) -> str"),
@@ -45,9 +44,8 @@ void BindStrutils(nb::module_& module) {
     module.def(
         "Utf8Len", [](nb::handle text) { return Utf8Len(text); }, "text"_a.none(),
         nb::sig("def Utf8Len(text: bytes | str) -> int"),
-        "Of a UTF-8 byte string the number of its characters, each byte but a continuation byte counting as "
-        "one;\n"
-        "of a text string the number of its UTF-8 bytes.");
+        "Of a UTF-8 byte string the number of its characters, each byte but a continuation byte counting\n"
+        "as one; of a text string the number of its UTF-8 bytes.");
     module.def(
         "IsUtf8LeadByte",
         [](CByteArgument byte) { return IsUtf8LeadByte(static_cast<unsigned char>(byte.byte)); }, "byte"_a,

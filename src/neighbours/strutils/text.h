@@ -13,20 +13,6 @@ namespace nb = nanobind;
 
 namespace codeloom {
 
-// The UTF-8 bytes of a text or byte string. They lie in the string itself, which the caller keeps alive; only
-// for a text with lone surrogates they are made and kept here. TypeError for anything else.
-class CUtf8Text {
-  public:
-    CUtf8Text() = default;
-    explicit CUtf8Text(nb::handle text);
-
-    std::string_view View() const { return _fView; }
-
-  private:
-    nb::object _fMade;
-    std::string_view _fView;
-};
-
 // The UTF-8 bytes of a text string as a byte string; a byte string as it is. TypeError for anything else.
 nb::object AsUtf8(nb::handle text);
 

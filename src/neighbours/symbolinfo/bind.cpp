@@ -91,33 +91,30 @@ Py_ssize_t HostNextIndex(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize
 
 nb::object HostEncodeStringLiteral(const CUtf8Argument& text) {
     std::string storage;
-    return BytesOf(EncodeStringLiteral(text.text.View(), storage));
+    return BytesOf(EncodeStringLiteral(text.text, storage));
 }
 
 nb::object HostJoinTokens(nb::handle tokens) {
     const nb::list kept(nb::borrow(tokens));
-    std::vector<CUtf8Text> texts;
-    for (nb::handle token : kept) texts.emplace_back(token);
-    std::vector<std::string_view> pieces;
-    pieces.reserve(texts.size());
-    for (const CUtf8Text& text : texts) pieces.push_back(text.View());
-    return BytesOf(JoinTokens(pieces));
+    const std::vector<CUtf8> texts(kept.begin(), kept.end());
+    const std::vector<std::string_view> views(texts.begin(), texts.end());
+    return BytesOf(JoinTokens(views));
 }
 
 void BindRecordFunctions(nb::module_& module) {
     module.def(
         "BuildLiteralInfo",
         [](const CUtf8Argument& type_name, nb::handle text) {
-            return BuildLiteralInfo(type_name.text.View(), text);
+            return BuildLiteralInfo(type_name.text, text);
         },
         "type_name"_a, "text"_a.none(),
         nb::sig("def BuildLiteralInfo(type_name: bytes | str, text: bytes | str | None) -> bytes"),
         "The record of a literal of this type with this text; None when the text isn't known.");
     module.def("EncodeStringLiteral", &HostEncodeStringLiteral, "text"_a,
                nb::sig("def EncodeStringLiteral(text: bytes | str) -> bytes"),
-               "The text of a string literal with its prefix and quotes on one row: what ends rows is "
-               "written as an\n"
-               "escape, and a continued row is joined. The value is the same, but for raw strings.");
+               "The text of a string literal with its prefix and quotes on one row: what ends rows is\n"
+               "written as an escape, and a continued row is joined. The value is the same, but for raw\n"
+               "strings.");
     module.def("JoinTokens", &HostJoinTokens, "tokens"_a,
                nb::sig("def JoinTokens(tokens: collections.abc.Iterable[bytes | str]) -> bytes"),
                "Tokens, or texts of expressions, joined with blanks as a formatter would.");
@@ -130,14 +127,12 @@ void BindRecordFunctions(nb::module_& module) {
 void BindScopeFunctions(nb::module_& module) {
     module.def(
         "EnsureScopeNameIndicies",
-        [](const CUtf8Argument& scope) { return TextFromUtf8(EnsureScopeNameIndicies(scope.text.View())); },
+        [](const CUtf8Argument& scope) { return TextFromUtf8(EnsureScopeNameIndicies(scope.text)); },
         "scope"_a, nb::sig("def EnsureScopeNameIndicies(scope: bytes | str) -> str"),
         "A scope with an index behind every name: \"A#1.f\" gives \"A#1.f#0\".");
     module.def(
         "GetInstanceNameForClass",
-        [](const CUtf8Argument& cls_name) {
-            return TextFromUtf8(GetInstanceNameForClass(cls_name.text.View()));
-        },
+        [](const CUtf8Argument& cls_name) { return TextFromUtf8(GetInstanceNameForClass(cls_name.text)); },
         "cls_name"_a, nb::sig("def GetInstanceNameForClass(cls_name: bytes | str) -> str"),
         "The name that stands for an instance of a class: \"list\" gives \"list:\". The index of a first\n"
         "definition, \"#0\", is left out.");

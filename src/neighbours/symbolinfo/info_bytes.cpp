@@ -1,5 +1,6 @@
 #include "neighbours/symbolinfo/info_bytes.h"
 
+#include "host/text.h"
 #include "neighbours/strutils/text.h"
 #include "symbolinfo/scoped_text.h"
 #include "symbolinfo/vocabulary.h"
@@ -40,8 +41,8 @@ void AppendName(std::string& scope, std::string_view name) {
 
 nb::object BuildLiteralInfo(std::string_view type_name, nb::handle text) {
     if (text.is_none()) return JoinUtf8({kTypedLiteralPrefix, type_name, kClassInstanceSuffix});
-    const CUtf8Text utf8(text);
-    return JoinUtf8({kTypedLiteralPrefix, type_name, kClassInstanceSuffix, " ", utf8.View()});
+    const CUtf8 utf8(text);
+    return JoinUtf8({kTypedLiteralPrefix, type_name, kClassInstanceSuffix, " ", utf8});
 }
 
 std::string EnsureScopeNameIndicies(std::string_view scope) {
