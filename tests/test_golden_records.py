@@ -9,7 +9,6 @@ versions differ, each has its own records.
 import re
 from contextlib import redirect_stdout
 from io import StringIO
-from itertools import groupby
 from pathlib import Path
 
 import pytest
@@ -61,11 +60,21 @@ def Output(source):
             for logical, (version, analyzer) in zip(logicals, ANALYZERS.items(), strict=True)
         ]
         rows += TextFromTokens(logicals[0]).strip().splitlines()
-        sections = [(list(same), outcome) for outcome, same in groupby(outcomes, key=lambda pair: pair[1])]
-        for same, outcome in sections:
-            rows += [f"  {version}" for version, _ in same if len(sections) > 1]
-            rows += [f"    {row}" for row in outcome]
+        rows += Sections(outcomes)
     return "\n".join(rows)
+
+
+def Sections(outcomes):
+    """The rows of the outcomes, once where they are equal, otherwise each behind its version."""
+    if all(outcome == outcomes[0][1] for _, outcome in outcomes):
+        return [f"    {row}" for row in outcomes[0][1]]
+    rows = []
+    for version, outcome in outcomes:
+        if len(outcome) == 1:
+            rows.append(f"  {version} {outcome[0]}")
+        else:
+            rows += [f"  {version}", *(f"      {row}" for row in outcome)]
+    return rows
 
 
 @pytest.mark.parametrize("case", CASES)
