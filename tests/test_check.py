@@ -4,7 +4,7 @@ import threading
 
 import pytest
 
-from codeloom import check
+from codeloom import engine
 from codeloom.check import CheckFile, CheckText, Problem
 
 
@@ -134,7 +134,7 @@ def test_a_walk_that_hits_a_limit_prints_nothing(capfd):
 
 
 def test_a_line_that_is_too_long_is_told(monkeypatch):
-    monkeypatch.setattr(check, "MOST_TOKENS", 5)
+    monkeypatch.setattr(engine, "MOST_TOKENS", 5)
     (problem,) = CheckText("if x:\n\ty = 1 + 1 + )\nz = 1")
     assert (problem.row, problem.column) == (2, 2)
     assert "7 tokens" in problem.message and "split it" in problem.message
