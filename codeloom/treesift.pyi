@@ -1453,6 +1453,32 @@ class CNodeWalker:
         ...
 
     @property
+    def _fIncludeExprText(self) -> bool:
+        """
+        True when literals of numbers and strings are recorded with their text.
+        """
+
+    @_fIncludeExprText.setter
+    def _fIncludeExprText(self, arg: bool, /) -> None:
+        ...
+
+    @property
+    def _fIncludeOperatorExpressions(self) -> bool:
+        """False keeps _TypeEquivForOperatorExpression from giving anything."""
+
+    @_fIncludeOperatorExpressions.setter
+    def _fIncludeOperatorExpressions(self, arg: bool, /) -> None:
+        ...
+
+    @property
+    def _fMaxOperatorExpressionLength(self) -> int:
+        """Kept for hosts; the limit of 120 bytes doesn't follow it."""
+
+    @_fMaxOperatorExpressionLength.setter
+    def _fMaxOperatorExpressionLength(self, arg: int, /) -> None:
+        ...
+
+    @property
     def _fPy3(self) -> bool:
         """True when the analysed language level is 3.0 or later."""
 
@@ -1460,16 +1486,193 @@ class CNodeWalker:
     def _fPy3(self, arg: bool, /) -> None:
         ...
 
+    @property
+    def _fToText(self) -> CNodeToTextConverterImpl | None:
+        """The converter for all text that is recorded."""
+
     def Walk(self, node: CNode | None | None, logical: codeloom._neighbours.CLogicalLine) -> None:
         """
-        Walk the tree of a logical line and record on the line what it says. ValueError while a walk is under way.
+        Walk the tree of a logical line and record on the line what it says. A walk of too many visits or too deep ends with a line on the standard output. ValueError while a walk is under way, SyntaxError for what parses but isn't allowed.
+        """
+
+    def _ProcessNamesFound(self, node: CNode) -> None:
+        """
+        Record the names read, then those bound within sub-expressions. `node` is the root; an import reads nothing.
         """
 
     def _VisitChildren(self, node: CNode) -> None:
         """Visit each direct child, in order."""
 
+    def _RaiseIfNotInstance(self, node: object | None, cls: object) -> None:
+        """ValueError unless `node` is an instance of `cls`."""
+
     def _VisitNode(self, node: CNode) -> None:
-        """Visit a node: count, limit, dispatch."""
+        """
+        Visit a node: count, limit, dispatch by its class. RuntimeError beyond 10000 visits or a depth of 40.
+        """
+
+    def _VisitStoreContextNode(self, node: CNode, within_sub_expr: bool=False) -> None:
+        """
+        Visit a target. With `within_sub_expr` its names are bound within a sub-expression of the line: a comprehension, a lambda.
+        """
+
+    def _VisitLoadContextNode(self, node: CNode) -> None:
+        """Visit a value, be it below a target."""
+
+    def _VisitCompForNode(self, node: CCompForNode) -> None:
+        """A `for` clause of a comprehension and the clauses behind it."""
+
+    def _VisitNameLiteral(self, node: CNameLiteral, atom_node: CNode | None | None=None, all_trailers: list[CNode] | None=None, trailer_i: int=-1) -> None:
+        """
+        A name: alone, or of a chain of `atom_node` and `all_trailers`, in the trailer at `trailer_i` or, with -1, as the atom itself.
+        """
+
+    def _VisitDottedName(self, node: CDottedName) -> None:
+        """Each prefix of `a.b.c` is read: `a`, `a.b`, `a.b.c`."""
+
+    def _ProcessLoadName(self, name: str | None | None) -> None:
+        """Note a name, a text string, as read."""
+
+    def _VisitImportNames(self, node: CImportNamesStmt) -> None:
+        """`import a.b` binds `a`, `import a.b as c` binds `c`."""
+
+    def _VisitFromImport(self, node: CFromImportStmt) -> None:
+        """`from m import a as b` binds `b`; a star is recorded as the name `*`."""
+
+    def _VisitExprStmt(self, node: CExprStmt) -> None:
+        """An assignment of one of the three forms."""
+
+    def _VisitWithItem(self, node: CWithItem) -> None:
+        """`a as b` of a `with`."""
+
+    def _VisitFuncdef(self, node: CFuncdefStmt) -> None:
+        """The header of a `def`; its body isn't visited."""
+
+    def _VisitLambdaExpr(self, node: CLambdaExpr) -> None:
+        """A lambda."""
+
+    def _ProcessLambdaDefiningArgList(self, arg_list: list[CArgInfo]) -> None:
+        """
+        The arguments of a lambda, a list of CArgInfo: bound within the expression.
+        """
+
+    def _VisitGlobalStmt(self, node: CGlobalStmt) -> None:
+        """Record each name of `global`."""
+
+    def _VisitNonlocalStmt(self, node: CNonlocalStmt) -> None:
+        """Record each name of `nonlocal`."""
+
+    def _VisitParameters(self, node: CParametersNode) -> None:
+        """The parameters of a `def`."""
+
+    def _ProcessDefiningArgList(self, arg_list: list[CArgInfo]) -> None:
+        """
+        Record the arguments of a `def`, a list of CArgInfo and, for the tuple parameters of Python 2, of such lists. AssertionError for any other item.
+        """
+
+    def _VisitAssignment(self, node: CExprStmt) -> None:
+        """`a = b = c`."""
+
+    def _VisitForStmt(self, node: CForStmt) -> None:
+        """A `for` line."""
+
+    def _ProcessTargets(self, lhs: CNode, rhs: CNode | None | None, extra_trailer: bytes | None | None=None) -> None:
+        """
+        Pair the names of a target with what they receive of `rhs`, be it ((a, b), c) = ... or a, *b = ... `extra_trailer`, bytes, tells which part of `rhs` the whole target receives.
+        """
+
+    def _VisitAugAssign(self, node: CExprStmt) -> None:
+        """`a += b`: both are read, nothing is bound."""
+
+    def _VisitAnnotatedAssign(self, node: CExprStmt) -> None:
+        """`a: b = c`; without a value nothing is bound."""
+
+    def _VisitReturn(self, return_stmt: CReturnStmt) -> None:
+        """Record the value under the name "return"."""
+
+    def _VisitYield(self, yield_expr: CYieldExpr) -> None:
+        """Record the value under the name "yield"."""
+
+    def _VisitPower(self, node: CPower) -> None:
+        """A power, and in the 2.7 grammar any chain."""
+
+    def _VisitAtomExpr(self, node: CAtomExpr) -> None:
+        """A chain."""
+
+    def _VisitAtomPlusTrailers(self, atom_node: CNode, all_trailers: list[CNode]) -> None:
+        """An atom and its trailers, from left to right."""
+
+    def _VisitCall(self, atom: CNode, prev_trailers: list[CNode], arglist: CNode) -> None:
+        """The call of what an atom and the trailers behind it give."""
+
+    def _ProcessFunctionCall(self, func_name: bytes | None | None, arg_list: list[CArgInfo]) -> None:
+        """
+        Visit the arguments of a call, a list of CArgInfo, and record the call of `func_name`, UTF-8 or None. SyntaxError for a bare generator beside another argument.
+        """
+
+    def _VisitSingleDecorator(self, node: CSingleDecorator) -> None:
+        """A decorator, which is a call also without brackets."""
+
+    def _ProcessIsInstanceCall(self, arg_list: list[CArgInfo]) -> None:
+        """Record what `isinstance(a, b)` says of `a`."""
+
+    def _VisitClassdef(self, classdef_node: CClassdefStmt) -> None:
+        """The header of a class; its body isn't visited."""
+
+    def _VisitExceptClause(self, exc_clause: CExceptClause) -> None:
+        """An `except` line. SyntaxError for a target that isn't a name."""
+
+    def _AppendEquivNode(self, name_node: CNode, equiv_node: CNode | None | None, extra_trailer: bytes | None | None=None) -> None:
+        """
+        Record a name as bound, unless its text holds "[", and what its value stands for.
+        """
+
+    def _AppendSubscriptedEquivNode(self, name_node: CNode, equiv_node: CNode | None | None, subscript: int=-1) -> None:
+        """
+        Record a name as bound, and as the item `subscript` of a value; -1 is any item.
+        """
+
+    def _AddNodeInfoStr(self, name_node: CNode, istr: str | bytes | None | None) -> None:
+        """Record `istr` for the name that a node shows."""
+
+    def _TypeEquivForNode(self, node: CNode, extra_trailer: bytes | None | None=None) -> bytes | None:
+        """
+        What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, stands behind it where a part of the value is meant.
+        """
+
+    def _TypeEquivForOperatorExpression(self, op_expr: COperatorExpression) -> bytes | None:
+        """
+        An operator expression with each operand replaced by what it stands for; None when one of them can't be told.
+        """
+
+    def _VisitNamedExpr(self, node: CNode) -> None:
+        """
+        `a := b`, as an expression or as an argument. AssertionError for others.
+        """
+
+    def _VisitCaseStmt(self, case_stmt: CCaseStmt) -> None:
+        """A `case` line."""
+
+    def _VisitMatchStmt(self, match_stmt: CMatchStmt) -> None:
+        """A `match` line."""
+
+    def _VisitPatternNode(self, pattern_node: CPatternNode) -> None:
+        """A pattern: captures are bound, values and classes are read."""
+
+    def _VisitTypeParameter(self, type_param: CTypeParameter) -> None:
+        """A type parameter (PEP 695)."""
+
+    def _AddNameDefined(self, name: str | bytes) -> None:
+        """Record a name, text or UTF-8, as bound."""
+
+    def _AddArgNameDefined(self, name: str | bytes) -> None:
+        """Record a name, text or UTF-8, as an argument."""
+
+    def _AddTypeEquiv(self, name: str | bytes, equiv: str | bytes) -> None:
+        """Append a record, text or UTF-8, to the line's; without a line nothing."""
+
+    def _AddArgInfoBytes(self, name: str | bytes, ibytes: str | bytes) -> None:
+        """Append a record, text or UTF-8, to those of the line's arguments."""
 
 class CDispatchWalker:
     """

@@ -1,5 +1,5 @@
-// An object of the host that may be none, with the kind in its type and in the host's signatures:
-// TOrNone<nb::str> reads `str | None`.
+// Objects of the host that may be of more than one kind, none among them, with the kinds in the type and in
+// the host's signatures: TOrNone<nb::str> reads `str | None`.
 #pragma once
 
 #include <nanobind/nanobind.h>
@@ -21,7 +21,24 @@ class TOrNone : public nb::object {
     static bool check_(nb::handle value) { return value.is_none() || nb::isinstance<Kind>(value); }
 };
 
+// A text string, or its UTF-8 form as a byte string.
+class CTextOrUtf8 : public nb::object {
+  public:
+    static constexpr auto Name = nb::detail::const_name("str | bytes");
+
+    CTextOrUtf8() = default;
+    CTextOrUtf8(nb::handle value) : nb::object(nb::borrow<nb::object>(value)) {}
+    CTextOrUtf8(nb::object value) : nb::object(std::move(value)) {}
+    CTextOrUtf8(nb::handle value, nb::detail::borrow_t) : nb::object(value, nb::detail::borrow_t()) {}
+    CTextOrUtf8(nb::handle value, nb::detail::steal_t) : nb::object(value, nb::detail::steal_t()) {}
+
+    static bool check_(nb::handle value) {
+        return nb::isinstance<nb::str>(value) || nb::isinstance<nb::bytes>(value);
+    }
+};
+
 using CTextOrNone = TOrNone<nb::str>;
 using CBytesOrNone = TOrNone<nb::bytes>;
+using CTextOrUtf8OrNone = TOrNone<CTextOrUtf8>;
 
 }  // namespace codeloom

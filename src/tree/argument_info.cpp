@@ -129,8 +129,12 @@ bool ArgumentFromHost(nb::handle candidate, CArgument& argument) {
         return ArgumentsFromHost(candidate, argument.tuple);
     }
     const CArgInfo* const info = TryInstance<CArgInfo>(candidate);
-    if (info != nullptr) argument = *info;
-    return info != nullptr;
+    if (info != nullptr) {
+        argument = *info;
+    } else {
+        argument.is_foreign = true;
+    }
+    return true;
 }
 
 }  // namespace

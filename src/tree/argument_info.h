@@ -24,6 +24,8 @@ struct CArgument {
     // A parameter of the old form that is a tuple of names in brackets has nothing but these.
     bool is_tuple = false;
     CArgumentList tuple;
+
+    bool is_foreign = false;  // stands for an item of a host's list that is no argument
 };
 
 // An argument as the host sees it. A tuple of parameters is a nested list there.
@@ -54,7 +56,8 @@ void BindArgumentInfo(nb::module_& module);
 // A new list of the host; an invalid handle, with a host exception pending, when it can't be made.
 nb::handle NewHostList(const CArgumentList& arguments) noexcept;
 
-// False, with `arguments` in any state, when `candidate` isn't a list of CArgInfo and of such lists.
+// False, with `arguments` in any state, when `candidate` isn't a list. Of its items CArgInfo and such lists
+// are arguments, and any other is foreign.
 bool ArgumentsFromHost(nb::handle candidate, CArgumentList& arguments) noexcept;
 
 }  // namespace codeloom

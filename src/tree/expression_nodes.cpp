@@ -120,9 +120,9 @@ CNodeRef CAtomExpr::GetAtom() {
     return fChildren.is_none() ? CNodeRef() : ChildAs<CNode>(_AtomIndex());
 }
 
-CNodeList CAtomExpr::GetTrailers() {
-    if (fChildren.is_none()) return nb::list();
-    return ListSlice(fChildren, _AtomIndex() + 1, _GetChildCount());
+CNodeRange CAtomExpr::GetTrailers() {
+    if (fChildren.is_none()) return CNodeRange();
+    return CNodeRange(fChildren, _AtomIndex() + 1, _GetChildCount());
 }
 
 Py_ssize_t CAtomExpr::_AtomIndex() {
@@ -136,13 +136,13 @@ CNodeRef CPower::GetAtom() {
     return atom_expr ? atom_expr->GetAtom() : ChildAs<CNode>(0);
 }
 
-CNodeList CPower::GetTrailers() {
+CNodeRange CPower::GetTrailers() {
     const CRef<CAtomExpr> atom_expr(ChildAt(0).As<CAtomExpr>());
     if (atom_expr) return atom_expr->GetTrailers();
     const Py_ssize_t child_count = _GetChildCount();
     Py_ssize_t end = 1;
     while (end < child_count && !IsToken(end, "**")) ++end;
-    return ListSlice(fChildren, 1, end);
+    return CNodeRange(fChildren, 1, end);
 }
 
 CNodeRef CPower::GetExponentNode() {

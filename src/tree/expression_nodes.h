@@ -3,7 +3,7 @@
 // was there: a lone child takes its parent's place.
 #pragma once
 
-#include "tree/node.h"
+#include "tree/node_range.h"
 
 namespace codeloom {
 
@@ -139,7 +139,7 @@ class CAtomExpr : public CExpression {
 
     virtual CNodeRef GetPrefix();
     virtual CNodeRef GetAtom();
-    virtual CNodeList GetTrailers();
+    virtual CNodeRange GetTrailers();
 
   private:
     Py_ssize_t _AtomIndex();
@@ -154,7 +154,7 @@ class CPower : public CExpression {
     using TOperations = TPowerOperations<Class>;
 
     virtual CNodeRef GetAtom();
-    virtual CNodeList GetTrailers();
+    virtual CNodeRange GetTrailers();
     virtual CNodeRef GetExponentNode();
 };
 

@@ -55,6 +55,23 @@ std::optional<std::vector<CNodeRef>> ExpandSeqLiteral(CNode& node) {
     return elements;
 }
 
+bool IsDottedName(CNode& node) {
+    const CNodeRef shown = DropSimpleParens(node);
+    if (shown->As<CNameLiteral>() != nullptr) return true;
+    if (CAtomExpr* const chain = shown->As<CAtomExpr>())
+        return !chain->GetPrefix() && IsDottedChain(*chain->GetAtom(), chain->GetTrailers());
+    CPower* const power = shown->As<CPower>();
+    return power != nullptr && !power->GetExponentNode() &&
+           IsDottedChain(*power->GetAtom(), power->GetTrailers());
+}
+
+bool IsDottedChain(CNode& atom, const CNodeRange& trailers) {
+    for (Py_ssize_t i = 0; i < trailers.Size(); ++i)
+        if (trailers.At<CTrailer>(i)->GetDotName().is_none()) return false;
+    // Brackets in front of a trailer aren't simple.
+    return trailers.Size() == 0 ? IsDottedName(atom) : atom.As<CNameLiteral>() != nullptr;
+}
+
 bool IsSetLiteral(CAtom& atom_node) {
     const bool is_filled_brace =
         TextIs(atom_node.GetInitialBracket(), "{") && atom_node._GetChildCount() == CAtom::kFilledChildCount;

@@ -16,6 +16,12 @@ CNodeRef DropSimpleParens(CNode& node);
 // element, which is empty.
 std::optional<std::vector<CNodeRef>> ExpandSeqLiteral(CNode& node);
 
+// True for a name and for a chain of names, `a.b.c`; for the first of them in brackets too.
+bool IsDottedName(CNode& node);
+
+// The same for an atom and the trailers behind it.
+bool IsDottedChain(CNode& atom, const CNodeRange& trailers);
+
 // True for `{a, b}`.
 bool IsSetLiteral(CAtom& atom_node);
 

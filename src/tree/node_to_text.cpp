@@ -84,14 +84,14 @@ nb::bytes CNodeToTextConverterImpl::_TextForStringLiteral(CStringLiteral& node) 
     return HostBytes(text);
 }
 
-CBytesOrNone CNodeToTextConverterImpl::TextForAtomPlusTrailers(CNode& atom, CNodeList trailers,
+CBytesOrNone CNodeToTextConverterImpl::TextForAtomPlusTrailers(CNode& atom, const CNodeRange& trailers,
                                                                bool dotted_name_only,
                                                                bool discard_simple_parens,
                                                                bool literal_only) {
     std::string text;
     const CNodeTextOptions options{dotted_name_only, discard_simple_parens, literal_only};
     const bool has_text =
-        CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(text, atom, std::move(trailers), options);
+        CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(text, atom, trailers, options);
     return has_text ? CBytesOrNone(HostBytes(text)) : CBytesOrNone();
 }
 
@@ -162,15 +162,15 @@ bool CNodeToTextConverterImpl::_AppendJoinedChildren(std::string& text, CNode& n
 // Chains
 
 bool CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(std::string& text, CNode& atom,
-                                                             CNodeList trailers,
+                                                             const CNodeRange& trailers,
                                                              const CNodeTextOptions& options) {
     // The brackets of `(a).b` are no longer simple.
-    const bool discard_simple_parens = options.discard_simple_parens && ListSize(trailers) == 0;
+    const bool discard_simple_parens = options.discard_simple_parens && trailers.Size() == 0;
     const CNodeTextOptions atom_options{options.dotted_name_only, discard_simple_parens,
                                         options.literal_only};
     if (!AppendTextForNode(text, atom, atom_options)) return false;
-    for (Py_ssize_t i = 0; i < ListSize(trailers); ++i) {
-        const CRef<CTrailer> trailer(Instance<CTrailer>(ListItem(trailers, i)));
+    for (Py_ssize_t i = 0; i < trailers.Size(); ++i) {
+        const CRef<CTrailer> trailer = trailers.At<CTrailer>(i);
         if (!_AppendTrailer(text, *trailer, options)) break;
     }
     return true;

@@ -51,7 +51,7 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
     CBytesOrNone TextForNode(CNode& node, bool dotted_name_only = false, bool discard_simple_parens = true,
                              bool literal_only = false, bool add_parens_if_operator = false) override;
     virtual nb::bytes _TextForStringLiteral(CStringLiteral& node);
-    virtual CBytesOrNone TextForAtomPlusTrailers(CNode& atom, CNodeList trailers,
+    virtual CBytesOrNone TextForAtomPlusTrailers(CNode& atom, const CNodeRange& trailers,
                                                  bool dotted_name_only = false,
                                                  bool discard_simple_parens = true,
                                                  bool literal_only = false);
@@ -60,7 +60,7 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
     // leaves `text` with an unfinished piece. A converter of a host subclass goes through its overrides.
     virtual bool AppendTextForNode(std::string& text, CNode& node, const CNodeTextOptions& options = {});
     virtual void AppendTextForStringLiteral(std::string& text, CStringLiteral& node);
-    virtual bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, CNodeList trailers,
+    virtual bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, const CNodeRange& trailers,
                                                const CNodeTextOptions& options = {});
 
     bool _fIncludeBracketText = false;     // what stands in `[...]`, `{...}` and `(...)`
@@ -100,7 +100,7 @@ class TNodeToTextConverterImplOperations : public TNodeToTextConverterOperations
     void AppendTextForStringLiteral(std::string& text, CStringLiteral& node) override {
         AppendHostText(text, this->_TextForStringLiteral(node));
     }
-    bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, CNodeList trailers,
+    bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, const CNodeRange& trailers,
                                        const CNodeTextOptions& options) override {
         return AppendHostText(
             text, this->TextForAtomPlusTrailers(atom, trailers, options.dotted_name_only,

@@ -1,20 +1,59 @@
 #include "walker/node_walker.h"
 
 #include "host/restore.h"
+#include "host/text.h"
+#include "host/errors.h"
+#include "neighbours/imported_names.h"
+#include "tree/node_helpers.h"
+#include "walker/dispatch.h"
 
 namespace codeloom {
 
 void CNodeWalker::Init(nb::tuple version_triple) {
     _fPy3 = version_triple >= nb::make_tuple(3, 0);
+    _fToText = MakeInstance<CNodeToTextConverterImpl>();
+    const nb::bool_ include_text(_fIncludeExprText);
+    _fToText->Init(include_text, include_text, include_text);
 }
+
+// The walk
 
 void CNodeWalker::Walk(CNodeRef node, CLogicalLine& logical) {
     if (_fLogical) RaiseWalkInProgress();
     if (!node) return;
-    const CRestoreOnExit idle_logical(_fLogical, CRef<CLogicalLine>(&logical));
-    const CRestoreOnExit idle_visits(_fVisitCount, 0);
-    const CRestoreOnExit idle_depth(_fRecurseCount, 0);
-    RunLimited([&] { _VisitNode(*node); });
+    _fLogical = CRef<CLogicalLine>(&logical);
+    _fLoadNameContext = true;
+    _fStoreWithinSubExpr = false;
+    const CCallOnExit idle([this] {
+        _fLogical.reset();
+        _fVisitCount = 0;
+        _fRecurseCount = 0;
+        _fNames.Clear();
+    });
+    RunLimited([&] {
+        _VisitNode(*node);
+        _ProcessNamesFound(*node);
+    });
+}
+
+void CNodeWalker::_ProcessNamesFound(CNode& node) {
+    if (node.As<CImportNamesStmt>() != nullptr || node.As<CFromImportStmt>() != nullptr) return;
+    _fNames.VisitLoads([this](nb::handle name) {
+        HostAssert(!name.is_none());
+        _AddTypeEquiv(name, gPrefixes.kGetPrefix);
+    });
+    _fNames.VisitStores([this](nb::handle name, nb::handle equiv) {
+        HostAssert(!name.is_none());
+        _AddTypeEquiv(name, equiv);
+    });
+}
+
+void CNodeWalker::_VisitNode(CNode& node) {
+    if (++_fVisitCount > kMaxVisits) RaiseTooManyVisits();
+    // Left too high when the limit is hit, which ends the walk.
+    if (++_fRecurseCount > kMaxRecurseCount) RaiseTooDeep();
+    const CCallOnExit up_again([this] { --_fRecurseCount; });
+    VisitFor(node)(*this, node);
 }
 
 void CNodeWalker::_VisitChildren(CNode& node) {
@@ -26,18 +65,70 @@ void CNodeWalker::_VisitChildren(CNode& node) {
     }
 }
 
-void CNodeWalker::_VisitNode(CNode& node) {
-    if (++_fVisitCount > kMaxVisits) RaiseTooManyVisits();
-    const CRestoreOnExit depth(_fRecurseCount, _fRecurseCount + 1);
-    if (_fRecurseCount > kMaxRecurseCount) RaiseTooDeep();
-    _VisitChildren(node);
+void CNodeWalker::_VisitStoreContextNode(CNode& node, bool within_sub_expr) {
+    const CRestoreOnExit context(_fLoadNameContext, false);
+    const CRestoreOnExit within(_fStoreWithinSubExpr, within_sub_expr);
+    _VisitNode(node);
+}
+
+void CNodeWalker::_VisitLoadContextNode(CNode& node) {
+    const CRestoreOnExit context(_fLoadNameContext, true);
+    _VisitNode(node);
+}
+
+void CNodeWalker::_RaiseIfNotInstance(nb::handle node, nb::handle cls) {
+    if (nb::cast<bool>(nb::module_::import_("builtins").attr("isinstance")(node, cls))) return;
+    RaiseHost(PyExc_ValueError, nb::str("Node is not a {}: {}").format(nb::repr(cls), nb::repr(node)));
+}
+
+// Records
+
+void CNodeWalker::_AddNameDefined(CTextOrUtf8 name) {
+    _AddTypeEquiv(std::move(name), gPrefixes.kSetPrefix);
+}
+
+void CNodeWalker::_AddArgNameDefined(CTextOrUtf8 name) {
+    _AddArgInfoBytes(std::move(name), gPrefixes.kSetPrefix);
+}
+
+void CNodeWalker::_AddTypeEquiv(CTextOrUtf8 name, CTextOrUtf8 equiv) {
+    if (_fLogical) _fLogical->AppendTypeEquiv(AsUtf8(name), AsUtf8(equiv));
+}
+
+void CNodeWalker::_AddArgInfoBytes(CTextOrUtf8 name, CTextOrUtf8 ibytes) {
+    if (_fLogical) _fLogical->AppendArgTypeEquiv(AsUtf8(name), AsUtf8(ibytes));
+}
+
+// Texts
+
+CBytesOrNone CNodeWalker::_TextForNode(CNode& node, const CNodeTextOptions& options) {
+    std::string text;
+    if (!_fToText->AppendTextForNode(text, node, options)) return CBytesOrNone();
+    return CBytesOrNone(JoinUtf8({text}));
+}
+
+CBytesOrNone CNodeWalker::_TextForChain(CNode& atom, const CNodeRange& trailers) {
+    std::string text;
+    if (!_fToText->AppendTextForAtomPlusTrailers(text, atom, trailers)) return CBytesOrNone();
+    return CBytesOrNone(JoinUtf8({text}));
+}
+
+CBytesOrNone CNodeWalker::_DottedNameOf(CNode& node) {
+    return IsDottedName(node) ? _TextForNode(node, {.dotted_name_only = true}) : CBytesOrNone();
 }
 
 void BindNodeWalker(nb::module_& module) {
     nb::class_<CNodeWalker, TNodeWalkerOperations<CNodeWalker>> binding(
         module, "CNodeWalker", Collected<CNodeWalker>(), "Records what a logical line does with names.");
     binding.def(TInit<nb::tuple>(), "version_triple"_a)
-        .def_rw("_fPy3", &CNodeWalker::_fPy3, "True when the analysed language level is 3.0 or later.");
+        .def_rw("_fIncludeExprText", &CNodeWalker::_fIncludeExprText,
+                "True when literals of numbers and strings are recorded with their text.")
+        .def_rw("_fIncludeOperatorExpressions", &CNodeWalker::_fIncludeOperatorExpressions,
+                "False keeps _TypeEquivForOperatorExpression from giving anything.")
+        .def_rw("_fMaxOperatorExpressionLength", &CNodeWalker::_fMaxOperatorExpressionLength,
+                "Kept for hosts; the limit of 120 bytes doesn't follow it.")
+        .def_rw("_fPy3", &CNodeWalker::_fPy3, "True when the analysed language level is 3.0 or later.")
+        .def_ro("_fToText", &CNodeWalker::_fToText, "The converter for all text that is recorded.");
     BindOperations(binding);
 }
 

@@ -1,0 +1,54 @@
+// Nodes that stand side by side, without a list of their own: a run of a node's children, or of a list that
+// the host gave. The host sees a new list.
+#pragma once
+
+#include <algorithm>
+
+#include "tree/node.h"
+
+namespace codeloom {
+
+class CNodeRange {
+  public:
+    CNodeRange() = default;
+    CNodeRange(nb::object list, Py_ssize_t start, Py_ssize_t end)
+        : _fList(std::move(list)), _fStart(start), _fEnd(std::max(start, end)) {}
+
+    Py_ssize_t Size() const { return _fEnd - _fStart; }
+
+    // TypeError when the item isn't a T, IndexError when host code has shortened the list meanwhile.
+    template <class T>
+    CRef<T> At(Py_ssize_t i) const {
+        return CRef<T>(Instance<T>(ListItem(_fList, _fStart + i)));
+    }
+
+    CNodeRange First(Py_ssize_t count) const { return CNodeRange(_fList, _fStart, _fStart + count); }
+
+    nb::list AsList() const { return Size() == 0 ? nb::list() : ListSlice(_fList, _fStart, _fEnd); }
+
+  private:
+    nb::object _fList;
+    Py_ssize_t _fStart = 0, _fEnd = 0;
+};
+
+}  // namespace codeloom
+
+namespace nanobind::detail {
+
+template <>
+struct type_caster<codeloom::CNodeRange> {
+    NB_TYPE_CASTER(codeloom::CNodeRange,
+                   const_name("list[") + make_caster<codeloom::CNode>::Name + const_name("]"))
+
+    bool from_python(handle source, uint32_t, cleanup_list*) noexcept {
+        if (!PyList_Check(source.ptr())) return false;
+        value = codeloom::CNodeRange(borrow<object>(source), 0, PyList_GET_SIZE(source.ptr()));
+        return true;
+    }
+
+    static handle from_cpp(const codeloom::CNodeRange& source, rv_policy, cleanup_list*) {
+        return source.AsList().release();
+    }
+};
+
+}  // namespace nanobind::detail

@@ -1,0 +1,180 @@
+// Names that are read: alone, in chains, in calls, in comprehensions and decorators.
+#include "analysis/syntax_error.h"
+#include "host/errors.h"
+#include "host/text.h"
+#include "neighbours/imported_names.h"
+#include "neighbours/symbolinfo/info_bytes.h"
+#include "symbolinfo/module_constants.h"
+#include "tree/node_helpers.h"
+#include "walker/node_walker.h"
+
+namespace codeloom {
+
+namespace {
+
+bool IsValueName(const CNode& name) {
+    return TextIsOneOf(name.fText, "None", "True", "False");
+}
+
+nb::object WithinExprEquiv(const CNode& name) {
+    return Utf8Concat2(gPrefixes.kWithinExprPrefix, BytesForInteger(ResultFromHost<Py_ssize_t>(name.fContext)));
+}
+
+// A lone `*a` is an argument whose record doesn't tell of the star.
+bool IsStarred(const CArgument& argument) {
+    const CRef<CSingleUsedArgumentNode> single(argument.value->As<CSingleUsedArgumentNode>());
+    return !argument.prefix.is_none() || (single && !single->GetPrefix().is_none());
+}
+
+}  // namespace
+
+// Names
+
+void CNodeWalker::_VisitNameLiteral(CNameLiteral& node, CNodeRef atom_node,
+                                    std::optional<CNodeRange> all_trailers, int trailer_i) {
+    if (IsValueName(node)) return;
+    nb::object name = node.fText;
+    bool more_follows = false;
+    if (all_trailers) {
+        const Py_ssize_t count = Py_ssize_t{trailer_i} + 1;
+        if (trailer_i >= 0) {
+            const CBytesOrNone text = _TextForChain(*atom_node, all_trailers->First(count));
+            if (text.is_none()) return;
+            name = AsStr(text);
+        }
+        more_follows = count < all_trailers->Size();
+    }
+    if (_fLoadNameContext || more_follows) {
+        _ProcessLoadName(name);
+    } else if (_fStoreWithinSubExpr) {
+        _fNames.AddStore(name, WithinExprEquiv(node));
+    }
+}
+
+void CNodeWalker::_VisitDottedName(CDottedName& node) {
+    nb::str name("");
+    for (Py_ssize_t i = 0; i < node._GetChildCount(); ++i) {
+        name = nb::str(name + node.ChildAt(i).fText);
+        if (i % 2 == 0) _ProcessLoadName(name);
+    }
+}
+
+void CNodeWalker::_ProcessLoadName(CTextOrNone name) {
+    _fNames.AddLoad(name);
+}
+
+// Chains
+
+void CNodeWalker::_VisitPower(CPower& node) {
+    _VisitAtomPlusTrailers(*node.GetAtom(), node.GetTrailers());
+    if (const CNodeRef exponent = node.GetExponentNode()) _VisitNode(*exponent);
+}
+
+void CNodeWalker::_VisitAtomExpr(CAtomExpr& node) {
+    _VisitAtomPlusTrailers(*node.GetAtom(), node.GetTrailers());
+}
+
+void CNodeWalker::_VisitAtomPlusTrailers(CNode& atom_node, const CNodeRange& all_trailers) {
+    if (CNameLiteral* const name = atom_node.As<CNameLiteral>()) {
+        _VisitNameLiteral(*name, CNodeRef(name), all_trailers, -1);
+    } else {
+        _VisitNode(atom_node);
+    }
+    for (Py_ssize_t i = 0; i < all_trailers.Size(); ++i) _VisitTrailer(atom_node, all_trailers, i);
+}
+
+// Brackets without contents have the closing one as their second child, which records nothing.
+void CNodeWalker::_VisitTrailer(CNode& atom_node, const CNodeRange& all_trailers, Py_ssize_t i) {
+    const CRef<CTrailer> trailer = all_trailers.At<CTrailer>(i);
+    const CTextOrNone token = trailer->GetInitialToken();
+    const CNodeRef child = trailer->ChildAs<CNode>(1);
+    if (TextIs(token, "(") && trailer->_GetChildCount() == 3) {
+        _VisitCall(atom_node, all_trailers.First(i), *child);
+    } else if (CNameLiteral* const name = TextIs(token, ".") ? child->As<CNameLiteral>() : nullptr) {
+        _VisitNameLiteral(*name, CNodeRef(&atom_node), all_trailers, static_cast<int>(i));
+    } else if (TextIsOneOf(token, "{", "[")) {
+        _VisitLoadContextNode(*child);
+    } else {
+        _VisitNode(*child);
+    }
+}
+
+// Calls
+
+void CNodeWalker::_VisitCall(CNode& atom, const CNodeRange& prev_trailers, CNode& arglist) {
+    CBytesOrNone func_name;
+    if (IsDottedChain(atom, prev_trailers)) func_name = _TextForChain(atom, prev_trailers);
+    _ProcessFunctionCall(std::move(func_name), GetUsedArgInfoList(CNodeRef(&arglist)));
+}
+
+void CNodeWalker::_ProcessFunctionCall(CBytesOrNone func_name, const CArgumentList& arg_list) {
+    for (const CArgument& argument : arg_list) {
+        if (arg_list.size() != 1) _RaiseIfBareGenerator(argument);
+        _VisitNode(*argument.value);
+    }
+    if (func_name.is_none()) return;
+    if (Utf8View(func_name) == "isinstance") _ProcessIsInstanceCall(arg_list);
+    const CBytesOrNone arguments = _TextForArguments(arg_list);
+    if (!arguments.is_none())
+        _AddTypeEquiv(func_name, Utf8Concat2(gPrefixes.kCalledPrefix, arguments));
+}
+
+void CNodeWalker::_RaiseIfBareGenerator(const CArgument& argument) {
+    const CRef<CSingleUsedArgumentNode> single(argument.value->As<CSingleUsedArgumentNode>());
+    if (!single || !single->IsUnparenthesizedGenExpr()) return;
+    const nb::str message("Generator expression must be parenthesized if not sole argument");
+    RaiseHost(PyExc_SyntaxError,
+              CreateSyntaxError(message, _fLogical.AsHost(), single->fContext, nb::none()));
+}
+
+// `(a,1)`; none when an argument has a name or a star, or no text.
+CBytesOrNone CNodeWalker::_TextForArguments(const CArgumentList& arg_list) {
+    std::string text = "(";
+    for (const CArgument& argument : arg_list) {
+        if (!argument.value || argument.name || IsStarred(argument)) return CBytesOrNone();
+        if (text.size() != 1) text += ',';
+        if (!_fToText->AppendTextForNode(text, *argument.value)) return CBytesOrNone();
+    }
+    return CBytesOrNone(JoinUtf8({text, ")"}));
+}
+
+void CNodeWalker::_ProcessIsInstanceCall(const CArgumentList& arg_list) {
+    if (arg_list.size() != 2) return;
+    const CArgument& object = arg_list[0];
+    const CArgument& classes = arg_list[1];
+    if (!object.prefix.is_none() || object.name || !classes.prefix.is_none() || classes.name) return;
+    const CBytesOrNone name = _DottedNameOf(*object.value);
+    if (name.is_none()) return;
+    for (const nb::object& instance_name : _InstanceNamesFor(*classes.value))
+        _fLogical->AppendTypeEquiv(name, instance_name);
+}
+
+std::vector<CTextOrUtf8> CNodeWalker::_InstanceNamesFor(CNode& class_or_tuple) {
+    std::vector<CTextOrUtf8> names;
+    const auto add = [&](CNode& node) {
+        const CBytesOrNone name = _DottedNameOf(node);
+        if (!name.is_none()) names.emplace_back(JoinUtf8({GetInstanceNameForClass(Utf8View(name))}));
+    };
+    add(class_or_tuple);
+    if (!names.empty()) return names;
+    for (const CNodeRef& element : ExpandSeqLiteral(class_or_tuple).value_or(std::vector<CNodeRef>()))
+        add(*element);
+    return names;
+}
+
+// Comprehensions and decorators
+
+void CNodeWalker::_VisitCompForNode(CCompForNode& node) {
+    _VisitStoreContextNode(*node.GetTargetNode(), true);
+    _VisitNode(*node.GetInNode());
+    if (const CNodeRef next = node.GetCompIterNode()) _VisitNode(*next);
+}
+
+void CNodeWalker::_VisitSingleDecorator(CSingleDecorator& node) {
+    const CNodeRef dotted = node.GetDottedName();
+    _VisitNode(*dotted);
+    const CArgumentList arg_list = node.GetUsedArgList();
+    _ProcessFunctionCall(_TextForNode(*dotted), arg_list);
+}
+
+}  // namespace codeloom
