@@ -93,7 +93,6 @@ def test_places_within_strings(text, found):
     assert Found(text) == found
 
 
-@NOT_WALKED_YET
 def test_place_of_a_walkers_complaint():
     # It counts rows in another way.
     (problem,) = CheckText("x = (1,\n f'{f(a for a in b, 1)}')")

@@ -37,7 +37,7 @@ class RecordingWalker(CNodeWalker):
 
 
 def test_every_level_of_a_recursion_calls_the_override_once():
-    logical = Logical("x = f(1, (2, 3))")
+    logical = Logical("(1, (2, 3)) < [-4]")
     tree = CPGenParserImpl(VERSION).ParseToNode(logical)
     walker = RecordingWalker()
     walker.Walk(tree, logical)

@@ -1,6 +1,7 @@
 // Statements that define names without an assignment. Of a `def` or a `class` only the header is read.
 #include "host/errors.h"
 #include "host/neighbour_call.h"
+#include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "strutils/text.h"
 #include "symbolinfo/module_constants.h"
@@ -31,9 +32,9 @@ void CNodeWalker::_VisitImportNames(CImportNamesStmt& node) {
         const CAsName& as_name = ItemAt(as_names, i);
         nb::object name = BoundName(as_name);
         nb::object module = AsUtf8(as_name.module_name);
-        const std::string_view bound = Utf8View(name);
-        if (const size_t dot = bound.find('.'); dot != std::string_view::npos)
-            name = module = JoinUtf8({bound.substr(0, dot)});
+        const CUtf8 bound(name);
+        if (const size_t dot = bound->find('.'); dot != std::string_view::npos)
+            name = module = JoinUtf8({bound->substr(0, dot)});
         _DefineImported(as_name, name, Utf8Concat2(gPrefixes.kImportPrefix, module));
     }
 }

@@ -17,7 +17,8 @@ bool IsValueName(const CNode& name) {
 }
 
 nb::object WithinExprEquiv(const CNode& name) {
-    return Utf8Concat2(gPrefixes.kWithinExprPrefix, BytesForInteger(ResultFromHost<Py_ssize_t>(name.fContext)));
+    return Utf8Concat2(gPrefixes.kWithinExprPrefix,
+                       BytesForInteger(ResultFromHost<Py_ssize_t>(name.fContext)));
 }
 
 // A lone `*a` is an argument whose record doesn't tell of the star.
@@ -113,18 +114,16 @@ void CNodeWalker::_ProcessFunctionCall(CBytesOrNone func_name, const CArgumentLi
         _VisitNode(*argument.value);
     }
     if (func_name.is_none()) return;
-    if (Utf8View(func_name) == "isinstance") _ProcessIsInstanceCall(arg_list);
+    if (CUtf8(func_name) == "isinstance") _ProcessIsInstanceCall(arg_list);
     const CBytesOrNone arguments = _TextForArguments(arg_list);
-    if (!arguments.is_none())
-        _AddTypeEquiv(func_name, Utf8Concat2(gPrefixes.kCalledPrefix, arguments));
+    if (!arguments.is_none()) _AddTypeEquiv(func_name, Utf8Concat2(gPrefixes.kCalledPrefix, arguments));
 }
 
 void CNodeWalker::_RaiseIfBareGenerator(const CArgument& argument) {
     const CRef<CSingleUsedArgumentNode> single(argument.value->As<CSingleUsedArgumentNode>());
     if (!single || !single->IsUnparenthesizedGenExpr()) return;
     const nb::str message("Generator expression must be parenthesized if not sole argument");
-    RaiseHost(PyExc_SyntaxError,
-              CreateSyntaxError(message, _fLogical.AsHost(), single->fContext, nb::none()));
+    RaiseHostError(CreateSyntaxError(message, _fLogical.AsHost(), single->fContext, nb::none()));
 }
 
 // `(a,1)`; none when an argument has a name or a star, or no text.
@@ -153,7 +152,7 @@ std::vector<CTextOrUtf8> CNodeWalker::_InstanceNamesFor(CNode& class_or_tuple) {
     std::vector<CTextOrUtf8> names;
     const auto add = [&](CNode& node) {
         const CBytesOrNone name = _DottedNameOf(node);
-        if (!name.is_none()) names.emplace_back(JoinUtf8({GetInstanceNameForClass(Utf8View(name))}));
+        if (!name.is_none()) names.emplace_back(JoinUtf8({GetInstanceNameForClass(CUtf8(name))}));
     };
     add(class_or_tuple);
     if (!names.empty()) return names;

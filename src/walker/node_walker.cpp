@@ -1,8 +1,8 @@
 #include "walker/node_walker.h"
 
+#include "host/errors.h"
 #include "host/restore.h"
 #include "host/text.h"
-#include "host/errors.h"
 #include "neighbours/imported_names.h"
 #include "tree/node_helpers.h"
 #include "walker/dispatch.h"
@@ -26,7 +26,7 @@ void CNodeWalker::Walk(CNodeRef node, CLogicalLine& logical) {
     _fStoreWithinSubExpr = false;
     const CCallOnExit idle([this] {
         _fLogical.reset();
-        _fVisitCount = 0;
+        _fVisits.Reset();
         _fRecurseCount = 0;
         _fNames.Clear();
     });
@@ -49,9 +49,8 @@ void CNodeWalker::_ProcessNamesFound(CNode& node) {
 }
 
 void CNodeWalker::_VisitNode(CNode& node) {
-    if (++_fVisitCount > kMaxVisits) RaiseTooManyVisits();
-    // Left too high when the limit is hit, which ends the walk.
-    if (++_fRecurseCount > kMaxRecurseCount) RaiseTooDeep();
+    _fVisits.CountVisit();
+    CVisitLimits::CheckDepth(++_fRecurseCount);  // left too high beyond the limit, which ends the walk
     const CCallOnExit up_again([this] { --_fRecurseCount; });
     VisitFor(node)(*this, node);
 }

@@ -71,7 +71,8 @@ class CNodeWalker : public CHosted {
     virtual void _VisitExceptClause(CExceptClause& exc_clause);
     virtual void _AppendEquivNode(CNode& name_node, CNodeRef equiv_node,
                                   CBytesOrNone extra_trailer = CBytesOrNone());
-    virtual void _AppendSubscriptedEquivNode(CNode& name_node, CNodeRef equiv_node, Py_ssize_t subscript = -1);
+    virtual void _AppendSubscriptedEquivNode(CNode& name_node, CNodeRef equiv_node,
+                                             Py_ssize_t subscript = -1);
     virtual void _AddNodeInfoStr(CNode& name_node, CTextOrUtf8OrNone istr);
     virtual CBytesOrNone _TypeEquivForNode(CNode& node, CBytesOrNone extra_trailer = CBytesOrNone());
     virtual CBytesOrNone _TypeEquivForOperatorExpression(COperatorExpression& op_expr);
@@ -127,22 +128,23 @@ class CNodeWalker : public CHosted {
     CBytesOrNone _EquivForOperators(CNode& node, const CBytesOrNone& extra_trailer);
     CBytesOrNone _InstanceNameForString(CStringLiteral& literal);
 
-    CRef<CLogicalLine> _fLogical;      // the line being walked; it guards against re-entry
-    bool _fLoadNameContext = true;     // a name that is met is read; false below a target
-    bool _fStoreWithinSubExpr = false; // below a target: one of a comprehension or a lambda
+    CRef<CLogicalLine> _fLogical;       // the line being walked; it guards against re-entry
+    bool _fLoadNameContext = true;      // a name that is met is read; false below a target
+    bool _fStoreWithinSubExpr = false;  // below a target: one of a comprehension or a lambda
     CNamesFound _fNames;
-    int _fVisitCount = 0;
+    CVisitLimits _fVisits;
     int _fRecurseCount = 0;
 };
 
 template <class Class>
 class TNodeWalkerOperations : public Class {
     FIRST_OPERATIONS
-    OPERATION(Walk,
-              "Walk the tree of a logical line and record on the line what it says. A walk of too many visits "
-              "or too deep ends with a line on the standard output. ValueError while a walk is under way, "
-              "SyntaxError for what parses but isn't allowed.",
-              "node"_a.none(), "logical"_a)
+    OPERATION(
+        Walk,
+        "Walk the tree of a logical line and record on the line what it says. A walk of too many visits "
+        "or too deep ends with a line on the standard output. ValueError while a walk is under way, "
+        "SyntaxError for what parses but isn't allowed.",
+        "node"_a.none(), "logical"_a)
     OPERATION(_ProcessNamesFound,
               "Record the names read, then those bound within sub-expressions. `node` is the root; an import "
               "reads nothing.",
@@ -150,10 +152,11 @@ class TNodeWalkerOperations : public Class {
     OPERATION(_VisitChildren, "Visit each direct child, in order.", "node"_a)
     OPERATION(_RaiseIfNotInstance, "ValueError unless `node` is an instance of `cls`.", "node"_a.none(),
               "cls"_a)
-    OPERATION(_VisitNode,
-              "Visit a node: count, limit, dispatch by its class. RuntimeError beyond 10000 visits or a depth "
-              "of 40.",
-              "node"_a)
+    OPERATION(
+        _VisitNode,
+        "Visit a node: count, limit, dispatch by its class. RuntimeError beyond 10000 visits or a depth "
+        "of 40.",
+        "node"_a)
     OPERATION(_VisitStoreContextNode,
               "Visit a target. With `within_sub_expr` its names are bound within a sub-expression of the "
               "line: a comprehension, a lambda.",
@@ -179,16 +182,18 @@ class TNodeWalkerOperations : public Class {
     OPERATION(_VisitGlobalStmt, "Record each name of `global`.", "node"_a)
     OPERATION(_VisitNonlocalStmt, "Record each name of `nonlocal`.", "node"_a)
     OPERATION(_VisitParameters, "The parameters of a `def`.", "node"_a)
-    OPERATION(_ProcessDefiningArgList,
-              "Record the arguments of a `def`, a list of CArgInfo and, for the tuple parameters of Python 2, "
-              "of such lists. AssertionError for any other item.",
-              "arg_list"_a)
+    OPERATION(
+        _ProcessDefiningArgList,
+        "Record the arguments of a `def`, a list of CArgInfo and, for the tuple parameters of Python 2, "
+        "of such lists. AssertionError for any other item.",
+        "arg_list"_a)
     OPERATION(_VisitAssignment, "`a = b = c`.", "node"_a)
     OPERATION(_VisitForStmt, "A `for` line.", "node"_a)
-    OPERATION(_ProcessTargets,
-              "Pair the names of a target with what they receive of `rhs`, be it ((a, b), c) = ... or a, *b = "
-              "... `extra_trailer`, bytes, tells which part of `rhs` the whole target receives.",
-              "lhs"_a, "rhs"_a.none(), "extra_trailer"_a.none() = nb::none())
+    OPERATION(
+        _ProcessTargets,
+        "Pair the names of a target with what they receive of `rhs`, be it ((a, b), c) = ... or a, *b = "
+        "... `extra_trailer`, bytes, tells which part of `rhs` the whole target receives.",
+        "lhs"_a, "rhs"_a.none(), "extra_trailer"_a.none() = nb::none())
     OPERATION(_VisitAugAssign, "`a += b`: both are read, nothing is bound.", "node"_a)
     OPERATION(_VisitAnnotatedAssign, "`a: b = c`; without a value nothing is bound.", "node"_a)
     OPERATION(_VisitReturn, "Record the value under the name \"return\".", "return_stmt"_a)
@@ -212,17 +217,19 @@ class TNodeWalkerOperations : public Class {
               "Record a name as bound, unless its text holds \"[\", and what its value stands for.",
               "name_node"_a, "equiv_node"_a.none(), "extra_trailer"_a.none() = nb::none())
     OPERATION(_AppendSubscriptedEquivNode,
-              "Record a name as bound, and as the item `subscript` of a value; -1 is any item.", "name_node"_a,
-              "equiv_node"_a.none(), "subscript"_a = -1)
-    OPERATION(_AddNodeInfoStr, "Record `istr` for the name that a node shows.", "name_node"_a, "istr"_a.none())
+              "Record a name as bound, and as the item `subscript` of a value; -1 is any item.",
+              "name_node"_a, "equiv_node"_a.none(), "subscript"_a = -1)
+    OPERATION(_AddNodeInfoStr, "Record `istr` for the name that a node shows.", "name_node"_a,
+              "istr"_a.none())
     OPERATION(_TypeEquivForNode,
               "What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, "
               "stands behind it where a part of the value is meant.",
               "node"_a, "extra_trailer"_a.none() = nb::none())
-    OPERATION(_TypeEquivForOperatorExpression,
-              "An operator expression with each operand replaced by what it stands for; None when one of them "
-              "can't be told.",
-              "op_expr"_a)
+    OPERATION(
+        _TypeEquivForOperatorExpression,
+        "An operator expression with each operand replaced by what it stands for; None when one of them "
+        "can't be told.",
+        "op_expr"_a)
     OPERATION(_VisitNamedExpr, "`a := b`, as an expression or as an argument. AssertionError for others.",
               "node"_a)
     OPERATION(_VisitCaseStmt, "A `case` line.", "case_stmt"_a)

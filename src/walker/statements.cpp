@@ -30,8 +30,8 @@ void CNodeWalker::_VisitExceptClause(CExceptClause& exc_clause) {
     _VisitNode(*type);
     if (!target) return;
     if (target->As<CNameLiteral>() == nullptr)
-        RaiseHost(PyExc_SyntaxError, CreateSyntaxError(nb::str("Name in except clause must be a simple name"),
-                                                       _fLogical.AsHost(), target->fContext, nb::none()));
+        RaiseHostError(CreateSyntaxError(nb::str("Name in except clause must be a simple name"),
+                                         _fLogical.AsHost(), target->fContext, nb::none()));
     _ProcessTargets(*target, CNodeRef());
     for (const CTextOrUtf8& instance_name : _InstanceNamesFor(*type))
         _AddNodeInfoStr(*target, CTextOrUtf8OrNone(instance_name));

@@ -17,8 +17,7 @@ CExpression* AsSequence(const CNode& node) {
 
 // Behind what the whole target receives, what position `i` of it does.
 CBytesOrNone PositionTrailer(const CBytesOrNone& extra_trailer, int i) {
-    const std::string_view outer = extra_trailer.is_none() ? std::string_view() : Utf8View(extra_trailer);
-    return JoinUtf8({outer, "[", Utf8View(BytesForInteger(i)), "]"});
+    return Utf8Concat4(extra_trailer, nb::bytes("["), BytesForInteger(i), nb::bytes("]"));
 }
 
 // The expression at `i` of the right side, as long as that can be taken apart.

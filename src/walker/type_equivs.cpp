@@ -1,5 +1,5 @@
-// What a value stands for: a typed literal, the text of a name or chain, the text of an expression. None where
-// that can't be told, which writes no record.
+// What a value stands for: a typed literal, the text of a name or chain, the text of an expression. None
+// where that can't be told, which writes no record.
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
@@ -17,7 +17,7 @@ namespace {
 constexpr size_t kMaxExpressionLength = 120;  // bytes, without a trailer
 
 bool StartsWith(const nb::object& equiv, nb::handle prefix) {
-    return Utf8View(equiv).starts_with(Utf8View(prefix));
+    return CUtf8(equiv)->starts_with(CUtf8(prefix));
 }
 
 // The number behind a plus or minus; null for any other node.
@@ -43,16 +43,16 @@ CBytesOrNone WithTrailer(CBytesOrNone text, const CBytesOrNone& extra_trailer) {
 nb::object ValueOfLiteral(nb::object equiv) {
     if (!StartsWith(equiv, gPrefixes.kTypedLiteralPrefix)) return equiv;
     constexpr std::string_view kValueMark = ": ";
-    const std::string_view utf8 = Utf8View(equiv);
-    const size_t mark = utf8.find(kValueMark, kPrefixLen);
-    const bool has_value = mark != std::string_view::npos && mark + kValueMark.size() < utf8.size();
-    return has_value ? JoinUtf8({utf8.substr(mark + kValueMark.size())}) : equiv;
+    const CUtf8 utf8(equiv);
+    const size_t mark = utf8->find(kValueMark, kPrefixLen);
+    const bool has_value = mark != std::string_view::npos && mark + kValueMark.size() < utf8->size();
+    return has_value ? JoinUtf8({utf8->substr(mark + kValueMark.size())}) : equiv;
 }
 
 }  // namespace
 
 CBytesOrNone CNodeWalker::_TypeEquivForNode(CNode& node, CBytesOrNone extra_trailer) {
-    if (!extra_trailer.is_none() && Utf8View(extra_trailer).empty()) extra_trailer = CBytesOrNone();
+    if (!extra_trailer.is_none() && CUtf8(extra_trailer)->empty()) extra_trailer = CBytesOrNone();
     const bool has_trailer = !extra_trailer.is_none();
     if (CAtom* const atom = node.As<CAtom>()) return _EquivForAtom(*atom, extra_trailer);
     if (CTestListStarExpr* const list = node.As<CTestListStarExpr>(); list != nullptr && list->IsTuple())
@@ -85,7 +85,7 @@ CBytesOrNone CNodeWalker::_EquivForAtom(CAtom& atom, const CBytesOrNone& extra_t
 
 CBytesOrNone CNodeWalker::_EquivForDisplay(CAtom& atom, nb::handle bracket) {
     const bool is_tuple = TextIs(bracket, "(");
-    const std::string_view type_name = is_tuple ? "tuple"
+    const std::string_view type_name = is_tuple               ? "tuple"
                                        : TextIs(bracket, "[") ? "list"
                                        : IsSetLiteral(atom)   ? "set"
                                                               : "dict";
@@ -102,12 +102,11 @@ CBytesOrNone CNodeWalker::_EquivForGrouping(CAtom& atom, const CBytesOrNone& ext
 }
 
 CBytesOrNone CNodeWalker::_EquivForTuple(CTestListStarExpr& tuple) {
-    CBytesOrNone text = _TextForNode(tuple);
-    if (!text.is_none()) {
-        const std::string_view elements = Utf8View(text);
-        text = elements.empty() ? JoinUtf8({"( )"}) : JoinUtf8({"(", elements, ")"});
-    }
-    return BuildLiteralInfo("tuple", text);
+    const CBytesOrNone text = _TextForNode(tuple);
+    if (text.is_none()) return BuildLiteralInfo("tuple", text);
+    const CUtf8 utf8(text);
+    const std::string_view elements = utf8->empty() ? " " : std::string_view(utf8);
+    return BuildLiteralInfo("tuple", JoinUtf8({"(", elements, ")"}));
 }
 
 CBytesOrNone CNodeWalker::_EquivForSimpleLiteral(CNode& node) {
@@ -131,7 +130,7 @@ CBytesOrNone CNodeWalker::_EquivForString(CStringLiteral& literal) {
     if (!_fIncludeExprText) return instance_name;
     std::string storage;
     const CUtf8 text(literal.fText);
-    return JoinUtf8({Utf8View(instance_name), " ", EncodeStringLiteral(text, storage)});
+    return JoinUtf8({CUtf8(instance_name), " ", EncodeStringLiteral(text, storage)});
 }
 
 CBytesOrNone CNodeWalker::_InstanceNameForString(CStringLiteral& literal) {
@@ -145,8 +144,7 @@ CBytesOrNone CNodeWalker::_EquivForOperators(CNode& node, const CBytesOrNone& ex
     const bool has_trailer = !extra_trailer.is_none();
     const bool has_text = _fToText->AppendTextForNode(text, node, {.add_parens_if_operator = has_trailer});
     if (!has_text || text.size() > kMaxExpressionLength) return CBytesOrNone();
-    const std::string_view trailer = has_trailer ? Utf8View(extra_trailer) : std::string_view();
-    return JoinUtf8({Utf8View(gPrefixes.kExpressionEquivPrefix), text, trailer});
+    return Utf8Concat3(gPrefixes.kExpressionEquivPrefix, JoinUtf8({text}), extra_trailer);
 }
 
 // What attaches an equiv to a name
@@ -155,7 +153,7 @@ CBytesOrNone CNodeWalker::_EquivForOperators(CNode& node, const CBytesOrNone& ex
 void CNodeWalker::_AppendEquivNode(CNode& name_node, CNodeRef equiv_node, CBytesOrNone extra_trailer) {
     const CBytesOrNone name = _TextForNode(name_node);
     if (name.is_none()) return;
-    if (Utf8View(name).find('[') == std::string_view::npos) _AddNameDefined(name);
+    if (CUtf8(name)->find('[') == std::string_view::npos) _AddNameDefined(name);
     if (!equiv_node) return;
     const CBytesOrNone equiv = _TypeEquivForNode(*equiv_node, std::move(extra_trailer));
     if (!equiv.is_none()) _AddTypeEquiv(name, equiv);
@@ -176,15 +174,14 @@ void CNodeWalker::_AppendSubscriptedEquivNode(CNode& name_node, CNodeRef equiv_n
     if (!equiv_node) return;
     nb::object equiv = _TypeEquivForNode(*equiv_node);
     if (equiv.is_none() || StartsWith(equiv, gPrefixes.kTypedLiteralPrefix)) return;
-    if (StartsWith(equiv, gPrefixes.kExpressionEquivPrefix))
-        equiv = JoinUtf8({Utf8View(gPrefixes.kExpressionEquivPrefix), "(",
-                          Utf8View(equiv).substr(kPrefixLen), ")"});
-    const nb::object position = BytesForInteger(subscript);
-    if (subscript == -1) {
-        equiv = JoinUtf8({Utf8View(equiv), kIterationSubscript});
-    } else {
-        equiv = JoinUtf8({Utf8View(equiv), "[", Utf8View(position), "]"});
+    if (StartsWith(equiv, gPrefixes.kExpressionEquivPrefix)) {
+        const CUtf8 expression(equiv);
+        equiv = JoinUtf8({expression->substr(0, kPrefixLen), "(", expression->substr(kPrefixLen), ")"});
     }
+    const nb::object position = subscript == -1
+                                    ? JoinUtf8({kIterationSubscript})
+                                    : Utf8Concat3(nb::bytes("["), BytesForInteger(subscript), nb::bytes("]"));
+    equiv = Utf8Concat2(equiv, position);
     _AddTypeEquiv(name, equiv);
 }
 
