@@ -1682,9 +1682,27 @@ class CDispatchWalker:
     def __init__(self, dispatch_dict: object | None) -> None:
         ...
 
+    @property
+    def _fLogical(self) -> codeloom._neighbours.CLogicalLine | None:
+        """The logical being walked; None between walks."""
+
+    @property
+    def _fDispatchDict(self) -> typing.Any:
+        """
+        The dispatch dictionary: exact node class to a callable of (walker, node), or to False. A change counts from the next node on.
+        """
+
+    @property
+    def _fNodeStack(self) -> list[typing.Any]:
+        """The nodes from the root to the one now visited, as a new list."""
+
+    @property
+    def _fVisitCount(self) -> int:
+        """Nodes visited since the walk began."""
+
     def Walk(self, node: CNode | None | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
         """
-        Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous.
+        Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous. ValueError while a walk is under way.
         """
 
     def _VisitNode(self, node: CNode | None | None) -> None:
@@ -1693,14 +1711,117 @@ class CDispatchWalker:
         """
 
 class CTypeHintWalker(CDispatchWalker):
-    """Records the type hints of a logical line."""
+    """
+    Records the type hints of a logical line: annotations, and hints in comments.
+    """
 
     def __init__(self, version_triple: object | None, grammar_file: object, general_node_walker: CNodeWalker | None | None) -> None:
         ...
 
+    @property
+    def _fNameConv(self) -> CNodeToTextConverterImpl | None:
+        """Gives the name text of a target."""
+
+    @property
+    def _fHintConv(self) -> CNodeToTextConverterImpl | None:
+        """Gives the text of a hint."""
+
+    @property
+    def _fCommentHintCount(self) -> int:
+        """
+        The comments of the logical being walked that hold "type:"; 0 between walks.
+        """
+
+    @property
+    def _fHintParser(self) -> CPGenParserImpl | None:
+        """The parser for hint text."""
+
+    @property
+    def _fGeneralNodeWalker(self) -> CNodeWalker | None:
+        """Records the names that hints in comments use."""
+
     def Walk(self, node: CNode | None | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
         """
-        Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous.
+        Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous. ValueError while a walk is under way.
+        """
+
+    def _VisitFuncdefStmt(self, node: CFuncdefStmt) -> typing.Any:
+        """Record the hints of a def's arguments and of what it returns."""
+
+    def _RewriteFuncdefCommentHint(self, hint: str) -> tuple[list[typing.Any], list[typing.Any]]:
+        """
+        Rewrite the function hint in a comment so that it parses: the tokens of a `def` with dummy names, and for each the offset to report a syntax error at.
+        """
+
+    def _ProcessFuncdefComment(self, hint: str, tok_i: int, funcdef_logical: codeloom._neighbours.CLogicalLine | None | None, is_arg: bool) -> None:
+        """
+        Record a hint for a `def`. `funcdef_logical` is None for a comment in the body: then the arguments go by their indexes. TypeError when it has no records of arguments to name them by.
+        """
+
+    def _ProcessArgSpecificComment(self, arg: CArgInfo) -> None:
+        """
+        Record the hint in a comment immediately after an argument and its comma.
+        """
+
+    def _VisitForStmt(self, node: CForStmt) -> typing.Any:
+        """Record the comment hint of a `for` for its target."""
+
+    def _VisitWithStmt(self, node: CWithStmt) -> typing.Any:
+        """Record the comment hint of a `with` for the target of each item."""
+
+    def _VisitExprStmt(self, node: CExprStmt) -> typing.Any:
+        """Record the annotation or the comment hint of an assignment."""
+
+    def _ProcessTarget(self, node: CNode, target: CNode | None | None) -> None:
+        """Record the hint in the comment at the end of `node` for `target`."""
+
+    def _ProcessNameAndHintNodes(self, name_node: CNode | None | None, hint_node: CNode | None | None, is_arg: bool=False) -> None:
+        """
+        Record a hint for a name. Tuples are paired item by item; what has no partner is passed over.
+        """
+
+    def _FindEndingTypeComment(self, node: CNode) -> tuple[str | None, int]:
+        """
+        The hint in the comment on the row on which `node` ends, and the index of its token; (None, -1) when there is no comment.
+        """
+
+    def _GetHintFromComment(self, comment: str) -> str | None:
+        """
+        The hint following `type:`, with blanks for all before it, so that offsets stay; None when there is none.
+        """
+
+    def _GetRowRange(self, node: CNode) -> tuple[int, int]:
+        """The first row of `node` and the one behind its last."""
+
+    def _IsDottedName(self, s: bytes) -> bool:
+        """
+        True for letters and digits alone that begin with a letter, and for nothing.
+        """
+
+    def _FindComment(self, row: int, logical: codeloom._neighbours.CLogicalLine | None | None=None) -> tuple[str | None, int]:
+        """
+        The comment on a row of `logical`, by default of the one that is walked, and the index of its token; (None, -1) when there is none.
+        """
+
+    def _GetHintInfoStr(self, node: CNode | None | None) -> bytes | None:
+        """The record of a hint; None when it has no text."""
+
+    def _AddSymInfo(self, name: object, istr: object, is_arg: bool) -> None:
+        """Append a record to the logical."""
+
+    def _ParseHint(self, hint: str, tok_i: int, call_general_node_walker: bool) -> CNode | None:
+        """
+        The top node of a hint, or None. Give it back with `_fHintParser.DiscardNode`. SyntaxError with the place in the comment when it doesn't parse.
+        """
+
+    def _RaiseHintSyntaxError(self, tok_i: int, utf8_offset_in_hint: int) -> None:
+        """
+        Raise SyntaxError for a place in the hint that the comment token at `tok_i` holds.
+        """
+
+    def _ParseFuncdefCommentHint(self, hint: str, tok_i: int) -> CNode | None:
+        """
+        The same as _ParseHint for the hint of a function; its names go to no walker.
         """
 
 class CPGenAnalyzerImpl(CPGenAnalyzer):

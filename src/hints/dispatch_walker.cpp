@@ -2,41 +2,56 @@
 
 #include "host/errors.h"
 #include "host/restore.h"
-#include "walker/walk_limits.h"
 
 namespace codeloom {
 
 void CDispatchWalker::Init(nb::object dispatch_dict) {
     if (!dispatch_dict.is_none() && !nb::isinstance<nb::dict>(dispatch_dict))
         RaiseWrongType("dict", dispatch_dict);
-    _fDispatchDict = std::move(dispatch_dict);
+    _fDispatch.Set(std::move(dispatch_dict));
+}
+
+void CDispatchWalker::InitWithVisits(nb::dict dispatch_dict, std::vector<CNativeVisit> native_visits) {
+    for (const CNativeVisit& visit : native_visits) dispatch_dict[visit.node_class] = visit.callable;
+    _fDispatch.Set(std::move(dispatch_dict), std::move(native_visits));
 }
 
 void CDispatchWalker::Walk(CNodeRef node, CLogicalLine& logical, bool) {
     if (_fLogical) RaiseWalkInProgress();
     const CRestoreOnExit idle_logical(_fLogical, CRef<CLogicalLine>(&logical));
-    const CRestoreOnExit idle_visits(_fVisitCount, 0);
-    const CRestoreOnExit idle_depth(_fRecurseCount, 0);
+    const CCallOnExit idle([this] {
+        _fLimits.Reset();
+        _fNodeStack.clear();
+    });
     _fNodeStack.clear();
-    const CCallOnExit empty_stack([this] { _fNodeStack.clear(); });
-    RunLimited([&] { _VisitNode(node); });
+    RunLimited([&] { _VisitNode(std::move(node)); });
 }
 
 void CDispatchWalker::_VisitNode(CNodeRef node) {
-    if (++_fVisitCount > kMaxVisits) RaiseTooManyVisits();
+    _fLimits.CountVisit();
     _fNodeStack.push_back(node);
-    if (_fNodeStack.size() > static_cast<size_t>(kMaxRecurseCount)) RaiseTooDeep();
+    CVisitLimits::CheckDepth(static_cast<Py_ssize_t>(_fNodeStack.size()));
+    const CCallOnExit popped([this] {
+        if (!_fNodeStack.empty()) _fNodeStack.pop_back();
+    });
     if (_AreChildrenWanted(node)) _VisitChildren(node);
     HostAssert(!_fNodeStack.empty() && _fNodeStack.back().get() == node.get());
-    if (!_fNodeStack.empty()) _fNodeStack.pop_back();
 }
 
 bool CDispatchWalker::_AreChildrenWanted(const CNodeRef& node) {
-    const nb::object host_node = node.AsHost();
-    const nb::object visit = FindInDict(_fDispatchDict, host_node.type());
-    if (!visit.is_valid() || visit.is_none()) return true;
-    if (visit.is(Py_False)) return false;
-    return nb::cast<bool>(nb::bool_(visit(Self(), host_node)));
+    using EAction = CDispatchTable::EAction;
+    const CDispatchTable::CEntry& entry = _fDispatch.Find(node ? node->Self().type() : nb::none().type());
+    switch (entry.action) {
+        case EAction::kVisitChildren:
+            return true;
+        case EAction::kSkip:
+            return false;
+        case EAction::kCallNative:
+            return IsTrue(entry.function(*this, *node));
+        case EAction::kCallHost:
+            return IsTrue(nb::borrow(entry.callable)(Self(), node.AsHost()));
+    }
+    return true;
 }
 
 void CDispatchWalker::_VisitChildren(const CNodeRef& node) {
@@ -46,12 +61,25 @@ void CDispatchWalker::_VisitChildren(const CNodeRef& node) {
     for (Py_ssize_t i = 0; i < ListSize(children); ++i) _VisitNode(CNodeRef::FromHost(ListItem(children, i)));
 }
 
+nb::list CDispatchWalker::GetNodeStack() const {
+    nb::list stack;
+    for (const CNodeRef& node : _fNodeStack) stack.append(node.AsHost());
+    return stack;
+}
+
 void BindDispatchWalker(nb::module_& module) {
     nb::class_<CDispatchWalker, TDispatchWalkerOperations<CDispatchWalker>> binding(
         module, "CDispatchWalker", Collected<CDispatchWalker>(),
         "A node walker that uses a dispatch dictionary keyed by node types to determine which visit method "
         "to call.");
-    binding.def(TInit<nb::object>(), "dispatch_dict"_a.none());
+    binding.def(TInit<nb::object>(), "dispatch_dict"_a.none())
+        .def_ro("_fLogical", &CDispatchWalker::_fLogical, "The logical being walked; None between walks.")
+        .def_prop_ro(
+            "_fDispatchDict", &CDispatchWalker::GetDispatchDict,
+            "The dispatch dictionary: exact node class to a callable of (walker, node), or to False. "
+            "A change counts from the next node on.")
+        .def_prop_ro("_fNodeStack", &CDispatchWalker::GetNodeStack,
+                     "The nodes from the root to the one now visited, as a new list.");
     BindOperations(binding);
 }
 

@@ -13,8 +13,9 @@
 
 #include <nanobind/nanobind.h>
 
+#include "hints/dispatch_table.h"
 #include "neighbours/logicalline/logical_line.h"
-#include "tree/node.h"
+#include "walker/walk_limits.h"
 
 namespace codeloom {
 
@@ -26,23 +27,28 @@ class CDispatchWalker : public CHosted {
     virtual void Walk(CNodeRef node, CLogicalLine& logical, bool first_in_def);
     virtual void _VisitNode(CNodeRef node);
 
+    nb::object GetDispatchDict() const { return _fDispatch.Dict(); }
+    nb::list GetNodeStack() const;
+
     template <class Visitor>
     void References(Visitor&& visit) {
         visit(_fLogical);
-        visit(_fDispatchDict);
+        _fDispatch.References(visit);
         for (CNodeRef& node : _fNodeStack) visit(node);
     }
 
-  protected:
     CRef<CLogicalLine> _fLogical;  // the line being walked; none between walks
-    nb::object _fDispatchDict = nb::none();
+
+  protected:
+    // For a class that has visits of its own.
+    void InitWithVisits(nb::dict dispatch_dict, std::vector<CNativeVisit> native_visits);
 
   private:
     bool _AreChildrenWanted(const CNodeRef& node);
     void _VisitChildren(const CNodeRef& node);
 
-    int _fVisitCount = 0;
-    int _fRecurseCount = 0;
+    CDispatchTable _fDispatch;
+    CVisitLimits _fLimits;
     std::vector<CNodeRef> _fNodeStack;  // from the root to the node now visited
 };
 
@@ -52,7 +58,7 @@ class TDispatchWalkerOperations : public Class {
     OPERATION(
         Walk,
         "Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's "
-        "ambiguous.",
+        "ambiguous. ValueError while a walk is under way.",
         "node"_a.none(), "logical"_a, "first_in_def"_a)
     OPERATION(_VisitNode, "Visit the node and all children. Dispatches to a visit method based on node type.",
               "node"_a.none())

@@ -2,7 +2,7 @@
 // runs, so every index is checked.
 #pragma once
 
-#include <string_view>
+#include <cstdint>
 
 #include <nanobind/nanobind.h>
 
@@ -69,8 +69,20 @@ inline bool DictContains(nb::handle dict, nb::handle key) {
 // The value of `key`; an invalid object when there is none, or no dictionary at all.
 nb::object FindInDict(nb::handle dict_or_none, nb::handle key);
 
+// Another number after each change of a dictionary, and another for each dictionary; 0 for none.
+inline uint64_t DictVersion(nb::handle dict_or_none) {
+    return dict_or_none.is_none() ? 0 : reinterpret_cast<PyDictObject*>(dict_or_none.ptr())->ma_version_tag;
+}
+
 // True when `candidate` is a class derived from `base`, or `base` itself.
 bool IsSubclass(nb::handle candidate, nb::handle base);
+
+// As the host's bool() tells it.
+inline bool IsTrue(nb::handle value) {
+    const int is_true = PyObject_IsTrue(value.ptr());
+    if (is_true < 0) throw nb::python_error();
+    return is_true != 0;
+}
 
 inline bool IsText(nb::handle candidate) {
     return PyUnicode_Check(candidate.ptr());

@@ -1,6 +1,7 @@
 // State that comes back on every road out of a scope.
 #pragma once
 
+#include <exception>
 #include <utility>
 
 namespace codeloom {
@@ -31,5 +32,18 @@ class CCallOnExit {
   private:
     Action _fAction;
 };
+
+// Calls `body` and then, whatever came of it, `last`, which may fail too: its failure is the one that counts.
+template <class Body, class Last>
+void TryFinally(Body body, Last last) {
+    std::exception_ptr failure;
+    try {
+        body();
+    } catch (...) {
+        failure = std::current_exception();
+    }
+    last();
+    if (failure) std::rethrow_exception(failure);
+}
 
 }  // namespace codeloom

@@ -123,6 +123,17 @@ nb::object HostArgument(const CArgument& argument) {
     return info.Release();
 }
 
+// What `make` gives, for a caster: an invalid handle, with the exception pending, when it fails.
+template <class Make>
+nb::handle Released(Make make) noexcept {
+    try {
+        return make().release();
+    } catch (nb::python_error& error) {
+        error.restore();
+        return nb::handle();
+    }
+}
+
 bool ArgumentFromHost(nb::handle candidate, CArgument& argument) {
     if (nb::isinstance<nb::list>(candidate)) {
         argument.is_tuple = true;
@@ -171,15 +182,16 @@ CArgumentList GetUsedArgInfoList(CNodeRef node) {
     return arguments;
 }
 
+nb::handle NewHostArgument(const CArgument& argument) noexcept {
+    return Released([&] { return HostArgument(argument); });
+}
+
 nb::handle NewHostList(const CArgumentList& arguments) noexcept {
-    try {
+    return Released([&]() -> nb::object {
         nb::list result;
         for (const CArgument& argument : arguments) result.append(HostArgument(argument));
-        return result.release();
-    } catch (nb::python_error& error) {
-        error.restore();
-        return nb::handle();
-    }
+        return result;
+    });
 }
 
 bool ArgumentsFromHost(nb::handle candidate, CArgumentList& arguments) noexcept {

@@ -53,6 +53,10 @@ CArgumentList GetUsedArgInfoList(CNodeRef node);
 // Binds CArgInfo and the functions.
 void BindArgumentInfo(nb::module_& module);
 
+// One argument as the host sees it: a new CArgInfo, or a list for a tuple of parameters; an invalid handle,
+// with a host exception pending, when it can't be made.
+nb::handle NewHostArgument(const CArgument& argument) noexcept;
+
 // A new list of the host; an invalid handle, with a host exception pending, when it can't be made.
 nb::handle NewHostList(const CArgumentList& arguments) noexcept;
 
@@ -63,6 +67,21 @@ bool ArgumentsFromHost(nb::handle candidate, CArgumentList& arguments) noexcept;
 }  // namespace codeloom
 
 namespace nanobind::detail {
+
+template <>
+struct type_caster<codeloom::CArgument> {
+    NB_TYPE_CASTER(codeloom::CArgument, make_caster<codeloom::CArgInfo>::Name)
+
+    bool from_python(handle source, uint32_t, cleanup_list*) noexcept {
+        const codeloom::CArgInfo* const info = codeloom::TryInstance<codeloom::CArgInfo>(source);
+        if (info != nullptr) value = *info;
+        return info != nullptr;
+    }
+
+    static handle from_cpp(const codeloom::CArgument& source, rv_policy, cleanup_list*) noexcept {
+        return codeloom::NewHostArgument(source);
+    }
+};
 
 template <>
 struct type_caster<codeloom::CArgumentList> {

@@ -17,10 +17,6 @@ nb::bytes HostBytes(std::string_view utf8) {
     return nb::bytes(utf8.data(), utf8.size());
 }
 
-bool IsTrue(nb::handle value) {
-    return nb::cast<bool>(nb::bool_(nb::borrow(value)));
-}
-
 bool IsName(const CNode& leaf) {
     return leaf.As<CNameLiteral>() != nullptr;
 }

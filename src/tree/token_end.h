@@ -9,4 +9,8 @@ namespace codeloom {
 // the last leaf's context isn't an integer, ValueError for a tree of the host that contains itself.
 Py_ssize_t GetTokenEndIndex(const CNode& node);
 
+// The leaf that is reached by always taking the first child, or the last one. ValueError as above.
+const CNode& FirstLeaf(const CNode& node);
+const CNode& LastLeaf(const CNode& node);
+
 }  // namespace codeloom

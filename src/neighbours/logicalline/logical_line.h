@@ -38,6 +38,9 @@ class CLogicalLine : public CHosted {
     virtual void ClearDerivedInfo();
     virtual nb::object GetExpLogicals();
 
+    // The places of the tokens as the tokenizer found them; null for a record made by hand.
+    const CTokenPlace* Places() const { return _fPlaces.get(); }
+
     // The host's tuples, made on demand.
     virtual nb::object GetPositions();
     virtual nb::object GetTokTypes();

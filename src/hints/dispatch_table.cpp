@@ -1,0 +1,30 @@
+#include "hints/dispatch_table.h"
+
+namespace codeloom {
+
+void CDispatchTable::Set(nb::object dict, std::vector<CNativeVisit> native_visits) {
+    _fDict = std::move(dict);
+    _fNativeVisits = std::move(native_visits);
+    _Forget();
+}
+
+void CDispatchTable::_Forget() {
+    _fEntries.fill(CEntry());
+    _fVersion = DictVersion(_fDict);
+}
+
+CDispatchTable::CEntry CDispatchTable::_Read(nb::handle node_class) const {
+    CEntry entry{node_class.ptr(), EAction::kVisitChildren, nullptr, nb::handle()};
+    const nb::object visit = FindInDict(_fDict, node_class);
+    if (!visit.is_valid() || visit.is_none()) return entry;
+    entry.action = visit.is(Py_False) ? EAction::kSkip : EAction::kCallHost;
+    entry.callable = visit;
+    for (const CNativeVisit& native : _fNativeVisits) {
+        if (!visit.is(native.callable)) continue;
+        entry.action = EAction::kCallNative;
+        entry.function = native.function;
+    }
+    return entry;
+}
+
+}  // namespace codeloom
