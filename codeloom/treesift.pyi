@@ -1696,10 +1696,6 @@ class CDispatchWalker:
     def _fNodeStack(self) -> list[typing.Any]:
         """The nodes from the root to the one now visited, as a new list."""
 
-    @property
-    def _fVisitCount(self) -> int:
-        """Nodes visited since the walk began."""
-
     def Walk(self, node: CNode | None | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
         """
         Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous. ValueError while a walk is under way.

@@ -78,6 +78,7 @@ def test_the_examples(run_cli):
         "fstring_field.py:4:34",
         "fstring_field.py:5:54",
         "fstring_field.py:8:16",
+        "fstring_field.py:14:38",
         "half_written.py:4:20",
         "half_written.py:6:8",
         "half_written.py:10:28",
