@@ -1,20 +1,19 @@
 """The syntax trees of logical lines, for those who look at what the engine is given."""
 
-import re
 from collections.abc import Iterator
 from dataclasses import dataclass
 
 from codeloom import logicalline
 from codeloom.check import Problem
+from codeloom.engine import TooLong
 from codeloom.languages import Language
+from codeloom.line_reader import LineReader, RowsOf
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
 from codeloom.optpgen import ParseError
-from codeloom.source import RowMap, Source
+from codeloom.source import Source
 from codeloom.treesift import CNode, CPGenParserImpl, CreateSyntaxError
 from codeloom.utils import GetLogicalsFromText
-
-_ROW_END = re.compile(r"\r\n|\r|\n")
 
 
 @dataclass(frozen=True, slots=True)
@@ -38,7 +37,7 @@ def LineTrees(source: Source, language: Language, path: str, row: int | None = N
     reader = _TreeReader(source, language, path)
     for logical in GetLogicalsFromText(source.text):
         origin = logical.fFirstLine, 0
-        if row is not None and row - 1 not in _RowsOf(logical, origin[0]):
+        if row is not None and row - 1 not in RowsOf(logical, origin[0]):
             continue
         yield reader.Read(logical, origin, logical.fInAsyncDef)
         for embedded in logical.GetExpLogicals():
@@ -47,59 +46,32 @@ def LineTrees(source: Source, language: Language, path: str, row: int | None = N
                 yield reader.Read(embedded, embedded.fOrigin, logical.fInAsyncDef)
 
 
-class _TreeReader:
+class _TreeReader(LineReader):
     """Parses the logical lines of one text."""
 
     def __init__(self, source: Source, language: Language, path: str) -> None:
-        self._fPath = path
-        self._fFaults = source.faults
-        self._fRowMap = RowMap(source.text)
+        super().__init__(source, path)
         self._fParser = CPGenParserImpl(
             language.version_triple, language.grammar_file, language.keywords, language.is_py3
         )
 
     def Read(self, logical: CLogicalLine, origin: tuple[int, int], in_async_def: bool) -> LineTree:
         """The tree of a logical whose text begins at `origin`: row and UTF-8 column, from zero."""
-        tree, problem = None, self._Fault(_RowsOf(logical, origin[0]))
+        tree, problem = None, self._Fault(RowsOf(logical, origin[0])) or self._TooLong(logical)
         if problem is None:
             try:
                 tree = self._fParser.ParseToNode(logical, in_async_def)
             except ParseError as error:
-                problem = self._Problem(logical, origin, error)
-        first_place = logical.fPositions[0] if logical.fPositions else (0, 0)
-        row, column = self._Place(origin, *first_place)
+                problem = self._Refusal(logical, origin, error)
+        row, column = self._FirstPlace(logical, origin)
         return LineTree(self._fPath, row, column, TextFromTokens(logical).lstrip(), tree, problem)
 
-    def _Fault(self, rows: range) -> Problem | None:
-        """What can't be read on these rows, which count from zero."""
-        for fault in self._fFaults:
-            if fault.row - 1 in rows:
-                source_row = self._fRowMap.Text(fault.row - 1)
-                return Problem(self._fPath, fault.row, fault.column, fault.message, source_row)
-        return None
+    def _TooLong(self, logical: CLogicalLine) -> Problem | None:
+        complaint = TooLong(logical)
+        return complaint and self._Problem(complaint)
 
-    def _Problem(self, logical: CLogicalLine, origin: tuple[int, int], parse_error: ParseError) -> Problem:
+    def _Refusal(self, logical: CLogicalLine, origin: tuple[int, int], parse_error: ParseError) -> Problem:
         *_, context = parse_error.args
         error = CreateSyntaxError("invalid syntax", logical, context)
         row, column = self._Place(origin, error.lineno - 1, error.offset - 1)
         return Problem(self._fPath, row, column, error.msg, self._fRowMap.Text(row - 1))
-
-    def _Place(self, origin: tuple[int, int], row: int, utf8_col: int) -> tuple[int, int]:
-        """Row and column, from 1, of a place in a logical."""
-        origin_row, origin_col = origin
-        place = self._fRowMap.Place(origin_row + row, utf8_col if row else origin_col + utf8_col)
-        return place[0] + 1, place[1] + 1
-
-
-def _RowsOf(logical: CLogicalLine, first_row: int) -> range:
-    """The rows of the file that a logical stands on, from zero."""
-    if not logical.fPositions:
-        return range(first_row, first_row)
-    last_row = logical.fPositions[-1][0] + len(_ROW_END.findall(logical.fToks[-1]))
-    return range(first_row + logical.fPositions[0][0], first_row + last_row + 1)
-
-
-def CountRows(text: str) -> int:
-    """The number of rows of a text; the last one may lack its end."""
-    rows = _ROW_END.split(text)
-    return len(rows) if rows[-1] else len(rows) - 1

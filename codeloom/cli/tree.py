@@ -9,7 +9,8 @@ from codeloom.cli.command import AddLanguageArgument, Command, ExitStatus
 from codeloom.cli.console import Console, PrintablePath
 from codeloom.cli.files import ReadFiles
 from codeloom.cli.tree_formats import FORMATS
-from codeloom.line_trees import CountRows, LineTrees
+from codeloom.line_reader import CountRows
+from codeloom.line_trees import LineTrees
 from codeloom.source import Source, SourceFromBytes, SourceFromText
 
 _CODE_PATH = "<string>"
