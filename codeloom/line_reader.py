@@ -45,11 +45,16 @@ def RowsOf(logical: CLogicalLine, first_row: int) -> range:
     """The rows of the file that a logical stands on, from zero."""
     if not logical.fPositions:
         return range(first_row, first_row)
-    last_row = logical.fPositions[-1][0] + len(_ROW_END.findall(logical.fToks[-1]))
-    return range(first_row + logical.fPositions[0][0], first_row + last_row + 1)
+    last_row = logical.fPositions[-1][0] + len(RowTexts(logical.fToks[-1]))
+    return range(first_row + logical.fPositions[0][0], first_row + last_row)
+
+
+def RowTexts(text: str) -> list[str]:
+    """The rows of a text, without their ends."""
+    return _ROW_END.split(text)
 
 
 def CountRows(text: str) -> int:
     """The number of rows of a text; the last one may lack its end."""
-    rows = _ROW_END.split(text)
+    rows = RowTexts(text)
     return len(rows) if rows[-1] else len(rows) - 1

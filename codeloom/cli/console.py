@@ -27,19 +27,22 @@ class Colour(StrEnum):
 
 
 class Console:
-    """The standard streams, as the terminal or the pipe behind them wants them."""
+    """The standard streams, as the terminal or the pipe behind them wants them.
+
+    `width` is the room for a row behind the indentation, in columns of the terminal.
+    """
 
     def __init__(self) -> None:
         if isinstance(sys.stdout, io.TextIOWrapper):
             sys.stdout.reconfigure(errors="backslashreplace")
         columns = shutil.get_terminal_size((_WIDTH_WITHOUT_TERMINAL, 0)).columns
-        self._fWidth = max(columns - len(_INDENT), _LEAST_WIDTH)
+        self.width = max(columns - len(_INDENT), _LEAST_WIDTH)
         self._fHasColour = _IsColourWanted()
 
     def PrintProblem(self, problem: Problem) -> None:
         """The problem's place and message, its row of source and a caret under the place."""
         place = f"{PrintablePath(problem.path)}:{problem.row}:{problem.column}:"
-        row, caret = Excerpt(problem.source_row, problem.column, self._fWidth)
+        row, caret = Excerpt(problem.source_row, problem.column, self.width)
         print(self.Coloured(Colour.BOLD, place), Printable(problem.message))
         print(_INDENT + row)
         print(_INDENT + self.Coloured(Colour.RED, caret))
