@@ -17,7 +17,15 @@ from codeloom.symbolinfo import (
     kTypeHintPrefix,
     kWithinExprPrefix,
 )
-from codeloom.treesift import CAtom, CNameLiteral, CNode, CNodeWalker, CStarExpression, CTestListStarExpr
+from codeloom.treesift import (
+    CAtom,
+    CDottedName,
+    CNameLiteral,
+    CNode,
+    CNodeWalker,
+    CStarExpression,
+    CTestListStarExpr,
+)
 
 
 class Tokens(NamedTuple):
@@ -26,6 +34,11 @@ class Tokens(NamedTuple):
     logical: CLogicalLine
     first: int
     last: int
+
+    @property
+    def text(self) -> str:
+        """The tokens without anything between them."""
+        return "".join(self.logical.fToks[self.first : self.last + 1])
 
 
 _PUNCTUATION = ("(", ")", "\\")
@@ -101,12 +114,16 @@ class PlaceFinder(CNodeWalker):
             self._fDefined.setdefault(name, tokens)
             self._fPlaces.of_names.setdefault(name, tokens)
 
+    def _DefineByText(self, node: CNode) -> None:
+        tokens = self._TokensOf(node)
+        if tokens is not None:
+            self._Define(tokens.text, tokens)
+
     def _Enter(self, tokens: Tokens | None) -> None:
         """Remember where the walk is, and what name stands there."""
         self._fHere = tokens
         if tokens is not None:
-            text = "".join(self._fLine.fToks[tokens.first : tokens.last + 1])
-            self._fPlaces.of_names.setdefault(text, tokens)
+            self._fPlaces.of_names.setdefault(tokens.text, tokens)
 
     # Records
 
@@ -126,7 +143,7 @@ class PlaceFinder(CNodeWalker):
             return self._fYields[-1]
         return self._fDefined.get(name, self._fHere)
 
-    def _AddArgInfoBytes(self, name: str | bytes, ibytes: bytes) -> None:
+    def _AddArgInfoBytes(self, name: str | bytes, ibytes: str | bytes) -> None:
         pass
 
     # Loads and calls
@@ -142,15 +159,16 @@ class PlaceFinder(CNodeWalker):
         self._fByContext[node.fContext] = self._fHere
         super()._VisitNameLiteral(node, atom_node, all_trailers, trailer_i)
 
-    def _VisitDottedName(self, node: CNode) -> None:
+    def _VisitDottedName(self, node: CDottedName) -> None:
         children = node.fChildren
         for child in children[::2]:
             name = "".join(part.fText for part in children[: children.index(child) + 1])
             self._fLoads.setdefault(name, self._TokensOf(node, child))
         super()._VisitDottedName(node)
 
-    def _ProcessLoadName(self, name: str) -> None:
-        self._fLoads.setdefault(name, self._fHere)
+    def _ProcessLoadName(self, name: str | None) -> None:
+        if name is not None:
+            self._fLoads.setdefault(name, self._fHere)
         super()._ProcessLoadName(name)
 
     def _VisitCall(self, atom: CNode, prev_trailers: list[CNode], arglist: CNode) -> None:
@@ -187,8 +205,7 @@ class PlaceFinder(CNodeWalker):
             for i in range(lhs.GetSubExprCount()):
                 target = lhs.GetSubExpr(i)
                 if isinstance(target, CStarExpression):
-                    starred = target.GetStarredExpression()
-                    self._Define(AsStr(self._fToText.TextForNode(starred) or b""), self._TokensOf(starred))
+                    self._DefineByText(target.fChildren[1])
         super()._ProcessTargets(lhs, rhs, extra_trailer)
 
     def _VisitFuncdef(self, node: Any) -> None:

@@ -99,18 +99,16 @@ def _Rows(said: Iterable[_Said]) -> list[list[str]]:
 def _Value(record: CRecord) -> str:
     """What a name stands for, in words."""
     match record.kind.name, record.value:
-        case "TypedLiteral", (type_name, None):
-            return _SomeInstance(type_name)
-        case "TypedLiteral", (_, value):
-            return value
+        case "TypedLiteral", (str(type_name), value):
+            return value or _SomeInstance(type_name)
         case "Import", module:
             return f"module {module}"
         case "FromImport", (module, "*"):
             return f"everything in {module}"
         case "FromImport", (module, name):
             return f"{name} from {module}"
-        case "PlainEquiv", text if record.name == "yield":
-            return _Yielded(text)
+        case "PlainEquiv", _ if record.name == "yield":
+            return _Yielded(record.payload)
         case _:
             return _ItemInWords(record.payload)
 
