@@ -14,7 +14,6 @@ from codeloom.symbolinfo import (
     kCalledPrefix,
     kGetPrefix,
     kPrefixLen,
-    kTypeHintPrefix,
     kWithinExprPrefix,
 )
 from codeloom.treesift import (
@@ -23,6 +22,7 @@ from codeloom.treesift import (
     CNameLiteral,
     CNode,
     CNodeWalker,
+    CPatternNode,
     CStarExpression,
     CTestListStarExpr,
 )
@@ -58,12 +58,10 @@ class NamePlaces:
         """The tokens of the next record of a name; equal records are told apart by their order."""
         text = AsStr(name)
         if of_arg:
-            return self.of_arguments.get(text)
+            return self.arrow if text == "return" else self.of_arguments.get(text)
         known = self.of_records.get((name, ibytes))
         if known:
             return known.popleft()
-        if text == "return" and ibytes.startswith(kTypeHintPrefix):
-            return self.arrow
         return self.of_names.get(text)
 
 
@@ -78,6 +76,8 @@ class PlaceFinder(CNodeWalker):
         """Add the places in a sound line, which may get more records meanwhile."""
         self._fPlaces = places
         self._fLine = logical
+        # What the tokens of a part that is parsed by itself count from.
+        self._fFirst = 0
         # The tokens of what is visited now, and of what is known by name or token.
         self._fHere: Tokens | None = None
         self._fDefined: dict[str, Tokens] = {}
@@ -101,6 +101,8 @@ class PlaceFinder(CNodeWalker):
         toks, context = self._fLine.fToks, leaf.fContext
         if isinstance(context, tuple) and context in self._fLine.fPositions:
             context = self._fLine.fPositions.index(context)
+        elif isinstance(context, int):
+            context += self._fFirst
         is_index = isinstance(context, int) and 0 <= context < len(toks)
         return context if is_index and toks[context] == leaf.fText else None
 
@@ -270,6 +272,20 @@ class PlaceFinder(CNodeWalker):
     def _VisitNonlocalStmt(self, node: Any) -> None:
         self._DefineEach(node.fChildren[1:])
         super()._VisitNonlocalStmt(node)
+
+    def _VisitCaseStmt(self, case_stmt: Any) -> None:
+        # A guard and a body are parsed by themselves, and count their tokens from their own first.
+        pattern, *rest = case_stmt.fChildren[1:]
+        if isinstance(pattern, CPatternNode):
+            self._VisitPatternNode(pattern)
+        at_colon = [child.fText for child in rest].index(":")
+        colon_i = self._LeafIndex(rest[at_colon]) or 0
+        for i, child in enumerate(rest):
+            if i == at_colon:
+                continue
+            self._fFirst = colon_i + 1 if i > at_colon else colon_i - child.fChildren[2].fContext
+            self._VisitNode(child)
+        self._fFirst = 0
 
     def _VisitPatternNode(self, pattern_node: Any) -> None:
         self._DefineEach(child for child in pattern_node.fChildren if isinstance(child, CNameLiteral))
