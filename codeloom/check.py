@@ -43,31 +43,41 @@ class Report:
     logical_count: int
 
 
-def CheckFile(path: str | PathLike[str], language: Language | str = DEFAULT_LANGUAGE_NAME) -> list[Problem]:
+def CheckFile(
+    path: str | PathLike[str],
+    language: Language | str = DEFAULT_LANGUAGE_NAME,
+    *,
+    false_hints: bool = False,
+) -> list[Problem]:
     """The problems of a file, in the order of the file; OSError when it can't be read.
 
-    `language` is the version of Python that it is written in, such as "3.12".
+    `language` is the version of Python that it is written in, such as "3.12". With `false_hints`
+    all that looks like a type hint is taken for one, as the engine itself does.
     """
-    return list(CheckBytes(Path(path).read_bytes(), language, fspath(path)).problems)
+    return list(CheckBytes(Path(path).read_bytes(), language, fspath(path), false_hints=false_hints).problems)
 
 
 def CheckText(
-    text: str, language: Language | str = DEFAULT_LANGUAGE_NAME, path: str = "<string>"
+    text: str,
+    language: Language | str = DEFAULT_LANGUAGE_NAME,
+    path: str = "<string>",
+    *,
+    false_hints: bool = False,
 ) -> list[Problem]:
     """The problems of a source text, in its order; `path` is the name that they bear."""
-    return list(_Check(SourceFromText(text), language, path).problems)
+    return list(_Check(SourceFromText(text), language, path, false_hints).problems)
 
 
-def CheckBytes(data: bytes, language: Language | str, path: str) -> Report:
+def CheckBytes(data: bytes, language: Language | str, path: str, *, false_hints: bool = False) -> Report:
     """The report on the bytes of a file, decoded as the file says; `path` is its name."""
-    return _Check(SourceFromBytes(data), language, path)
+    return _Check(SourceFromBytes(data), language, path, false_hints)
 
 
-def _Check(source: Source, language: Language | str, path: str) -> Report:
+def _Check(source: Source, language: Language | str, path: str, false_hints: bool) -> Report:
     if isinstance(language, str):
         language = LanguageNamed(language)
     logicals = GetLogicalsFromText(source.text)
-    complaints = _Complaints(logicals, source, language)
+    complaints = _Complaints(logicals, source, language, FalseHintRemover(source.text, keep=false_hints))
     if not complaints and not source.faults:
         return Report((), len(logicals))
     found = [(fault.row, fault.column, fault.message) for fault in source.faults]
@@ -81,10 +91,11 @@ def _Check(source: Source, language: Language | str, path: str) -> Report:
     return Report(problems, len(logicals))
 
 
-def _Complaints(logicals: Iterable[CLogicalLine], source: Source, language: Language) -> list[Complaint]:
+def _Complaints(
+    logicals: Iterable[CLogicalLine], source: Source, language: Language, false_hints: FalseHintRemover
+) -> list[Complaint]:
     """What is wrong with logical lines, false hints and unreadable places apart."""
     analyze = AnalyzerOf(language).AnalyzeSingleLogical
-    false_hints = FalseHintRemover(source.text)
     complaints = []
     with Analysis():
         for logical in logicals:
@@ -92,12 +103,8 @@ def _Complaints(logicals: Iterable[CLogicalLine], source: Source, language: Lang
             if too_long is not None:
                 complaints.append(too_long)
                 continue
-            error = analyze(logical, logical.fInAsyncDef, logical.fFirstInDef)
-            if error is None or IsSpoiled(logical, source.spoiled_rows):
-                continue
-            plain = false_hints.Without(logical)
-            if plain is not None:
-                error = analyze(plain, logical.fInAsyncDef, logical.fFirstInDef)
-            if error is not None:
-                complaints.append(ComplaintOf(error, plain or logical))
+            plain = false_hints.Without(logical) or logical
+            error = analyze(plain, logical.fInAsyncDef, logical.fFirstInDef)
+            if error is not None and not IsSpoiled(logical, source.spoiled_rows):
+                complaints.append(ComplaintOf(error, plain))
     return complaints

@@ -16,13 +16,14 @@ FALSE_COMMENTS = [
     "# type: 'a' text",
     "# type: <class 'int'>",
     "# type: int?",
+    "# type: (int) -> (str, bool)",
 ]
 TRUE_COMMENTS = [
     "# type: int",
     "# type: ignore",
     "# type: List[int]  # a list of them",
     "# type: Optional['a b'] or not None",
-    "# type: (int, *str) -> Dict[str, int]",
+    "# type: (int, List[*Ts], a ** b) -> Dict[str, (int)]",
     "# type: List[",
     "# note: no type: int at all",
     "# typed",
@@ -49,6 +50,41 @@ def test_false_hints_are_blanked_in_place(comment):
 def test_other_comments_are_left_alone(comment):
     text = f"x = f(1)  {comment}"
     assert FalseHintRemover(text).Without(_Only(text)) is None
+
+
+@pytest.mark.parametrize(
+    ("comment", "readable"),
+    [
+        ("# type: (int, *str, ** List[*Ts]) -> a  # why", "# type: (int,  str,    List[*Ts]) -> a  # why"),
+        ("# type: ( *a) -> ( b[c] ) ", "# type: (  a) ->   b[c]   "),
+    ],
+)
+def test_forms_of_hints_that_the_engine_does_not_know(comment, readable):
+    text = f"def f(a, b):  {comment}"
+    assert FalseHintRemover(text).Without(_Only(text)).fToks[-1] == readable
+
+
+@pytest.mark.parametrize(
+    "text",
+    [
+        "def f():  # type: (int) -> str\n  pass",
+        "def f(a, *b, **c):  # type: (int, *str, **Any) -> (bool)\n  pass",
+        "x: Literal['a b'] = 1",
+        "def f(a: Annotated[int, 'free text']) -> Annotated['A', 'more of it', f('a b')]: ...",
+        "x: int = Field(description='what it is')",
+        "def f(a: 'This is the first one', b: 'not a type', c: 'Optional.') -> 'the sum, in kg': ...",
+        "'List[int'",
+        "def f(): 'a docstring'",
+    ],
+)
+def test_no_false_problems(text, caplog):
+    assert CheckText(text) == [] and not caplog.records
+
+
+def test_the_engines_own_behaviour():
+    text = "def f(a):  # type: ignore[a]\n  x: 'this is some prose' = 1\n"
+    assert CheckText(text) == []
+    assert [problem.row for problem in CheckText(text, false_hints=True)] == [1, 2]
 
 
 @pytest.mark.parametrize("comment", FALSE_COMMENTS)

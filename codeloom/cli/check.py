@@ -4,7 +4,7 @@ import argparse
 from dataclasses import dataclass
 
 from codeloom.check import CheckBytes, Report
-from codeloom.cli.command import AddSourceArguments, Command, ExitStatus
+from codeloom.cli.command import AddFalseHintsArgument, AddSourceArguments, Command, ExitStatus
 from codeloom.cli.console import Console
 from codeloom.cli.files import ReadFiles
 
@@ -58,11 +58,12 @@ class CheckCommand(Command):
     def AddArguments(parser: argparse.ArgumentParser) -> None:
         """Add the command's own arguments."""
         AddSourceArguments(parser)
+        AddFalseHintsArgument(parser)
 
     def Run(self, arguments: argparse.Namespace) -> ExitStatus:
         """Check all files; one that can't be read is told, and the others are checked."""
         for path, data in ReadFiles(arguments.paths, self._OnFailure):
-            report = CheckBytes(data, arguments.language, path)
+            report = CheckBytes(data, arguments.language, path, false_hints=arguments.false_hints)
             self._fTally.Add(report)
             for problem in report.problems:
                 self._fConsole.PrintProblem(problem)

@@ -62,6 +62,16 @@ def AddLanguageArgument(parser: argparse.ArgumentParser) -> None:
     )
 
 
+def AddFalseHintsArgument(parser: argparse.ArgumentParser) -> None:
+    """Add `false_hints`."""
+    parser.add_argument(
+        "--false-hints",
+        action="store_true",
+        help="take all that looks like a type hint for one, as the engine itself does: prose behind "
+        "`# type:`, error codes behind `# type: ignore`, sentences in quoted annotations",
+    )
+
+
 def _Language(name: str) -> Language:
     try:
         return LanguageNamed(name)
