@@ -10,7 +10,7 @@ from hand_made import DRIVERS, Leaf, Node
 
 from codeloom.false_hints import FalseHintRemover
 from codeloom.logicalline import CLogicalLine, kComment
-from codeloom.symbolinfo import kSetPrefix
+from codeloom.symbolinfo import kPrefixLen, kSetPrefix, kTypeHintPrefix
 from codeloom.treesift import (
     CFuncdefStmt,
     CNode,
@@ -43,9 +43,9 @@ def Tree(logical, version="3.8"):
 def Hints(pairs):
     """The hints among records, a row for each."""
     return [
-        f"{name.decode()}: {record.decode().removeprefix(':h:')}"
+        f"{name.decode()}: {record[kPrefixLen:].decode()}"
         for name, record in pairs or ()
-        if record != kSetPrefix
+        if record.startswith(kTypeHintPrefix)
     ]
 
 
