@@ -471,14 +471,6 @@ def test_driver_and_parser_are_collected():
     assert gone() is None
 
 
-@pytest.mark.parametrize("open_, close", [("[", "]"), ("(", ")"), ("A(", ")"), ("A(a=", ")"), ("{1:", "}")])
-def test_deep_patterns_end_in_an_exception(open_, close):
-    text = f"case {open_ * 10_000}1{close * 10_000}:"
-    with pytest.raises(RecursionError):
-        Parse(text)
-    assert Form(Parse("case a | b:").GetPattern()) == ("or", "a", "b")
-
-
 def test_removed_tokens_are_no_tokens_of_these_statements():
     logical = CLogicalLine(kCase, ("case", None, "1", ":"), ((0, 0), (0, 5), (0, 6), (0, 7)))
     with pytest.raises(TypeError):

@@ -33,7 +33,8 @@ void HostAssert(bool condition, MakeValue make_value) {
     if (!condition && HostAssertionsOn()) RaiseHost(PyExc_AssertionError, make_value());
 }
 
-// Counts one level of native recursion against the host's limit, whose RecursionError it raises.
+// Counts one level of native recursion against the host's limit. RecursionError past that, and where the
+// thread's own stack comes to its end, whatever the limit.
 class CRecursionScope {
   public:
     CRecursionScope();

@@ -1,6 +1,10 @@
+#include <algorithm>
 #include <string>
 
 #include <cxxabi.h>
+#ifdef __linux__
+#include <pthread.h>
+#endif
 
 #include "host/collections.h"
 #include "host/errors.h"
@@ -95,7 +99,32 @@ void RaiseHostError(nb::handle error) {
     throw nb::python_error();
 }
 
+namespace {
+
+// Where the stack of this thread is as good as used up: what lies beyond is for the host's own calls. Null
+// when the platform doesn't tell.
+const char* LowestStackAddress() {
+#ifdef __linux__
+    constexpr size_t kReserve = 128 * 1024;
+    pthread_attr_t attributes;
+    if (pthread_getattr_np(pthread_self(), &attributes) != 0) return nullptr;
+    void* lowest = nullptr;
+    size_t size = 0;
+    pthread_attr_getstack(&attributes, &lowest, &size);
+    pthread_attr_destroy(&attributes);
+    return static_cast<const char*>(lowest) + std::min(size / 4, kReserve);
+#else
+    return nullptr;
+#endif
+}
+
+}  // namespace
+
 CRecursionScope::CRecursionScope() {
+    static thread_local const char* const lowest = LowestStackAddress();
+    if (static_cast<const char*>(__builtin_frame_address(0)) < lowest)
+        RaiseHost(PyExc_RecursionError,
+                  "the thread's stack is too small to go deeper: make it larger with threading.stack_size()");
     if (Py_EnterRecursiveCall(" in codeloom") != 0) throw nb::python_error();
 }
 

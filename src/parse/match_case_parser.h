@@ -8,6 +8,7 @@
 
 #include <nanobind/nanobind.h>
 
+#include "parse/pattern_work.h"
 #include "parse/token_search.h"
 #include "tree/node_factory.h"
 
@@ -15,7 +16,7 @@ namespace codeloom {
 
 class CPGenParserImpl;
 
-// Subject, guard and body go to the grammar, patterns are parsed here by recursive descent. It is no full
+// Subject, guard and body go to the grammar, patterns are parsed here by descent. It is no full
 // checker of patterns: it decides by the first token and by separators outside brackets.
 //
 // Comments and continuation backslashes are taken out first, so that the tokens have other indexes here than
@@ -43,6 +44,10 @@ class CMatchCaseStatementParser : public CHosted {
     virtual CNodeRef _NodeForMappingPattern(Py_ssize_t start_i, Py_ssize_t end_i);
     virtual nb::object _ParseExceptionAt(Py_ssize_t error_i);
 
+    // Does one step of a pattern: plans the parts of a node, or makes it. A parser of a host subclass makes
+    // it by its operations.
+    virtual void DoPatternStep(CPatternWork& work, const CPatternStep& step);
+
     template <class Visitor>
     void References(Visitor&& visit) {
         visit(_fPGenParser);
@@ -57,12 +62,21 @@ class CMatchCaseStatementParser : public CHosted {
     bool _IsStatementOfType(nb::handle logical_type) const;
     CNodeRef _ParseRange(Py_ssize_t start_i, Py_ssize_t end_i);
 
-    CNodeRef _NodeForCapture(Py_ssize_t start_i, Py_ssize_t end_i);
-    CNodeRef _NodeForAlternatives(Py_ssize_t start_i, Py_ssize_t end_i);
-    CNodeRef _NodeForGroup(Py_ssize_t start_i, Py_ssize_t end_i);
-    CNodeRef _NodeForSingleToken(Py_ssize_t tok_i, int tok_type);
-    CNodeRef _NodeForStar(Py_ssize_t start_i, Py_ssize_t end_i);
-    CNodeRef _NodeForClassArgument(Py_ssize_t start_i, Py_ssize_t end_i);
+    // Plans of patterns, see case_patterns.cpp.
+    using CPlan = CPatternWork::CPlan;
+    CNodeRef _NodeFor(const CPatternStep& first);
+    void _PlanPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as);
+    void _PlanCapture(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanAlternatives(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanGroup(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanSingleToken(CPlan& plan, Py_ssize_t tok_i, int tok_type);
+    void _PlanStar(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanNumberPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanDottedNameValue(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanSequencePattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanMappingPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanClassPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanClassArgument(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
 
     // Tokens of the line; IndexError outside it, TypeError while there is none.
     Py_ssize_t _TokCount() const;
@@ -122,6 +136,26 @@ class TMatchCaseParserOperations : public Class {
               "A ParseError at the token `error_i`, with the token's position as context; not raised here.",
               "error_i"_a)
     END_OPERATIONS
+
+    void DoPatternStep(CPatternWork& work, const CPatternStep& step) override {
+        using EKind = CPatternStep::EKind;
+        switch (step.kind) {
+            case EKind::kPattern:
+                return work.AddNode(this->_NodeForPattern(step.start_i, step.end_i, step.allow_as));
+            case EKind::kClassPattern:
+                return work.AddNode(this->_NodeForClassPattern(step.start_i, step.end_i));
+            case EKind::kDottedName:
+                return work.AddNode(this->_NodeForDottedNameValue(step.start_i, step.end_i));
+            case EKind::kNumber:
+                return work.AddNode(this->_NodeForNumberPattern(step.start_i, step.end_i));
+            case EKind::kSequence:
+                return work.AddNode(this->_NodeForSequencePattern(step.start_i, step.end_i));
+            case EKind::kMapping:
+                return work.AddNode(this->_NodeForMappingPattern(step.start_i, step.end_i));
+            default:
+                return Class::DoPatternStep(work, step);
+        }
+    }
 };
 
 void BindMatchCaseParser(nb::module_& module);
