@@ -197,6 +197,33 @@ def test_type_parameters():
         PY38.GetTypeParameterNodes(("def", "f", "[", "T", ":", "int", "]"))
 
 
+@pytest.mark.parametrize(
+    "parameters",
+    [
+        "T: int, *U, V: (a, b)",
+        "T: # c\n int # d\n, U: \\\n x \\\n",
+        "T: type, U: lambda: 0",
+        "T: a b",
+        "T: x, U: with",
+        "T: async x",
+        "T: @",
+        "T: else",
+        "T: ...",
+    ],
+)
+def test_bounds_are_the_same_for_a_host_subclass_which_gets_copies(parameters):
+    class Driver(CPGenParserImpl):
+        pass
+
+    def Outcome(driver):
+        try:
+            return Shape(Parse(f"def f[{parameters}](): pass", driver))
+        except ParseError as error:
+            return error.args
+
+    assert Outcome(PY38) == Outcome(Driver((3, 8, 0)))
+
+
 def test_token_indexes():
     toks = (None, "", "# x", "\\", "f", "(", ")", ")", "x")
     assert PY38._FindNextNonSkipIndex(toks, -1) == 4

@@ -106,8 +106,13 @@ CNodeRef CPGenParserImpl::ParseTokenListToNode(nb::list toks, bool in_async_def)
 }
 
 CNodeRef CPGenParserImpl::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, CPositions positions) {
-    if (TupleSize(toks) == 0) return CNodeRef();
-    CTokenFeed feed(*this, toks, in_async_def, positions);
+    return _ParseByGrammar(toks, in_async_def, positions, 0, TupleSize(toks));
+}
+
+CNodeRef CPGenParserImpl::_ParseByGrammar(const nb::tuple& toks, bool in_async_def,
+                                          const CPositions& positions, Py_ssize_t start, Py_ssize_t end) {
+    if (end == 0) return CNodeRef();
+    CTokenFeed feed(*this, toks, in_async_def, positions, start, end);
     feed.FeedAll();
     return _PeelRoot(_fParser->finish(), feed.IsDecorator());
 }

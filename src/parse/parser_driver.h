@@ -48,6 +48,11 @@ class CPGenParserImpl : public CPGenAnalyzer {
     virtual bool _ShouldSkipSlash(Py_ssize_t tok_i, CPositions positions);
     virtual nb::list GetTypeParameterNodes(nb::tuple toks);
 
+    // ParseToksToNode for toks[:end], the tokens before `start` removed. A driver of a host subclass makes
+    // the copies that its operations want.
+    virtual CNodeRef ParsePart(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                               Py_ssize_t start, Py_ssize_t end);
+
     template <class Visitor>
     void References(Visitor&& visit) {
         visit(_fGrammar);
@@ -64,12 +69,18 @@ class CPGenParserImpl : public CPGenAnalyzer {
     bool _fAsyncAlwaysKeyword = false;        // `async` and `await` are keywords everywhere
     CRef<CMatchCaseStatementParser> _fMatchCaseStatementParser;
 
+  protected:
+    CNodeRef _ParseCopyOfPart(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                              Py_ssize_t start, Py_ssize_t end);
+
   private:
     friend class CTokenFeed;
     friend class CMatchCaseStatementParser;  // works on the same factory and keywords
 
     CNodeRef _ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                          Py_ssize_t colon_i, Py_ssize_t end, bool raise_errors);
+    CNodeRef _ParseByGrammar(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                             Py_ssize_t start, Py_ssize_t end);
     CNodeRef _PeelRoot(nb::object parsed, bool is_decorator);
 
     nb::object _fGrammar = nb::none();
@@ -143,6 +154,11 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
               "if possible ",
               "toks"_a)
     END_OPERATIONS
+
+    CNodeRef ParsePart(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                       Py_ssize_t start, Py_ssize_t end) override {
+        return this->_ParseCopyOfPart(toks, in_async_def, positions, start, end);
+    }
 };
 
 // Binds the driver, and the parser of `match` and `case` that it owns. `kClsForState` is set here, after all

@@ -22,6 +22,10 @@ bool IsName(const nb::tuple& toks, Py_ssize_t i) {
     return GetTokenType(CUtf8(TupleItem(toks, i))) == kTokenId_NAME;
 }
 
+bool MayBeSpecialCase(nb::handle first_tok) {
+    return TextIsOneOf(first_tok, "with", "match", "case", "except", "type", "def", "class", "async");
+}
+
 bool IsParseError(const nb::python_error& error) {
     return error.matches(ParseErrorClass());
 }
@@ -144,14 +148,27 @@ CNodeRef CPGenParserImpl::_CreateSingleTypeParameterNode(nb::tuple toks, bool in
 // The node of what stands behind the colon at `colon_i`; none when it is refused and errors aren't raised.
 CNodeRef CPGenParserImpl::_ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                                       Py_ssize_t colon_i, Py_ssize_t end, bool raise_errors) {
-    const nb::tuple bound_toks = WithoutTokens(ItemsBetween(toks, 0, end), 0, colon_i + 1);
-    const CPositions bound_positions(ItemsBetween(positions.AsHost(), 0, end));
     try {
-        return ParseToksToNode(bound_toks, in_async_def, bound_positions);
+        return ParsePart(toks, in_async_def, positions, colon_i + 1, end);
     } catch (const nb::python_error& error) {
         if (raise_errors || !IsParseError(error)) throw;
         return CNodeRef();
     }
+}
+
+// Without a copy, unless hand-written parsers or a failure need one: a line may hold many bounds.
+CNodeRef CPGenParserImpl::ParsePart(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                                    Py_ssize_t start, Py_ssize_t end) {
+    const Py_ssize_t i = _FindNextNonSkipIndex(toks, start - 1);
+    if (positions.IsNone() || (i < end && MayBeSpecialCase(TupleItem(toks, i))))
+        return _ParseCopyOfPart(toks, in_async_def, positions, start, end);
+    return _ParseByGrammar(toks, in_async_def, positions, start, end);
+}
+
+CNodeRef CPGenParserImpl::_ParseCopyOfPart(const nb::tuple& toks, bool in_async_def,
+                                           const CPositions& positions, Py_ssize_t start, Py_ssize_t end) {
+    const nb::tuple part = WithoutTokens(ItemsBetween(toks, 0, end), 0, start);
+    return ParseToksToNode(part, in_async_def, CPositions(ItemsBetween(positions.AsHost(), 0, end)));
 }
 
 nb::list CPGenParserImpl::GetTypeParameterNodes(nb::tuple toks) {

@@ -7,21 +7,22 @@
 namespace codeloom {
 
 CTokenFeed::CTokenFeed(CPGenParserImpl& driver, const nb::tuple& toks, bool in_async_def,
-                       const CPositions& positions)
+                       const CPositions& positions, Py_ssize_t start, Py_ssize_t end)
     : _fDriver(driver),
       _fParser(*driver._fParser),
       _fToks(toks),
       _fPositions(positions),
+      _fStart(start),
+      _fEnd(end),
       _fAsyncIsKeyword(driver._fAsyncAlwaysKeyword || in_async_def) {
     _fParser.setup(nb::int_(driver._fFileInputNumber));
 }
 
 void CTokenFeed::FeedAll() {
-    const Py_ssize_t count = TupleSize(_fToks);
-    for (Py_ssize_t i = 0; i < count; ++i) _FeedToken(i);
+    for (Py_ssize_t i = _fStart; i < _fEnd; ++i) _FeedToken(i);
     _CompleteStatement();
     static const CHostText kNewline("\n");
-    const nb::int_ end(count);  // the context of the invented tail: behind the last real token
+    const nb::int_ end(_fEnd);  // the context of the invented tail: behind the last real token
     _fParser.addtoken(kTokenId_NEWLINE, kNewline, end);
     _fParser.addtoken(kTokenId_ENDMARKER, nb::none(), end);
 }
@@ -67,7 +68,9 @@ int CTokenFeed::_AsyncTokenType(nb::handle tok, int type) const {
 
 bool CTokenFeed::_IsSkipped(int type, Py_ssize_t i) {
     if (type == kTokenId_COMMENT) return true;
-    return type == kTokenId_BACKSLASH && _fDriver._ShouldSkipSlash(i, _fPositions);
+    if (type != kTokenId_BACKSLASH) return false;
+    const bool ends_part = i + 1 == _fEnd && _fEnd < TupleSize(_fToks);
+    return ends_part || _fDriver._ShouldSkipSlash(i, _fPositions);
 }
 
 // The 2.7 grammar knows an ellipsis as three dots.
@@ -90,7 +93,7 @@ void CTokenFeed::_CompleteStatement() {
         _FeedInventedTail({"\n", "def", "function", "(", ")", ":", "pass"});
     } else if (lacks_body) {
         static const CHostText kPass("pass");
-        _fParser.addtoken(kTokenId_NAME, kPass, nb::int_(TupleSize(_fToks)));
+        _fParser.addtoken(kTokenId_NAME, kPass, nb::int_(_fEnd));
     }
 }
 
@@ -101,7 +104,7 @@ void CTokenFeed::_FeedInventedHead(std::initializer_list<const char*> texts, Py_
 void CTokenFeed::_FeedInventedTail(std::initializer_list<const char*> texts) {
     nb::list invented;
     for (const char* text : texts) invented.append(InternedText(text));
-    _fDriver._AddTokenList(invented, TupleSize(_fToks));
+    _fDriver._AddTokenList(invented, _fEnd);
 }
 
 }  // namespace codeloom

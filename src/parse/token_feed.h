@@ -13,11 +13,11 @@ namespace codeloom {
 
 class CTokenFeed {
   public:
-    // Sets the parser up for a new file.
-    CTokenFeed(CPGenParserImpl& driver, const nb::tuple& toks, bool in_async_def,
-               const CPositions& positions);
+    // Sets the parser up for a new file, which toks[start:end] is to become.
+    CTokenFeed(CPGenParserImpl& driver, const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+               Py_ssize_t start, Py_ssize_t end);
 
-    // Feeds all tokens of the logical and the invented ones around them.
+    // Feeds the tokens and the invented ones around them.
     void FeedAll();
 
     bool IsDecorator() const { return _fIsDecorator; }
@@ -36,6 +36,8 @@ class CTokenFeed {
     Parser& _fParser;
     const nb::tuple& _fToks;
     const CPositions& _fPositions;
+    const Py_ssize_t _fStart;
+    const Py_ssize_t _fEnd;
     bool _fAsyncIsKeyword;
     bool _fIsDecorator = false;
     int _fLastFedType = -1;
