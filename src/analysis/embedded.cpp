@@ -29,12 +29,8 @@ void RaiseEmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_log
 }
 
 void LiftTypeEquivs(const CLogicalLine& exp_logical, CLogicalLine& logical) {
-    if (exp_logical.fTypeEquivs.is_none()) return;
-    for (nb::handle item : exp_logical.fTypeEquivs) {
-        const nb::tuple pair(nb::borrow(item));
-        if (pair.size() != 2) throw nb::value_error("a type equiv must be a pair of name and equiv");
-        logical.AppendTypeEquiv(pair[0], pair[1]);
-    }
+    exp_logical.fTypeEquivs.ForEach(
+        [&](nb::handle name, nb::handle equiv) { logical.AppendTypeEquiv(name, equiv); });
 }
 
 }  // namespace codeloom

@@ -57,13 +57,11 @@ Py_ssize_t RowCount(const CNode& leaf) {
 
 // The arguments of a `def`, by the records which say that they are bound; none when it has no records.
 nb::object NamesOfArguments(const CLogicalLine& funcdef_logical) {
-    if (funcdef_logical.fArgTypeEquivs.is_none()) return nb::none();
+    if (funcdef_logical.fArgTypeEquivs.IsEmpty()) return nb::none();
     nb::list names;
-    for (nb::handle item : funcdef_logical.fArgTypeEquivs) {
-        const nb::tuple pair(nb::borrow(item));
-        if (pair.size() != 2) throw nb::value_error("an argument's equiv must be a pair of name and equiv");
-        if (std::string_view(CUtf8(pair[1])).starts_with(kSetPrefix)) names.append(pair[0]);
-    }
+    funcdef_logical.fArgTypeEquivs.ForEach([&](nb::handle name, nb::handle equiv) {
+        if (CUtf8(equiv)->starts_with(kSetPrefix)) names.append(name);
+    });
     return names;
 }
 

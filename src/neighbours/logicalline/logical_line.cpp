@@ -15,11 +15,6 @@ nb::object TypesOf(nb::handle toks) {
     });
 }
 
-void AppendPair(nb::object& pairs, nb::handle name, nb::handle equiv) {
-    if (pairs.is_none()) pairs = nb::list();
-    nb::borrow<nb::list>(pairs).append(nb::make_tuple(name, equiv));
-}
-
 }  // namespace
 
 void CLogicalLine::Init(nb::object type, nb::tuple toks, nb::tuple positions, int32_t first_line,
@@ -58,11 +53,11 @@ int CLogicalLine::GetTokenType(Py_ssize_t i) {
 }
 
 void CLogicalLine::AppendTypeEquiv(nb::handle name, nb::handle equiv) {
-    AppendPair(fTypeEquivs, name, equiv);
+    fTypeEquivs.Append(name, equiv);
 }
 
 void CLogicalLine::AppendArgTypeEquiv(nb::handle name, nb::handle equiv) {
-    AppendPair(fArgTypeEquivs, name, equiv);
+    fArgTypeEquivs.Append(name, equiv);
 }
 
 void CLogicalLine::MarkParsed(bool parsed) {
@@ -70,8 +65,8 @@ void CLogicalLine::MarkParsed(bool parsed) {
 }
 
 void CLogicalLine::ClearDerivedInfo() {
-    fTypeEquivs = nb::none();
-    fArgTypeEquivs = nb::none();
+    fTypeEquivs.Clear();
+    fArgTypeEquivs.Clear();
     if (_fExpLogicals.is_none()) return;
     for (nb::handle exp_logical : nb::borrow<nb::tuple>(_fExpLogicals))
         Instance<CLogicalLine>(exp_logical)->ClearDerivedInfo();

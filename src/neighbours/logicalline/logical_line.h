@@ -11,6 +11,7 @@
 
 #include "host/binding.h"
 #include "host/collections.h"
+#include "neighbours/logicalline/record_pairs.h"
 #include "neighbours/tokenizer/raw_logical.h"
 
 namespace codeloom {
@@ -49,8 +50,8 @@ class CLogicalLine : public CHosted {
     void References(Visitor&& visit) {
         visit(fType);
         visit(fToks);
-        visit(fTypeEquivs);
-        visit(fArgTypeEquivs);
+        fTypeEquivs.References(visit);
+        fArgTypeEquivs.References(visit);
         visit(_fExpLogicals);
         visit(_fPositions);
         visit(_fTokTypes);
@@ -61,8 +62,8 @@ class CLogicalLine : public CHosted {
     bool fParsed = false;
     int32_t fFirstLine = 0;
     int32_t fTokenCount = 0;
-    nb::object fTypeEquivs = nb::none();
-    nb::object fArgTypeEquivs = nb::none();
+    CRecordPairs fTypeEquivs;
+    CRecordPairs fArgTypeEquivs;
 
     // What the tokenizer knows beyond the line itself.
     CPosition fOrigin;  // the place in the file of position (0, 0); columns of row 0 count from it
