@@ -300,6 +300,7 @@ class CNodeClassInfo:
 
     def __init__(self, cls: object | None, nodetype: int, name: object | None) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def fCls(self) -> typing.Any:
@@ -322,6 +323,7 @@ class CNode:
 
     def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def fChildren(self) -> typing.Any:
@@ -696,6 +698,7 @@ class CArgInfo:
 
     def __init__(self) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def name(self) -> CNode | None:
@@ -737,6 +740,7 @@ class CAsName:
 
     def __init__(self) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def module_name(self) -> str | None:
@@ -1167,6 +1171,7 @@ class CNodeFactory:
 
     def __init__(self, gram: object, cls_for_nodetype: object, keywords: object | None, tok_number2name: object, op_text2number: object) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def _fOperatorStrToNumber(self) -> typing.Any:
@@ -1227,6 +1232,7 @@ class CNodeToTextConverter:
 
     def __init__(self) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     def TextForNode(self, node: CNode, dotted_name_only: bool=False, discard_simple_parens: bool=True, literal_only: bool=False, add_parens_if_operator: bool=False) -> bytes | None:
         """
@@ -1281,6 +1287,7 @@ class CMatchCaseStatementParser:
 
     def __init__(self, pgen_parser: CPGenParserImpl | None | None) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     def _NonNestedFindTokenIndex(self, tok: str, start: int, end: int) -> int:
         """
@@ -1341,6 +1348,7 @@ class CPGenParserImpl(CPGenAnalyzer):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: object=True) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def _fVersionTriple(self) -> typing.Any:
@@ -1451,6 +1459,7 @@ class CNodeWalker:
 
     def __init__(self, version_triple: tuple[typing.Any, ...]) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def _fIncludeExprText(self) -> bool:
@@ -1681,6 +1690,7 @@ class CDispatchWalker:
 
     def __init__(self, dispatch_dict: object | None) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def _fLogical(self) -> codeloom._neighbours.CLogicalLine | None:
@@ -1713,6 +1723,7 @@ class CTypeHintWalker(CDispatchWalker):
 
     def __init__(self, version_triple: object | None, grammar_file: object, general_node_walker: CNodeWalker | None | None) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def _fNameConv(self) -> CNodeToTextConverterImpl | None:
@@ -1825,6 +1836,7 @@ class CPGenAnalyzerImpl(CPGenAnalyzer):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: object=True, hint_grammar_file: object='Python-Grammar-3.8') -> None:
         ...
+    __class__: getset_descriptor = ...
 
     @property
     def _fNodeWalker(self) -> CNodeWalker | None:

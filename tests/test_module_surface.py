@@ -232,6 +232,14 @@ print(sys.path == path)
 # Stubs
 
 
+@pytest.mark.parametrize("module", [treesift, _neighbours], ids=lambda module: module.__name__)
+def test_no_object_changes_its_class(module):
+    for cls in vars(module).values():
+        if isinstance(cls, type) and not issubclass(cls, BaseException):
+            with pytest.raises(AttributeError, match="__class__"):
+                cls.__new__(cls).__class__ = cls
+
+
 def test_the_stubs_are_up_to_date():
     pytest.importorskip("nanobind")
     path = ROOT / "tools/make_stubs.py"

@@ -20,7 +20,7 @@ struct TInit : nb::def_visitor<TInit<Arguments...>> {
             [](nb::pointer_and_handle<Class> self, Arguments... arguments) {
                 Class* const made =
                     nb::inst_python_derived(self.h) ? new (self.p) HostSubclass : new (self.p) Class;
-                made->SetSelf(self.h);
+                CHosted::Introduce<Class>(*made, self.h);
                 nb::inst_mark_ready(self.h);
                 made->Init(std::forward<Arguments>(arguments)...);
             },
@@ -80,13 +80,26 @@ int ClearCollected(PyObject* self) {
     return 0;
 }
 
+// An object that changed its class would be taken for the other one natively too.
+inline PyObject* ClassOf(PyObject* self, void*) {
+    return Py_NewRef(Py_TYPE(self));
+}
+inline PyGetSetDef kFixedClass[] = {{"__class__", ClassOf, nullptr, nullptr, nullptr}, {}};
+
 // The slots of a collected class, for nb::type_slots.
 template <class Class>
 inline PyType_Slot kCollectedSlots[] = {
     {Py_tp_traverse, reinterpret_cast<void*>(Traverse<Class>)},
     {Py_tp_clear, reinterpret_cast<void*>(ClearCollected<Class>)},
+    {Py_tp_getset, kFixedClass},
     {0, nullptr},
 };
+
+// The same for a class that holds no references.
+inline PyType_Slot kPlainSlots[] = {{Py_tp_getset, kFixedClass}, {0, nullptr}};
+inline nb::type_slots Plain() {
+    return nb::type_slots(kPlainSlots);
+}
 
 template <class Class>
 nb::type_slots Collected() {

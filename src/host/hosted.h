@@ -26,8 +26,13 @@ class CHosted {
 
     nb::handle Self() const { return _fSelf; }
 
-    // Class set-up and MakeInstance call this once, before anything else.
-    void SetSelf(nb::handle self) { _fSelf = self; }
+    // Tells a new object of class T where it lives, before anything else. A class that wants to know its own
+    // declares SetClass<T>().
+    template <class T>
+    static void Introduce(T& made, nb::handle self) {
+        made._fSelf = self;
+        if constexpr (requires { made.template SetClass<T>(); }) made.template SetClass<T>();
+    }
 
   private:
     nb::handle _fSelf;  // borrowed: it owns us
@@ -41,9 +46,16 @@ class CHosted {
 // Raises the host's AttributeError of an operation on none.
 [[noreturn]] void RaiseNoneUsed(const std::type_info& wanted);
 
-// The object of class T inside `candidate`; null when it is of another class or not yet constructed.
+// The object of class T inside `candidate`; null when it is of another class or not yet constructed. Classes
+// whose common base, `CAnyOfKind`, knows which one it is of are told apart by that.
 template <class T>
 T* TryInstance(nb::handle candidate) {
+    if constexpr (requires { typename T::CAnyOfKind; }) {
+        if constexpr (!std::is_same_v<T, typename T::CAnyOfKind>) {
+            const auto* const base = TryInstance<typename T::CAnyOfKind>(candidate);
+            return base == nullptr ? nullptr : base->template As<T>();
+        }
+    }
     static PyTypeObject* const type = reinterpret_cast<PyTypeObject*>(nb::type<T>().ptr());
     if (!PyObject_TypeCheck(candidate.ptr(), type) || !nb::inst_ready(candidate)) return nullptr;
     return nb::inst_ptr<T>(candidate);
@@ -128,7 +140,7 @@ template <class T, class... Arguments>
 CRef<T> MakeInstance(Arguments&&... arguments) {
     nb::object owner = nb::inst_alloc(nb::type<T>());
     T* const made = new (nb::inst_ptr<void>(owner)) T(std::forward<Arguments>(arguments)...);
-    made->SetSelf(owner);
+    CHosted::Introduce<T>(*made, owner);
     nb::inst_mark_ready(owner);
     return CRef<T>::Steal(made, std::move(owner));
 }

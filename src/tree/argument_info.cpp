@@ -12,7 +12,7 @@ namespace {
 // The node as a Class, borrowed; null when it is of another class, or none.
 template <class Class>
 Class* As(const CNodeRef& node) {
-    return node ? TryInstance<Class>(node->Self()) : nullptr;
+    return node ? node->As<Class>() : nullptr;
 }
 
 template <class Class>

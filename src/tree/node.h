@@ -5,6 +5,7 @@
 //   start  at CNode here, CNodeFactory in node_factory.h, the classes in node_classes.h
 #pragma once
 
+#include <bitset>
 #include <string_view>
 
 #include <nanobind/nanobind.h>
@@ -40,6 +41,29 @@ class CNodeClassInfo : public CHosted {
     CNodeRef fFirstFree;
 };
 
+// Which node class an object is of, and which are its bases, without a question to the interpreter.
+class CNodeKind {
+  public:
+    bool Is(const CNodeKind& kind) const { return _fKinds[kind._fIndex]; }
+
+    // Sets the kind up once that of its base is; of CNode itself that is an empty kind.
+    void DeriveFrom(const CNodeKind& base) {
+        static size_t last_index = 0;
+        if (_fIndex == 0) _fIndex = ++last_index;
+        _fKinds = base._fKinds;
+        _fKinds.set(_fIndex);
+    }
+
+  private:
+    static constexpr size_t kMaxKinds = 128;
+    size_t _fIndex = 0;
+    std::bitset<kMaxKinds> _fKinds;
+};
+
+// Set up when the class is bound.
+template <class Class>
+inline CNodeKind kNodeKind;
+
 template <class Class>
 class TNodeOperations;
 
@@ -51,8 +75,16 @@ class CNode : public CHosted {
     template <class Class>
     using TOperations = TNodeOperations<Class>;
 
+    using CAnyOfKind = CNode;
+
     CNode() = default;
     ~CNode() override;
+
+    template <class Class>
+    void SetClass() {
+        _fKind = &kNodeKind<Class>;
+    }
+
     void Init(CRef<CNodeClassInfo> cls_info) { fClsInfo = std::move(cls_info); }
 
     virtual Py_ssize_t GetChildCount();
@@ -69,7 +101,7 @@ class CNode : public CHosted {
     // This node as a T; null when it is of another class.
     template <class T>
     T* As() const {
-        return TryInstance<T>(Self());
+        return _fKind->Is(kNodeKind<T>) ? static_cast<T*>(const_cast<CNode*>(this)) : nullptr;
     }
 
     // The child at `i`, borrowed. TypeError for a leaf, IndexError outside the list.
@@ -118,6 +150,8 @@ class CNode : public CHosted {
     CNodeRef fNextFree;                 // link of the free list; stale while the node is in use
 
   private:
+    const CNodeKind* _fKind = &kNodeKind<CNode>;
+
     bool _HasItem(Py_ssize_t i) const { return !fChildren.is_none() && i < ListSize(fChildren); }
     nb::handle _ItemAt(Py_ssize_t i) const;
 };

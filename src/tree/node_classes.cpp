@@ -22,6 +22,7 @@ nb::list Texts(std::initializer_list<const char*> texts) {
 template <class Class, class Base>
 void Bind(nb::module_& module, const char* name, const char* doc,
           std::initializer_list<const char*> rules = {}) {
+    kNodeKind<Class>.DeriveFrom(kNodeKind<Base>);
     nb::class_<Class, Base, typename Class::template TOperations<Class>> binding(module, name, doc);
     binding.def(TInit<CRef<CNodeClassInfo>>(), "cls_info"_a.none() = nb::none());
     BindOperations(binding);
@@ -41,6 +42,7 @@ void BindClassInfo(nb::module_& module) {
 }
 
 void BindNode(nb::module_& module) {
+    kNodeKind<CNode>.DeriveFrom(CNodeKind());
     nb::class_<CNode, TNodeOperations<CNode>> binding(module, "CNode", Collected<CNode>(),
                                                       "Base of all syntax tree nodes.");
     binding.def(TInit<CRef<CNodeClassInfo>>(), "cls_info"_a.none() = nb::none())

@@ -218,7 +218,8 @@ void CNodeToTextConverterImpl::AppendTextForStringLiteral(std::string& text, CSt
 
 void BindNodeToText(nb::module_& module) {
     nb::class_<CNodeToTextConverter, TNodeToTextConverterOperations<CNodeToTextConverter>> interface(
-        module, "CNodeToTextConverter", "What turns nodes into short texts; a host may derive its own.");
+        module, "CNodeToTextConverter", Plain(),
+        "What turns nodes into short texts; a host may derive its own.");
     interface.def(TInit<>());
     BindOperations(interface);
 

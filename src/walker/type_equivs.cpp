@@ -116,7 +116,7 @@ CBytesOrNone CNodeWalker::_EquivForSimpleLiteral(CNode& node) {
     if (TextIsOneOf(node.fText, "True", "False"))
         return Utf8Concat3(gPrefixes.kTypedLiteralPrefix, nb::bytes("bool: "), node.fText);
     if (CNumberLiteral* const number = node.As<CNumberLiteral>()) return _EquivForNumber(*number);
-    return _EquivForString(*Instance<CStringLiteral>(node.Self()));
+    return _EquivForString(*node.As<CStringLiteral>());
 }
 
 CBytesOrNone CNodeWalker::_EquivForNumber(CNumberLiteral& number, std::string_view sign) {

@@ -48,7 +48,7 @@ Py_ssize_t HostFindStringEnd(const CNonNestedSearch& search, Py_ssize_t quote_i)
 }
 
 void BindStringTokenizer(nb::module_& module) {
-    nb::class_<CStringTokenizer>(module, "CStringTokenizer", kStringTokenizerDoc)
+    nb::class_<CStringTokenizer>(module, "CStringTokenizer", Plain(), kStringTokenizerDoc)
         .def(TInit<CUtf8Argument>(), "utf8"_a)
         .def_prop_ro(
             "fAtEnd", [](CStringTokenizer& tokenizer) { return tokenizer.Tokens().IsAtEnd(); },
@@ -67,7 +67,7 @@ void BindStringTokenizer(nb::module_& module) {
 }
 
 void BindNonNestedSearch(nb::module_& module) {
-    nb::class_<CNonNestedSearch>(module, "CNonNestedSearch", kNonNestedSearchDoc)
+    nb::class_<CNonNestedSearch>(module, "CNonNestedSearch", Plain(), kNonNestedSearchDoc)
         .def(TInit<>())
         .def(
             "InitWith",

@@ -42,7 +42,7 @@ void BindGrammar(nb::module_& module) {
                 "Rule names to rule numbers: 256 for the start symbol, then the other names in order.")
         .def_ro("number2symbol", &CGrammar::number2symbol, "Rule numbers to rule names.")
         .def("__repr__", &CGrammar::Repr);
-    nb::class_<ParserGenerator>(module, "ParserGenerator", kParserGeneratorDoc)
+    nb::class_<ParserGenerator>(module, "ParserGenerator", Plain(), kParserGeneratorDoc)
         .def(TInit<nb::object, nb::dict, nb::dict>(), "grammar_file"_a, "tok_number2name"_a,
              "op_text2number"_a)
         .def("make_grammar", &ParserGenerator::make_grammar, kMakeGrammarDoc);

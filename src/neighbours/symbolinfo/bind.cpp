@@ -74,7 +74,7 @@ void BindVocabulary(nb::module_& module) {
 }
 
 void BindKindFilter(nb::module_& module) {
-    nb::class_<CKindFilter>(module, "CKindFilter",
+    nb::class_<CKindFilter>(module, "CKindFilter", Plain(),
                             "A set of kinds: CKindFilter(kinds), a byte string of them.")
         .def(TInit<nb::bytes>(), "kinds"_a = nb::bytes(""))
         .def(
