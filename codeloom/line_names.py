@@ -140,12 +140,13 @@ class _NameReader(LineReader):
         places = NamePlaces()
         parser, finder = _ParserOf(self._fLanguage), _PlaceFinderOf(self._fLanguage)
         for part in (logical, *logical.GetExpLogicals()):
-            if part.fType in (logicalline.kComment, logicalline.kCommentedTypeHint):
-                continue
-            tree = parser.ParseToNode(part, in_async_def)
-            if tree is not None:
-                finder.Find(tree, part, places)
-                parser.DiscardNode(tree)
+            if part.fType == logicalline.kCommentedTypeHint:
+                places.AddComment(part)
+            elif part.fType != logicalline.kComment:
+                tree = parser.ParseToNode(part, in_async_def)
+                if tree is not None:
+                    finder.Find(tree, part, places)
+                    parser.DiscardNode(tree)
         return places
 
     def _Placed(self, records: list[CRecord], places: NamePlaces) -> Iterator[PlacedRecord]:

@@ -52,6 +52,7 @@ class NamePlaces:
         self.of_records: dict[tuple[bytes, bytes], deque[Tokens | None]] = defaultdict(deque)
         self.of_arguments: dict[str, Tokens] = {}
         self.of_names: dict[str, Tokens] = {}
+        self.in_comments: dict[str, Tokens] = {}
         self.arrow: Tokens | None = None
 
     def Take(self, name: bytes, ibytes: bytes, of_arg: bool) -> Tokens | None:
@@ -62,7 +63,18 @@ class NamePlaces:
         known = self.of_records.get((name, ibytes))
         if known:
             return known.popleft()
+        if ibytes == kGetPrefix and text in self.in_comments:
+            return self.in_comments[text]
         return self.of_names.get(text)
+
+    def AddComment(self, hint: CLogicalLine) -> None:
+        """Add the names that a hint in a comment reads, which is rewritten before it is parsed."""
+        first = 0
+        for i, token in enumerate(hint.fToks):
+            if token.isidentifier():
+                first = first if i and hint.fToks[i - 1] == "." else i
+                tokens = Tokens(hint, first, i)
+                self.in_comments.setdefault(tokens.text, tokens)
 
 
 class PlaceFinder(CNodeWalker):
