@@ -11,10 +11,11 @@ from collections.abc import Sequence
 from codeloom import __version__
 from codeloom.cli.check import CheckCommand
 from codeloom.cli.command import Command, ExitStatus
+from codeloom.cli.hints import HintsCommand
 from codeloom.cli.names import NamesCommand
 from codeloom.cli.tree import TreeCommand
 
-COMMANDS: Sequence[type[Command]] = (CheckCommand, NamesCommand, TreeCommand)
+COMMANDS: Sequence[type[Command]] = (CheckCommand, NamesCommand, HintsCommand, TreeCommand)
 
 # What a shell reports for a program that SIGINT or SIGPIPE ended.
 _INTERRUPTED = 130

@@ -1,0 +1,356 @@
+"""The defs of a source: their arguments with types and defaults, and what they are known to give back."""
+
+import re
+from collections.abc import Iterable, Iterator
+from dataclasses import dataclass, field, replace
+from os import PathLike, fspath
+from pathlib import Path
+from typing import Any
+
+from codeloom import logicalline
+from codeloom.check import Problem
+from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, TooLong
+from codeloom.false_hints import FalseHintRemover
+from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageNamed
+from codeloom.line_reader import LineReader, RowsOf
+from codeloom.logicalline import CLogicalLine
+from codeloom.records import CRecord, RecordsOfLogical
+from codeloom.source import Source, SourceFromBytes, SourceFromText
+from codeloom.symbolinfo import kArgPrefix
+from codeloom.treesift import (
+    CFuncdefStmt,
+    CNode,
+    CNodeToTextConverterImpl,
+    FinishedWithNode,
+    GetDefiningArgInfoList,
+)
+from codeloom.utils import GetLogicalsFromText
+
+
+@dataclass(frozen=True, slots=True)
+class Value:
+    """What is known of a value on a row, from 1: its type, the text that it is written as, or both."""
+
+    row: int
+    type: str | None
+    text: str | None
+
+
+@dataclass(frozen=True, slots=True)
+class Argument:
+    """One argument: its stars, its type by annotation or comment, and its default.
+
+    A bare `*` and a `/` stand among the arguments without a name.
+    """
+
+    name: str | None
+    prefix: str = ""
+    hint: str | None = None
+    default: Value | None = None
+
+
+@dataclass(frozen=True, slots=True)
+class Signature:
+    """One def, or what is wrong with its line.
+
+    `name` is that of the def behind those of the classes and defs around it. `row` and `column`
+    count from 1, the column in characters.
+    """
+
+    path: str
+    row: int
+    column: int
+    name: str = ""
+    is_async: bool = False
+    type_parameters: tuple[str, ...] = ()
+    arguments: tuple[Argument, ...] = ()
+    return_hint: str | None = None
+    returns: tuple[Value, ...] = ()
+    yields: tuple[Value, ...] = ()
+    problem: Problem | None = None
+
+
+def SignaturesInFile(
+    path: str | PathLike[str],
+    language: Language | str = DEFAULT_LANGUAGE_NAME,
+    *,
+    false_hints: bool = False,
+) -> list[Signature]:
+    """The signatures in a file, in its order; OSError when it can't be read.
+
+    `language` is the version of Python that it is written in, such as "3.12". With `false_hints`
+    all that looks like a type hint is taken for one, as the engine itself does.
+    """
+    return SignaturesInBytes(Path(path).read_bytes(), language, fspath(path), false_hints=false_hints)
+
+
+def SignaturesInText(
+    text: str,
+    language: Language | str = DEFAULT_LANGUAGE_NAME,
+    path: str = "<string>",
+    *,
+    false_hints: bool = False,
+) -> list[Signature]:
+    """The same for a source text; `path` is the name that its lines bear."""
+    return _Signatures(SourceFromText(text), language, path, false_hints)
+
+
+def SignaturesInBytes(
+    data: bytes, language: Language | str, path: str, *, false_hints: bool = False
+) -> list[Signature]:
+    """The same for the bytes of a file, decoded as the file says; `path` is its name."""
+    return _Signatures(SourceFromBytes(data), language, path, false_hints)
+
+
+def _Signatures(source: Source, language: Language | str, path: str, false_hints: bool) -> list[Signature]:
+    if isinstance(language, str):
+        language = LanguageNamed(language)
+    reader = _SignatureReader(source, language, path, FalseHintRemover(source.text, keep=false_hints))
+    with Analysis():
+        for logical in GetLogicalsFromText(source.text):
+            reader.Read(logical)
+    return reader.Signatures()
+
+
+@dataclass
+class _Scope:
+    """A class or a def whose body is being read; `of_def` is its place among the signatures."""
+
+    indent: int
+    name: str
+    of_def: int | None = None
+
+
+@dataclass
+class _Outcomes:
+    returns: list[Value] = field(default_factory=list)
+    yields: list[Value] = field(default_factory=list)
+
+
+class _SignatureReader(LineReader):
+    """Reads the logical lines of one text in their order."""
+
+    def __init__(self, source: Source, language: Language, path: str, false_hints: FalseHintRemover) -> None:
+        super().__init__(source, path)
+        self._fAnalyzer = AnalyzerOf(language)
+        self._fFalseHints = false_hints
+        self._fSignatures: list[Signature] = []
+        self._fOutcomes: list[_Outcomes] = []
+        self._fScopes: list[_Scope] = []
+
+    def Signatures(self) -> list[Signature]:
+        """What was read so far."""
+        return [
+            replace(signature, returns=tuple(outcomes.returns), yields=tuple(outcomes.yields))
+            for signature, outcomes in zip(self._fSignatures, self._fOutcomes, strict=True)
+        ]
+
+    def Read(self, logical: CLogicalLine) -> None:
+        """Read the next line."""
+        is_comment = logical.fType == logicalline.kComment
+        if not logical.fTokenCount or (is_comment and not logical.fFirstInDef):
+            return
+        if not is_comment:
+            self._LeaveScopes(logical)
+        if logical.fType == logicalline.kFunctionDef:
+            self._ReadDef(logical)
+        elif logical.fType == logicalline.kClassDef:
+            self._Enter(logical, _NameBehind("class", logical))
+        elif self._fScopes and not TooLong(logical):
+            self._ReadBodyLine(logical)
+
+    # Scopes
+
+    def _LeaveScopes(self, logical: CLogicalLine) -> None:
+        indent = self._Indent(logical)
+        while indent is not None and self._fScopes and self._fScopes[-1].indent >= indent:
+            self._fScopes.pop()
+
+    def _Indent(self, logical: CLogicalLine) -> int | None:
+        """The width of the blanks before a line; None behind another line on the same row."""
+        row, col = logical.fPositions[0]
+        before = self._fRowMap.Text(logical.fFirstLine + row).encode()[:col].decode()
+        return None if before.strip() else len(before.rpartition("\f")[2].expandtabs())
+
+    def _Enter(self, logical: CLogicalLine, name: str, of_def: int | None = None) -> None:
+        self._fScopes.append(_Scope(self._Indent(logical) or 0, name, of_def))
+
+    # Lines
+
+    def _ReadDef(self, logical: CLogicalLine) -> None:
+        """Add the signature of a def, or its fault."""
+        row, column = self._FirstPlace(logical, (logical.fFirstLine, 0))
+        name = _NameBehind("def", logical)
+        is_method = bool(self._fScopes) and self._fScopes[-1].of_def is None
+        self._Enter(logical, name, len(self._fSignatures))
+        signature = Signature(
+            self._fPath, row, column, ".".join(scope.name for scope in self._fScopes),
+            is_async=logical.fToks[0] == "async",
+        )  # fmt: skip
+        problem = self._Fault(RowsOf(logical, logical.fFirstLine))
+        too_long = TooLong(logical)
+        if problem is None and too_long is not None:
+            problem = self._Problem(too_long)
+        self._fOutcomes.append(_Outcomes())
+        self._fSignatures.append(
+            self._Analyzed(signature, logical, is_method)
+            if problem is None
+            else replace(signature, problem=problem)
+        )
+
+    def _Analyzed(self, signature: Signature, logical: CLogicalLine, is_method: bool) -> Signature:
+        plain = self._fFalseHints.Without(logical) or logical
+        error = self._fAnalyzer.AnalyzeSingleLogical(plain, logical.fInAsyncDef, logical.fFirstInDef)
+        if error is not None:
+            return replace(signature, problem=self._Problem(ComplaintOf(error, plain)))
+        tree = self._fAnalyzer.ParseToNode(plain, logical.fInAsyncDef)
+        if tree is None:
+            return signature
+        may_lack_self = is_method and _HasFunctionHint(plain)
+        filled = _Filled(signature, tree, RecordsOfLogical(plain), may_lack_self)
+        FinishedWithNode(tree)
+        return filled
+
+    def _ReadBodyLine(self, logical: CLogicalLine) -> None:
+        """Take what a line in the body of a def gives back, and its hint for the def."""
+        scope = self._fScopes[-1]
+        if scope.of_def is None:
+            return
+        plain = self._fFalseHints.Without(logical) or logical
+        if self._fAnalyzer.AnalyzeSingleLogical(plain, logical.fInAsyncDef, logical.fFirstInDef) is not None:
+            return
+        records = RecordsOfLogical(plain)
+        if logical.fType == logicalline.kComment:
+            is_method = len(self._fScopes) > 1 and self._fScopes[-2].of_def is None
+            signature = self._fSignatures[scope.of_def]
+            self._fSignatures[scope.of_def] = _WithHintsOfBody(signature, records, is_method)
+            return
+        outcomes = self._fOutcomes[scope.of_def]
+        for record in records:
+            if record.name in ("return", "yield") and record.kind.name != "Get":
+                values = outcomes.returns if record.name == "return" else outcomes.yields
+                values.append(_ValueOf(record, logical.fFirstLine + 1))
+
+
+def _NameBehind(keyword: str, logical: CLogicalLine) -> str:
+    toks = [tok for tok in logical.fToks if tok and tok[0] not in "#\\"]
+    behind = toks[toks.index(keyword) + 1 :] if keyword in toks else []
+    return behind[0] if behind else "?"
+
+
+def _ValueOf(record: CRecord, row: int) -> Value:
+    if record.kind.payload != "literal":
+        return Value(row, None, record.payload)
+    type_name, text = record.value if isinstance(record.value, tuple) else (record.payload, None)
+    return Value(row, type_name, text)
+
+
+# The signature of one def
+
+_TO_TEXT = CNodeToTextConverterImpl(True, True, True)
+_FUNCTION_HINT = re.compile(r"#\s*type:\s*\(")
+
+
+def _HasFunctionHint(logical: CLogicalLine) -> bool:
+    return any(tok and _FUNCTION_HINT.match(tok) for tok in logical.fToks)
+
+
+def _Filled(signature: Signature, tree: CNode, records: Iterable[CRecord], may_lack_self: bool) -> Signature:
+    """A signature with what the tree and the records say of its def."""
+    of_arguments: dict[str, list[CRecord]] = {}
+    for record in records:
+        if record.of_arg:
+            of_arguments.setdefault(record.name, []).append(record)
+    funcdef = tree
+    while not isinstance(funcdef, CFuncdefStmt):  # it stands last behind `async` and type parameters
+        funcdef = funcdef.fChildren[-1]
+    arguments = _Arguments(funcdef, of_arguments, signature.row)
+    return replace(
+        signature,
+        type_parameters=tuple(_TypeParameters(of_arguments)),
+        arguments=tuple(_WithSelf(arguments) if may_lack_self else arguments),
+        return_hint=_Hint(of_arguments.get("return", ())),
+    )
+
+
+def _Arguments(funcdef: CFuncdefStmt, of_arguments: dict[str, list[CRecord]], row: int) -> list[Argument]:
+    arguments = []
+    for info in _Flat(GetDefiningArgInfoList(funcdef.GetParameters())):
+        name = None if info.name is None else info.name.fText
+        records = of_arguments.get(name, ()) if name else ()
+        arguments.append(Argument(name, info.prefix or "", _Hint(records), _Default(info, records, row)))
+    slash_i = _SlashIndex(funcdef)
+    if slash_i is not None:
+        arguments.insert(slash_i, Argument(None, "/"))
+    return arguments
+
+
+def _SlashIndex(funcdef: CFuncdefStmt) -> int | None:
+    """The number of arguments in front of a `/`."""
+    parameters = funcdef.GetParameters()
+    inner = parameters.GetChild(1) if parameters is not None else None
+    texts = [child.fText for child in (inner and inner.fChildren) or ()]
+    return texts[: texts.index("/")].count(",") if "/" in texts else None
+
+
+def _Flat(infos: Iterable[Any]) -> Iterator[Any]:
+    for info in infos:
+        if isinstance(info, list):
+            yield from _Flat(info)
+        else:
+            yield info
+
+
+def _Hint(records: Iterable[CRecord]) -> str | None:
+    return next((record.payload for record in records if record.kind.name == "TypeHint"), None)
+
+
+def _Default(info: Any, records: Iterable[CRecord], row: int) -> Value | None:
+    if info.value is None:
+        return None
+    text = _TO_TEXT.TextForNode(info.value)
+    value = Value(row, None, None if text is None else text.decode())
+    for record in records:
+        if record.kind.payload == "literal":
+            known = _ValueOf(record, row)
+            return known if known.text is not None else replace(value, type=known.type)
+    return value
+
+
+def _TypeParameters(of_arguments: dict[str, list[CRecord]]) -> Iterator[str]:
+    for name, records in of_arguments.items():
+        for record in records:
+            if record.kind.name == "TypeParameter":
+                bound = record.payload.lstrip("* ")
+                stars = record.payload[: len(record.payload) - len(record.payload.lstrip("*"))]
+                yield stars + name + (f": {bound}" if bound else "")
+
+
+def _WithSelf(arguments: list[Argument]) -> list[Argument]:
+    """Arguments of a method whose comment leaves out the first one, as it may."""
+    named = [i for i, argument in enumerate(arguments) if argument.name]
+    hints = [arguments[i].hint for i in named]
+    if not hints or hints[-1] is not None or None in hints[:-1]:
+        return arguments
+    for i, hint in zip(named, [None, *hints], strict=False):
+        arguments[i] = replace(arguments[i], hint=hint)
+    return arguments
+
+
+def _WithHintsOfBody(signature: Signature, records: Iterable[CRecord], is_method: bool) -> Signature:
+    """A signature with the hints of a comment on the first row of the body, which knows no names."""
+    hints = {record.name: record.payload for record in records if record.kind.name == "TypeHint"}
+    return_hint = hints.pop("return", None)
+    named = [argument for argument in signature.arguments if argument.name]
+    skipped = 1 if is_method and len(hints) == len(named) - 1 else 0
+    by_name = {
+        argument.name: hints.get(f"{kArgPrefix.decode()}{i}") for i, argument in enumerate(named[skipped:])
+    }
+    return replace(
+        signature,
+        return_hint=signature.return_hint or return_hint,
+        arguments=tuple(
+            replace(argument, hint=argument.hint or by_name.get(argument.name))
+            for argument in signature.arguments
+        ),
+    )

@@ -1,0 +1,114 @@
+"""`codeloom hints` and the signatures behind it.
+
+Golden files in signatures/ hold sources with what the command prints of them.
+"""
+
+import ast
+import json
+import random
+from contextlib import redirect_stdout
+from io import StringIO
+from pathlib import Path
+
+import pytest
+from golden import Cases, Check
+from test_library import LibraryTexts
+
+from codeloom.cli.console import Console
+from codeloom.cli.hints import TextFormat
+from codeloom.signatures import Argument, SignaturesInFile, SignaturesInText, Value
+
+
+def Printed(source):
+    stream = StringIO()
+    with redirect_stdout(stream):
+        text_format = TextFormat(Console())
+        for signature in SignaturesInText(source, "3.12"):
+            text_format.Add(signature)
+    return f"---\n{stream.getvalue()}".replace("<string>:", "").rstrip("\n")
+
+
+@pytest.mark.parametrize("case", Cases(Path(__file__).parent / "signatures", ".signatures"))
+def test_signatures(case, rewrite):
+    Check(case, Printed(case.source), rewrite)
+
+
+def NamesByTree(tree):
+    """Place and argument names of each def, by the interpreter's own parser."""
+    for node in ast.walk(tree):
+        if isinstance(node, ast.FunctionDef | ast.AsyncFunctionDef):
+            args = node.args
+            names = [arg.arg for arg in (*args.posonlyargs, *args.args)]
+            names += [args.vararg.arg] if args.vararg else []
+            names += [arg.arg for arg in args.kwonlyargs]
+            names += [args.kwarg.arg] if args.kwarg else []
+            annotated = sum(arg.annotation is not None for arg in ast.walk(args) if isinstance(arg, ast.arg))
+            yield node.lineno, node.name, names, annotated, node.returns is not None
+
+
+def test_signatures_are_those_of_the_interpreter():
+    seed = random.randrange(1 << 30)
+    for path, text, tree in LibraryTexts(60, seed):
+        signatures = [signature for signature in SignaturesInText(text) if signature.problem is None]
+        ours = {
+            (
+                signature.row,
+                signature.name.rpartition(".")[2],
+                tuple(argument.name for argument in signature.arguments if argument.name),
+            )
+            for signature in signatures
+        }
+        theirs = {(row, name, tuple(names)) for row, name, names, *_ in NamesByTree(tree)}
+        assert ours <= theirs and len(theirs - ours) <= len(SignaturesInText(text)) - len(signatures), (
+            seed,
+            path,
+        )
+
+
+def test_an_api_of_values(tmp_path):
+    path = tmp_path / "a.py"
+    path.write_text("class A:\n  def f(self, a: int = 1): return 2\n  def g(self):\n    return b\n")
+    f, g = SignaturesInFile(path)
+    assert (f.path, f.row, f.column, f.name) == (str(path), 2, 3, "A.f")
+    assert f.arguments == (Argument("self"), Argument("a", "", "int", Value(2, "int", "1")))
+    assert (f.returns, g.returns) == ((), (Value(4, None, "b"),))
+    with pytest.raises(FileNotFoundError):
+        SignaturesInFile(tmp_path / "absent.py")
+
+
+@pytest.mark.parametrize(
+    ("arguments", "status", "rows"),
+    [
+        (["a.py"], 0, ["a.py:1:1: def f(a)", "    a      int", "    gives  int 1"]),
+        (["b.py", "a.py"], 1, ["b.py:1:9: invalid syntax", "    def f(a b): pass"]),
+        (["absent.py", "b.py"], 2, ["b.py:1:9: invalid syntax"]),
+        (["--python", "2.7", "old.py"], 0, ["old.py:1:1: def f(a, b, c)", "    a  = 1, int"]),
+        (["c.py"], 0, ["c.py:1:1: def f(a)"]),
+        (["--false-hints", "c.py"], 1, ["c.py:1:20: invalid syntax"]),
+    ],
+)
+def test_the_command(run_cli, write_files, arguments, status, rows):
+    write_files(
+        {
+            "a.py": "def f(a):\n  # type: (int) -> None\n  return 1\n".replace(" -> None", ""),
+            "b.py": "def f(a b): pass\n",
+            "c.py": "def f(a):  # type: ignore[x]\n  pass",
+            "old.py": "def f(a=1, (b, c)=d): print a\n",
+        }
+    )
+    done = run_cli("hints", *arguments)
+    assert done.returncode == status
+    assert done.stdout.splitlines()[: len(rows)] == rows
+    assert ("absent.py" in done.stderr) == (status == 2)
+
+
+def test_rows_of_json(run_cli, write_files):
+    write_files({"a.py": "async def f(a: int = 1, *b):\n  yield\n  yield c\ndef g(h i): pass\n"})
+    done = run_cli("hints", "--format", "jsonl", "a.py")
+    f, g = map(json.loads, done.stdout.splitlines())
+    assert f["is_async"] and f["yields"] == [{"row": 3, "type": None, "text": "c"}]
+    assert f["arguments"] == [
+        {"name": "a", "prefix": "", "hint": "int", "default": {"row": 1, "type": "int", "text": "1"}},
+        {"name": "b", "prefix": "*", "hint": None, "default": None},
+    ]
+    assert (g["name"], g["row"], g["error"]) == ("g", 4, {"row": 4, "column": 9, "message": "invalid syntax"})
