@@ -237,11 +237,7 @@ nb::object BytesWithSurrogates(nb::handle text) {
 
 }  // namespace
 
-CUtf8::CUtf8(nb::handle text) {
-    if (PyBytes_Check(text.ptr())) {
-        _fView = BytesView(text);
-        return;
-    }
+void CUtf8::_SetView(nb::handle text) {
     if (!PyUnicode_Check(text.ptr())) RaiseWrongType("str or bytes", text);
     Py_ssize_t size = 0;
     if (const char* const utf8 = PyUnicode_AsUTF8AndSize(text.ptr(), &size)) {

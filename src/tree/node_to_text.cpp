@@ -1,7 +1,5 @@
 #include "tree/node_to_text.h"
 
-#include <vector>
-
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/symbolinfo/info_bytes.h"
@@ -135,22 +133,16 @@ bool CNodeToTextConverterImpl::_AppendAtom(std::string& text, CAtom& atom, const
 bool CNodeToTextConverterImpl::_AppendJoinedChildren(std::string& text, CNode& node,
                                                      const CNodeTextOptions& options) {
     if (!_fIncludeBracketText || options.dotted_name_only || node.fChildren.is_none()) return false;
-    std::string children;
-    std::vector<size_t> ends;
-    for (Py_ssize_t i = 0; i < node._GetChildCount(); ++i) {
-        const CNodeRef child = node.ChildAs<CNode>(i);
-        if (!AppendTextForNode(children, *child)) return false;
-        ends.push_back(children.size());
-    }
-    std::vector<std::string_view> pieces;
-    size_t start = 0;
-    for (const size_t end : ends) {
-        pieces.push_back(std::string_view(children).substr(start, end - start));
-        start = end;
-    }
-    const bool has_parens = options.add_parens_if_operator && pieces.size() != 1;
+    const Py_ssize_t child_count = node._GetChildCount();
+    const bool has_parens = options.add_parens_if_operator && child_count != 1;
     if (has_parens) text += '(';
-    text += JoinTokens(pieces);
+    CTokenJoiner joiner;
+    for (Py_ssize_t i = 0; i < child_count; ++i) {
+        const CNodeRef child = node.ChildAs<CNode>(i);
+        const size_t start = text.size();
+        if (!AppendTextForNode(text, *child)) return false;
+        joiner.PartFromPrevious(text, start);
+    }
     if (has_parens) text += ')';
     return true;
 }

@@ -4,6 +4,7 @@
 #include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/symbolinfo/info_bytes.h"
+#include "strutils/text.h"
 #include "symbolinfo/module_constants.h"
 #include "tree/node_helpers.h"
 #include "walker/node_walker.h"
@@ -39,9 +40,10 @@ void CNodeWalker::_VisitNameLiteral(CNameLiteral& node, CNodeRef atom_node,
     if (all_trailers) {
         const Py_ssize_t count = Py_ssize_t{trailer_i} + 1;
         if (trailer_i >= 0) {
-            const CBytesOrNone text = _TextForChain(*atom_node, all_trailers->First(count));
-            if (text.is_none()) return;
-            name = AsStr(text);
+            std::string text;
+            if (!_fToText->AppendTextForAtomPlusTrailers(text, *atom_node, all_trailers->First(count)))
+                return;
+            name = TextFromUtf8(text);
         }
         more_follows = count < all_trailers->Size();
     }

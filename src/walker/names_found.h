@@ -1,50 +1,103 @@
 // The names that a walk has met, until its end turns them into records.
 #pragma once
 
+#include <algorithm>
+#include <cstdint>
+#include <vector>
+
 #include <nanobind/nanobind.h>
 
-#include "host/binding.h"
-#include "strutils/text.h"
+#include "host/text.h"
 
 namespace codeloom {
 
-// Names read, and names bound within sub-expressions, each in the order first met.
-class CNamesFound {
+// Names in the order first met, each once. Emptied, it keeps its memory for the next walk.
+class COrderedNames {
   public:
-    // Later loads of a name change nothing.
-    void AddLoad(nb::handle name) { _fLoaded[name] = nb::none(); }
-
-    // Equivs of one name are kept together, in the order met.
-    void AddStore(nb::handle name, const nb::object& equiv) {
-        const nb::object earlier = FindInDict(_fStored, name);
-        _fStored[name] = earlier.is_valid() ? Utf8Concat3(earlier, nb::bytes(";"), equiv) : equiv;
+    // The position of a name, a text string or none, which is added behind the others when it is new.
+    size_t Add(nb::handle text) {
+        nb::object name = PlainText(text);
+        const auto hash = static_cast<size_t>(nb::hash(name));
+        size_t slot_i = hash & (_fSlots.size() - 1);
+        for (; _fSlots[slot_i] != kFree; slot_i = (slot_i + 1) & (_fSlots.size() - 1))
+            if (const uint32_t i = _fSlots[slot_i]; _IsName(i, hash, name)) return i;
+        _fSlots[slot_i] = static_cast<uint32_t>(_fNames.size());
+        _fNames.push_back({hash, std::move(name)});
+        if (_fNames.size() * 2 > _fSlots.size()) _Grow();
+        return _fNames.size() - 1;
     }
 
-    // Calls visit(name). What it does to the names here doesn't matter.
-    template <class Visit>
-    void VisitLoads(Visit visit) const {
-        if (_fLoaded.size() == 0) return;
-        for (const nb::handle name : _fLoaded.keys()) visit(name);
-    }
-
-    // Calls visit(name, equiv).
-    template <class Visit>
-    void VisitStores(Visit visit) const {
-        if (_fStored.size() == 0) return;
-        for (const nb::handle item : _fStored.items()) {
-            const nb::object equivs = item[1].attr("split")(nb::bytes(";"));
-            for (const nb::handle equiv : equivs) visit(item[0], equiv);
-        }
-    }
+    size_t Count() const { return _fNames.size(); }
+    nb::object At(size_t i) const { return _fNames[i].name; }
 
     void Clear() {
-        if (_fLoaded.size() != 0) _fLoaded.clear();
-        if (_fStored.size() != 0) _fStored.clear();
+        if (_fNames.empty()) return;
+        _fNames.clear();
+        std::fill(_fSlots.begin(), _fSlots.end(), kFree);
     }
 
   private:
-    nb::dict _fLoaded;
-    nb::dict _fStored;
+    struct CEntry {
+        size_t hash;
+        nb::object name;
+    };
+
+    bool _IsName(size_t i, size_t hash, nb::handle name) const {
+        const CEntry& entry = _fNames[i];
+        return entry.name.is(name) || (entry.hash == hash && entry.name.equal(name));
+    }
+
+    void _Grow() {
+        _fSlots.assign(_fSlots.size() * 4, kFree);
+        for (size_t i = 0; i < _fNames.size(); ++i) {
+            size_t slot_i = _fNames[i].hash & (_fSlots.size() - 1);
+            while (_fSlots[slot_i] != kFree) slot_i = (slot_i + 1) & (_fSlots.size() - 1);
+            _fSlots[slot_i] = static_cast<uint32_t>(i);
+        }
+    }
+
+    static constexpr uint32_t kFree = UINT32_MAX;
+
+    std::vector<CEntry> _fNames;
+    std::vector<uint32_t> _fSlots = std::vector<uint32_t>(32, kFree);  // a power of two of them
+};
+
+// Names read, and names bound within sub-expressions with their equivs.
+class CNamesFound {
+  public:
+    void AddLoad(nb::handle name) { _fLoaded.Add(name); }
+
+    void AddStore(nb::handle name, nb::object equiv) {
+        const size_t i = _fStored.Add(name);
+        if (i == _fStoredEquivs.size()) _fStoredEquivs.emplace_back();
+        _fStoredEquivs[i].push_back(std::move(equiv));
+    }
+
+    // Calls visit(name). It may add names, which aren't visited any more.
+    template <class Visit>
+    void VisitLoads(Visit visit) const {
+        const size_t count = _fLoaded.Count();
+        for (size_t i = 0; i < count; ++i) visit(_fLoaded.At(i));
+    }
+
+    // Calls visit(name, equiv), equivs of one name together, in the order met.
+    template <class Visit>
+    void VisitStores(Visit visit) const {
+        const auto equivs = _fStoredEquivs;
+        for (size_t i = 0; i < equivs.size(); ++i)
+            for (const nb::object& equiv : equivs[i]) visit(_fStored.At(i), equiv);
+    }
+
+    void Clear() {
+        _fLoaded.Clear();
+        _fStored.Clear();
+        _fStoredEquivs.clear();
+    }
+
+  private:
+    COrderedNames _fLoaded;
+    COrderedNames _fStored;
+    std::vector<std::vector<nb::object>> _fStoredEquivs;
 };
 
 }  // namespace codeloom

@@ -4,6 +4,7 @@
 #include "host/restore.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
+#include "strutils/text.h"
 #include "tree/node_helpers.h"
 #include "walker/dispatch.h"
 
@@ -38,11 +39,11 @@ void CNodeWalker::Walk(CNodeRef node, CLogicalLine& logical) {
 
 void CNodeWalker::_ProcessNamesFound(CNode& node) {
     if (node.As<CImportNamesStmt>() != nullptr || node.As<CFromImportStmt>() != nullptr) return;
-    _fNames.VisitLoads([this](nb::handle name) {
+    _fNames.VisitLoads([this](const nb::object& name) {
         HostAssert(!name.is_none());
         _AddTypeEquiv(name, gPrefixes.kGetPrefix);
     });
-    _fNames.VisitStores([this](nb::handle name, nb::handle equiv) {
+    _fNames.VisitStores([this](const nb::object& name, const nb::object& equiv) {
         HostAssert(!name.is_none());
         _AddTypeEquiv(name, equiv);
     });

@@ -50,14 +50,14 @@ void BindGrammar(nb::module_& module) {
 
 void BindNodeConverter(nb::module_& module) {
     nb::class_<NodeConverter, TNodeConverterOperations<NodeConverter>> binding(
-        module, "NodeConverter", "Makes the nodes of a parse; derive from it to make your own.");
+        module, "NodeConverter", Plain(), "Makes the nodes of a parse; derive from it to make your own.");
     binding.def(TInit<>());
     BindOperations(binding);
 }
 
 void BindParser(nb::module_& module) {
     nb::class_<Parser, TParserOperations<Parser>> binding(
-        module, "Parser", "What takes the tokens of a text one by one. CreateParser makes one.");
+        module, "Parser", Plain(), "What takes the tokens of a text one by one. CreateParser makes one.");
     binding.def(TInit<>());
     BindOperations(binding);
 

@@ -7,20 +7,7 @@ namespace codeloom {
 
 namespace {
 
-enum class EPiece {
-    kNone,     // before the first piece
-    kOperand,  // a name, a literal, an expression
-    kTrailer,  // `.name`, or an operand that begins with ( or [
-    kWord,     // a keyword that is no operand, or an expression that ends with one
-    kOpener,
-    kCloser,
-    kComma,  // a semicolon too
-    kColon,
-    kSliceColon,  // a colon with nothing before it
-    kTight,       // an operator with no blanks around it
-    kSign,        // a unary operator
-    kBinary,
-};
+using EPiece = CTokenJoiner::EPiece;
 
 bool IsValue(EPiece piece) {
     return piece == EPiece::kOperand || piece == EPiece::kTrailer || piece == EPiece::kCloser;
@@ -91,17 +78,22 @@ bool HasBlankBetween(EPiece previous, EPiece kind, char first) {
 
 }  // namespace
 
+void CTokenJoiner::PartFromPrevious(std::string& text, size_t start) {
+    if (start == text.size()) return;
+    const EPiece kind = KindOf(std::string_view(text).substr(start), _fPrevious);
+    if (HasBlankBetween(_fPrevious, kind, text[start])) text.insert(start, 1, ' ');
+    _fPrevious = kind;
+}
+
 std::string JoinTokens(std::span<const std::string_view> pieces) {
-    std::string result;
-    EPiece previous = EPiece::kNone;
+    std::string text;
+    CTokenJoiner joiner;
     for (const std::string_view piece : pieces) {
-        if (piece.empty()) continue;
-        const EPiece kind = KindOf(piece, previous);
-        if (HasBlankBetween(previous, kind, piece[0])) result += ' ';
-        result += piece;
-        previous = kind;
+        const size_t start = text.size();
+        text += piece;
+        joiner.PartFromPrevious(text, start);
     }
-    return result;
+    return text;
 }
 
 }  // namespace codeloom

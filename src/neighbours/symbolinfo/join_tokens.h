@@ -12,4 +12,29 @@ namespace codeloom {
 // piece is a token or the text of an expression; empty ones are left out.
 std::string JoinTokens(std::span<const std::string_view> pieces);
 
+// The same, piece by piece, for a text that grows.
+class CTokenJoiner {
+  public:
+    // Puts a blank, where one belongs, before the piece that stands in `text` from `start` to its end.
+    void PartFromPrevious(std::string& text, size_t start);
+
+    enum class EPiece {
+        kNone,     // before the first piece
+        kOperand,  // a name, a literal, an expression
+        kTrailer,  // `.name`, or an operand that begins with ( or [
+        kWord,     // a keyword that is no operand, or an expression that ends with one
+        kOpener,
+        kCloser,
+        kComma,  // a semicolon too
+        kColon,
+        kSliceColon,  // a colon with nothing before it
+        kTight,       // an operator with no blanks around it
+        kSign,        // a unary operator
+        kBinary,
+    };
+
+  private:
+    EPiece _fPrevious = EPiece::kNone;
+};
+
 }  // namespace codeloom
