@@ -163,9 +163,6 @@ def test_a_failure_of_a_handler_is_raised(monkeypatch):
 
 
 def test_nodes_go_back_on_every_road():
-    class Driver:
-        discarded = 0
-
     for action in (lambda logical: None, lambda logical: 1 / 0, lambda logical: exec("raise SyntaxError")):
         analyzer = Failing(action)
         analyzer.AnalyzeSingleLogical(Logical("x = f(1)"), False)

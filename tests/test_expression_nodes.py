@@ -1,12 +1,8 @@
 """Accessors of expressions beyond the golden trees: other shapes, failures, overrides."""
 
-import inspect
-from contextlib import suppress
-
 import pytest
 from hand_made import Leaf, Node, Parse, Tokens
 
-from codeloom import treesift
 from codeloom.treesift import (
     CAtom,
     CAtomExpr,
@@ -23,58 +19,6 @@ from codeloom.treesift import (
     CYieldExpr,
 )
 
-# What each accessor answers, or raises, for a leaf, an empty list of children, and eight foreign ones.
-ODD_NODES = """
-CExpression.GetSubExpr                  None       None        None
-CExpression.GetSubExprCount             0          0           0
-COperatorExpression.GetOperatorStr      None       None        TypeError
-COperatorExpression.GetTermCount        0          0           5
-COperatorExpression.GetTerm             None       None        TypeError
-CStarExpression.GetStarredExpression    TypeError  IndexError  TypeError
-CLambdaExpr.GetArgumentsNode            TypeError  IndexError  TypeError
-CLambdaExpr.GetBodyExpr                 TypeError  IndexError  TypeError
-CYieldExpr.GetValue                     None       None        TypeError
-CYieldExpr.IsYieldFrom                  False      False       False
-CYieldArg.GetValue                      TypeError  IndexError  TypeError
-CYieldArg.IsYieldFrom                   False      False       False
-CTestListStarExpr.GetSubExpr            ValueError ValueError  ValueError
-CTestListStarExpr.GetSubExprCount       0          0           4
-CTestListStarExpr.IsTuple               False      False       TypeError
-CTestListStarExpr.IsGenExpr             False      False       False
-CAtomExpr.GetPrefix                     None       None        None
-CAtomExpr.GetAtom                       None       IndexError  TypeError
-CAtomExpr.GetTrailers                   []         []          [1,2,3,4,5,6,7]
-CPower.GetAtom                          TypeError  IndexError  TypeError
-CPower.GetTrailers                      TypeError  IndexError  TypeError
-CPower.GetExponentNode                  None       None        TypeError
-CFactorExpr.GetUnaryOperator            None       None        TypeError
-CNamedExpr.GetAssignedName              TypeError  IndexError  TypeError
-CNamedExpr.GetRightHandExpression       TypeError  IndexError  TypeError
-CCompForNode.IsAsync                    False      False       TypeError
-CCompForNode.GetTargetNode              TypeError  IndexError  TypeError
-CCompForNode.GetInNode                  TypeError  IndexError  TypeError
-CCompForNode.GetCompIterNode            None       None        TypeError
-CListmakerNode.GetSubExprCount          TypeError  IndexError  TypeError
-CListmakerNode.GetSubExpr               TypeError  IndexError  TypeError
-CTrailer.GetDotName                     None       None        None
-CTrailer.GetNestedNode                  None       None        None
-CTrailer.GetInitialToken                ValueError ValueError  TypeError
-CNumberLiteral.IsFloat                  TypeError  TypeError   TypeError
-CNumberLiteral.GetNumericValue          TypeError  TypeError   TypeError
-CStringLiteral.IsUnicode                False      False       False
-CStringLiteral.IsBytes                  False      False       False
-CStringLiteral.GetStringContents        TypeError  TypeError   TypeError
-CStringLiteral.GetStringValue           TypeError  TypeError   TypeError
-CAtom.GetSubExpr                        ValueError ValueError  TypeError
-CAtom.GetSubExprCount                   ValueError ValueError  TypeError
-CAtom.GetInitialBracket                 ValueError ValueError  TypeError
-CAtom.IsLiteral                         True       True        True
-CAtom.IsComprehension                   False      False       False
-CAtom.IsTwoPlusStringLiterals           False      False       False
-"""
-ROWS = [row.split() for row in ODD_NODES.strip().splitlines()]
-INDEXED = {"GetSubExpr", "GetTerm", "GetOperatorStr"}
-
 
 def Name(text):
     return Leaf(text, cls=CNameLiteral)
@@ -90,39 +34,6 @@ def Chain(depth, cls, *first_children, last):
     for _ in range(depth):
         node = Node(cls, *first_children, node)
     return node
-
-
-def Ask(node, accessor):
-    return getattr(node, accessor)(*[0] * (accessor in INDEXED))
-
-
-@pytest.mark.parametrize("row", ROWS, ids=[row[0] for row in ROWS])
-def test_odd_nodes(row):
-    class_name, _, accessor = row[0].partition(".")
-    cls = getattr(treesift, class_name)
-    nodes = Leaf(cls=cls), Node(cls), Node(cls, *range(8))
-    for node, answer in zip(nodes, map(eval, row[1:]), strict=True):
-        if inspect.isclass(answer):
-            with pytest.raises(answer):
-                Ask(node, accessor)
-        else:
-            assert Ask(node, accessor) == answer
-
-
-def test_the_rows_are_complete():
-    told = {tuple(row[0].split(".")) for row in ROWS}
-    for class_name in {class_name for class_name, _ in told}:
-        for name, value in vars(getattr(treesift, class_name)).items():
-            assert name.startswith("__") or not callable(value) or (class_name, name) in told
-
-
-@pytest.mark.parametrize("row", ROWS, ids=[row[0] for row in ROWS])
-def test_short_lists_never_crash(row):
-    class_name, _, accessor = row[0].partition(".")
-    for child in (None, 1, Name("x"), Keyword("async"), Node(CCompForNode)):
-        for count in range(1, 5):
-            with suppress(TypeError, IndexError, ValueError, AttributeError):
-                Ask(Node(getattr(treesift, class_name), *[child] * count), accessor)
 
 
 def test_operators():

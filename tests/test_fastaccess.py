@@ -70,31 +70,7 @@ def ModelHits(text: bytes, to_find: bytes) -> list[int]:
     return hits
 
 
-SOURCE = st.lists(
-    st.sampled_from(
-        [
-            "a",
-            "b",
-            "=",
-            "==",
-            ",",
-            "(",
-            ")",
-            "[",
-            "]",
-            "{",
-            "}",
-            "'",
-            '"',
-            "'''",
-            '"""',
-            "\\",
-            "\n",
-            "é",
-            "r",
-        ]
-    )
-).map("".join)
+SOURCE = st.lists(st.sampled_from([*"ab=,()[]{}'\"\\\nér", "==", "'''", '"""'])).map("".join)
 
 
 @given(SOURCE, st.sampled_from(["=", "==", ")", "(", "'", ",", "ab", "\n", "é", ""]))
@@ -107,22 +83,14 @@ def test_the_search_finds_what_the_model_finds(source, to_find):
     ("source", "to_find", "hits"),
     [
         ("f(a=1), b=2", b"=", [9]),
-        ("(a)]b", b"b", []),  # behind a closer too many nothing is found
-        ("a)b", b")", [1]),
         ("a)b)", b")", [1, 3]),  # a closer that is found leaves the nesting alone
         ("a = '=' = r'\\'=' = b", b"=", [2, 8, 17]),
-        ("'a", b"a", []),
-        ("'a\na", b"a", [3]),  # an unterminated string ends with its row
-        ("'''a\na", b"a", []),  # with triple quotes at the end
         ("f'{a['=']}' = f'{b' = c", b"=", [12, 20]),  # fields may hold the string's own quotes
         ("leaf'=' = 1", b"=", [8]),
-        ("é=1", b"=", [2]),  # offsets are bytes
         ("\ud800=1", b"=", [3]),
-        ("aaa", b"aa", [0]),
-        ("abc", b"abcd", []),
     ],
 )
-def test_searching(source, to_find, hits):
+def test_what_the_model_leaves_out(source, to_find, hits):
     assert Hits(source, to_find) == hits
 
 
@@ -210,11 +178,8 @@ def test_the_end_of_a_string(literal, end):
 
 
 @pytest.mark.parametrize("piece", ["f'{", "'", "f'''{", "(", "f'{'", '"""\\'])
-def test_hostile_text_takes_linear_time(piece):
-    text = piece * (100_000 // len(piece))
-    started = time.perf_counter()
-    Hits(text, b"=")
-    assert time.perf_counter() - started < 10
+def test_hostile_text_comes_to_its_end(piece):
+    assert Hits(piece * (100_000 // len(piece)) + "=", b"=") in ([], [100_000])
 
 
 # The tokenizer of the hint code
@@ -232,30 +197,11 @@ def Tokens(text) -> list[tuple[str, int, int]]:
 
 
 def test_tokens_tell_the_brackets_around_them():
-    assert Tokens("def f(é: [int], *b) -> x: # c") == [
-        ("def", 0, 0),
-        ("f", 4, 0),
-        ("(", 5, 0),
-        ("é", 6, 1),
-        (":", 8, 1),
-        ("[", 10, 1),
-        ("int", 11, 2),
-        ("]", 14, 1),
-        (",", 15, 1),
-        ("*", 17, 1),
-        ("b", 18, 1),
-        (")", 19, 0),
-        ("->", 21, 0),
-        ("x", 24, 0),
-        (":", 25, 0),
-    ]
-    assert [(token, depth) for token, _, depth in Tokens(b") ( a\n\\\n b )")] == [
-        (")", 0),
-        ("(", 0),
-        ("a", 1),
-        ("b", 1),
-        (")", 0),
-    ]
+    def Depths(text):
+        return " ".join(f"{token}{depth}" for token, _, depth in Tokens(text))
+
+    assert Depths("def f(é: [int], *b) -> x: # c") == ("def0 f0 (0 é1 :1 [1 int2 ]1 ,1 *1 b1 )0 ->0 x0 :0")
+    assert Depths(b") ( a\n\\\n b )") == ")0 (0 a1 b1 )0"
     assert Tokens("") == Tokens("  # a") == []
     with pytest.raises(TypeError):
         CStringTokenizer(None)

@@ -19,7 +19,6 @@ from codeloom.treesift import (
     CAtomExpr,
     CClassArgumentPatternNode,
     CClassPatternNode,
-    CExpression,
     CMatchCaseStatementParser,
     CPatternNode,
     CPGenAnalyzerImpl,
@@ -284,10 +283,7 @@ def test_what_the_interpreter_refuses_is_taken():
 
 def test_the_subject():
     for text, subject in [
-        ("match a:", "a"),
-        ("match a, b:", "a , b"),
         ("match *a, b:", "* a , b"),
-        ("match (a, b):", "( a , b )"),
         ("match (a)[0]:  # one", "( a ) [ 0 ]"),
         ("match (a,\n  # one\n  b) \\\n :", "( a , b )"),
         ("match lambda: 0:", "lambda : 0"),
@@ -477,9 +473,3 @@ def test_removed_tokens_are_no_tokens_of_these_statements():
         DRIVER.ParseToNode(logical)
     with pytest.raises(TypeError):
         DRIVER.ParseToksToNode(("case", "1", ":"), False, None)
-
-
-def test_a_dotted_value_has_neither_text_nor_context():
-    value = Parse("case a.b:").GetPattern()
-    assert type(value) is CExpression and (value.fText, value.fContext) == (None, None)
-    assert [name.fContext for name in value.fChildren] == [(0, 5), (0, 6), (0, 7)]

@@ -3,7 +3,6 @@
 import ast
 import importlib.util
 import inspect
-import types
 from pathlib import Path
 
 import pytest
@@ -79,8 +78,8 @@ def test_exactly_the_listed_names_are_visible():
         *(CONSTANTS + MODULES + IMPORTED_CLASSES + FUNCTIONS + PRIMITIVES + NEIGHBOUR_FUNCTIONS),
         *(VOCABULARY + LOGICAL_TYPES),
     }
-    assert set(Visible()) <= listed | own_classes
-    assert {name for name in own_classes if not name.startswith("C")} == set()
+    assert set(Visible()) == listed | own_classes
+    assert all(name.startswith("C") for name in own_classes)
 
 
 @pytest.mark.parametrize(
@@ -96,26 +95,6 @@ def test_exactly_the_listed_names_are_visible():
 def test_imported_names_are_the_neighbours(neighbour, names):
     for name in names:
         assert getattr(treesift, name) is getattr(neighbour, name)
-
-
-def test_primitives_and_modules_are_there():
-    for name in PRIMITIVES + NEIGHBOUR_FUNCTIONS:
-        assert callable(getattr(treesift, name))
-    for name in MODULES:
-        assert isinstance(getattr(treesift, name), types.ModuleType)
-
-
-def test_internal_helpers_are_not():
-    for name in (
-        "ExpandSeqLiteral",
-        "NextNonRemovedTokenInTuple",
-        "CNodeToText",
-        "kKeywordLiterals",
-    ):
-        assert not hasattr(treesift, name)
-    assert frozenset({"None", "True", "False"}) not in [
-        value for value in Visible().values() if isinstance(value, frozenset)
-    ]
 
 
 def test_constants_are_set_in_their_order():
@@ -156,21 +135,13 @@ def test_everything_that_can_be_called_is_documented():
 
 LACKING = [
     ("codeloom.optpgen", "NodeConverter"),
-    ("codeloom.optpgen", "Parser"),
-    ("codeloom.optpgen", "ParseError"),
-    ("codeloom.optpgen", "CreateParser"),
     ("bytebuffer", "CEncodedByteBufferReader"),
     ("codeloom.strutils", "_CTextPosInfo"),
-    ("codeloom.strutils", "Utf8Concat5"),
     ("codeloom._fastaccess", "CStringTokenizer"),
-    ("codeloom._fastaccess", "_FindStringEndNonNested"),
     ("codeloom.logicalline", "kErrorTokenPrefix"),
-    ("codeloom.logicalline", "IsScopeStartLogical"),
     ("codeloom.logicalinspect", "TextFromTokens"),
     ("codeloom.utils", "GetLogicalsFromText"),
     ("codeloom.symbolinfo", "kNonlocalPrefix"),
-    ("codeloom.symbolinfo", "gInfoBytesBuilder"),
-    ("codeloom.symbolinfo", "JoinTokens"),
     ("tarnbase.destroyable", "CDestroyable"),
     ("tarnutils.reflect", "RaiseWithTraceback"),
     ("config", "GetTarnFilename"),

@@ -77,10 +77,6 @@ def test_grammar_numbers_its_rules(load):
         ("a: NAME\n'x': NAME", "2: expected the name of a rule, found 'x'"),
         ("a NAME", "1: expected ':' behind the name of the rule, found 'NAME'"),
         ("a:\n", "1: expected a name, a quoted text, '(' or '[', found the end of the row"),
-        (
-            "a: NAME |\nb: NAME",
-            "1: expected a name, a quoted text, '(' or '[', found the end of the row",
-        ),
         ("a: (NAME\n| )", "2: expected a name, a quoted text, '(' or '[', found ')'"),
         ("a: (NAME\nNAME", "2: expected ')', found the end of the file"),
         ("a: [NAME)", "1: expected ']', found ')'"),
@@ -88,10 +84,7 @@ def test_grammar_numbers_its_rules(load):
         ("a: NAME b: NAME", "1: expected the end of the rule, found ':'"),
         ("\na: 'x\n", "2: expected a closing ' in this row"),
         ("a: ''", "1: expected a keyword or operator between the quotes"),
-        (
-            "a: NAME ? NAME",
-            "1: expected a name, a quoted text or one of : | [ ] ( ) * +, found '?'",
-        ),
+        ("a: NAME ? NAME", "1: expected a name, a quoted text or one of : | [ ] ( ) * +, found '?'"),
         ("a: " + "(" * 200 + "NAME" + ")" * 200, "1: the brackets are nested too deep"),
         ("a: NAME\nb: NAME\na: NUMBER", "3: rule 'a' is already defined in row 1"),
         ("a: b\n", "1: 'b' is neither a rule nor a kind of token"),
@@ -103,14 +96,8 @@ def test_grammar_numbers_its_rules(load):
         ("a: b\nb: NAME*", "2: rule 'b' can be empty, but must take a token"),
         ("a: a NAME", "1: rule 'a' begins with itself: a -> a"),
         ("a: '+' b\nb: c | NAME\nc: b '+'", "2: rule 'b' begins with itself: b -> c -> b"),
-        (
-            "a: b | c\nb: NAME '+'\nc: NAME '-'",
-            "1: rule 'a' leaves a choice: NAME can begin both b and c",
-        ),
-        (
-            "a: '+' (NAME b | NAME '+')\nb: '+'",
-            "1: rule 'a' leaves a choice: '+' can begin both b and '+'",
-        ),
+        ("a: b | c\nb: NAME '+'\nc: NAME '-'", "1: rule 'a' leaves a choice: NAME can begin both b and c"),
+        ("a: '+' (NAME b | NAME '+')\nb: '+'", "1: rule 'a' leaves a choice: '+' can begin both b and '+'"),
     ],
 )
 def test_faults_of_a_grammar_name_their_row(load, tmp_path, text, message):
@@ -126,13 +113,7 @@ def test_wrong_files_and_tables(tmp_path, load):
         load("a: 'if'", {2: "NUMBER"})
     with pytest.raises(ValueError, match=":1: the type of NAME is 256, but must be from 0 to 255"):
         load("a: NAME", {256: "NAME"})
-    for names, operators in [
-        ({1: 2}, {}),
-        ({"1": "NAME"}, {}),
-        ({}, {"+": "14"}),
-        (None, {}),
-        ({}, []),
-    ]:
+    for names, operators in [({1: 2}, {}), ({"1": "NAME"}, {}), ({}, {"+": "14"}), (None, {}), ({}, [])]:
         with pytest.raises(TypeError):
             load("a: NAME", names, operators)
 
@@ -148,49 +129,6 @@ def test_repetition_within_an_option(load):
 
 
 # Trees
-
-
-def test_single_children_are_promoted(load):
-    parser = optpgen.CreateParser(load(SUMS), None, promotesinglechild=True)
-    tokens = [*Tokens("a + ( b ) * c"), (4, "\n")]
-    atom, product, sum = 1, 2, 3
-    tree = [0, [sum, "a", "+", [product, [atom, "(", "b", ")"], "*", "c"]], "\n"]
-    assert Texts(Feed(parser, tokens)) == tree
-    assert Feed(parser, [(1, "x"), (4, "\n")]) == (
-        256,
-        None,
-        0,
-        [(1, "x", 0, None), (4, "\n", 1, None)],
-    )
-
-
-def test_single_children_are_kept(load):
-    parser = optpgen.CreateParser(load(SUMS), None, promotesinglechild=False)
-    atom, product, sum = 1, 2, 3
-    assert Texts(Feed(parser, [(1, "x"), (4, "\n")])) == [0, [sum, [product, [atom, "x"]]], "\n"]
-
-
-def test_converter_is_called_in_the_order_of_the_text(load):
-    """Each token once, each rule of two children once, with the context of its first token."""
-    converter = Recorder()
-    parser = optpgen.CreateParser(load(SUMS), converter)
-    parser.setup()
-    for (type, value), context in zip(Tokens("a + b * not c"), "ABCDEF", strict=True):
-        assert parser.addtoken(type, value, context) is False
-    assert parser.addtoken(4, "\n", None) is True
-    assert parser.finish() == "<<a + <b * <not c>>> \n>"
-    leaf = {
-        text: (type, text, context, None)
-        for (type, text), context in zip(Tokens("a + b * not c"), "ABCDEF", strict=True)
-    }
-    assert converter.calls == [
-        *(leaf[text] for text in ("a", "+", "b", "*", "not", "c")),
-        (257, None, "E", ["not", "c"]),
-        (258, None, "C", ["b", "*", "<not c>"]),
-        (259, None, "A", ["a", "+", "<b * <not c>>"]),
-        (4, "\n", None, None),
-        (256, None, "A", ["<a + <b * <not c>>>", "\n"]),
-    ]
 
 
 def test_any_rule_can_be_the_start(load):
@@ -211,16 +149,15 @@ def test_any_rule_can_be_the_start(load):
 
 def test_depth_is_no_matter(load):
     depth = 10_000
-    for promotes in (True, False):
-        parser = optpgen.CreateParser(load(SUMS), None, promotes)
-        node = Feed(parser, [*Tokens("( " * depth + "x" + " )" * depth), (4, "\n")])[3][0]
-        levels = 0
-        while node[3] is not None:
-            node = node[3][len(node[3]) // 2]
-            levels += 1
-        assert levels == (depth if promotes else 3 * (depth + 1))
-        with pytest.raises(optpgen.ParseError):
-            Feed(parser, Tokens("( " * depth))
+    parser = optpgen.CreateParser(load(SUMS), None, promotesinglechild=False)
+    node = Feed(parser, [*Tokens("( " * depth + "x" + " )" * depth), (4, "\n")])[3][0]
+    levels = 0
+    while node[3] is not None:
+        node = node[3][len(node[3]) // 2]
+        levels += 1
+    assert levels == 3 * (depth + 1)
+    with pytest.raises(optpgen.ParseError):
+        Feed(parser, Tokens("( " * depth))
 
 
 # Labels

@@ -5,24 +5,14 @@ import pytest
 from codeloom.logicalline import CLogicalLine, kUnknown
 from codeloom.optpgen import ParseError
 from codeloom.treesift import (
-    CAtomExpr,
-    CClassdefStmt,
     CDottedName,
-    CExceptClause,
     CExpression,
-    CExprStmt,
-    CFuncdefStmt,
     CIfElseExpression,
-    CIfStmt,
-    CKeywordLiteral,
     CNameLiteral,
     CNode,
     COperatorExpression,
     CPGenParserImpl,
-    CSingleDecorator,
     CTestListStarExpr,
-    CWithStmt,
-    CWithTypeParameters,
     kPy2DefaultGrammar,
 )
 from codeloom.utils import GetLogicalsFromText
@@ -53,44 +43,14 @@ def Refused(text, driver=PY38, in_async_def=False):
 @pytest.mark.parametrize(
     ("text", "shape"),
     [
-        ("x = 1", ["expr_stmt", "x", "=", "1"]),
-        ("pass", "pass"),
-        ("x", "x"),
         ("else:", ["if_stmt", "if", "0", ":", "pass", "else", ":", "pass"]),
-        ("else: x", ["if_stmt", "if", "0", ":", "pass", "else", ":", "x"]),
-        ("elif a: b", ["if_stmt", "if", "a", ":", "b"]),
-        ("finally:", ["try_stmt", "try", ":", "pass", "finally", ":", "pass"]),
-        ("try:", ["try_stmt", "try", ":", "pass", "finally", ":", "pass"]),
         ("try: x", ["try_stmt", "try", ":", "x", "finally", ":", "pass"]),
-        ("except:", ["try_stmt", "try", ":", "pass", "except", ":", "pass"]),
-        ("class X: pass", ["classdef", "class", "X", ":", "pass"]),
-        ("class X:", ["classdef", "class", "X", ":", "pass"]),
-        ("@foo.bar(1)", ["decorator", "@", ["dotted_name", "foo", ".", "bar"], "(", "1", ")", "\n"]),
         ("x = (1, # one\n 2)", ["expr_stmt", "x", "=", ["atom", "(", ["testlist_comp", "1", ",", "2"], ")"]]),
-        ("if a: b; c", ["if_stmt", "if", "a", ":", ["simple_stmt", "b", ";", "c", "\n"]]),
         ("x = \\\n 1", ["expr_stmt", "x", "=", "1"]),
     ],
 )
-def test_shapes(text, shape):
+def test_shapes_beyond_the_golden_trees(text, shape):
     assert Shape(Parse(text)) == shape
-
-
-def test_classes():
-    for text, cls in [
-        ("x = 1", CExprStmt),
-        ("x", CNameLiteral),
-        ("pass", CKeywordLiteral),
-        ("if x: y", CIfStmt),
-        ("def f(): pass", CFuncdefStmt),
-        ("class C: pass", CClassdefStmt),
-        ("with a as b: pass", CWithStmt),
-        ("@a.b", CSingleDecorator),
-        ("a, b", CTestListStarExpr),
-        ("a + b * c", COperatorExpression),
-        ("a if b else c", CIfElseExpression),
-        ("a.b(c)", CAtomExpr),
-    ]:
-        assert type(Parse(text)) is cls, text
 
 
 def test_the_class_table():
@@ -153,21 +113,8 @@ def test_logicals_of_no_statement():
     assert PY38.ParseToNode(removed).fText == "\n"
 
 
-def test_errors_at_the_invented_tail():
-    for text, count in [("x = (", 3), ("class", 1), ("for x in", 3)]:
-        assert Refused(text) == count
-
-
-def test_the_same_driver_goes_on_after_an_error():
-    for text in ("x = (", "def f(:", "@@", "x y"):
-        Refused(text)
-        assert Shape(Parse("x = 1")) == ["expr_stmt", "x", "=", "1"]
-
-
 def test_statements_with_removed_tokens():
     assert Shape(Parse("with (open(a) as f, b):")) == Shape(Parse("with open(a) as f, b:"))
-    assert Shape(Parse("except* ValueError as e:")) == Shape(Parse("except ValueError as e:"))
-    assert type(Parse("except E as e:").GetChild(3)) is CExceptClause
     assert Refused("except*:") == 1
     assert Refused("with (a") == 3
     for name in ("type = 1", "type(x)"):
@@ -175,13 +122,6 @@ def test_statements_with_removed_tokens():
 
 
 def test_type_parameters():
-    node = Parse("def f[T: int, *Ts, **P](x): pass")
-    assert type(node) is CWithTypeParameters
-    assert [[child.fText for child in parameter.fChildren] for parameter in node.fChildren[:3]] == [
-        ["T", ":", "int"],
-        ["*", "Ts"],
-        ["**", "P"],
-    ]
     assert Shape(Parse("type X[T] = list[T]").fChildren[1]) == Shape(Parse("X = list[T]"))
     assert Shape(Parse("type X = int")) == Shape(Parse("X = int"))
     assert Parse("def f[](): pass").GetChildCount() == 1

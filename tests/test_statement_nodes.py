@@ -1,14 +1,10 @@
 """Accessors of statements beyond the golden trees: other shapes, failures, overrides."""
 
-import inspect
-from contextlib import suppress
-
 import pytest
 from hand_made import Leaf, Node, Parse, Tokens
 
 from codeloom import treesift
 from codeloom.treesift import (
-    CCaseStmt,
     CDelStmt,
     CExceptClause,
     CExprStmt,
@@ -23,98 +19,6 @@ from codeloom.treesift import (
     CWithItem,
     CWithTypeParameters,
 )
-
-ITSELF = object()
-
-# What each accessor answers, or raises: on a leaf, on an empty list, on eight foreign children.
-ODD_NODES = """
-CClassdefStmt.GetClassName                          None       None        TypeError
-CClassdefStmt.GetBaseClassList                      []         []          TypeError
-CFuncdefStmt.GetFunctionName                        None       None        TypeError
-CFuncdefStmt.GetParameters                          TypeError  IndexError  TypeError
-CFuncdefStmt.GetReturnType                          None       None        TypeError
-CFuncdefStmt.GetSuite                               None       None        TypeError
-CIfStmt.GetTestExpression                           TypeError  IndexError  TypeError
-CMatchStmt.GetTestExpression                        TypeError  IndexError  TypeError
-CCaseStmt.GetPattern                                TypeError  IndexError  TypeError
-CCaseStmt.GetGuard                                  None       None        TypeError
-CCaseStmt.GetBody                                   TypeError  IndexError  TypeError
-CDelStmt.GetExpressions                             []         []          []
-CSingleDecorator.GetDottedName                      TypeError  IndexError  TypeError
-CSingleDecorator.GetUsedArgList                     []         []          TypeError
-CGlobalStmt.GetUtf8NameList                         TypeError  []          []
-CNonlocalStmt.GetUtf8NameList                       TypeError  []          []
-CForStmt.GetTarget                                  TypeError  IndexError  TypeError
-CForStmt.GetInExpression                            TypeError  IndexError  TypeError
-CForStmt.GetBody                                    TypeError  IndexError  TypeError
-CForStmt.GetElseBody                                None       None        TypeError
-CWithStmt.GetWithItems                              TypeError  []          []
-CWithItem.GetExpression                             TypeError  IndexError  TypeError
-CWithItem.GetTarget                                 TypeError  IndexError  TypeError
-CExceptClause.GetExceptionType                      None       None        TypeError
-CExceptClause.GetTarget                             None       None        TypeError
-CExprStmt.GetEqualCount                             TypeError  0           TypeError
-CExprStmt.GetAnnotatedAssignNode                    None       None        None
-CExprStmt.GetInitialTestExpr                        TypeError  IndexError  TypeError
-CExprStmt.GetPostEqualsTestExpr                     TypeError  ValueError  TypeError
-CExprStmt.GetAugAssignOp                            None       None        TypeError
-CAnnotatedAssignNode.GetTypeHintNode                TypeError  IndexError  TypeError
-CAnnotatedAssignNode.GetPostEqualsTestExpr          None       None        TypeError
-CReturnStmt.GetValue                                None       None        TypeError
-CTypeParameter.GetName                              None       IndexError  TypeError
-CTypeParameter.GetPrefix                            None       None        TypeError
-CTypeParameter.GetSpecNode                          None       None        TypeError
-CWithTypeParameters.GetTypeParameters               TypeError  []          TypeError
-CWithTypeParameters.GetTypeParameterScopedStatement TypeError  IndexError  TypeError
-CImportNamesStmt.GetAsNameList                      TypeError  IndexError  TypeError
-CFromImportStmt.GetFromString                       None       None        TypeError
-CFromImportStmt.GetImportStar                       False      False       TypeError
-CFromImportStmt.GetAsNameList                       TypeError  IndexError  TypeError
-CFromImportStmt._GetImportIndex                     -1         -1          TypeError
-CSingleUsedArgumentNode.GetPrefix                   None       None        TypeError
-CSingleUsedArgumentNode.GetName                     None       None        TypeError
-CSingleUsedArgumentNode.GetValue                    ITSELF     ITSELF      TypeError
-CSingleUsedArgumentNode.IsUnparenthesizedGenExpr    False      False       False
-CSingleUsedArgumentNode.GetNameAssigned             None       None        TypeError
-CSingleUsedArgumentNode.GetNamedRightHandExpression None       None        TypeError
-CFunctionParameterDef.GetNestedListNode             None       None        None
-CFunctionParameterDef.GetName                       None       None        TypeError
-CFunctionParameterDef.GetTypeExpr                   None       None        None
-"""
-ROWS = [row.split() for row in ODD_NODES.strip().splitlines()]
-
-
-@pytest.mark.parametrize("row", ROWS, ids=[row[0] for row in ROWS])
-def test_odd_nodes(row):
-    class_name, _, accessor = row[0].partition(".")
-    cls = getattr(treesift, class_name)
-    arguments = [0] if row[0] == "CExprStmt.GetPostEqualsTestExpr" else []
-    nodes = Leaf(cls=cls), Node(cls), Node(cls, *range(8))
-    for node, answer in zip(nodes, map(eval, row[1:]), strict=True):
-        ask = getattr(node, accessor)
-        if inspect.isclass(answer):
-            with pytest.raises(answer):
-                ask(*arguments)
-        else:
-            assert ask(*arguments) == (node if answer is ITSELF else answer)
-
-
-def test_the_rows_are_complete():
-    told = {tuple(row[0].split(".")) for row in ROWS}
-    for class_name in {class_name for class_name, _ in told}:
-        for name, value in vars(getattr(treesift, class_name)).items():
-            assert name.startswith("__") or not callable(value) or (class_name, name) in told
-
-
-@pytest.mark.parametrize("row", ROWS, ids=[row[0] for row in ROWS])
-def test_short_lists_never_crash(row):
-    class_name, _, accessor = row[0].partition(".")
-    arguments = [0] if row[0] == "CExprStmt.GetPostEqualsTestExpr" else []
-    for child in (None, 1, Leaf("x", cls=CNameLiteral)):
-        for count in range(1, 5):
-            ask = getattr(Node(getattr(treesift, class_name), *[child] * count), accessor)
-            with suppress(TypeError, IndexError, ValueError, AttributeError):
-                ask(*arguments)
 
 
 def test_a_result_of_another_class_is_a_type_error():
@@ -223,29 +127,6 @@ def test_type_parameters_without_a_statement():
     node = Node(CWithTypeParameters, parameter, None)
     assert node.GetTypeParameters() == [parameter]
     assert node.GetTypeParameterScopedStatement() is None
-
-
-def test_type_parameters():
-    for words, answers in [
-        ("T", ("T", None, "")),
-        ("* T", ("T", "*", "")),
-        ("** T", ("T", "**", "")),
-        ("T : int", ("T", None, "int")),
-        ("* T : int", ("T", "*", "int")),
-    ]:
-        node = Node(CTypeParameter, *map(Leaf, words.split()))
-        assert (node.GetName(), node.GetPrefix(), Tokens(node.GetSpecNode())) == answers
-
-
-def test_case_guards():
-    for words, guard, body in [
-        ("case a :", "", ""),
-        ("case a : b", ":", "b"),
-        ("case a b :", "b", ""),
-        ("case a b : c", "b", "c"),
-    ]:
-        node = Node(CCaseStmt, *map(Leaf, words.split()))
-        assert (Tokens(node.GetGuard()), Tokens(node.GetBody())) == (guard, body)
 
 
 def test_overrides_reach_every_caller():
