@@ -8,7 +8,7 @@ from pathlib import Path
 from codeloom.engine import Analysis, AnalyzerOf, Complaint, ComplaintOf, IsSpoiled, TooLong
 from codeloom.excerpt import Excerpt
 from codeloom.false_hints import FalseHintRemover
-from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageNamed
+from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.logicalline import CLogicalLine
 from codeloom.source import RowMap, Source, SourceFromBytes, SourceFromText
 from codeloom.utils import GetLogicalsFromText
@@ -74,8 +74,7 @@ def CheckBytes(data: bytes, language: Language | str, path: str, *, false_hints:
 
 
 def _Check(source: Source, language: Language | str, path: str, false_hints: bool) -> Report:
-    if isinstance(language, str):
-        language = LanguageNamed(language)
+    language = LanguageOf(source.text, language)
     logicals = GetLogicalsFromText(source.text)
     complaints = _Complaints(logicals, source, language, FalseHintRemover(source.text, keep=false_hints))
     if not complaints and not source.faults:

@@ -1,7 +1,8 @@
 """The versions of Python that can be analysed, and what the engine needs to know of each."""
 
+import re
 import sys
-from dataclasses import dataclass
+from dataclasses import dataclass, replace
 from functools import cache
 
 _OLDEST_PY3_MINOR = 0
@@ -18,6 +19,9 @@ _PY2_KEYWORDS = _KEYWORDS | {"exec", "print"}
 _PY3_KEYWORDS = _KEYWORDS | {"False", "None", "True", "nonlocal"}
 _ASYNC_KEYWORDS = frozenset({"async", "await"})
 _FIRST_ASYNC_VERSION = (3, 7, 0)
+_PRINT_FUNCTION = re.compile(
+    r"^from[ \t]+__future__[ \t]+import\b(?:[^\n(#]|\([^)]*)*\bprint_function\b", re.MULTILINE
+)
 
 # The names that `LanguageNamed` takes, oldest first.
 LANGUAGE_NAMES = (
@@ -69,3 +73,20 @@ def _KeywordsOf(triple: tuple[int, int, int]) -> frozenset[str]:
     if triple[0] == 2:
         return _PY2_KEYWORDS
     return _PY3_KEYWORDS | _ASYNC_KEYWORDS if triple >= _FIRST_ASYNC_VERSION else _PY3_KEYWORDS
+
+
+def LanguageOf(text: str, language: Language | str) -> Language:
+    """The language that a source text is written in, given the version of Python.
+
+    That is `language` itself, but for a text of Python 2 that imports `print_function` from the
+    future, where `print` is a name. An unknown name raises UnknownLanguageError.
+    """
+    if isinstance(language, str):
+        language = LanguageNamed(language)
+    if language.is_py3 or not _PRINT_FUNCTION.search(text):
+        return language
+    return replace(
+        language,
+        grammar_file=f"{language.grammar_file}-print-function",
+        keywords=tuple(word for word in language.keywords if word != "print"),
+    )

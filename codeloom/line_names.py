@@ -11,7 +11,7 @@ from codeloom import logicalline
 from codeloom.check import Problem
 from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, TooLong
 from codeloom.false_hints import FalseHintRemover
-from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageNamed
+from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.line_reader import LineReader, RowsOf, RowTexts
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
@@ -85,8 +85,7 @@ def NamesInBytes(data: bytes, language: Language | str, path: str) -> Iterator[L
 
 
 def _Names(source: Source, language: Language | str, path: str) -> Iterator[LineNames]:
-    if isinstance(language, str):
-        language = LanguageNamed(language)
+    language = LanguageOf(source.text, language)
     reader = _NameReader(source, language, path)
     return map(reader.Read, GetLogicalsFromText(source.text))
 

@@ -6,7 +6,7 @@ from dataclasses import dataclass
 from codeloom import logicalline
 from codeloom.check import Problem
 from codeloom.engine import TooLong
-from codeloom.languages import Language
+from codeloom.languages import Language, LanguageOf
 from codeloom.line_reader import LineReader, RowsOf
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
@@ -34,7 +34,7 @@ class LineTree:
 
 def LineTrees(source: Source, language: Language, path: str, row: int | None = None) -> Iterator[LineTree]:
     """The trees of all logical lines of a text, or of those that stand on one row, counted from 1."""
-    reader = _TreeReader(source, language, path)
+    reader = _TreeReader(source, LanguageOf(source.text, language), path)
     for logical in GetLogicalsFromText(source.text):
         origin = logical.fFirstLine, 0
         if row is not None and row - 1 not in RowsOf(logical, origin[0]):

@@ -66,3 +66,24 @@ def test_all_names_make_an_analyzer():
 def test_what_is_sound_depends_on_the_version(line, sound_in):
     sound = {name for name in ("2.7", "3.6", "3.7", "3.12") if not CheckText(line, name)}
     assert sound == sound_in
+
+
+@pytest.mark.parametrize(
+    ("head", "is_function"),
+    [
+        ("from __future__ import print_function", True),
+        ("'doc'\nfrom __future__ import (division,  # one\n  print_function as p)", True),
+        ("from __future__ import division", False),
+        ("from __future__ import division  # no print_function", False),
+        ("x = 'from __future__ import print_function'", False),
+    ],
+)
+def test_print_is_a_function_in_texts_that_import_it(head, is_function):
+    def Rows(line, version):
+        return [problem.row for problem in CheckText(f"{head}\n{line}", version)]
+
+    row = head.count("\n") + 2
+    assert Rows("print(x, file=f)", "2.7") == ([] if is_function else [row])
+    assert Rows("print x", "2.7") == ([row] if is_function else [])
+    assert Rows("print(x)", "2.7") == Rows("print(x, file=f)", "3.8") == []
+    assert Rows("exec 'a' in b", "2.7") == []
