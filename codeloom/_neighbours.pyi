@@ -266,6 +266,7 @@ class NodeConverter:
 
     def __init__(self) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
         """
@@ -282,6 +283,7 @@ class Parser:
 
     def __init__(self) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     def setup(self, start: object | None=None) -> None:
         """

@@ -203,12 +203,13 @@ print(sys.path == path)
 # Stubs
 
 
-@pytest.mark.parametrize("module", [treesift, _neighbours], ids=lambda module: module.__name__)
-def test_no_object_changes_its_class(module):
-    for cls in vars(module).values():
-        if getattr(cls, "__module__", None) in (treesift.__name__, _neighbours.__name__) and isinstance(
-            cls, type
-        ):
+def test_no_object_changes_its_class():
+    modules = (treesift, _neighbours)
+    classes = {cls for module in modules for cls in vars(module).values() if isinstance(cls, type)}
+    native = [cls for cls in classes if cls.__module__ in {module.__name__ for module in modules}]
+    assert len(native) > 70
+    for cls in native:
+        if not issubclass(cls, BaseException):
             with pytest.raises(AttributeError, match="__class__"):
                 cls.__new__(cls).__class__ = cls
 
