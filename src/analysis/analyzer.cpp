@@ -38,14 +38,21 @@ CHostError InspectionFailure(const CLogicalLine& logical, CHostError error) {
 
 }  // namespace
 
-void CPGenAnalyzerImpl::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-                             nb::object py3_grammar, nb::object hint_grammar_file) {
+CAnalyzerParts PartsAround(CRef<CPGenParserImpl> parser, nb::object version_triple,
+                           nb::object hint_grammar_file) {
     CAnalyzerParts parts;
-    parts.parser = NewInstance<CPGenParserImpl>(version_triple, grammar_file, keyword_seq, py3_grammar);
+    parts.parser = std::move(parser);
     parts.node_walker = NewInstance<CNodeWalker>(version_triple);
     parts.type_hint_walker =
         NewInstance<CTypeHintWalker>(version_triple, hint_grammar_file, parts.node_walker.AsHost());
-    InitFromParts(std::move(parts));
+    return parts;
+}
+
+void CPGenAnalyzerImpl::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
+                             nb::object py3_grammar, nb::object hint_grammar_file) {
+    CRef<CPGenParserImpl> parser =
+        NewInstance<CPGenParserImpl>(version_triple, grammar_file, keyword_seq, py3_grammar);
+    InitFromParts(PartsAround(std::move(parser), version_triple, hint_grammar_file));
 }
 
 void CPGenAnalyzerImpl::InitFromParts(CAnalyzerParts parts) {

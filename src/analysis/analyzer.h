@@ -22,6 +22,10 @@ struct CAnalyzerParts {
     CRef<CTypeHintWalker> type_hint_walker;
 };
 
+// The parts around a parser: the walkers of the system.
+CAnalyzerParts PartsAround(CRef<CPGenParserImpl> parser, nb::object version_triple,
+                           nb::object hint_grammar_file);
+
 class CPGenAnalyzerImpl : public CPGenAnalyzer {
   public:
     void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,

@@ -11,6 +11,7 @@
 #include "host/neighbour_call.h"
 #include "host/restore.h"
 #include "neighbours/imported_names.h"
+#include "newer/newer_analyzer.h"
 #include "parse/parser_driver.h"
 #include "strutils/bind.h"
 #include "strutils/text.h"
@@ -92,6 +93,7 @@ void BindClasses(nb::module_& module) {
     BindDispatchWalker(module);
     BindTypeHintWalker(module);
     BindAnalyzer(module);
+    BindNewerAnalyzer(module);
 }
 
 }  // namespace

@@ -43,6 +43,10 @@ CNodeRef CMatchCaseStatementParser::_NodeFor(const CPatternStep& first) {
     const CRecursionScope recursion;  // for overrides, which call one another
     CPatternWork work;
     CMatchCaseStatementParser::DoPatternStep(work, first);
+    return _Finish(work);
+}
+
+CNodeRef CMatchCaseStatementParser::_Finish(CPatternWork& work) {
     while (!work.IsDone()) DoPatternStep(work, work.TakeStep());
     return work.Result();
 }
@@ -191,16 +195,20 @@ void CMatchCaseStatementParser::_PlanSequencePattern(CPlan&& plan, Py_ssize_t st
     if (start_i + 1 >= end_i) _FailAt(start_i);
     const Py_ssize_t close_i = end_i - 1;
     plan.Token(start_i);
-    for (Py_ssize_t i = start_i + 1; i < close_i;) {
-        const Py_ssize_t comma_i = _FindOrEnd(",", i, close_i);
-        plan.Pattern(i, comma_i);
-        if (comma_i != close_i) plan.Token(comma_i);
-        i = comma_i + 1;
-    }
+    _PlanPatterns(plan, start_i + 1, close_i);
     if (_IsTok(start_i, "[") && !_IsTok(close_i, "]")) plan.Fail(close_i);
     if (_IsTok(start_i, "(") && !_IsTok(close_i, ")")) plan.Fail(close_i);
     plan.Token(close_i);
     plan.Build<CSequencePatternNode>();
+}
+
+void CMatchCaseStatementParser::_PlanPatterns(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
+    for (Py_ssize_t i = start_i; i < end_i;) {
+        const Py_ssize_t comma_i = _FindOrEnd(",", i, end_i);
+        plan.Pattern(i, comma_i);
+        if (comma_i != end_i) plan.Token(comma_i);
+        i = comma_i + 1;
+    }
 }
 
 //   case {"a": 1, **rest}:

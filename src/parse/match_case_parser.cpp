@@ -6,10 +6,10 @@
 #include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/token_type.h"
+#include "parse/parentheses.h"
 #include "parse/parser_driver.h"
 #include "parse/pseudo_node.h"
 #include "parse/token_copy.h"
-#include "tree/recycling.h"
 #include "tree/statement_nodes.h"
 
 namespace codeloom {
@@ -36,25 +36,6 @@ bool IsSkipped(const nb::tuple& toks, const nb::tuple& positions, Py_ssize_t i) 
 nb::tuple OfLine(const nb::object& tuple_or_none) {
     if (tuple_or_none.is_none()) RaiseHost(PyExc_TypeError, "no match or case statement is being parsed");
     return nb::borrow<nb::tuple>(tuple_or_none);
-}
-
-// The tokens as an expression in parentheses, which take the places of the word and the colon.
-nb::tuple InParentheses(const nb::tuple& toks) {
-    const Py_ssize_t count = TupleSize(toks);
-    return MakeTuple(count, [&](Py_ssize_t i) -> nb::object {
-        if (i == count - 1) return nb::str(")");
-        return i == 0 ? nb::str("(") : nb::borrow(TupleItem(toks, i));
-    });
-}
-
-// What stands in the parentheses; the node itself when they belong to a part of it.
-CNodeRef WithoutParentheses(CNodeRef node) {
-    if (!node || node->GetChildCount() != 3) return node;
-    if (!node->GetChildText(0).equal(nb::str("(")) || !node->GetChildText(2).equal(nb::str(")"))) return node;
-    CNodeRef inner = node->GetChild(1);
-    DeleteListItem(node->fChildren, 1);
-    FinishedWithNode(node->Self());
-    return inner;
 }
 
 }  // namespace
@@ -87,16 +68,22 @@ CNodeRef CMatchCaseStatementParser::ParseMatchStmt(nb::tuple toks, nb::tuple pos
     return _ParseMatchStmtImpl();
 }
 
+CNodeRef CMatchCaseStatementParser::_ParseMatchStmtImpl() {
+    return _MatchStmt([this] {
+        const nb::tuple toks = OfLine(_fToks);
+        return _fPGenParser->_ParseToksToNodeImpl(InParentheses(toks, 0, TupleSize(toks) - 1), true,
+                                                  CPositions(_fPositions));
+    });
+}
+
 //   match a, b:
 //         ^^^^    parsed as `(a, b)`
 //   a CMatchStmt: `match`, the expression, `:`
-CNodeRef CMatchCaseStatementParser::_ParseMatchStmtImpl() {
+CNodeRef CMatchCaseStatementParser::_MatchStmt(const std::function<CNodeRef()>& parse_subject) {
     if (!_IsStatementOfType(gLogicalTypes.kMatch)) return CNodeRef();
-    const nb::tuple toks = OfLine(_fToks);
-    const Py_ssize_t colon_i = _Find(":", 1, TupleSize(toks));
+    const Py_ssize_t colon_i = _Find(":", 1, _TokCount());
     if (colon_i == -1) return CNodeRef();
-    const CNodeRef subject = WithoutParentheses(
-        _fPGenParser->_ParseToksToNodeImpl(InParentheses(toks), true, CPositions(_fPositions)));
+    const CNodeRef subject = WithoutParentheses(parse_subject());
     return NewPseudoNode<CMatchStmt>({_TokNode(0), subject, _TokNode(colon_i)});
 }
 
@@ -106,23 +93,28 @@ CNodeRef CMatchCaseStatementParser::ParseCaseStmt(nb::tuple toks, nb::tuple posi
     return _ParseCaseStmtImpl();
 }
 
+CNodeRef CMatchCaseStatementParser::_ParseCaseStmtImpl() {
+    return _CaseStmt([this](Py_ssize_t start_i, Py_ssize_t end_i) { return _ParseRange(start_i, end_i); });
+}
+
 //   case [a, b] if a > b: print(a)
 //        ^^^^^^                       a pattern
 //               ^^^^^^^^^             an `if` statement without a body
 //                         ^^^^^^^^    a statement of its own
 //   a CCaseStmt: `case`, the pattern, the guard if any, `:`, the body if any
-CNodeRef CMatchCaseStatementParser::_ParseCaseStmtImpl() {
+CNodeRef CMatchCaseStatementParser::_CaseStmt(
+    const std::function<CNodeRef(Py_ssize_t start_i, Py_ssize_t end_i)>& parse_range) {
     if (!_IsStatementOfType(gLogicalTypes.kCase)) return CNodeRef();
     const Py_ssize_t count = _TokCount();
     const Py_ssize_t colon_i = _Find(":", 1, count);
     if (colon_i == -1) return CNodeRef();
     const Py_ssize_t if_i = _Find("if", 1, colon_i);
     const CNodeRef pattern = _NodeForPattern(1, if_i == -1 ? colon_i : if_i);
-    const CNodeRef guard = if_i == -1 ? CNodeRef() : _ParseRange(if_i, colon_i + 1);
+    const CNodeRef guard = if_i == -1 ? CNodeRef() : parse_range(if_i, colon_i + 1);
     std::vector<CNodeRef> children = {_TokNode(0), pattern};
     if (guard) children.push_back(guard);
     children.push_back(_TokNode(colon_i));
-    if (colon_i + 1 < count) children.push_back(_ParseRange(colon_i + 1, count));
+    if (colon_i + 1 < count) children.push_back(parse_range(colon_i + 1, count));
     return NewPseudoNode<CCaseStmt>(children);
 }
 

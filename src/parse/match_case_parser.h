@@ -6,6 +6,9 @@
 //   start  at ParseMatchStmt and ParseCaseStmt here; patterns are in case_patterns.cpp
 #pragma once
 
+#include <functional>
+#include <vector>
+
 #include <nanobind/nanobind.h>
 
 #include "parse/pattern_work.h"
@@ -56,6 +59,34 @@ class CMatchCaseStatementParser : public CHosted {
         visit(_fPositions);
     }
 
+  protected:
+    // The two statements; what isn't a pattern is parsed as the caller says. The subject comes in brackets.
+    CNodeRef _MatchStmt(const std::function<CNodeRef()>& parse_subject);
+    CNodeRef _CaseStmt(const std::function<CNodeRef(Py_ssize_t start_i, Py_ssize_t end_i)>& parse_range);
+
+    using CPlan = CPatternWork::CPlan;
+
+    // Plans the patterns in [start_i, end_i) with the commas between them.
+    void _PlanPatterns(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    // The node that the steps which are left lead to.
+    CNodeRef _Finish(CPatternWork& work);
+
+    // Tokens of the line; IndexError outside it, TypeError while there is none.
+    Py_ssize_t _TokCount() const;
+    nb::object _Tok(Py_ssize_t tok_i) const;
+    nb::object _Position(Py_ssize_t tok_i) const;
+    int _TokType(Py_ssize_t tok_i) const;
+    bool _IsTok(Py_ssize_t tok_i, std::string_view text) const;
+
+    // -1 where `tok` isn't found; or the end of the range.
+    Py_ssize_t _Find(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
+    Py_ssize_t _FindOrEnd(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
+
+    [[noreturn]] void _FailAt(Py_ssize_t error_i);
+
+    CRef<CPGenParserImpl> _fPGenParser;
+    CRef<CNodeFactory> _fNodeFactory;
+
   private:
     void _SetLine(const nb::tuple& toks_and_positions);
     void _ForgetLine();
@@ -63,7 +94,6 @@ class CMatchCaseStatementParser : public CHosted {
     CNodeRef _ParseRange(Py_ssize_t start_i, Py_ssize_t end_i);
 
     // Plans of patterns, see case_patterns.cpp.
-    using CPlan = CPatternWork::CPlan;
     CNodeRef _NodeFor(const CPatternStep& first);
     void _PlanPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as);
     void _PlanCapture(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
@@ -77,23 +107,8 @@ class CMatchCaseStatementParser : public CHosted {
     void _PlanMappingPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
     void _PlanClassPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
     void _PlanClassArgument(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-
-    // Tokens of the line; IndexError outside it, TypeError while there is none.
-    Py_ssize_t _TokCount() const;
-    nb::object _Tok(Py_ssize_t tok_i) const;
-    nb::object _Position(Py_ssize_t tok_i) const;
-    int _TokType(Py_ssize_t tok_i) const;
-    bool _IsTok(Py_ssize_t tok_i, std::string_view text) const;
     bool _IsSign(Py_ssize_t tok_i) const;
 
-    // -1 where `tok` isn't found; or the end of the range.
-    Py_ssize_t _Find(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
-    Py_ssize_t _FindOrEnd(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
-
-    [[noreturn]] void _FailAt(Py_ssize_t error_i);
-
-    CRef<CPGenParserImpl> _fPGenParser;
-    CRef<CNodeFactory> _fNodeFactory;
     nb::object _fToks = nb::none();       // tuple of the line's token texts; none between two parses
     nb::object _fPositions = nb::none();  // tuple of their positions; none between two parses
     CBracketSteps _fBracketSteps;         // those of _fToks

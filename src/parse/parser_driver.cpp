@@ -52,10 +52,6 @@ nb::dict KeywordsOf(nb::object keyword_seq) {
     return keywords;
 }
 
-int32_t SymbolNumber(nb::handle grammar, const char* symbol) {
-    return ResultFromHost<int32_t>(nb::object(grammar.attr("symbol2number")[symbol]));
-}
-
 }  // namespace
 
 void CPGenParserImpl::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
@@ -73,12 +69,16 @@ void CPGenParserImpl::Init(nb::object version_triple, nb::object grammar_file, n
     _fKeywords = KeywordsOf(std::move(keyword_seq));
     _fParser = CRef<Parser>(
         Instance<Parser>(nb::object(kCreateParser(_fGrammar, Self(), "promotesinglechild"_a = true))));
-    _fFileInputNumber = SymbolNumber(_fGrammar, "file_input");
+    _fFileInputNumber = _NumberOfSymbol("file_input");
     _fClsForStateList = _BuildClsForStateList();
     _fNodeFactory = MakeInstance<CNodeFactory>();
     _fNodeFactory->Init(_fGrammar, _fClsForStateList, _fKeywords, token_names, operator_types);
     _fMatchCaseStatementParser = NewInstance<CMatchCaseStatementParser>(Self());
     __GetTime = HomeModule().attr("time").attr("time");
+}
+
+int CPGenParserImpl::_NumberOfSymbol(const char* symbol) const {
+    return ResultFromHost<int32_t>(nb::object(_fGrammar.attr("symbol2number")[symbol]));
 }
 
 nb::object CPGenParserImpl::convert(nb::handle, int type, nb::handle value, nb::handle context,

@@ -72,13 +72,19 @@ class CPGenParserImpl : public CPGenAnalyzer {
   protected:
     CNodeRef _ParseCopyOfPart(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                               Py_ssize_t start, Py_ssize_t end);
+    // The node of what stands behind `mark_i` in a type parameter that ends at `end`, its bound for one; none
+    // when it is refused and errors aren't raised.
+    CNodeRef _ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                         Py_ssize_t mark_i, Py_ssize_t end, bool raise_errors);
+    int _NumberOfSymbol(const char* symbol) const;
+
+    nb::object _fKeywords = nb::none();
+    CRef<CNodeFactory> _fNodeFactory;
 
   private:
     friend class CTokenFeed;
     friend class CMatchCaseStatementParser;  // works on the same factory and keywords
 
-    CNodeRef _ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
-                         Py_ssize_t colon_i, Py_ssize_t end, bool raise_errors);
     CNodeRef _ParseByGrammar(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                              Py_ssize_t start, Py_ssize_t end);
     CNodeRef _PeelRoot(nb::object parsed, bool is_decorator);
@@ -86,9 +92,7 @@ class CPGenParserImpl : public CPGenAnalyzer {
     nb::object _fGrammar = nb::none();
     bool _fPy3Grammar = true;
     int _fFileInputNumber = 0;
-    nb::object _fKeywords = nb::none();
     CRef<Parser> _fParser;
-    CRef<CNodeFactory> _fNodeFactory;
     nb::object _fClsForStateList = nb::none();
     nb::object __GetTime = nb::none();
 };

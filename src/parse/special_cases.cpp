@@ -4,23 +4,15 @@
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
-#include "neighbours/token_type.h"
 #include "parse/parser_driver.h"
 #include "parse/pseudo_node.h"
 #include "parse/token_copy.h"
+#include "parse/token_search.h"
 #include "tree/statement_nodes.h"
 
 namespace codeloom {
 
 namespace {
-
-bool IsToken(const nb::tuple& toks, Py_ssize_t i, std::string_view text) {
-    return i < TupleSize(toks) && CUtf8(TupleItem(toks, i)) == text;
-}
-
-bool IsName(const nb::tuple& toks, Py_ssize_t i) {
-    return GetTokenType(CUtf8(TupleItem(toks, i))) == kTokenId_NAME;
-}
 
 bool MayBeSpecialCase(nb::handle first_tok) {
     return TextIsOneOf(first_tok, "with", "match", "case", "except", "type", "def", "class", "async");
@@ -145,11 +137,10 @@ CNodeRef CPGenParserImpl::_CreateSingleTypeParameterNode(nb::tuple toks, bool in
     return NewPseudoNode<CTypeParameter>(std::move(children));
 }
 
-// The node of what stands behind the colon at `colon_i`; none when it is refused and errors aren't raised.
 CNodeRef CPGenParserImpl::_ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
-                                      Py_ssize_t colon_i, Py_ssize_t end, bool raise_errors) {
+                                      Py_ssize_t mark_i, Py_ssize_t end, bool raise_errors) {
     try {
-        return ParsePart(toks, in_async_def, positions, colon_i + 1, end);
+        return ParsePart(toks, in_async_def, positions, mark_i + 1, end);
     } catch (const nb::python_error& error) {
         if (raise_errors || !IsParseError(error)) throw;
         return CNodeRef();

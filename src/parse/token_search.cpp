@@ -2,12 +2,10 @@
 
 #include "host/collections.h"
 #include "host/text.h"
+#include "neighbours/token_type.h"
 
 namespace codeloom {
 
-namespace {
-
-// 1 for an opening bracket, -1 for a closing one, 0 for any other token.
 int DepthStep(std::string_view token) {
     if (token.size() != 1) return 0;
     switch (token[0]) {
@@ -24,7 +22,13 @@ int DepthStep(std::string_view token) {
     }
 }
 
-}  // namespace
+bool IsToken(nb::handle toks, Py_ssize_t i, std::string_view text) {
+    return i < TupleSize(toks) && CUtf8(TupleItem(toks, i)) == text;
+}
+
+bool IsName(nb::handle toks, Py_ssize_t i) {
+    return GetTokenType(CUtf8(TupleItem(toks, i))) == kTokenId_NAME;
+}
 
 Py_ssize_t FindOutsideBrackets(std::string_view target, nb::handle toks, Py_ssize_t start, Py_ssize_t end,
                                int depth) {

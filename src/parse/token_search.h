@@ -11,6 +11,15 @@ namespace nb = nanobind;
 
 namespace codeloom {
 
+// 1 for an opening bracket, -1 for a closing one, 0 for any other token.
+int DepthStep(std::string_view token);
+
+// True when there is a token at `i`, and it is `text`.
+bool IsToken(nb::handle toks, Py_ssize_t i, std::string_view text);
+
+// True for a name or a keyword; IndexError past the end.
+bool IsName(nb::handle toks, Py_ssize_t i);
+
 // The index in [start, end) of the token `target` outside brackets; -1 when there is none. The target may be
 // a bracket itself. `depth` is that of `start`.
 Py_ssize_t FindOutsideBrackets(std::string_view target, nb::handle toks, Py_ssize_t start, Py_ssize_t end,

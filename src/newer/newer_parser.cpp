@@ -1,0 +1,239 @@
+#include "newer/newer_parser.h"
+
+#include "host/errors.h"
+#include "host/text.h"
+#include "neighbours/imported_names.h"
+#include "neighbours/token_type.h"
+#include "newer/newer_match_case_parser.h"
+#include "newer/outside_brackets.h"
+#include "parse/parentheses.h"
+#include "parse/pseudo_node.h"
+#include "parse/token_search.h"
+#include "tree/child_list.h"
+#include "tree/statement_nodes.h"
+
+namespace codeloom {
+
+namespace {
+
+// The brackets behind a `with` are those of its items, and not of an expression.
+bool HoldsWithItems(const nb::tuple& toks, Py_ssize_t open_i, Py_ssize_t close_i) {
+    bool is_empty = true, is_item_start = true, is_expression = false, has_target = false;
+    ForEachOutsideBrackets(toks, open_i + 1, close_i, [&](Py_ssize_t, std::string_view text) {
+        is_empty = false;
+        has_target |= text == "as";
+        is_expression |= text == "yield" || text == ":=" || text == "for" || (is_item_start && text == "*");
+        is_item_start = text == ",";
+        return !has_target;
+    });
+    return has_target || !(is_empty || is_expression);
+}
+
+}  // namespace
+
+void CNewerParser::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
+                        nb::object py3_grammar) {
+    CPGenParserImpl::Init(std::move(version_triple), std::move(grammar_file), std::move(keyword_seq),
+                          std::move(py3_grammar));
+    const CRef<CNewerMatchCaseParser> match_case_parser = NewInstance<CNewerMatchCaseParser>(Self());
+    _fMatchCaseStatementParser = CRef<CMatchCaseStatementParser>(match_case_parser.get());
+}
+
+// A star before any expression has a rule of its own in the grammar, since `star_expr` takes less.
+nb::list CNewerParser::_BuildClsForStateList() {
+    nb::list classes = CPGenParserImpl::_BuildClsForStateList();
+    classes[_NumberOfSymbol("star_test")] = nb::type<CStarExpression>();
+    return classes;
+}
+
+CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
+    const Py_ssize_t i = _FindNextNonSkipIndex(toks, -1);
+    if (IsToken(toks, i, "@")) return _ParseDecorator(toks, in_async_def, positions, i);
+    if (IsToken(toks, i, "case")) return _ParseCase(toks, in_async_def, positions);
+    if (IsToken(toks, i, "async")) {
+        const Py_ssize_t next_i = _FindNextNonSkipIndex(toks, i);
+        if (IsToken(toks, next_i, "with"))
+            return _ParseSpecialCaseParenthesizedWith(toks, in_async_def, positions, next_i);
+    }
+    return CPGenParserImpl::_ParseSpecialCases(std::move(toks), in_async_def, std::move(positions));
+}
+
+// `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
+CNodeRef CNewerParser::_ParseCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions) {
+    try {
+        return CPGenParserImpl::_ParseSpecialCases(toks, in_async_def, positions);
+    } catch (const nb::python_error& error) {
+        if (!error.matches(ParseErrorClass())) throw;
+        const Py_ssize_t case_i = _FindNextNonSkipIndex(toks, -1);
+        if (!IsToken(toks, _FindNextNonSkipIndex(toks, case_i), "[")) throw;
+        try {
+            return _ParseToksToNodeImpl(toks, in_async_def, positions);
+        } catch (const nb::python_error& second_error) {
+            if (!second_error.matches(ParseErrorClass())) throw;
+        }
+        throw;
+    }
+}
+
+//   with (open(a) as f, open(b)):    items
+//   with (a), (b):   with (a)[0]:    with (x := f()) as y:    with (yield):    none
+CNodeRef CNewerParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def,
+                                                          CPositions positions, Py_ssize_t i) {
+    const Py_ssize_t open_i = _FindNextNonSkipIndex(toks, i);
+    if (!IsToken(toks, open_i, "(")) return CNodeRef();
+    const Py_ssize_t close_i = _NonNestedFindTokenIndex(nb::str(")"), toks, open_i + 1, TupleSize(toks));
+    if (close_i == -1 || !IsToken(toks, _FindNextNonSkipIndex(toks, close_i), ":")) return CNodeRef();
+    if (!HoldsWithItems(toks, open_i, close_i)) return CNodeRef();
+    return CPGenParserImpl::_ParseSpecialCaseParenthesizedWith(std::move(toks), in_async_def,
+                                                               std::move(positions), i);
+}
+
+//   except A, B:         may lack its brackets (PEP 758)
+//   except A, B as e:    may not, which the grammar doesn't tell
+CNodeRef CNewerParser::_ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                   Py_ssize_t i) {
+    Py_ssize_t comma_i = -1, as_i = -1;
+    ForEachOutsideBrackets(toks, i + 1, TupleSize(toks), [&](Py_ssize_t tok_i, std::string_view text) {
+        if (comma_i == -1 && text == ",") comma_i = tok_i;
+        if (text == "as") as_i = tok_i;
+        return as_i == -1 && text != ":";
+    });
+    if (comma_i != -1 && as_i != -1) _RaiseParseError(nb::int_(comma_i));
+    return CPGenParserImpl::_ParseSpecialCaseExceptStar(std::move(toks), in_async_def, std::move(positions),
+                                                        i);
+}
+
+//   @a.b(c)    the grammar's
+//   @a[0].b    parsed as `(a[0].b)`
+//   a CSingleDecorator: `@`, the expression, the end of the row
+CNodeRef CNewerParser::_ParseDecorator(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                                       Py_ssize_t at_i) {
+    if (_FitsDecoratorRule(toks, at_i)) return CNodeRef();
+    const Py_ssize_t count = TupleSize(toks);
+    if (_FindNextNonSkipIndex(toks, at_i) == count) _RaiseParseError(nb::int_(count));
+    const Py_ssize_t close_i = _NonNestedFindTokenIndex(nb::str(")"), toks, at_i + 1, count);
+    if (close_i != -1) _RaiseParseError(nb::int_(close_i));
+    CNodeRef expression =
+        WithoutParentheses(_ParseToksToNodeImpl(InParentheses(toks, at_i, count), in_async_def, positions));
+    _RequireSingle(*expression);
+    nb::list children;
+    const nb::int_ end(count);
+    children.append(_fNodeFactory->CreateOperatorNode(nb::str("@"), nb::int_(at_i)).Release());
+    children.append(expression.Release());
+    children.append(
+        _fNodeFactory->ConvertSingleNode(kTokenId_NEWLINE, nb::str("\n"), end, nb::none()).Release());
+    return _fNodeFactory->ConvertSingleNode(_NumberOfSymbol("decorator"), nb::none(), nb::int_(at_i),
+                                            children);
+}
+
+// `@name.name`, perhaps called: the form that the grammar has a tree for.
+bool CNewerParser::_FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i) {
+    Py_ssize_t i = at_i;
+    do {
+        i = _FindNextNonSkipIndex(toks, i);
+        if (!_IsPlainName(toks, i)) return false;
+        i = _FindNextNonSkipIndex(toks, i);
+    } while (IsToken(toks, i, "."));
+    if (IsToken(toks, i, "(")) {
+        i = _NonNestedFindTokenIndex(nb::str(")"), toks, i + 1, TupleSize(toks));
+        if (i == -1) return true;  // the grammar tells what is wrong
+        i = _FindNextNonSkipIndex(toks, i);
+    }
+    return i >= TupleSize(toks);
+}
+
+// `type` is a name like any other, unless it begins an alias.
+CNodeRef CNewerParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool in_async_def,
+                                                          CPositions positions, Py_ssize_t i) {
+    const bool is_type = IsToken(toks, i, "type");
+    if (is_type && !_BeginsTypeAlias(toks, i)) return CNodeRef();
+    CNodeRef node = CPGenParserImpl::_ParseSpecialCaseWithTypeParameter(std::move(toks), in_async_def,
+                                                                        std::move(positions), i);
+    if (is_type && node) _RequireAlias(*node);
+    return node;
+}
+
+//   type X = int    type X[T] = list[T]
+//          ^                  ^             tells it from `type`, the name
+bool CNewerParser::_BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i) {
+    const Py_ssize_t name_i = _FindNextNonSkipIndex(toks, type_i);
+    if (!_IsPlainName(toks, name_i)) return false;
+    Py_ssize_t i = _FindNextNonSkipIndex(toks, name_i);
+    if (IsToken(toks, i, "[")) {
+        i = _NonNestedFindTokenIndex(nb::str("]"), toks, i + 1, TupleSize(toks));
+        if (i == -1) return true;  // the bracket is what is wrong
+        i = _FindNextNonSkipIndex(toks, i);
+    }
+    return IsToken(toks, i, "=");
+}
+
+// The assignment that an alias is parsed as has one `=`, and one expression behind it.
+void CNewerParser::_RequireAlias(const CNode& node) {
+    const CNode& assignment = node.As<CWithTypeParameters>() ? node.ChildAt(-1) : node;
+    if (ListedCount(assignment) > 3) _RaiseParseError(assignment.ChildAt(3).fContext);
+    _RequireSingle(assignment.ChildAt(2));
+}
+
+//   T = int        name '=' default
+//   T: a = b       name ':' node, a CNode of the bound, '=' and the default
+CNodeRef CNewerParser::_CreateSingleTypeParameterNode(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                      Py_ssize_t start, Py_ssize_t end, bool raise_errors) {
+    const Py_ssize_t equal_i = _NonNestedFindTokenIndex(nb::str("="), toks, start, end);
+    if (equal_i == -1)
+        return CPGenParserImpl::_CreateSingleTypeParameterNode(toks, in_async_def, positions, start, end,
+                                                               raise_errors);
+    CNodeRef parameter = CPGenParserImpl::_CreateSingleTypeParameterNode(toks, in_async_def, positions, start,
+                                                                         equal_i, raise_errors);
+    if (!parameter && raise_errors) _RaiseParseError(nb::int_(start));
+    if (!parameter) return parameter;
+    CNodeRef value = _ParseDefault(toks, in_async_def, positions, equal_i, end, raise_errors);
+    if (!value) return parameter;
+    CNodeRef equal = _fNodeFactory->CreateOperatorNode(nb::str("="), nb::int_(equal_i));
+    nb::list children = nb::borrow<nb::list>(parameter->fChildren);
+    if (parameter->IsToken(-2, ":")) {
+        const CNodeRef bound = parameter->GetChild(-1);
+        DeleteListItem(children, -1);
+        children.append(NewPseudoNode<CNode>({bound, equal, value}).Release());
+    } else {
+        children.append(equal.Release());
+        children.append(value.Release());
+    }
+    return parameter;
+}
+
+// The default behind the `=` at `equal_i`; none when it is refused and errors aren't raised.
+CNodeRef CNewerParser::_ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                                     Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors) {
+    const bool is_missing = _FindNextNonSkipIndex(toks, equal_i) >= end;
+    if (is_missing && raise_errors) _RaiseParseError(nb::int_(end));
+    if (is_missing) return CNodeRef();
+    CNodeRef value = _ParseBound(toks, in_async_def, positions, equal_i, end, raise_errors);
+    const bool is_unpacking = value && value->As<CStarExpression>();
+    if (raise_errors && !is_unpacking) _RequireSingle(*value);
+    return value;
+}
+
+// A ParseError at what makes more of a node than one expression: a comma, a comprehension, `=`, `yield`, `*`.
+void CNewerParser::_RequireSingle(const CNode& node) {
+    const bool is_list = node.As<CTestListStarExpr>() || !node.As<CExpression>();
+    if (is_list && ListedCount(node) > 1) _RaiseParseError(node.ChildAt(1).fContext);
+    if (is_list || node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield"))
+        _RaiseParseError(node.fContext);
+}
+
+// A name that is no keyword.
+bool CNewerParser::_IsPlainName(const nb::tuple& toks, Py_ssize_t i) const {
+    return i < TupleSize(toks) && IsName(toks, i) && !DictContains(_fKeywords, TupleItem(toks, i));
+}
+
+void BindNewerParser(nb::module_& module) {
+    BindNewerMatchCaseParser(module);
+    nb::class_<CNewerParser, CPGenParserImpl, TParserDriverOperations<CNewerParser>> binding(
+        module, "CNewerParser", Collected<CNewerParser>(),
+        "Parses the language up to Python 3.14, with the grammar file of that version.");
+    binding.def(TInit<nb::object, nb::object, nb::object, nb::object>(), "version_triple"_a.none(),
+                "grammar_file"_a = kNewerGrammar, "keyword_seq"_a = nb::none(), "py3_grammar"_a = true);
+    BindOperations(binding);
+}
+
+}  // namespace codeloom

@@ -1,0 +1,53 @@
+// newer/: the language beyond Python 3.8 for those who read whole files of it.
+//   in     the same as the classes beneath
+//   out    the same node classes, so that walkers need nothing new
+//   keeps  the same
+//   start  at CNewerParser, which a host could have written with the operations that it overrides
+//
+// What one token can decide is in the grammar file of 3.14. Here is the rest:
+//   with (x := f()) as y:   with (yield):   async with (a as b, c as d):   brackets that are and aren't
+//   items'
+//   @a[0].b                                 any expression as a decorator
+//   type is x                               `type` as a name in front of a keyword
+//   def f[T: int = str]():                  defaults of type parameters
+//   case a, b:                              in newer_match_case_parser.h
+#pragma once
+
+#include "parse/parser_driver.h"
+
+namespace codeloom {
+
+inline constexpr const char* kNewerGrammar = "Python-Grammar-3.14";
+
+class CNewerParser : public CPGenParserImpl {
+  public:
+    void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
+              nb::object py3_grammar);
+
+    nb::list _BuildClsForStateList() override;
+    CNodeRef _ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) override;
+    CNodeRef _ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                Py_ssize_t i) override;
+    CNodeRef _ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async_def, CPositions positions,
+                                         Py_ssize_t i) override;
+    CNodeRef _ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                Py_ssize_t i) override;
+    CNodeRef _CreateSingleTypeParameterNode(nb::tuple toks, bool in_async_def, CPositions positions,
+                                            Py_ssize_t start, Py_ssize_t end, bool raise_errors) override;
+
+  private:
+    CNodeRef _ParseCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions);
+    CNodeRef _ParseDecorator(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                             Py_ssize_t at_i);
+    bool _FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i);
+    bool _BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i);
+    void _RequireAlias(const CNode& node);
+    bool _IsPlainName(const nb::tuple& toks, Py_ssize_t i) const;
+    CNodeRef _ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                           Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors);
+    void _RequireSingle(const CNode& node);
+};
+
+void BindNewerParser(nb::module_& module);
+
+}  // namespace codeloom
