@@ -63,30 +63,40 @@ class LineNames:
 
 
 def NamesInFile(
-    path: str | PathLike[str], language: Language | str = DEFAULT_LANGUAGE_NAME
+    path: str | PathLike[str],
+    language: Language | str = DEFAULT_LANGUAGE_NAME,
+    *,
+    false_hints: bool = False,
 ) -> Iterator[LineNames]:
     """The names in each logical line of a file, in its order; OSError when it can't be read.
 
-    `language` is the version of Python that it is written in, such as "3.12".
+    `language` is the version of Python that it is written in, such as "3.12". With `false_hints`
+    all that looks like a type hint is taken for one, as the engine itself does.
     """
-    return NamesInBytes(Path(path).read_bytes(), language, fspath(path))
+    return NamesInBytes(Path(path).read_bytes(), language, fspath(path), false_hints=false_hints)
 
 
 def NamesInText(
-    text: str, language: Language | str = DEFAULT_LANGUAGE_NAME, path: str = "<string>"
+    text: str,
+    language: Language | str = DEFAULT_LANGUAGE_NAME,
+    path: str = "<string>",
+    *,
+    false_hints: bool = False,
 ) -> Iterator[LineNames]:
     """The same for a source text; `path` is the name that its lines bear."""
-    return _Names(SourceFromText(text), language, path)
+    return _Names(SourceFromText(text), language, path, false_hints)
 
 
-def NamesInBytes(data: bytes, language: Language | str, path: str) -> Iterator[LineNames]:
+def NamesInBytes(
+    data: bytes, language: Language | str, path: str, *, false_hints: bool = False
+) -> Iterator[LineNames]:
     """The same for the bytes of a file, decoded as the file says; `path` is its name."""
-    return _Names(SourceFromBytes(data), language, path)
+    return _Names(SourceFromBytes(data), language, path, false_hints)
 
 
-def _Names(source: Source, language: Language | str, path: str) -> Iterator[LineNames]:
+def _Names(source: Source, language: Language | str, path: str, false_hints: bool) -> Iterator[LineNames]:
     language = LanguageOf(source.text, language)
-    reader = _NameReader(source, language, path)
+    reader = _NameReader(source, language, path, FalseHintRemover(source.text, keep=false_hints))
     return map(reader.Read, GetLogicalsFromText(source.text))
 
 
@@ -103,9 +113,9 @@ def _ParserOf(language: Language) -> CPGenParserImpl:
 class _NameReader(LineReader):
     """Analyses the logical lines of one text."""
 
-    def __init__(self, source: Source, language: Language, path: str) -> None:
+    def __init__(self, source: Source, language: Language, path: str, false_hints: FalseHintRemover) -> None:
         super().__init__(source, path)
-        self._fFalseHints = FalseHintRemover(source.text)
+        self._fFalseHints = false_hints
         self._fLanguage = language
 
     def Read(self, logical: CLogicalLine) -> LineNames:

@@ -2,7 +2,7 @@
 
 import argparse
 
-from codeloom.cli.command import AddSourceArguments, Command, ExitStatus
+from codeloom.cli.command import AddFalseHintsArgument, AddSourceArguments, Command, ExitStatus
 from codeloom.cli.console import Console
 from codeloom.cli.files import ReadFiles
 from codeloom.cli.names_formats import FORMATS
@@ -29,6 +29,7 @@ class NamesCommand(Command):
     def AddArguments(parser: argparse.ArgumentParser) -> None:
         """Add the command's own arguments."""
         AddSourceArguments(parser)
+        AddFalseHintsArgument(parser)
         parser.add_argument(
             "--format",
             choices=FORMATS,
@@ -40,7 +41,7 @@ class NamesCommand(Command):
         """Print all files; one that can't be read is told, and the others are printed."""
         names_format = FORMATS[arguments.format](self._fConsole)
         for path, data in ReadFiles(arguments.paths, self._OnFailure):
-            for line in NamesInBytes(data, arguments.language, path):
+            for line in NamesInBytes(data, arguments.language, path, false_hints=arguments.false_hints):
                 names_format.Add(line)
                 if line.problem is not None:
                     self._fStatus = max(self._fStatus, ExitStatus.PROBLEMS)
