@@ -5,10 +5,11 @@ from dataclasses import dataclass
 from os import PathLike, fspath
 from pathlib import Path
 
-from codeloom.engine import Analysis, AnalyzerOf, Complaint, ComplaintOf, IsSpoiled, TooLong
+from codeloom.engine import Analysis, AnalyzerOf, Complaint, ComplaintOf, IsSpoiled
 from codeloom.excerpt import Excerpt
 from codeloom.false_hints import FalseHintRemover
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
+from codeloom.line_length import TooLong
 from codeloom.logicalline import CLogicalLine
 from codeloom.source import RowMap, Source, SourceFromBytes, SourceFromText
 from codeloom.utils import GetLogicalsFromText

@@ -1,4 +1,4 @@
-"""The engine as the upper layers use it: its analyzers, its complaints in places of the file, its limits."""
+"""The engine as the upper layers use it: its analyzers, and its complaints in places of the file."""
 
 import threading
 from collections.abc import Iterator
@@ -13,9 +13,6 @@ from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
 from codeloom.source import REPLACEMENT
 from codeloom.treesift import CPGenAnalyzerImpl
-
-# A logical line of more tokens isn't analysed.
-MOST_TOKENS = 1_000_000
 
 # The file name in the errors of a line. Those of an expression within it that doesn't parse have
 # another one; only walkers use this one there too.
@@ -50,18 +47,6 @@ def Analysis() -> Iterator[StringIO]:
     """
     with _gLock, redirect_stdout(StringIO()) as printed:
         yield printed
-
-
-def TooLong(logical: CLogicalLine) -> Complaint | None:
-    """The complaint about a line that is too long to be analysed; None for any other."""
-    if logical.fTokenCount <= MOST_TOKENS:
-        return None
-    row, col = logical.fPositions[0]
-    message = (
-        f"this logical line has {logical.fTokenCount:,} tokens and isn't analysed: "
-        f"split it into lines of {MOST_TOKENS:,} at the most"
-    )
-    return Complaint(logical.fFirstLine + row, col, message)
 
 
 def ComplaintOf(error: SyntaxError, logical: CLogicalLine) -> Complaint:

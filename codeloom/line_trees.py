@@ -5,8 +5,8 @@ from dataclasses import dataclass
 
 from codeloom import logicalline
 from codeloom.check import Problem
-from codeloom.engine import TooLong
 from codeloom.languages import Language, LanguageOf
+from codeloom.line_length import TooLong
 from codeloom.line_reader import LineReader, RowsOf
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine

@@ -9,9 +9,10 @@ from typing import Any
 
 from codeloom import logicalline
 from codeloom.check import Problem
-from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, TooLong
+from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf
 from codeloom.false_hints import FalseHintRemover
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageNamed
+from codeloom.line_length import TooLong
 from codeloom.line_reader import LineReader, RowsOf
 from codeloom.logicalline import CLogicalLine
 from codeloom.records import CRecord, RecordsOfLogical
