@@ -131,6 +131,8 @@ class CNodeWalker : public CHosted {
     CRef<CLogicalLine> _fLogical;       // the line being walked; it guards against re-entry
     bool _fLoadNameContext = true;      // a name that is met is read; false below a target
     bool _fStoreWithinSubExpr = false;  // below a target: one of a comprehension or a lambda
+    // What parentheses that are no tuple's hold. So nested ones are told from a tuple's but once.
+    const CNode* _fInnerGrouping = nullptr;
     CNamesFound _fNames;
     CVisitLimits _fVisits;
     int _fRecurseCount = 0;

@@ -1,6 +1,7 @@
 // What a value stands for: a typed literal, the text of a name or chain, the text of an expression. None
 // where that can't be told, which writes no record.
 #include "host/errors.h"
+#include "host/restore.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/symbolinfo/info_bytes.h"
@@ -73,7 +74,8 @@ CBytesOrNone CNodeWalker::_TypeEquivForNode(CNode& node, CBytesOrNone extra_trai
 CBytesOrNone CNodeWalker::_EquivForAtom(CAtom& atom, const CBytesOrNone& extra_trailer) {
     const CTextOrNone bracket = atom.GetInitialBracket();
     const bool has_trailer = !extra_trailer.is_none();
-    if (TextIs(bracket, "(") && !IsTupleLiteralNode(atom)) return _EquivForGrouping(atom, extra_trailer);
+    if (TextIs(bracket, "(") && (_fInnerGrouping == &atom || !IsTupleLiteralNode(atom)))
+        return _EquivForGrouping(atom, extra_trailer);
     if (!bracket.is_none()) return has_trailer ? CBytesOrNone() : _EquivForDisplay(atom, bracket);
     if (atom.IsTwoPlusStringLiterals())
         return has_trailer ? CBytesOrNone() : _InstanceNameForString(*atom.ChildAs<CStringLiteral>(0));
@@ -95,8 +97,11 @@ CBytesOrNone CNodeWalker::_EquivForDisplay(CAtom& atom, nb::handle bracket) {
 // Parentheses that aren't a tuple's are looked through.
 CBytesOrNone CNodeWalker::_EquivForGrouping(CAtom& atom, const CBytesOrNone& extra_trailer) {
     const CRecursionScope recursion;
-    if (atom._GetChildCount() == CAtom::kFilledChildCount)
-        return _TypeEquivForNode(*atom.ChildAs<CNode>(CAtom::kContentsIndex), extra_trailer);
+    if (atom._GetChildCount() == CAtom::kFilledChildCount) {
+        const CNodeRef contents = atom.ChildAs<CNode>(CAtom::kContentsIndex);
+        const CRestoreOnExit<const CNode*> inner_grouping(_fInnerGrouping, contents.get());
+        return _TypeEquivForNode(*contents, extra_trailer);
+    }
     HostAssert(false, [&]() -> nb::object { return _TextForNode(atom, {.literal_only = true}); });
     return CBytesOrNone();
 }
