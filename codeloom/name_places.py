@@ -18,6 +18,7 @@ from codeloom.symbolinfo import (
 )
 from codeloom.treesift import (
     CAtom,
+    CClassArgumentPatternNode,
     CDottedName,
     CNameLiteral,
     CNode,
@@ -300,7 +301,10 @@ class PlaceFinder(CNodeWalker):
         self._fFirst = 0
 
     def _VisitPatternNode(self, pattern_node: Any) -> None:
-        self._DefineEach(child for child in pattern_node.fChildren if isinstance(child, CNameLiteral))
+        # The name in front of a "=" belongs to the class.
+        first_i = 2 if isinstance(pattern_node, CClassArgumentPatternNode) else 0
+        children = pattern_node.fChildren[first_i:]
+        self._DefineEach(child for child in children if isinstance(child, CNameLiteral))
         super()._VisitPatternNode(pattern_node)
 
     def _DefineEach(self, nodes: Iterable[CNode]) -> None:
