@@ -78,6 +78,7 @@ fuzz: build
 bench: build
 	$(BIN)/python benchmarks/bench_accessors.py
 	$(BIN)/python benchmarks/bench_analyze.py
+	$(BIN)/python benchmarks/bench_hints.py
 
 clean:
 	rm -rf build $(VENV)

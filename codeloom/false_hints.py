@@ -25,11 +25,15 @@ _OPERATORS = r"(?:and|or|not|in|is|if|else)\b"
 _IGNORE_WITH_MORE = re.compile(r"ignore\W")
 _STRING_LITERAL = re.compile(r"""(?<!\w)[a-zA-Z]{0,2}("[^"]*"|'[^']*')""")
 # Two words in a row that no operator joins, a character that no expression holds, or a beginning
-# that no expression has.
+# that no expression has: that of a statement among others.
+_STATEMENT = (
+    r"(?:assert|break|class|continue|def|del|except|finally|for|from|global|import|nonlocal|pass|raise"
+    r"|return|try|while|with|yield)\b|[\w.]+\s*=(?!=)"
+)
 _PROSE = re.compile(
     rf"\b(?!{_OPERATORS}|lambda\b)\w+\s+(?!{_OPERATORS})\w"
     r"|[?!$;]"
-    r"|^[<>=/%&|^@,:)\]}]"
+    rf"|^(?:[<>=/%&|^@,:)\]}}]|{_STATEMENT})"
 )
 # In quotes a sentence: such words in front of any bracket and three of them in all, or the mark at
 # its end. What is shorter is taken for a hint with a fault.

@@ -16,11 +16,14 @@ FALSE_COMMENTS = [
     "# type: 'a' text",
     "# type: <class 'int'>",
     "# type: int?",
+    "# type: return",
+    "# type: kind = a",
     "# type: (int) -> (str, bool)",
 ]
 TRUE_COMMENTS = [
     "# type: int",
     "# type: ignore",
+    "# type: returns == a",
     "# type: List[int]  # a list of them",
     "# type: Optional['a b'] or not None",
     "# type: (int, List[*Ts], a ** b) -> Dict[str, (int)]",
