@@ -12,7 +12,7 @@ from codeloom.languages import Language
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
 from codeloom.source import REPLACEMENT
-from codeloom.treesift import CPGenAnalyzerImpl
+from codeloom.treesift import CNewerAnalyzer, CNewerParser, CPGenAnalyzerImpl, CPGenParserImpl
 
 # The file name in the errors of a line. Those of an expression within it that doesn't parse have
 # another one; only walkers use this one there too.
@@ -30,9 +30,14 @@ class Complaint(NamedTuple):
 @cache
 def AnalyzerOf(language: Language) -> CPGenAnalyzerImpl:
     """The one analyzer of a language version. Use it within `Analysis` only."""
-    return CPGenAnalyzerImpl(
-        language.version_triple, language.grammar_file, language.keywords, language.is_py3
-    )
+    make = CNewerAnalyzer if language.is_py3 else CPGenAnalyzerImpl
+    return make(language.version_triple, language.grammar_file, language.keywords, language.is_py3)
+
+
+def NewParser(language: Language) -> CPGenParserImpl:
+    """A parser of a language version, for the caller alone."""
+    make = CNewerParser if language.is_py3 else CPGenParserImpl
+    return make(language.version_triple, language.grammar_file, language.keywords, language.is_py3)
 
 
 _gLock = threading.Lock()

@@ -19,6 +19,7 @@ _PY2_KEYWORDS = _KEYWORDS | {"exec", "print"}
 _PY3_KEYWORDS = _KEYWORDS | {"False", "None", "True", "nonlocal"}
 _ASYNC_KEYWORDS = frozenset({"async", "await"})
 _FIRST_ASYNC_VERSION = (3, 7, 0)
+_FIRST_VERSION_BEYOND_3_8 = (3, 9, 0)
 _PRINT_FUNCTION = re.compile(
     r"^from[ \t]+__future__[ \t]+import\b(?:[^\n(#]|\([^)]*)*\bprint_function\b", re.MULTILINE
 )
@@ -63,10 +64,16 @@ def LanguageNamed(name: str = DEFAULT_LANGUAGE_NAME) -> Language:
     return Language(
         name=name,
         version_triple=triple,
-        grammar_file="Python-Grammar-3.8" if major == 3 else "Python-Grammar-2.7",
+        grammar_file=_GrammarOf(triple),
         keywords=tuple(sorted(_KeywordsOf(triple))),
         is_py3=major == 3,
     )
+
+
+def _GrammarOf(triple: tuple[int, int, int]) -> str:
+    if triple[0] == 2:
+        return "Python-Grammar-2.7"
+    return "Python-Grammar-3.14" if triple >= _FIRST_VERSION_BEYOND_3_8 else "Python-Grammar-3.8"
 
 
 def _KeywordsOf(triple: tuple[int, int, int]) -> frozenset[str]:

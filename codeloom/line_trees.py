@@ -5,6 +5,7 @@ from dataclasses import dataclass
 
 from codeloom import logicalline
 from codeloom.check import Problem
+from codeloom.engine import NewParser
 from codeloom.languages import Language, LanguageOf
 from codeloom.line_length import TooLong
 from codeloom.line_reader import LineReader, RowsOf
@@ -12,7 +13,7 @@ from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
 from codeloom.optpgen import ParseError
 from codeloom.source import Source
-from codeloom.treesift import CNode, CPGenParserImpl, CreateSyntaxError
+from codeloom.treesift import CNode, CreateSyntaxError
 from codeloom.utils import GetLogicalsFromText
 
 
@@ -51,9 +52,7 @@ class _TreeReader(LineReader):
 
     def __init__(self, source: Source, language: Language, path: str) -> None:
         super().__init__(source, path)
-        self._fParser = CPGenParserImpl(
-            language.version_triple, language.grammar_file, language.keywords, language.is_py3
-        )
+        self._fParser = NewParser(language)
 
     def Read(self, logical: CLogicalLine, origin: tuple[int, int], in_async_def: bool) -> LineTree:
         """The tree of a logical whose text begins at `origin`: row and UTF-8 column, from zero."""
@@ -62,7 +61,10 @@ class _TreeReader(LineReader):
             try:
                 tree = self._fParser.ParseToNode(logical, in_async_def)
             except ParseError as error:
-                problem = self._Refusal(logical, origin, error)
+                *_, context = error.args
+                problem = self._Refusal(CreateSyntaxError("invalid syntax", logical, context), origin)
+            except SyntaxError as error:
+                problem = self._Refusal(error, origin)
         row, column = self._FirstPlace(logical, origin)
         return LineTree(self._fPath, row, column, TextFromTokens(logical).lstrip(), tree, problem)
 
@@ -70,8 +72,7 @@ class _TreeReader(LineReader):
         complaint = TooLong(logical)
         return complaint and self._Problem(complaint)
 
-    def _Refusal(self, logical: CLogicalLine, origin: tuple[int, int], parse_error: ParseError) -> Problem:
-        *_, context = parse_error.args
-        error = CreateSyntaxError("invalid syntax", logical, context)
+    def _Refusal(self, error: SyntaxError, origin: tuple[int, int]) -> Problem:
+        assert error.lineno is not None and error.offset is not None
         row, column = self._Place(origin, error.lineno - 1, error.offset - 1)
         return Problem(self._fPath, row, column, error.msg, self._fRowMap.Text(row - 1))

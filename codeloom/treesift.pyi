@@ -1877,3 +1877,89 @@ class CPGenAnalyzerImpl(CPGenAnalyzer):
         """
         Inspect all embedded expressions.  Will raise exceptions on parse errors
         """
+
+class CNewerMatchCaseParser(CMatchCaseStatementParser):
+    """
+    Parses match and case statements, open and empty sequences and adjacent strings included.
+    """
+
+    def __init__(self, pgen_parser: CPGenParserImpl | None | None) -> None:
+        ...
+
+    def ParseMatchStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
+        """
+        The CMatchStmt of a logical line, given as tuples of token texts and (row, column) positions; None when it is no `match` statement (PEP 634). ParseError on a bad subject.
+        """
+
+    def _ParseMatchStmtImpl(self) -> CNode | None:
+        """ParseMatchStmt for the tokens of the line under way."""
+
+    def ParseCaseStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
+        """
+        The CCaseStmt of a logical line, given as tuples of token texts and (row, column) positions; None when it is no `case` statement (PEP 634). ParseError on a bad pattern, guard or body.
+        """
+
+    def _ParseCaseStmtImpl(self) -> CNode | None:
+        """ParseCaseStmt for the tokens of the line under way."""
+
+    def _NodeForPattern(self, start_i: int, end_i: int, allow_as: bool=True) -> CNode | None:
+        """
+        The node of the pattern in [start_i, end_i). `allow_as`: the range may end in `as name`.
+        """
+
+class CNewerParser(CPGenParserImpl):
+    """
+    Parses the language up to Python 3.14, with the grammar file of that version.
+    """
+
+    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True) -> None:
+        ...
+
+    def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
+        """
+        Make the node of a token or of a rule; what it returns is what the rule above gets as a child.
+
+        Called once for each token that the grammar takes, with its type (int), text (str) and context
+        (any object) and None as children, and once for each rule that is complete, with the rule's
+        number, None as value, the context of its first token and the list of its children. This one
+        returns the tuple (type, value, context, children).
+        """
+
+    def _BuildClsForStateList(self) -> list[typing.Any]:
+        """
+        The list that gives the node class for each token type and grammar state. Updates kClsForState.
+        """
+
+    def ParseToNode(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool=False) -> CNode | None:
+        """
+        The node of a logical's statement, or None. ParseError on a token that the grammar refuses. Give it back with DiscardNode.
+        """
+
+    def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None) -> CNode | None:
+        """
+        The node of a statement that is parsed by hand; None for the ordinary road.
+        """
+
+    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+        """
+        A `with` whose items stand in parentheses, with `i` the index of `with`; None when they don't.
+        """
+
+    def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+        """
+        An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.
+        """
+
+    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+        """
+        A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of its keyword; None for the ordinary road.
+        """
+
+    def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, start: int, end: int, raise_errors: bool) -> CNode | None:
+        """The node of the one type parameter in [start, end), or None."""
+
+class CNewerAnalyzer(CPGenAnalyzerImpl):
+    """Analyzes logical lines of the language up to Python 3.14."""
+
+    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True, hint_grammar_file: object='Python-Grammar-3.14') -> None:
+        ...

@@ -75,7 +75,7 @@ def Tokens(text, version="3.8", tables=ENGINE):
             split = value == "..." and version == "2.7"
             found += [(tables.operators["."], ".")] * 3 if split else [(tables.operators[value], value)]
             continue
-        if kind == "NAME" and value in ("async", "await") and version == "3.8":
+        if kind == "NAME" and value in ("async", "await") and version != "2.7":
             kind = value.upper()
         found.append((tables.NumberOf(kind), value[:1] if kind == "NEWLINE" else value))
         if kind == "NEWLINE":

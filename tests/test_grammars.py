@@ -1,4 +1,4 @@
-"""The grammars of Python 2.7 and 3.8: what they accept, what they refuse, how they number."""
+"""The grammars of Python 2.7, 3.8 and 3.14: what they accept, what they refuse, how they number."""
 
 import ast
 import random
@@ -22,7 +22,7 @@ from grammar_tools import (
 from codeloom import optpgen
 from codeloom.treesift import CPGenParserImpl
 
-GRAMMARS = {version: LoadGrammar(GrammarPath(version)) for version in ("2.7", "3.8")}
+GRAMMARS = {version: LoadGrammar(GrammarPath(version)) for version in ("2.7", "3.8", "3.14")}
 PARSERS = {version: optpgen.CreateParser(loaded, None) for version, loaded in GRAMMARS.items()}
 
 IN_BOTH = r"""
@@ -123,6 +123,19 @@ ONLY_IN_3_8 = r"""
     with a, b,: c
 """
 
+# Beyond what 3.8 has.
+ONLY_IN_3_14 = r"""
+    a[b := c]; a[b := c, d:e]
+    a[*b]; a[*b or c, d]; a[d, *b] = e
+    {a := b}; {a := b, *c, d := e,}; {*a, b := c}; {a := b for b in c}
+    def f(*a: *b): pass
+    def f(a, *b: *c, d=e, **f): pass
+    for a in *b, c: d
+    a += *b, c
+    f(a := b for b in c)
+    try: a\nexcept B, C: d\nexcept D,: e
+"""
+
 ONLY_IN_2_7 = r"""
     print
     print a, b,
@@ -219,13 +232,12 @@ IN_NEITHER = r"""
     if a:\nb
 """
 
-ONLY_REFUSED_IN_3_8 = r"""
+NOT_IN_PY3 = r"""
     print a
     exec a
     a <> b
     `a`
     raise A, b
-    try: a\nexcept B, c: d
     def f(a, (b, c)): pass
     def f(*): pass
     def f(*, **a): pass
@@ -250,6 +262,12 @@ ONLY_REFUSED_IN_3_8 = r"""
     yield from a, b
     nonlocal
     for a in: b
+    def f(a: *b): pass
+    def f(**a: *b): pass
+    [*a or b]
+    a[**b]
+    a[*b:c]
+    except* B: c
 """
 
 ONLY_REFUSED_IN_2_7 = r"""
@@ -278,14 +296,24 @@ def Snippets(text):
     return [line.strip(" ").replace("\\n", "\n") for line in text.splitlines() if line.strip()]
 
 
-def ForVersions(both, only_3_8, only_2_7):
-    return [("3.8", text) for text in Snippets(both) + Snippets(only_3_8)] + [
-        ("2.7", text) for text in Snippets(both) + Snippets(only_2_7)
+def ForVersions(**blocks):
+    return [
+        (version.removeprefix("in_").replace("_", "."), text)
+        for version, texts in blocks.items()
+        for text in Snippets("".join(texts))
     ]
 
 
-ACCEPTED = ForVersions(IN_BOTH, ONLY_IN_3_8, ONLY_IN_2_7)
-REFUSED = ForVersions(IN_NEITHER, ONLY_REFUSED_IN_3_8, ONLY_REFUSED_IN_2_7)
+ACCEPTED = ForVersions(
+    in_2_7=(IN_BOTH, ONLY_IN_2_7),
+    in_3_8=(IN_BOTH, ONLY_IN_3_8),
+    in_3_14=(IN_BOTH, ONLY_IN_3_8, ONLY_IN_3_14),
+)
+REFUSED = ForVersions(
+    in_2_7=(IN_NEITHER, ONLY_REFUSED_IN_2_7),
+    in_3_8=(IN_NEITHER, NOT_IN_PY3, ONLY_IN_3_14),
+    in_3_14=(IN_NEITHER, NOT_IN_PY3),
+)
 
 
 @pytest.mark.parametrize(("version", "text"), ACCEPTED)
@@ -300,12 +328,17 @@ def test_refused(version, text):
 
 
 def test_snippets_are_what_they_are_said_to_be():
-    """The interpreter agrees, but where its syntax isn't that of 3.8."""
-    differ = {"with a, b,: c", "del *a, b", "(a for b, c in d if lambda: e)"}
-    for text in Snippets(IN_BOTH) + Snippets(ONLY_IN_3_8):
-        if text not in differ:
+    """The interpreter agrees, but where its syntax isn't that of the grammars."""
+    differ = {
+        "with a, b,: c",
+        "del *a, b",
+        "(a for b, c in d if lambda: e)",
+        r"try: a\nexcept B, C: d\nexcept D,: e",
+    }
+    for text in Snippets(IN_BOTH + ONLY_IN_3_8 + ONLY_IN_3_14):
+        if text.replace("\n", r"\n") not in differ:
             ast.parse(text)
-    for text in Snippets(IN_NEITHER) + Snippets(ONLY_REFUSED_IN_3_8):
+    for text in Snippets(IN_NEITHER + NOT_IN_PY3):
         with pytest.raises(SyntaxError):
             ast.parse(text)
 
@@ -327,6 +360,8 @@ def test_every_rule_with_a_class_is_there():
     by_version = {version: set(loaded.symbol2number) for version, loaded in GRAMMARS.items()}
     assert names <= by_version["2.7"] | by_version["3.8"]
     assert names - by_version["3.8"] == {"fpdef", "fplist", "list_for", "listmaker"}
+    assert by_version["3.14"] - by_version["3.8"] == {"fpdef", "star_test"}
+    assert by_version["3.8"] <= by_version["3.14"]
     assert names - by_version["2.7"] == {
         *("annassign", "atom_expr", "namedexpr_test", "nonlocal_stmt", "star_expr"),
         *("sync_comp_for", "testlist_star_expr", "tfpdef", "typedargslist", "yield_arg"),

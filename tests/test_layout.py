@@ -14,8 +14,12 @@ STEPS = [
     ["walker"],
     ["hints"],
     ["analysis"],
+    ["newer"],
 ]
 STEP_OF = {folder: step for step, folders in enumerate(STEPS) for folder in folders}
+
+# The module's entry stands above all of them.
+ENTRY = "analysis/treesift.cpp"
 
 # Headers that depend on nothing above the logical line, for everybody.
 FOR_ALL = {"analysis/syntax_error.h", "analysis/pgen_analyzer.h"}
@@ -28,6 +32,8 @@ def Includes(path):
 def test_includes_go_down_the_road():
     wrong = []
     for path in sorted(SOURCES.rglob("*.[hc]*")):
+        if str(path.relative_to(SOURCES)) == ENTRY:
+            continue
         folder = path.relative_to(SOURCES).parts[0]
         for included in Includes(path):
             other = included.split("/")[0]

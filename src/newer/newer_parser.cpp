@@ -16,17 +16,24 @@ namespace codeloom {
 
 namespace {
 
-// The brackets behind a `with` are those of its items, and not of an expression.
-bool HoldsWithItems(const nb::tuple& toks, Py_ssize_t open_i, Py_ssize_t close_i) {
-    bool is_empty = true, is_item_start = true, is_expression = false, has_target = false;
+// What stands in the brackets behind a `with`.
+struct CWithContents {
+    bool has_target = false;  // `a as b`, which no expression has
+    bool are_items = false;   // without a target, expressions with commas between them
+};
+
+CWithContents ReadWithContents(const nb::tuple& toks, Py_ssize_t open_i, Py_ssize_t close_i) {
+    CWithContents contents;
+    bool is_item_start = true, is_expression = false;
     ForEachOutsideBrackets(toks, open_i + 1, close_i, [&](Py_ssize_t, std::string_view text) {
-        is_empty = false;
-        has_target |= text == "as";
+        contents.are_items = true;
+        contents.has_target |= text == "as";
         is_expression |= text == "yield" || text == ":=" || text == "for" || (is_item_start && text == "*");
         is_item_start = text == ",";
-        return !has_target;
+        return !contents.has_target;
     });
-    return has_target || !(is_empty || is_expression);
+    contents.are_items &= contents.has_target || !is_expression;
+    return contents;
 }
 
 }  // namespace
@@ -37,19 +44,41 @@ void CNewerParser::Init(nb::object version_triple, nb::object grammar_file, nb::
                           std::move(py3_grammar));
     const CRef<CNewerMatchCaseParser> match_case_parser = NewInstance<CNewerMatchCaseParser>(Self());
     _fMatchCaseStatementParser = CRef<CMatchCaseStatementParser>(match_case_parser.get());
+    _fForms.SetVersion(_fVersionTriple);
+    _fForms.WatchStates(
+        [this](const char* state) { return _HasSymbol(state) ? _NumberOfSymbol(state) : -1; });
+}
+
+nb::object CNewerParser::convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
+                                 nb::handle children) {
+    _fForms.NoteNode(type, value, context, children);
+    return CPGenParserImpl::convert(grammar, type, value, context, children);
+}
+
+CNodeRef CNewerParser::ParseToNode(CLogicalLine& logical, bool in_async_def) {
+    _fForms.Reset();
+    CNodeRef node = CPGenParserImpl::ParseToNode(logical, in_async_def);
+    if (!_fForms.HasFound()) return node;
+    if (node) DiscardNode(node.AsHost());
+    _fForms.Raise(logical);
 }
 
 // A star before any expression has a rule of its own in the grammar, since `star_expr` takes less.
 nb::list CNewerParser::_BuildClsForStateList() {
     nb::list classes = CPGenParserImpl::_BuildClsForStateList();
-    classes[_NumberOfSymbol("star_test")] = nb::type<CStarExpression>();
+    if (_HasSymbol("star_test")) classes[_NumberOfSymbol("star_test")] = nb::type<CStarExpression>();
     return classes;
 }
 
 CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
     const Py_ssize_t i = _FindNextNonSkipIndex(toks, -1);
     if (IsToken(toks, i, "@")) return _ParseDecorator(toks, in_async_def, positions, i);
-    if (IsToken(toks, i, "case")) return _ParseCase(toks, in_async_def, positions);
+    if (IsToken(toks, i, "match") || IsToken(toks, i, "case")) {
+        CNodeRef node = _ParseMatchOrCase(toks, in_async_def, positions);
+        if (node && node->As<CMatchStmt>()) _fForms.Note(forms::kMatch, nb::int_(i));
+        if (node && node->As<CCaseStmt>()) _fForms.Note(forms::kCase, nb::int_(i));
+        return node;
+    }
     if (IsToken(toks, i, "async")) {
         const Py_ssize_t next_i = _FindNextNonSkipIndex(toks, i);
         if (IsToken(toks, next_i, "with"))
@@ -59,13 +88,14 @@ CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPo
 }
 
 // `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
-CNodeRef CNewerParser::_ParseCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions) {
+CNodeRef CNewerParser::_ParseMatchOrCase(const nb::tuple& toks, bool in_async_def,
+                                         const CPositions& positions) {
     try {
         return CPGenParserImpl::_ParseSpecialCases(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
         if (!error.matches(ParseErrorClass())) throw;
-        const Py_ssize_t case_i = _FindNextNonSkipIndex(toks, -1);
-        if (!IsToken(toks, _FindNextNonSkipIndex(toks, case_i), "[")) throw;
+        const Py_ssize_t word_i = _FindNextNonSkipIndex(toks, -1);
+        if (!IsToken(toks, _FindNextNonSkipIndex(toks, word_i), "[")) throw;
         try {
             return _ParseToksToNodeImpl(toks, in_async_def, positions);
         } catch (const nb::python_error& second_error) {
@@ -83,7 +113,9 @@ CNodeRef CNewerParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool i
     if (!IsToken(toks, open_i, "(")) return CNodeRef();
     const Py_ssize_t close_i = _NonNestedFindTokenIndex(nb::str(")"), toks, open_i + 1, TupleSize(toks));
     if (close_i == -1 || !IsToken(toks, _FindNextNonSkipIndex(toks, close_i), ":")) return CNodeRef();
-    if (!HoldsWithItems(toks, open_i, close_i)) return CNodeRef();
+    const CWithContents contents = ReadWithContents(toks, open_i, close_i);
+    if (!contents.are_items) return CNodeRef();
+    if (contents.has_target) _fForms.Note(forms::kWithBrackets, nb::int_(open_i));
     return CPGenParserImpl::_ParseSpecialCaseParenthesizedWith(std::move(toks), in_async_def,
                                                                std::move(positions), i);
 }
@@ -99,8 +131,9 @@ CNodeRef CNewerParser::_ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async
         return as_i == -1 && text != ":";
     });
     if (comma_i != -1 && as_i != -1) _RaiseParseError(nb::int_(comma_i));
-    return CPGenParserImpl::_ParseSpecialCaseExceptStar(std::move(toks), in_async_def, std::move(positions),
-                                                        i);
+    CNodeRef node = CPGenParserImpl::_ParseSpecialCaseExceptStar(toks, in_async_def, positions, i);
+    if (node) _fForms.Note(forms::kExceptStar, nb::int_(_FindNextNonSkipIndex(toks, i)));
+    return node;
 }
 
 //   @a.b(c)    the grammar's
@@ -116,6 +149,7 @@ CNodeRef CNewerParser::_ParseDecorator(const nb::tuple& toks, bool in_async_def,
     CNodeRef expression =
         WithoutParentheses(_ParseToksToNodeImpl(InParentheses(toks, at_i, count), in_async_def, positions));
     _RequireSingle(*expression);
+    _fForms.Note(forms::kDecorator, nb::int_(_FindNextNonSkipIndex(toks, at_i)));
     nb::list children;
     const nb::int_ end(count);
     children.append(_fNodeFactory->CreateOperatorNode(nb::str("@"), nb::int_(at_i)).Release());
@@ -147,9 +181,11 @@ CNodeRef CNewerParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool i
                                                           CPositions positions, Py_ssize_t i) {
     const bool is_type = IsToken(toks, i, "type");
     if (is_type && !_BeginsTypeAlias(toks, i)) return CNodeRef();
-    CNodeRef node = CPGenParserImpl::_ParseSpecialCaseWithTypeParameter(std::move(toks), in_async_def,
-                                                                        std::move(positions), i);
-    if (is_type && node) _RequireAlias(*node);
+    CNodeRef node = CPGenParserImpl::_ParseSpecialCaseWithTypeParameter(toks, in_async_def, positions, i);
+    if (!node) return node;
+    if (is_type) _RequireAlias(*node);
+    const Py_ssize_t behind_name_i = _FindNextNonSkipIndex(toks, _FindNextNonSkipIndex(toks, i));
+    _fForms.Note(is_type ? forms::kTypeAlias : forms::kTypeParameters, nb::int_(is_type ? i : behind_name_i));
     return node;
 }
 
@@ -186,11 +222,12 @@ CNodeRef CNewerParser::_CreateSingleTypeParameterNode(nb::tuple toks, bool in_as
                                                                          equal_i, raise_errors);
     if (!parameter && raise_errors) _RaiseParseError(nb::int_(start));
     if (!parameter) return parameter;
+    _fForms.Note(forms::kTypeDefault, nb::int_(equal_i));
     CNodeRef value = _ParseDefault(toks, in_async_def, positions, equal_i, end, raise_errors);
     if (!value) return parameter;
     CNodeRef equal = _fNodeFactory->CreateOperatorNode(nb::str("="), nb::int_(equal_i));
     nb::list children = nb::borrow<nb::list>(parameter->fChildren);
-    if (parameter->IsToken(-2, ":")) {
+    if (ListedCount(*parameter) > 2 && parameter->IsToken(-2, ":")) {
         const CNodeRef bound = parameter->GetChild(-1);
         DeleteListItem(children, -1);
         children.append(NewPseudoNode<CNode>({bound, equal, value}).Release());

@@ -11,8 +11,10 @@
 //   type is x                               `type` as a name in front of a keyword
 //   def f[T: int = str]():                  defaults of type parameters
 //   case a, b:                              in newer_match_case_parser.h
+// What a line has that is newer than the version asked for is refused by its name: newer_forms.h.
 #pragma once
 
+#include "newer/newer_forms.h"
 #include "parse/parser_driver.h"
 
 namespace codeloom {
@@ -24,7 +26,11 @@ class CNewerParser : public CPGenParserImpl {
     void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
               nb::object py3_grammar);
 
+    nb::object convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
+                       nb::handle children) override;
     nb::list _BuildClsForStateList() override;
+    // SyntaxError for a form that is newer than the version asked for.
+    CNodeRef ParseToNode(CLogicalLine& logical, bool in_async_def) override;
     CNodeRef _ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) override;
     CNodeRef _ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def, CPositions positions,
                                                 Py_ssize_t i) override;
@@ -35,8 +41,14 @@ class CNewerParser : public CPGenParserImpl {
     CNodeRef _CreateSingleTypeParameterNode(nb::tuple toks, bool in_async_def, CPositions positions,
                                             Py_ssize_t start, Py_ssize_t end, bool raise_errors) override;
 
+    template <class Visitor>
+    void References(Visitor&& visit) {
+        CPGenParserImpl::References(visit);
+        _fForms.References(visit);
+    }
+
   private:
-    CNodeRef _ParseCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions);
+    CNodeRef _ParseMatchOrCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions);
     CNodeRef _ParseDecorator(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                              Py_ssize_t at_i);
     bool _FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i);
@@ -46,6 +58,8 @@ class CNewerParser : public CPGenParserImpl {
     CNodeRef _ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                            Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors);
     void _RequireSingle(const CNode& node);
+
+    CNewerForms _fForms;
 };
 
 void BindNewerParser(nb::module_& module);

@@ -77,6 +77,10 @@ void CPGenParserImpl::Init(nb::object version_triple, nb::object grammar_file, n
     __GetTime = HomeModule().attr("time").attr("time");
 }
 
+bool CPGenParserImpl::_HasSymbol(const char* symbol) const {
+    return DictContains(nb::dict(_fGrammar.attr("symbol2number")), nb::str(symbol));
+}
+
 int CPGenParserImpl::_NumberOfSymbol(const char* symbol) const {
     return ResultFromHost<int32_t>(nb::object(_fGrammar.attr("symbol2number")[symbol]));
 }

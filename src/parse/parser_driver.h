@@ -76,7 +76,8 @@ class CPGenParserImpl : public CPGenAnalyzer {
     // when it is refused and errors aren't raised.
     CNodeRef _ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                          Py_ssize_t mark_i, Py_ssize_t end, bool raise_errors);
-    int _NumberOfSymbol(const char* symbol) const;
+    bool _HasSymbol(const char* symbol) const;
+    int _NumberOfSymbol(const char* symbol) const;  // KeyError when the grammar has no such rule
 
     nb::object _fKeywords = nb::none();
     CRef<CNodeFactory> _fNodeFactory;

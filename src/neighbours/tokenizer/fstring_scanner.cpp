@@ -13,6 +13,11 @@ namespace {
 // As deep as strings and fields may nest; CPython gives up at 150 strings, and at 2 format specs.
 constexpr int kMaxDepth = 160;
 
+// The end of the comment that begins at `pos`; `pos` when none does.
+size_t CommentEnd(std::string_view text, size_t pos) {
+    return ByteAt(text, pos) == '#' ? FindRowEnd(text, pos) : pos;
+}
+
 }  // namespace
 
 CStringEnd CFstringScanner::Scan(size_t pos, const CStringStart& start) {
@@ -141,7 +146,9 @@ size_t CFstringScanner::_ScanConversion(size_t pos, bool& is_sound) {
     const size_t name_end = NameEnd(text, name_start);
     const std::string_view name = text.substr(pos + 1, name_end - pos - 1);
     is_sound = name == "r" || name == "s" || name == "a";
-    return _SkipToToken(name_end);
+    pos = _SkipToToken(name_end);
+    while (pos != kFailed && text[pos] == '#') pos = _SkipToToken(CommentEnd(text, pos));
+    return pos;
 }
 
 // The sign that ends the expression, where the "=" at `pos` stands before one as in `{x = !r}`; `pos`
@@ -149,8 +156,9 @@ size_t CFstringScanner::_ScanConversion(size_t pos, bool& is_sound) {
 size_t CFstringScanner::_ScanDebugSign(size_t pos) {
     const std::string_view text = _fLexer.Text();
     if (text[pos] != '=' || ByteAt(text, pos + 1) == '=') return pos;
-    size_t behind = pos + 1;
-    while (behind < text.size() && (IsBlank(text[behind]) || IsRowEnd(text[behind]))) ++behind;
+    size_t behind = CommentEnd(text, SkipBlanks(text, pos + 1));
+    while (behind < text.size() && (IsBlank(text[behind]) || IsRowEnd(text[behind])))
+        behind = CommentEnd(text, behind + 1);
     return behind < text.size() && _IsExpressionEndAt(behind) ? behind : pos;
 }
 

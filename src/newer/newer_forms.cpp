@@ -1,0 +1,144 @@
+#include "newer/newer_forms.h"
+
+#include "analysis/syntax_error.h"
+#include "host/errors.h"
+#include "host/text.h"
+#include "neighbours/token_type.h"
+#include "neighbours/tokenizer/string_lexer.h"
+#include "tree/child_list.h"
+#include "tree/expression_nodes.h"
+
+namespace codeloom {
+
+namespace {
+
+constexpr int kVersionsOfMajor = 100;  // 3.12 is 312
+
+CNode& Child(nb::handle children, Py_ssize_t i) {
+    return *Instance<CNode>(ListItem(children, i));
+}
+
+// The first child that `matches`, or -1.
+template <class Matches>
+Py_ssize_t FindChild(nb::handle children, Matches matches) {
+    for (Py_ssize_t i = 0; i < ListSize(children); ++i)
+        if (matches(Child(children, i))) return i;
+    return -1;
+}
+
+template <class Class>
+Py_ssize_t FindOfClass(nb::handle children) {
+    return FindChild(children, [](const CNode& child) { return child.As<Class>() != nullptr; });
+}
+
+template <Py_ssize_t child_i>
+Py_ssize_t Always(nb::handle) {
+    return child_i;
+}
+
+template <Py_ssize_t child_i, class Class>
+Py_ssize_t IfOfClass(nb::handle children) {
+    return child_i < ListSize(children) && Child(children, child_i).As<Class>() ? child_i : -1;
+}
+
+Py_ssize_t FindSlash(nb::handle children) {
+    return FindChild(children, [](const CNode& child) { return child.HasText("/"); });
+}
+
+Py_ssize_t FindNamedArgument(nb::handle children) {
+    return Child(children, 1).HasText(":=") ? 1 : -1;
+}
+
+// In a set of one; the `:=` of `(x := 1)` has its brackets.
+Py_ssize_t FindInBraces(nb::handle children) {
+    return Child(children, 0).HasText("{") ? IfOfClass<1, CNamedExpr>(children) : -1;
+}
+
+// A comma list that holds a starred expression.
+template <Py_ssize_t child_i>
+Py_ssize_t FindStarInList(nb::handle children) {
+    if (IfOfClass<child_i, CTestListStarExpr>(children) == -1) return -1;
+    return FindOfClass<CStarExpression>(ChildList(Child(children, child_i))) == -1 ? -1 : child_i;
+}
+
+// The version of a string literal; null for one that has always been.
+const CForm* FormOfString(std::string_view text) {
+    const CStringStart start = ReadStringStart(text, 0);
+    if (!start.has_fields) return nullptr;
+    return text.substr(0, start.prefix_length).find_first_of("tT") == std::string_view::npos
+               ? &forms::kFString
+               : &forms::kTString;
+}
+
+int VersionOf(nb::handle version_triple) {
+    if (!nb::isinstance<nb::tuple>(version_triple) || TupleSize(version_triple) < 2) return INT32_MAX;
+    int major = 0, minor = 0;
+    const bool is_read = nb::try_cast(TupleItem(version_triple, 0), major) &&
+                         nb::try_cast(TupleItem(version_triple, 1), minor);
+    return is_read ? major * kVersionsOfMajor + minor : INT32_MAX;
+}
+
+}  // namespace
+
+const std::vector<CNewerForms::CNodeForm>& CNewerForms::_NodeForms() {
+    static const std::vector<CNodeForm> node_forms = {
+        {"annassign", forms::kVariableAnnotation, Always<0>},
+        {"namedexpr_test", forms::kWalrus, Always<1>},
+        {"argument", forms::kWalrus, FindNamedArgument},
+        {"typedargslist", forms::kPositionalOnly, FindSlash},
+        {"varargslist", forms::kPositionalOnly, FindSlash},
+        {"return_stmt", forms::kStarInResult, FindStarInList<1>},
+        {"yield_expr", forms::kStarInResult, FindStarInList<1>},
+        {"for_stmt", forms::kStarInFor, FindStarInList<3>},
+        {"trailer", forms::kWalrusInSubscript, IfOfClass<1, CNamedExpr>},
+        {"subscriptlist", forms::kWalrusInSubscript, FindOfClass<CNamedExpr>},
+        {"atom", forms::kWalrusInSet, FindInBraces},
+        {"dictorsetmaker", forms::kWalrusInSet, FindOfClass<CNamedExpr>},
+        {"star_test", forms::kStarInSubscript, Always<0>},
+        {"fpdef", forms::kStarredAnnotation, IfOfClass<2, CStarExpression>},
+        {"except_clause", forms::kBareExcept, IfOfClass<1, CTestListStarExpr>},
+    };
+    return node_forms;
+}
+
+void CNewerForms::SetVersion(nb::handle version_triple) {
+    _fVersion = VersionOf(version_triple);
+    if (_fVersion < forms::kTString.version) _Watch(kTokenId_STRING, nullptr);
+}
+
+void CNewerForms::_Watch(int type, const CNodeForm* form) {
+    if (type < 0) return;
+    const size_t type_i = static_cast<size_t>(type);
+    if (type_i >= _fWatched.size()) {
+        _fWatched.resize(type_i + 1);
+        _fNodeForm.resize(type_i + 1);
+    }
+    _fWatched[type_i] = true;
+    _fNodeForm[type_i] = form;
+}
+
+void CNewerForms::_Look(int type, nb::handle value, nb::handle context, nb::handle children) {
+    if (type == kTokenId_STRING) {
+        const CForm* const form = FormOfString(CUtf8(value));
+        if (form) Note(*form, context);
+        return;
+    }
+    if (!nb::isinstance<nb::list>(children)) return;
+    const CNodeForm& node_form = *_fNodeForm[static_cast<size_t>(type)];
+    const Py_ssize_t child_i = node_form.find(children);
+    if (child_i >= 0) Note(node_form.form, Child(children, child_i).fContext);
+}
+
+void CNewerForms::Note(const CForm& form, nb::handle context) {
+    if (_fFound || form.version <= _fVersion) return;
+    _fFound = &form;
+    _fContext = nb::borrow(context);
+}
+
+void CNewerForms::Raise(CLogicalLine& logical) const {
+    const int major = _fFound->version / kVersionsOfMajor, minor = _fFound->version % kVersionsOfMajor;
+    const nb::str message = nb::str("{} needs Python {}.{}").format(_fFound->name, major, minor);
+    RaiseHostError(CreateSyntaxError(message, logical.Self(), _fContext, nb::none()));
+}
+
+}  // namespace codeloom

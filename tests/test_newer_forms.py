@@ -1,0 +1,174 @@
+"""What each version of the language brought, one row for each form: accepted from there on, named before.
+
+A row is a statement, and behind two blanks and `#!` what is said of it to somebody who asks for the version
+before.
+"""
+
+import ast
+import sys
+
+import pytest
+
+from codeloom.check import CheckText
+from codeloom.languages import LANGUAGE_NAMES
+
+ONLY_IN_2_7 = r"""
+    print 'a', b
+    print 'a',
+    exec 'a' in b, c
+    raise E, 'text', tb
+    x = `y` <> 0777 + 10L
+    def f(a, (b, (c, d))=e): pass
+    [a for b in 1, 2]
+"""
+
+NEW_IN = {
+    # 308 ternary, 341 try with all its parts, 342 yield as an expression, 343 with, 274 and 3127 of 2.7
+    "2.7": r"""
+    x = a if b else c
+    try: a\nexcept B as b: c\nelse: d\nfinally: e
+    x = yield a
+    with a as b, c as (d, e): f
+    {a: b for c in d}; {a for b in c}; {a, b}
+    0o17 + 0b1
+    class A: pass
+    @a.b(c)\nclass A: pass
+    """,
+    # 3102, 3104, 3107, 3109, 3115, 3132, 380, 414, 448, 465
+    "3.0": r"""
+    def f(a, *, b: c = 1, **d) -> e: pass
+    nonlocal a
+    raise A from b
+    class A(B, metaclass=C): pass
+    a, *b = c
+    yield from a
+    x = u'a'
+    f(*a, *b, **c, **d); [*a, *b]; {**a, 'b': c}
+    a @ b; a @= b
+    with (yield from a) as b: c
+    match = case = type; match.case(type)[case]; type is a; type in a; type not in a; type(a)
+    """,
+    # 498, 526, 515, 492, 530
+    "3.6": r"""
+    x = f'{a!r:>{b}}'  #! an f-string needs Python 3.6
+    x: int  #! an annotation of a variable needs Python 3.6
+    x = 1_000
+    case[a + 1]: int = 3; match[a]: int; type[a]: b = c  #! an annotation of a variable needs Python 3.6
+    async def f():\n  async with a as b: await c\n  async for d in e: pass
+    async def f(): return [a async for b in c]
+    """,
+    # 572, 570
+    "3.8": r"""
+    if (a := b): c  #! `:=` needs Python 3.8
+    f(a := b, c)  #! `:=` needs Python 3.8
+    def f(a, /, b): pass  #! `/` among parameters needs Python 3.8
+    lambda a, /: 0  #! `/` among parameters needs Python 3.8
+    return *a, b  #! a starred expression without brackets behind `return` or `yield` needs Python 3.8
+    x = f'{a = }'
+    with (a := b) as c, (d): e
+    """,
+    # 614, 617
+    "3.9": r"""
+    @a[0].b\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
+    @(lambda f: f)\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
+    @a.b(c)(d)\nclass A: pass  #! a decorator that is no name or call of one needs Python 3.9
+    @lambda a, b: c\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
+    @a := b\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
+    with (a as b, c): d  #! a `with` whose items stand in brackets needs Python 3.9
+    with (a as b, c as d,): e  #! a `with` whose items stand in brackets needs Python 3.9
+    async def f():\n  async with (a as b, c): d  #! a `with` whose items stand in brackets needs Python 3.9
+    {a := b}  #! invalid syntax
+    {*a, b := c}  #! invalid syntax
+    {a := b for b in c}  #! invalid syntax
+    for a in *b, c: d  #! invalid syntax
+    a += *b, c  #! invalid syntax
+    f(a := b for b in c)  #! invalid syntax
+    """,
+    # 634
+    "3.10": r"""
+    match a:\n  case b: c  #! `match` needs Python 3.10
+    match a, *b:\n  case c, *d: e  #! `match` needs Python 3.10
+    match a:\n  case *a, b: c\n  case (): d\n  case a,: e  #! `match` needs Python 3.10
+    match a:\n  case 'b' 'c': d\n  case {'b' r'c': 'd' 'e' | 'f'}: g  #! `match` needs Python 3.10
+    match a:\n  case A(b, c=[d, *_]) | {1: -2j, **e} as f if g: h  #! `match` needs Python 3.10
+    a[b := c]  #! `:=` without brackets of its own in a subscript needs Python 3.10
+    a[b := c, d]  #! `:=` without brackets of its own in a subscript needs Python 3.10
+    """,
+    # 654, 646
+    "3.11": r"""
+    try: a\nexcept* B as c: d  #! `except*` needs Python 3.11
+    try: a\nexcept *(B, C): d  #! `except*` needs Python 3.11
+    a[*b]; a[*b, c] = d  #! a starred expression in a subscript needs Python 3.11
+    a[*b or c, d:e]  #! a starred expression in a subscript needs Python 3.11
+    def f(*args: *Ts): pass  #! a starred annotation needs Python 3.11
+    """,
+    # 695, 701
+    "3.12": r"""
+    type A = int  #! `type` needs Python 3.12
+    type A[T] = list[T]  #! `type` needs Python 3.12
+    type type = type; type match = case  #! `type` needs Python 3.12
+    def f[T: int, *Ts, **P](a: T) -> T: pass  #! a list of type parameters needs Python 3.12
+    async def f[T: (int, str)](): pass  #! a list of type parameters needs Python 3.12
+    class A[T](B[T]): pass  #! a list of type parameters needs Python 3.12
+    x = f'{f'{a['b']}'}'
+    x = f'{a\n  # why\n  + b}' f'{'\n'.join(c)}'
+    x = f'''{\na = # why\n:>3}'''
+    """,
+    # 696
+    "3.13": r"""
+    def f[T = int](): pass  #! a default of a type parameter needs Python 3.13
+    class A[T: int = bool, *B = *b, **P = [int]]: pass  #! a default of a type parameter needs Python 3.13
+    type A[T = list[int], U = T] = B[T, U]  #! a default of a type parameter needs Python 3.13
+    """,
+    # 758, 750
+    "3.14": r"""
+    try: a\nexcept B, C: d  #! an `except` of several types without brackets needs Python 3.14
+    try: a\nexcept* B, C,: d  #! an `except` of several types without brackets needs Python 3.14
+    x = t'{a}'  #! a t-string needs Python 3.14
+    x = Rt'''{a!r:{b}}''' t'c'  #! a t-string needs Python 3.14
+    x = f'{t'{a}'}'  #! a t-string needs Python 3.14
+    """,
+}
+
+
+def Rows(text):
+    for row in filter(None, map(str.strip, text.splitlines())):
+        statement, _, told = row.partition("  #! ")
+        yield statement.replace("\\n", "\n").replace("'\n'", r"'\n'"), told
+
+
+ROWS = [(since, *row) for since, text in NEW_IN.items() for row in Rows(text)]
+VERSIONS = [name for name in LANGUAGE_NAMES if name != "2.7"]
+
+
+def Messages(statement, version):
+    return [problem.message for problem in CheckText(f"{statement}\n", version)]
+
+
+@pytest.mark.parametrize(("since", "statement", "told"), ROWS, ids=[statement for _, statement, _ in ROWS])
+def test_accepted_from_its_version_on_and_named_before(since, statement, told):
+    assert since != "2.7" or Messages(statement, "2.7") == []
+    first = VERSIONS.index(since) if since != "2.7" else 0
+    for version in VERSIONS[first:]:
+        assert Messages(statement, version) == [], version
+    if told:
+        assert told in Messages(statement, VERSIONS[first - 1])
+
+
+@pytest.mark.filterwarnings("ignore")
+@pytest.mark.parametrize(("since", "statement", "told"), ROWS, ids=[statement for _, statement, _ in ROWS])
+def test_rows_say_the_truth_of_this_interpreter(since, statement, told):
+    is_known = tuple(map(int, since.split("."))) <= sys.version_info[:2]
+    try:
+        ast.parse(statement)
+    except SyntaxError:
+        assert not is_known
+    else:
+        assert is_known
+
+
+@pytest.mark.parametrize("statement", [statement for statement, _ in Rows(ONLY_IN_2_7)])
+def test_what_went_with_2_7(statement):
+    assert Messages(statement, "2.7") == []
+    for version in VERSIONS:
+        assert Messages(statement, version)
