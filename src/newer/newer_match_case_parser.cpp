@@ -63,9 +63,13 @@ CNodeRef CNewerMatchCaseParser::_NodeForPattern(Py_ssize_t start_i, Py_ssize_t e
 //        ^^^^^
 //   a CSequencePatternNode: the patterns with the commas, without brackets
 CNodeRef CNewerMatchCaseParser::_NodeForOpenSequence(Py_ssize_t start_i, Py_ssize_t end_i) {
-    std::vector<CNodeRef> children;
-    _AppendPatterns(start_i, end_i, children);
-    return NewPseudoNode<CSequencePatternNode>(children);
+    CPatternWork work;
+    {
+        CPlan plan(work);
+        _PlanPatterns(plan, start_i, end_i);
+        plan.Build<CSequencePatternNode>();
+    }
+    return _Finish(work);
 }
 
 //   case "a" "b":
