@@ -9,7 +9,7 @@ from pathlib import Path
 
 from codeloom import logicalline
 from codeloom.check import Problem
-from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf
+from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, NewParser
 from codeloom.false_hints import FalseHintRemover
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.line_length import TooLong
@@ -108,7 +108,7 @@ def _PlaceFinderOf(language: Language) -> PlaceFinder:
 
 @cache
 def _ParserOf(language: Language) -> CPGenParserImpl:
-    return CPGenParserImpl(language.version_triple, language.grammar_file, language.keywords, language.is_py3)
+    return NewParser(language)
 
 
 class _NameReader(LineReader):
