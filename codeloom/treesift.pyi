@@ -1885,6 +1885,7 @@ class CNewerMatchCaseParser(CMatchCaseStatementParser):
 
     def __init__(self, pgen_parser: CPGenParserImpl | None | None) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     def ParseMatchStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
         """
@@ -1914,6 +1915,7 @@ class CNewerParser(CPGenParserImpl):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True) -> None:
         ...
+    __class__: getset_descriptor = ...
 
     def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
         """
@@ -1963,3 +1965,4 @@ class CNewerAnalyzer(CPGenAnalyzerImpl):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True, hint_grammar_file: object='Python-Grammar-3.14') -> None:
         ...
+    __class__: getset_descriptor = ...

@@ -1,5 +1,6 @@
 #include "newer/newer_match_case_parser.h"
 
+#include "host/errors.h"
 #include "host/restore.h"
 #include "neighbours/token_type.h"
 #include "parse/parentheses.h"
@@ -47,41 +48,53 @@ CNodeRef CNewerMatchCaseParser::_ParseCaseStmtImpl() {
 }
 
 CNodeRef CNewerMatchCaseParser::_NodeForPattern(Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as) {
-    // Of the ranges that begin here, the whole pattern is the only one with a comma outside brackets.
-    if (start_i == kPatternIndex && allow_as && _Find(",", start_i, end_i) != -1)
-        return _NodeForOpenSequence(start_i, end_i);
-    const bool is_capture = allow_as && start_i + 2 < end_i && _IsTok(end_i - 2, "as");
-    const bool is_single = !is_capture && _Find("|", start_i, end_i) == -1;
-    if (is_single && start_i + 1 < end_i && _TokType(start_i) == kTokenId_STRING)
-        return _NodeForStrings(start_i, end_i);
-    if (start_i + 2 == end_i && _IsTok(start_i, "(") && _IsTok(start_i + 1, ")"))
-        return _NodeForSequencePattern(start_i, end_i);
-    return CMatchCaseStatementParser::_NodeForPattern(start_i, end_i, allow_as);
+    const CRecursionScope recursion;  // for overrides, which call one another
+    CPatternWork work;
+    CNewerMatchCaseParser::DoPatternStep(work, {CPatternStep::EKind::kPattern, start_i, end_i, allow_as});
+    return _Finish(work);
+}
+
+void CNewerMatchCaseParser::DoPatternStep(CPatternWork& work, const CPatternStep& step) {
+    const bool is_pattern = step.kind == CPatternStep::EKind::kPattern;
+    if (is_pattern && _IsOpenSequence(step)) return _PlanOpenSequence(CPlan(work), step.start_i, step.end_i);
+    if (is_pattern && _BeginsWithStrings(step)) return _PlanStrings(CPlan(work), step.start_i, step.end_i);
+    if (is_pattern && _IsEmptySequence(step))
+        return CPlan(work).Part(CPatternStep::EKind::kSequence, step.start_i, step.end_i);
+    CMatchCaseStatementParser::DoPatternStep(work, step);
+}
+
+// Of the ranges that begin behind `case`, the whole pattern is the only one with a comma outside brackets.
+bool CNewerMatchCaseParser::_IsOpenSequence(const CPatternStep& step) {
+    return step.start_i == kPatternIndex && step.allow_as && _Find(",", step.start_i, step.end_i) != -1;
+}
+
+bool CNewerMatchCaseParser::_BeginsWithStrings(const CPatternStep& step) {
+    if (step.start_i + 1 >= step.end_i || _TokType(step.start_i) != kTokenId_STRING) return false;
+    const bool is_capture = step.allow_as && step.start_i + 2 < step.end_i && _IsTok(step.end_i - 2, "as");
+    return !is_capture && _Find("|", step.start_i, step.end_i) == -1;
+}
+
+bool CNewerMatchCaseParser::_IsEmptySequence(const CPatternStep& step) const {
+    return step.start_i + 2 == step.end_i && _IsTok(step.start_i, "(") && _IsTok(step.start_i + 1, ")");
 }
 
 //   case a, *b:
 //        ^^^^^
 //   a CSequencePatternNode: the patterns with the commas, without brackets
-CNodeRef CNewerMatchCaseParser::_NodeForOpenSequence(Py_ssize_t start_i, Py_ssize_t end_i) {
-    CPatternWork work;
-    {
-        CPlan plan(work);
-        _PlanPatterns(plan, start_i, end_i);
-        plan.Build<CSequencePatternNode>();
-    }
-    return _Finish(work);
+void CNewerMatchCaseParser::_PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
+    _PlanPatterns(plan, start_i, end_i);
+    plan.Build<CSequencePatternNode>();
 }
 
 //   case "a" "b":
 //        ^^^^^^^
 //   a CAtom, as in an expression: a leaf for each string
-CNodeRef CNewerMatchCaseParser::_NodeForStrings(Py_ssize_t start_i, Py_ssize_t end_i) {
-    nb::list strings;
+void CNewerMatchCaseParser::_PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
     for (Py_ssize_t i = start_i; i < end_i; ++i) {
         if (_TokType(i) != kTokenId_STRING) _FailAt(i);
-        strings.append(_TokNode(i).Release());
+        plan.Token(i);
     }
-    return NewPseudoNode<CAtom>(std::move(strings));
+    plan.Build<CAtom>();
 }
 
 // Where a token stands among those of the line, comments and backslashes included.

@@ -19,6 +19,7 @@ class CNewerMatchCaseParser : public CMatchCaseStatementParser {
     CNodeRef ParseCaseStmt(nb::tuple toks, nb::tuple positions) override;
     CNodeRef _ParseCaseStmtImpl() override;
     CNodeRef _NodeForPattern(Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as = true) override;
+    void DoPatternStep(CPatternWork& work, const CPatternStep& step) override;
 
     template <class Visitor>
     void References(Visitor&& visit) {
@@ -28,8 +29,11 @@ class CNewerMatchCaseParser : public CMatchCaseStatementParser {
     }
 
   private:
-    CNodeRef _NodeForOpenSequence(Py_ssize_t start_i, Py_ssize_t end_i);
-    CNodeRef _NodeForStrings(Py_ssize_t start_i, Py_ssize_t end_i);
+    bool _IsOpenSequence(const CPatternStep& step);
+    bool _BeginsWithStrings(const CPatternStep& step);
+    bool _IsEmptySequence(const CPatternStep& step) const;
+    void _PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    void _PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
     Py_ssize_t _IndexInLine(Py_ssize_t tok_i) const;
     CNodeRef _Parse(nb::tuple toks);
 
