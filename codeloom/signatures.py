@@ -11,7 +11,7 @@ from codeloom import logicalline
 from codeloom.check import Problem
 from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf
 from codeloom.false_hints import FalseHintRemover
-from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageNamed
+from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.line_length import TooLong
 from codeloom.line_reader import LineReader, RowsOf
 from codeloom.logicalline import CLogicalLine
@@ -104,8 +104,7 @@ def SignaturesInBytes(
 
 
 def _Signatures(source: Source, language: Language | str, path: str, false_hints: bool) -> list[Signature]:
-    if isinstance(language, str):
-        language = LanguageNamed(language)
+    language = LanguageOf(source.text, language)
     reader = _SignatureReader(source, language, path, FalseHintRemover(source.text, keep=false_hints))
     with Analysis():
         for logical in GetLogicalsFromText(source.text):

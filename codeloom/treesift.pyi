@@ -353,12 +353,14 @@ class CNode:
 
     def GetChildText(self, child_i: int) -> str | None:
         """
-        The text of the child at `child_i`; None at or past the end, and for a child without text. A negative index counts from the end; IndexError below the start.
+        The text of the child at `child_i`; None at or past the end, and for a child without text.
+        A negative index counts from the end; IndexError below the start.
         """
 
     def GetChild(self, child_i: int) -> CNode | None:
         """
-        The child at `child_i`; None at or past the end. A negative index counts from the end; IndexError below the start.
+        The child at `child_i`; None at or past the end. A negative index counts from the end;
+        IndexError below the start.
         """
 
     def GetStateName(self) -> str | None:
@@ -1183,7 +1185,8 @@ class CNodeFactory:
 
     def ConvertSingleNode(self, type: int, text: object | None, context: object | None, children: object | None) -> CNode | None:
         """
-        The node for a token (children None) or a completed rule (a list of at least two nodes). A statement followed by its newline is the statement itself.
+        The node for a token (children None) or a completed rule (a list of at least two nodes). A
+        statement followed by its newline is the statement itself.
         """
 
     def NewNode(self, clsinfo: CNodeClassInfo, type: int, text: object | None, context: object | None, children: object | None) -> CNode | None:
@@ -1384,7 +1387,8 @@ class CPGenParserImpl(CPGenAnalyzer):
 
     def ParseToNode(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool=False) -> CNode | None:
         """
-        The node of a logical's statement, or None. ParseError on a token that the grammar refuses. Give it back with DiscardNode.
+        The node of a logical's statement, or None. ParseError on a token that the grammar
+        refuses. Give it back with DiscardNode.
         """
 
     def ParseToksToNode(self, toks: object, in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None) -> CNode | None:
@@ -1395,7 +1399,8 @@ class CPGenParserImpl(CPGenAnalyzer):
 
     def _FindNextNonSkipIndex(self, toks: tuple[typing.Any, ...], index: int) -> int:
         """
-        The first index beyond `index` whose token is neither removed nor empty, comment or backslash; the token count when there is none.
+        The first index beyond `index` whose token is neither removed nor empty, comment or
+        backslash; the token count when there is none.
         """
 
     def _NonNestedFindTokenIndex(self, target: object, toks: tuple[typing.Any, ...], start: int, end: int) -> int:
@@ -1420,12 +1425,14 @@ class CPGenParserImpl(CPGenAnalyzer):
 
     def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
         """
-        A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of its keyword; None for the ordinary road.
+        A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of
+        its keyword; None for the ordinary road.
         """
 
     def _NodesForTypeParameters(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, start: int, end: int, raise_errors: bool) -> list[typing.Any]:
         """
-        The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors` malformed parameters are dropped.
+        The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors`
+        malformed parameters are dropped.
         """
 
     def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, start: int, end: int, raise_errors: bool) -> CNode | None:

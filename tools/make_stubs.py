@@ -44,6 +44,8 @@ class _AnnotationsOnly(ast.NodeTransformer):
         return node
 
     def visit_AnnAssign(self, node: ast.AnnAssign) -> ast.AST:
+        if ast.unparse(node.target) == "__class__":  # as every object has it
+            return ast.Pass()
         node.annotation = self._ResultType(node.annotation)
         return node
 

@@ -163,9 +163,8 @@ void BindAnalyzer(nb::module_& module) {
         .def("ParseTokenListToNode", &CPGenAnalyzerImpl::ParseTokenListToNode, "logical"_a,
              "in_async_def"_a = false, "The same for a list of token texts, without the special cases.")
         .def("GetTypeParameterNodes", &CPGenAnalyzerImpl::GetTypeParameterNodes, "toks"_a,
-             " Get type parameters defined in toks. Tries to ignore parse errors\n        and get all names "
-             "if "
-             "possible ");
+             " Get type parameters defined in toks. Tries to ignore parse errors\n"
+             "        and get all names if possible ");
     BindOperations(binding);
 }
 

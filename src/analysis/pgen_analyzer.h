@@ -18,12 +18,11 @@ class CPGenAnalyzer : public NodeConverter {
 template <class Class>
 class TPGenAnalyzerOperations : public TNodeConverterOperations<Class> {
     OPERATIONS_BEYOND(TNodeConverterOperations<Class>)
-    OPERATION(
-        AnalyzeSingleLogical,
-        " Analyze a single logical and return any exception (typically\n        SyntaxError, but can be "
-        "other "
-        "errors). Note that exception is only\n        returned if logical has not previously been parsed. ",
-        "logical"_a, "in_async_def"_a, "first_in_def"_a = false)
+    OPERATION(AnalyzeSingleLogical,
+              " Analyze a single logical and return any exception (typically\n"
+              "        SyntaxError, but can be other errors). Note that exception is only\n"
+              "        returned if logical has not previously been parsed. ",
+              "logical"_a, "in_async_def"_a, "first_in_def"_a = false)
     END_OPERATIONS
 };
 

@@ -106,18 +106,16 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
         "The list that gives the node class for each token type and grammar state. Updates kClsForState.")
     OPERATION(DiscardNode, "Give a tree back to the free lists.", "node"_a)
     OPERATION(ParseToNode,
-              "The node of a logical's statement, or None. ParseError on a token that the grammar refuses. "
-              "Give it back "
-              "with DiscardNode.",
+              "The node of a logical's statement, or None. ParseError on a token that the grammar\n"
+              "refuses. Give it back with DiscardNode.",
               "logical"_a, "in_async_def"_a = false)
     OPERATION(ParseToksToNode, "ParseToNode for a tuple of tokens and their positions.", "toks"_a,
               "in_async_def"_a, "positions"_a.none())
     OPERATION(_ParseToksToNodeImpl, "Parse by the grammar alone, without the special cases.", "toks"_a,
               "in_async_def"_a, "positions"_a.none())
     OPERATION(_FindNextNonSkipIndex,
-              "The first index beyond `index` whose token is neither removed nor empty, comment or "
-              "backslash; the token "
-              "count when there is none.",
+              "The first index beyond `index` whose token is neither removed nor empty, comment or\n"
+              "backslash; the token count when there is none.",
               "toks"_a, "index"_a)
     OPERATION(_NonNestedFindTokenIndex,
               "The index in [start, end) of the token `target` outside brackets; -1 when there is none.",
@@ -133,14 +131,12 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
               "An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.",
               "toks"_a, "in_async_def"_a, "positions"_a.none(), "i"_a)
     OPERATION(_ParseSpecialCaseWithTypeParameter,
-              "A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of "
-              "its keyword; "
-              "None for the ordinary road.",
+              "A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of\n"
+              "its keyword; None for the ordinary road.",
               "toks"_a, "in_async_def"_a, "positions"_a.none(), "i"_a)
     OPERATION(_NodesForTypeParameters,
-              "The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors` "
-              "malformed "
-              "parameters are dropped.",
+              "The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors`\n"
+              "malformed parameters are dropped.",
               "toks"_a, "in_async_def"_a, "positions"_a.none(), "start"_a, "end"_a, "raise_errors"_a)
     OPERATION(_CreateSingleTypeParameterNode, "The node of the one type parameter in [start, end), or None.",
               "toks"_a, "in_async_def"_a, "positions"_a.none(), "start"_a, "end"_a, "raise_errors"_a)
@@ -150,13 +146,13 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
     OPERATION(_AddTokenList, "Feed each token text to the parser, all with the context `tok_i`.", "toks"_a,
               "tok_i"_a)
     OPERATION(_ShouldSkipSlash,
-              " Utility method to determine if slash (\\) token at tok_i --\n        can be relatively slow "
-              "since slashes "
-              "are uncommon and is usually called\n        after testing token is a slash. ",
+              " Utility method to determine if slash (\\) token at tok_i --\n"
+              "        can be relatively slow since slashes are uncommon and is usually called\n"
+              "        after testing token is a slash. ",
               "tok_i"_a, "positions"_a.none())
     OPERATION(GetTypeParameterNodes,
-              " Get type parameters defined in toks. Tries to ignore parse errors\n        and get all names "
-              "if possible ",
+              " Get type parameters defined in toks. Tries to ignore parse errors\n"
+              "        and get all names if possible ",
               "toks"_a)
     END_OPERATIONS
 

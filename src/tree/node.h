@@ -161,14 +161,12 @@ class TNodeOperations : public Class {
     FIRST_OPERATIONS
     OPERATION(GetChildCount, "The number of direct children; 0 for a leaf.")
     OPERATION(GetChildText,
-              "The text of the child at `child_i`; None at or past the end, and for a child without text. A "
-              "negative "
-              "index counts from the end; IndexError below the start.",
+              "The text of the child at `child_i`; None at or past the end, and for a child without text.\n"
+              "A negative index counts from the end; IndexError below the start.",
               "child_i"_a)
     OPERATION(GetChild,
-              "The child at `child_i`; None at or past the end. A negative index counts from the end; "
-              "IndexError below "
-              "the start.",
+              "The child at `child_i`; None at or past the end. A negative index counts from the end;\n"
+              "IndexError below the start.",
               "child_i"_a)
     OPERATION(GetStateName, "The name of the grammar state; the class name of a node without a class record.")
     OPERATION(_DoesChildTextMatch, "True when a direct child's text equals `text`.", "text"_a)

@@ -51,9 +51,8 @@ template <class Class>
 class TNodeFactoryOperations : public Class {
     FIRST_OPERATIONS
     OPERATION(ConvertSingleNode,
-              "The node for a token (children None) or a completed rule (a list of at least two nodes). A "
-              "statement "
-              "followed by its newline is the statement itself.",
+              "The node for a token (children None) or a completed rule (a list of at least two nodes). A\n"
+              "statement followed by its newline is the statement itself.",
               "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none())
     OPERATION(NewNode, "A node of the record `clsinfo`, from its free list or new; `type` is ignored.",
               "clsinfo"_a, "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none())
