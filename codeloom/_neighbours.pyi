@@ -121,7 +121,6 @@ class CLogicalLine:
 
     def __init__(self, type: object, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...], first_line: int=0, exp_logicals: tuple[typing.Any, ...]=(), tok_types: object | None=None) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def fType(self) -> typing.Any:
@@ -224,7 +223,6 @@ class Grammar:
     """
     The rules of a grammar, as tables that a parser runs on. ParserGenerator.make_grammar makes it.
     """
-    __class__: getset_descriptor = ...
 
     @property
     def symbol2number(self) -> typing.Any:
@@ -251,7 +249,6 @@ class ParserGenerator:
 
     def __init__(self, grammar_file: object, tok_number2name: dict[typing.Any, typing.Any], op_text2number: dict[typing.Any, typing.Any]) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def make_grammar(self) -> Grammar | None:
         """
@@ -266,7 +263,6 @@ class NodeConverter:
 
     def __init__(self) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
         """
@@ -283,7 +279,6 @@ class Parser:
 
     def __init__(self) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def setup(self, start: object | None=None) -> None:
         """
@@ -322,7 +317,6 @@ class ParserImpl(Parser):
 
     def __init__(self, grammar: Grammar, node_converter: NodeConverter | None | None=None, promotesinglechild: bool=True) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def setup(self, start: object | None=None) -> None:
         """
@@ -504,7 +498,6 @@ class CStringTokenizer:
 
     def __init__(self, utf8: bytes | str) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def fAtEnd(self) -> bool:
@@ -537,7 +530,6 @@ class CNonNestedSearch:
 
     def __init__(self) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def InitWith(self, to_search: object, to_find_bytes: bytes, start: int, end: int) -> int:
         """
@@ -576,7 +568,6 @@ class CKindFilter:
 
     def __init__(self, kinds: bytes=...) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def KindMatches(self, kind: int | bytes | str) -> bool:
         """True when the kind is in the set."""

@@ -300,7 +300,6 @@ class CNodeClassInfo:
 
     def __init__(self, cls: object | None, nodetype: int, name: object | None) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def fCls(self) -> typing.Any:
@@ -323,7 +322,6 @@ class CNode:
 
     def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def fChildren(self) -> typing.Any:
@@ -700,7 +698,6 @@ class CArgInfo:
 
     def __init__(self) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def name(self) -> CNode | None:
@@ -742,7 +739,6 @@ class CAsName:
 
     def __init__(self) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def module_name(self) -> str | None:
@@ -1173,7 +1169,6 @@ class CNodeFactory:
 
     def __init__(self, gram: object, cls_for_nodetype: object, keywords: object | None, tok_number2name: object, op_text2number: object) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def _fOperatorStrToNumber(self) -> typing.Any:
@@ -1235,7 +1230,6 @@ class CNodeToTextConverter:
 
     def __init__(self) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def TextForNode(self, node: CNode, dotted_name_only: bool=False, discard_simple_parens: bool=True, literal_only: bool=False, add_parens_if_operator: bool=False) -> bytes | None:
         """
@@ -1290,7 +1284,6 @@ class CMatchCaseStatementParser:
 
     def __init__(self, pgen_parser: CPGenParserImpl | None | None) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def _NonNestedFindTokenIndex(self, tok: str, start: int, end: int) -> int:
         """
@@ -1351,7 +1344,6 @@ class CPGenParserImpl(CPGenAnalyzer):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: object=True) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def _fVersionTriple(self) -> typing.Any:
@@ -1466,7 +1458,6 @@ class CNodeWalker:
 
     def __init__(self, version_triple: tuple[typing.Any, ...]) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def _fIncludeExprText(self) -> bool:
@@ -1697,7 +1688,6 @@ class CDispatchWalker:
 
     def __init__(self, dispatch_dict: object | None) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def _fLogical(self) -> codeloom._neighbours.CLogicalLine | None:
@@ -1730,7 +1720,6 @@ class CTypeHintWalker(CDispatchWalker):
 
     def __init__(self, version_triple: object | None, grammar_file: object, general_node_walker: CNodeWalker | None | None) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def _fNameConv(self) -> CNodeToTextConverterImpl | None:
@@ -1843,7 +1832,6 @@ class CPGenAnalyzerImpl(CPGenAnalyzer):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: object=True, hint_grammar_file: object='Python-Grammar-3.8') -> None:
         ...
-    __class__: getset_descriptor = ...
 
     @property
     def _fNodeWalker(self) -> CNodeWalker | None:

@@ -43,9 +43,9 @@ class _AnnotationsOnly(ast.NodeTransformer):
             node.annotation = _ItemTypes().visit(node.annotation or ANYTHING)
         return node
 
-    def visit_AnnAssign(self, node: ast.AnnAssign) -> ast.AST:
+    def visit_AnnAssign(self, node: ast.AnnAssign) -> ast.AST | None:
         if ast.unparse(node.target) == "__class__":  # as every object has it
-            return ast.Pass()
+            return None
         node.annotation = self._ResultType(node.annotation)
         return node
 
