@@ -1880,7 +1880,6 @@ class CNewerMatchCaseParser(CMatchCaseStatementParser):
 
     def __init__(self, pgen_parser: CPGenParserImpl | None | None) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def ParseMatchStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
         """
@@ -1910,7 +1909,6 @@ class CNewerParser(CPGenParserImpl):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True) -> None:
         ...
-    __class__: getset_descriptor = ...
 
     def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
         """
@@ -1929,7 +1927,8 @@ class CNewerParser(CPGenParserImpl):
 
     def ParseToNode(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool=False) -> CNode | None:
         """
-        The node of a logical's statement, or None. ParseError on a token that the grammar refuses. Give it back with DiscardNode.
+        The node of a logical's statement, or None. ParseError on a token that the grammar
+        refuses. Give it back with DiscardNode.
         """
 
     def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None) -> CNode | None:
@@ -1949,7 +1948,8 @@ class CNewerParser(CPGenParserImpl):
 
     def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
         """
-        A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of its keyword; None for the ordinary road.
+        A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of
+        its keyword; None for the ordinary road.
         """
 
     def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, start: int, end: int, raise_errors: bool) -> CNode | None:
@@ -1960,4 +1960,3 @@ class CNewerAnalyzer(CPGenAnalyzerImpl):
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True, hint_grammar_file: object='Python-Grammar-3.14') -> None:
         ...
-    __class__: getset_descriptor = ...
