@@ -26,9 +26,9 @@ def Driver(version):
 DRIVERS = {version: Driver(version) for version in ("3.8", "2.7")}
 
 
-def Parse(source, version="3.8"):
+def Parse(source, version="3.8", driver=None):
     (logical,) = GetLogicalsFromText(source)
-    return DRIVERS[version].ParseToNode(logical, in_async_def=True)
+    return (driver or DRIVERS[version]).ParseToNode(logical, in_async_def=True)
 
 
 def Tokens(node):

@@ -12,36 +12,15 @@ from pathlib import Path
 import pytest
 
 from codeloom import treesift
-from codeloom.logicalinspect import TextFromTokens
-from codeloom.treesift import CNode, CPGenAnalyzerImpl
+from codeloom.logicalline import kComment
+from codeloom.optpgen import ParseError
+from codeloom.treesift import CNewerAnalyzer, CNode, CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
 
-# The forms newer than the grammar file that the library and its tests use.
-NEWER_FORMS = {
-    "walrus in a subscript": lambda node: (
-        isinstance(node, ast.Subscript)
-        and any(isinstance(part, ast.NamedExpr) for part in _Parts(node.slice))
-    ),
-    "starred in a subscript": lambda node: (
-        isinstance(node, ast.Subscript) and any(isinstance(part, ast.Starred) for part in _Parts(node.slice))
-    ),
-    "starred annotation of *args": lambda node: (
-        isinstance(node, ast.arg) and isinstance(node.annotation, ast.Starred)
-    ),
-    "walrus in a set": lambda node: (
-        isinstance(node, ast.Set) and any(isinstance(part, ast.NamedExpr) for part in node.elts)
-    ),
-    "starred in the iterable of a for": lambda node: (
-        isinstance(node, ast.For) and any(isinstance(part, ast.Starred) for part in _Parts(node.iter))
-    ),
-}
+VERSION = (3, 11, 0)
 
-# Lines that the engine parses by hand, with nodes of their own, or can't parse yet.
+# Lines that the engine parses by hand, with nodes of their own.
 HAND_PARSED = {"match", "case", "type", "@"}
-
-
-def _Parts(node):
-    return node.elts if isinstance(node, ast.Tuple) else [node]
 
 
 def LibraryTexts(count=None, seed=None):
@@ -60,20 +39,9 @@ def LibraryTexts(count=None, seed=None):
             continue
 
 
-def IsExpected(error, logical, tree):
-    """True when a line is refused for a form that is newer than the grammar, or for a hint in prose."""
-    if error.msg == "invalid syntax in stringified type hint":
-        return not _Compiles(error.text)
-    first = logical.fFirstLine + 1
-    rows = range(first, first + TextFromTokens(logical).count("\n") + 1)
-    if logical.fToks[0] == "@":
-        return True  # only names and calls of names are decorators of the grammar
-    if logical.fToks[0] == "case":
-        return logical.fToks[1:3] == ("(", ")") or "," in logical.fToks  # empty and open sequences
-    return any(
-        getattr(node, "lineno", 0) in rows and any(test(node) for test in NEWER_FORMS.values())
-        for node in ast.walk(tree)
-    )
+def IsExpected(error):
+    """True when a quoted annotation holds no expression."""
+    return error.msg == "invalid syntax in stringified type hint" and not _Compiles(error.text)
 
 
 def _Compiles(hint):
@@ -100,23 +68,53 @@ def no_swallowing(monkeypatch):
     assert not swallowed
 
 
-@pytest.mark.parametrize(
-    "count", [pytest.param(120, id="sample"), pytest.param(None, id="all", marks=pytest.mark.slow)]
+SAMPLE_OR_ALL = pytest.mark.parametrize(
+    "count", [pytest.param(60, id="sample"), pytest.param(None, id="all", marks=pytest.mark.slow)]
 )
+
+
+@SAMPLE_OR_ALL
 def test_no_sound_line_is_refused(count, no_swallowing):
     seed = random.randrange(1 << 30)
-    analyzer = CPGenAnalyzerImpl((3, 11, 0))
+    analyzer = CNewerAnalyzer(VERSION)
     refused = [
         (seed, str(path), logical.fFirstLine + error.lineno, error.text)
-        for path, text, tree in LibraryTexts(count, seed)
+        for path, text, _ in LibraryTexts(count, seed)
         for logical, error in Analyze(analyzer, GetLogicalsFromText(text))
-        if error is not None and not IsExpected(error, logical, tree)
+        if error is not None and not IsExpected(error)
     ]
     assert not refused
 
 
+def Shape(node):
+    """What a walker sees of a tree, from the root down."""
+    nodes = [node]
+    while nodes:
+        node = nodes.pop()
+        children = node.fChildren
+        yield type(node), node.fText, node.fContext, children and len(children)
+        nodes += children or ()
+
+
+@SAMPLE_OR_ALL
+def test_the_newer_grammar_keeps_the_shape_of_every_tree(count):
+    older, newer = (CPGenParserImpl(VERSION, f"Python-Grammar-{version}") for version in ("3.8", "3.14"))
+    seed = random.randrange(1 << 30)
+    for path, text, _ in LibraryTexts(count, seed):
+        for logical in GetLogicalsFromText(text):
+            try:
+                tree = logical.fType != kComment and older.ParseToNode(logical, logical.fInAsyncDef)
+            except ParseError:
+                continue
+            if tree:
+                same = newer.ParseToNode(logical, logical.fInAsyncDef)
+                assert list(Shape(tree)) == list(Shape(same)), (seed, path, logical.fFirstLine)
+                older.DiscardNode(tree)
+                newer.DiscardNode(same)
+
+
 def test_a_second_pass_makes_no_nodes():
-    analyzer = CPGenAnalyzerImpl((3, 11, 0))
+    analyzer = CNewerAnalyzer(VERSION)
     texts = [text for _, text, _ in LibraryTexts(40, 1)]
 
     def Pass():

@@ -20,6 +20,9 @@ from codeloom.treesift import (
     CClassArgumentPatternNode,
     CClassPatternNode,
     CMatchCaseStatementParser,
+    CNewerAnalyzer,
+    CNewerMatchCaseParser,
+    CNewerParser,
     CPatternNode,
     CPGenAnalyzerImpl,
     CPGenParserImpl,
@@ -29,16 +32,14 @@ from codeloom.utils import GetLogicalsFromText
 
 VERSION = (3, 11, 0)
 ANALYZER = CPGenAnalyzerImpl(VERSION)
+NEWER_ANALYZER = CNewerAnalyzer(VERSION)
 DRIVER = CPGenParserImpl(VERSION)
+NEWER_DRIVER = CNewerParser(VERSION)
 
 
-def Analyze(text):
+def Place(text, analyzer=ANALYZER):
     (logical,) = GetLogicalsFromText(text)
-    return ANALYZER.AnalyzeSingleLogical(logical, False, False)
-
-
-def Place(text):
-    error = Analyze(text)
+    error = analyzer.AnalyzeSingleLogical(logical, False, False)
     return error and (error.lineno, error.offset)
 
 
@@ -114,6 +115,7 @@ def Joined(parts, open, close, least=0):
 
 
 NAMES = st.sampled_from(["a", "b", "match", "case", "_x"])
+STARRED = NAMES.map("*{}".format)
 VALUES = st.sampled_from(["1", "-1", "2j", "1 + 2j", "-1 - 2j", "'s'", "a.b", "a.case.b", "None", "True"])
 SINGLE = st.one_of(NAMES, VALUES, st.just("_"), NAMES.map("{}()".format))
 
@@ -123,7 +125,7 @@ def Larger(patterns):
     arguments = st.one_of(patterns, st.tuples(NAMES, patterns).map("=".join))
     pairs = st.tuples(VALUES, patterns).map(": ".join)
     return st.one_of(
-        Joined(st.one_of(patterns, NAMES.map("*{}".format)), "[", "]"),
+        Joined(st.one_of(patterns, STARRED), "[", "]"),
         Joined(patterns, "(", ",)", least=1),
         patterns.map("({})".format),
         Joined(arguments, "a.b(", ")"),
@@ -143,6 +145,20 @@ def test_patterns_have_the_structure_that_the_interpreter_sees(pattern):
         return  # such as a positional argument behind a named one
     expected = tree.body[0].cases[0].pattern
     assert Form(Parse(f"case {pattern}:").GetPattern()) == ExpectedForm(expected)
+
+
+@settings(max_examples=300, deadline=None)
+@given(st.lists(st.one_of(st.recursive(SINGLE, Larger, max_leaves=4), STARRED), min_size=1, max_size=3))
+def test_open_sequences_have_it_too(patterns):
+    pattern = ", ".join(patterns) if len(patterns) > 1 else f"{patterns[0]},"
+    try:
+        tree = ast.parse(f"match x:\n case {pattern}: pass")
+    except SyntaxError:
+        return
+    node = Parse(f"case {pattern}:", driver=NEWER_DRIVER).GetPattern()
+    assert type(node) is CSequencePatternNode
+    parts = tuple(Form(part) for part in node.fChildren if part.fText != ",")
+    assert ("sequence", *parts) == ExpectedForm(tree.body[0].cases[0].pattern)
 
 
 # Bad patterns, each with the place of its fault
@@ -237,14 +253,58 @@ case A(a=1) b:
 case A(a).b:
         ^
 """
-BAD_ROWS = BAD_PATTERNS.strip("\n").split("\n")
+
+# Those of them that the newer parser takes, and what else is bad for it.
+NO_LONGER_BAD = {"case ():", "case a, b:", "case *a, b:", 'case "a" "b":'}
+BAD_FOR_NEWER = """
+case a,, b:
+       ^
+case *a, 1 b:
+           ^
+case a, b as 1:
+             ^
+case a, b as c, d e:
+                  ^
+case "a" b:
+         ^
+case "a" "b" "c" d | e:
+                 ^
+case [a, "b" 1]:
+             ^
+case (,):
+      ^
+case {a, b: 1}, c:
+       ^
+case a if b c:
+            ^
+case a, b if c: d e
+                  ^
+case a: b +
+           ^
+match a, b c:
+           ^
+"""
 
 
-@pytest.mark.parametrize(
-    ("text", "caret"), list(zip(BAD_ROWS[::2], BAD_ROWS[1::2], strict=True)), ids=BAD_ROWS[::2]
-)
-def test_the_place_of_the_fault(text, caret):
-    assert Place(text) == (1, len(text[: caret.index("^")].encode()) + 1)
+def PlacesIn(table):
+    rows = table.strip("\n").split("\n")
+    for text, caret in zip(rows[::2], rows[1::2], strict=True):
+        yield text, (1, len(text[: caret.index("^")].encode()) + 1)
+
+
+def Tables(*tables):
+    pairs = [pair for table in tables for pair in PlacesIn(table)]
+    return pytest.mark.parametrize(("text", "place"), pairs, ids=[text for text, _ in pairs])
+
+
+@Tables(BAD_PATTERNS)
+def test_the_place_of_the_fault(text, place):
+    assert Place(text) == place
+
+
+@Tables(BAD_PATTERNS, BAD_FOR_NEWER)
+def test_the_place_of_the_fault_for_the_newer_parser(text, place):
+    assert Place(text, NEWER_ANALYZER) == (None if text in NO_LONGER_BAD else place)
 
 
 def test_places_in_lines_of_several_rows():
@@ -252,6 +312,13 @@ def test_places_in_lines_of_several_rows():
     assert Place("case [a,  # one\n      # two\n  b 1]:") == (3, 5)
     assert Place("case \\\n  a \\\n  b:") == (3, 3)
     assert Place("case é, b:") == (1, 8)  # columns are bytes
+    for text, place in [
+        ("case [a,  # one\n  b] if c d:", (2, 11)),
+        ("match (a,  # one\n  b c):", (2, 5)),
+        ("match \\\n  a \\\n  b:", (3, 3)),
+        ("case é, \\\n  b: c d", (2, 8)),
+    ]:
+        assert Place(text, NEWER_ANALYZER) == place
 
 
 def test_brackets_of_unlike_kinds():
@@ -377,6 +444,25 @@ def test_overrides_at_every_depth():
         parser.ParseCaseStmt(*Tuples("case 1 2:"))
     parser.ParseMatchStmt(*Tuples("match a:"))
     assert {name for name, *_ in parser.calls} == {name for name in vars(Recording) if "__" not in name}
+
+
+def test_overrides_of_the_newer_parser():
+    class Parser(CNewerMatchCaseParser):
+        calls = []
+
+        def _NodeForPattern(self, start_i, end_i, allow_as=True):
+            self.calls.append((start_i, end_i, allow_as))
+            return super()._NodeForPattern(start_i, end_i, allow_as)
+
+        def ParseCaseStmt(self, toks, positions):  # leaves out what the class keeps of the line
+            return CMatchCaseStatementParser.ParseCaseStmt(self, toks, positions)
+
+    node = Parser(NEWER_DRIVER).ParseCaseStmt(*Tuples("case a, (), 'b' 'c' as d, [*e, f] if g: h"))
+    assert Parser.calls == [
+        *((1, 17, True), (1, 2, True), (3, 5, True), (6, 10, True), (6, 8, False)),
+        *((11, 17, True), (12, 14, True), (15, 16, True)),
+    ]
+    assert [Tokens(part) for part in (node.GetGuard(), node.GetBody())] == ["if g : pass", "h"]
 
 
 def test_what_overrides_may_answer():

@@ -32,8 +32,10 @@ CNodeRef CNewerMatchCaseParser::ParseCaseStmt(nb::tuple toks, nb::tuple position
 CNodeRef CNewerMatchCaseParser::_ParseMatchStmtImpl() {
     if (_fLineToks.is_none()) return CMatchCaseStatementParser::_ParseMatchStmtImpl();
     return _MatchStmt([this] {
-        return _Parse(
+        CNodeRef node = _Parse(
             InParentheses(nb::borrow<nb::tuple>(_fLineToks), _IndexInLine(0), _IndexInLine(_TokCount() - 1)));
+        // `...` is no expression by itself.
+        return node && node->IsToken(1, "...") ? node : WithoutParentheses(std::move(node));
     });
 }
 

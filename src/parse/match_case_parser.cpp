@@ -71,8 +71,8 @@ CNodeRef CMatchCaseStatementParser::ParseMatchStmt(nb::tuple toks, nb::tuple pos
 CNodeRef CMatchCaseStatementParser::_ParseMatchStmtImpl() {
     return _MatchStmt([this] {
         const nb::tuple toks = OfLine(_fToks);
-        return _fPGenParser->_ParseToksToNodeImpl(InParentheses(toks, 0, TupleSize(toks) - 1), true,
-                                                  CPositions(_fPositions));
+        return WithoutParentheses(_fPGenParser->_ParseToksToNodeImpl(
+            InParentheses(toks, 0, TupleSize(toks) - 1), true, CPositions(_fPositions)));
     });
 }
 
@@ -83,7 +83,7 @@ CNodeRef CMatchCaseStatementParser::_MatchStmt(const std::function<CNodeRef()>& 
     if (!_IsStatementOfType(gLogicalTypes.kMatch)) return CNodeRef();
     const Py_ssize_t colon_i = _Find(":", 1, _TokCount());
     if (colon_i == -1) return CNodeRef();
-    const CNodeRef subject = WithoutParentheses(parse_subject());
+    const CNodeRef subject = parse_subject();
     return NewPseudoNode<CMatchStmt>({_TokNode(0), subject, _TokNode(colon_i)});
 }
 

@@ -60,7 +60,7 @@ class CMatchCaseStatementParser : public CHosted {
     }
 
   protected:
-    // The two statements; what isn't a pattern is parsed as the caller says. The subject comes in brackets.
+    // The two statements; what isn't a pattern is parsed as the caller says.
     CNodeRef _MatchStmt(const std::function<CNodeRef()>& parse_subject);
     CNodeRef _CaseStmt(const std::function<CNodeRef(Py_ssize_t start_i, Py_ssize_t end_i)>& parse_range);
 
