@@ -28,9 +28,9 @@ class Café(Base):
 IN_WORDS = """\
 f.py:1:1: import os.path as p, sys
     binds    p = module os.path
-             sys = module sys
+             module sys
 f.py:2:1: from typing import List
-    binds    List = List from typing
+    binds    List from typing
 f.py:3:1: class Café(Base):
     binds    Café
     reads    Base

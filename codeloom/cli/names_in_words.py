@@ -68,6 +68,10 @@ class _Said:
                 stars = record.payload[: len(record.payload) - len(record.payload.lstrip("*"))]
                 self._fName = stars + self._fName
                 self._fHints += [spec] if (spec := record.payload.lstrip("* ")) else []
+            case "Import" if record.payload == record.name:
+                self._fName = f"module {record.name}"
+            case "FromImport" if record.payload.endswith(f" {record.name}"):
+                self._fName = _Value(record)
             case "Called":
                 self._fCalls.append(self._fName + record.payload)
             case _:
@@ -84,7 +88,7 @@ class _Said:
         values = " or ".join(self._fValues)
         hints = " or ".join(self._fHints)
         if self._fIsOutcome:
-            return values or hints
+            return values or hints or self._fName
         return self._fName + (f": {hints}" if hints else "") + (f" = {values}" if values else "")
 
 
