@@ -79,6 +79,7 @@ bench: build
 	$(BIN)/python benchmarks/bench_accessors.py
 	$(BIN)/python benchmarks/bench_analyze.py
 	$(BIN)/python benchmarks/bench_hints.py
+	$(BIN)/python benchmarks/bench_names.py
 
 clean:
 	rm -rf build $(VENV)

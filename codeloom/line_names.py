@@ -9,7 +9,7 @@ from pathlib import Path
 
 from codeloom import logicalline
 from codeloom.check import Problem
-from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, NewParser
+from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf
 from codeloom.false_hints import FalseHintRemover
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.line_length import TooLong
@@ -19,7 +19,6 @@ from codeloom.logicalline import CLogicalLine
 from codeloom.name_places import NamePlaces, PlaceFinder, Tokens
 from codeloom.records import CRecord, RecordsOfLogical
 from codeloom.source import Source, SourceFromBytes, SourceFromText
-from codeloom.treesift import CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
 
 
@@ -106,11 +105,6 @@ def _PlaceFinderOf(language: Language) -> PlaceFinder:
     return PlaceFinder(language.version_triple)
 
 
-@cache
-def _ParserOf(language: Language) -> CPGenParserImpl:
-    return NewParser(language)
-
-
 class _NameReader(LineReader):
     """Analyses the logical lines of one text."""
 
@@ -148,15 +142,14 @@ class _NameReader(LineReader):
     def _Places(self, logical: CLogicalLine, in_async_def: bool) -> NamePlaces:
         """The places of the names in a line that is sound."""
         places = NamePlaces()
-        parser, finder = _ParserOf(self._fLanguage), _PlaceFinderOf(self._fLanguage)
+        analyzer, finder = AnalyzerOf(self._fLanguage), _PlaceFinderOf(self._fLanguage)
         for part in (logical, *logical.GetExpLogicals()):
             if part.fType == logicalline.kCommentedTypeHint:
                 places.AddComment(part)
             elif part.fType != logicalline.kComment:
-                tree = parser.ParseToNode(part, in_async_def)
+                tree = analyzer.ParseToNode(part, in_async_def)
                 if tree is not None:
                     finder.Find(tree, part, places)
-                    parser.DiscardNode(tree)
         return places
 
     def _Placed(self, records: list[CRecord], places: NamePlaces) -> Iterator[PlacedRecord]:
