@@ -287,7 +287,7 @@ class PlaceFinder(CNodeWalker):
         super()._VisitNonlocalStmt(node)
 
     def _VisitCaseStmt(self, case_stmt: Any) -> None:
-        # A guard and a body are parsed by themselves, and count their tokens from their own first.
+        # A guard and a body may be parsed by themselves, and then count their tokens from their own first.
         pattern, *rest = case_stmt.fChildren[1:]
         if isinstance(pattern, CPatternNode):
             self._VisitPatternNode(pattern)
@@ -296,9 +296,10 @@ class PlaceFinder(CNodeWalker):
         for i, child in enumerate(rest):
             if i == at_colon:
                 continue
-            self._fFirst = colon_i + 1 if i > at_colon else colon_i - child.fChildren[2].fContext
+            if _Leaf(child, 0).fContext == 0:
+                self._fFirst = colon_i + 1 if i > at_colon else colon_i - child.fChildren[2].fContext
             self._VisitNode(child)
-        self._fFirst = 0
+            self._fFirst = 0
 
     def _VisitPatternNode(self, pattern_node: Any) -> None:
         # The name in front of a "=" belongs to the class.

@@ -90,7 +90,7 @@ f.py:15:9: yield from a.b
 
 def test_in_words(run_cli, write_files):
     write_files({"f.py": SOURCE})
-    done = run_cli("names", "f.py")
+    done = run_cli("names", "--python", "3.12", "f.py")
     assert (done.stdout, done.stderr, done.returncode) == (IN_WORDS, "", 1)
 
 
