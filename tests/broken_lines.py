@@ -4,7 +4,7 @@ One token of one logical line is deleted, doubled or replaced by another of the 
 alone is judged by the interpreter: what it still accepts, or refuses only after its grammar, doesn't
 count. Run it for a measurement; tests/test_broken_lines.py holds the goal.
 
-    python tests/broken_lines.py [--cases N] [--seed N] [--show]
+    python tests/broken_lines.py [--analyzer older|newer] [--cases N] [--seed N] [--show]
 """
 
 import argparse
@@ -18,10 +18,10 @@ from dataclasses import dataclass
 from pathlib import Path
 
 from codeloom.logicalline import kComment
-from codeloom.treesift import CPGenAnalyzerImpl
+from codeloom.treesift import CNewerAnalyzer, CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
 
-ANALYZER = CPGenAnalyzerImpl((3, 8, 0))
+ANALYZERS = {"older": CPGenAnalyzerImpl((3, 8, 0)), "newer": CNewerAnalyzer((3, 11, 0))}
 
 # What the interpreter says of code that its grammar holds and that it refuses afterwards.
 AFTER_THE_GRAMMAR = (
@@ -80,12 +80,12 @@ def SoundFiles() -> list[Path]:
     return [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
 
 
-def Errors(text: str) -> list[tuple[int, str]]:
+def Errors(text: str, analyzer: CPGenAnalyzerImpl) -> list[tuple[int, str]]:
     """The row in the file and the text of every broken logical line."""
     errors = []
     with redirect_stdout(io.StringIO()):
         for logical in GetLogicalsFromText(text):
-            error = ANALYZER.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
+            error = analyzer.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
             if error is not None:
                 errors.append((logical.fFirstLine + error.lineno - 1, error.text))
     return errors
@@ -122,7 +122,10 @@ def IsBroken(line: str) -> bool:
 class Breaker:
     """Breaks lines of one sound file."""
 
-    def __init__(self, path: Path, text: str, random_source: random.Random) -> None:
+    def __init__(
+        self, path: Path, text: str, random_source: random.Random, analyzer: CPGenAnalyzerImpl
+    ) -> None:
+        self.analyzer = analyzer
         self.path = path
         self.random = random_source
         self.data = text.encode()
@@ -149,7 +152,7 @@ class Breaker:
             return None
         text = (self.data[:start] + new_bytes + self.data[end:]).decode()
         end_row = logical.fFirstLine + line.count(b"\n") + 1
-        return Case(self.path, logical.fFirstLine, end_row, deed, line.decode(), Errors(text))
+        return Case(self.path, logical.fFirstLine, end_row, deed, line.decode(), Errors(text, self.analyzer))
 
     def _Bytes(self, logical, token_i: int) -> tuple[int, int]:
         row, col = logical.fPositions[token_i]
@@ -157,7 +160,7 @@ class Breaker:
         return start, start + len(logical.fToks[token_i].encode())
 
 
-def Cases(count: int, seed: int) -> list[Case]:
+def Cases(count: int, seed: int, analyzer: CPGenAnalyzerImpl = ANALYZERS["newer"]) -> list[Case]:
     """`count` broken lines of random sound files."""
     random_source = random.Random(seed)
     files = SoundFiles()
@@ -169,9 +172,9 @@ def Cases(count: int, seed: int) -> list[Case]:
             ast.parse(text)
         except (SyntaxError, ValueError):
             continue
-        if not text.strip() or "\f" in text or len(text) > 200_000 or Errors(text):
+        if not text.strip() or "\f" in text or len(text) > 200_000 or Errors(text, analyzer):
             continue
-        breaker = Breaker(path, text, random_source)
+        breaker = Breaker(path, text, random_source, analyzer)
         if breaker.logicals:
             cases += [case for _ in range(10) if (case := breaker.Break()) is not None]
     return cases[:count]
@@ -180,10 +183,11 @@ def Cases(count: int, seed: int) -> list[Case]:
 def main() -> None:
     parser = argparse.ArgumentParser(description=__doc__.splitlines()[0])
     parser.add_argument("--cases", type=int, default=500)
+    parser.add_argument("--analyzer", choices=ANALYZERS, default="newer")
     parser.add_argument("--seed", type=int, default=random.randrange(1 << 30))
     parser.add_argument("--show", action="store_true", help="print the lines that were missed")
     options = parser.parse_args()
-    cases = Cases(options.cases, options.seed)
+    cases = Cases(options.cases, options.seed, ANALYZERS[options.analyzer])
     missed = [case for case in cases if not case.IsExact()]
     if options.show:
         for case in missed:

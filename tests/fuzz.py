@@ -14,7 +14,7 @@ from contextlib import redirect_stdout
 from pathlib import Path
 
 from codeloom import treesift
-from codeloom.treesift import CPGenAnalyzerImpl
+from codeloom.treesift import CNewerAnalyzer, CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
 
 PIECES = [
@@ -124,6 +124,8 @@ class Fuzzer:
         library = Path(sysconfig.get_path("stdlib"))
         self.files = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
         self.analyzers = [
+            CNewerAnalyzer((3, 11, 0)),
+            CNewerAnalyzer((3, 14, 0)),
             CPGenAnalyzerImpl((3, 11, 0)),
             CPGenAnalyzerImpl((3, 5, 0)),
             CPGenAnalyzerImpl((2, 7, 18), "Python-Grammar-2.7", ["print", "exec", "if"], False),

@@ -447,18 +447,18 @@ def test_overrides_at_every_depth():
 
 
 def test_overrides_of_the_newer_parser():
-    class Parser(CNewerMatchCaseParser):
-        calls = []
+    calls = []
 
+    class Parser(CNewerMatchCaseParser):
         def _NodeForPattern(self, start_i, end_i, allow_as=True):
-            self.calls.append((start_i, end_i, allow_as))
+            calls.append((start_i, end_i, allow_as))
             return super()._NodeForPattern(start_i, end_i, allow_as)
 
         def ParseCaseStmt(self, toks, positions):  # leaves out what the class keeps of the line
             return CMatchCaseStatementParser.ParseCaseStmt(self, toks, positions)
 
     node = Parser(NEWER_DRIVER).ParseCaseStmt(*Tuples("case a, (), 'b' 'c' as d, [*e, f] if g: h"))
-    assert Parser.calls == [
+    assert calls == [
         *((1, 17, True), (1, 2, True), (3, 5, True), (6, 10, True), (6, 8, False)),
         *((11, 17, True), (12, 14, True), (15, 16, True)),
     ]

@@ -72,14 +72,11 @@ nb::list CNewerParser::_BuildClsForStateList() {
 
 CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
     const Py_ssize_t i = _FindNextNonSkipIndex(toks, -1);
-    if (IsToken(toks, i, "@")) return _ParseDecorator(toks, in_async_def, positions, i);
-    if (IsToken(toks, i, "match") || IsToken(toks, i, "case")) {
-        CNodeRef node = _ParseMatchOrCase(toks, in_async_def, positions);
-        if (node && node->As<CMatchStmt>()) _fForms.Note(forms::kMatch, nb::int_(i));
-        if (node && node->As<CCaseStmt>()) _fForms.Note(forms::kCase, nb::int_(i));
-        return node;
-    }
-    if (IsToken(toks, i, "async")) {
+    if (i >= TupleSize(toks)) return CNodeRef();
+    const CUtf8 text(TupleItem(toks, i));
+    if (text == "@") return _ParseDecorator(toks, in_async_def, positions, i);
+    if (text == "match" || text == "case") return _ParseMatchOrCase(toks, in_async_def, positions, i);
+    if (text == "async") {
         const Py_ssize_t next_i = _FindNextNonSkipIndex(toks, i);
         if (IsToken(toks, next_i, "with"))
             return _ParseSpecialCaseParenthesizedWith(toks, in_async_def, positions, next_i);
@@ -87,14 +84,21 @@ CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPo
     return CPGenParserImpl::_ParseSpecialCases(std::move(toks), in_async_def, std::move(positions));
 }
 
-// `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
 CNodeRef CNewerParser::_ParseMatchOrCase(const nb::tuple& toks, bool in_async_def,
-                                         const CPositions& positions) {
+                                         const CPositions& positions, Py_ssize_t word_i) {
+    CNodeRef node = _ParseMatchCaseOrName(toks, in_async_def, positions, word_i);
+    if (node && node->As<CMatchStmt>()) _fForms.Note(forms::kMatch, nb::int_(word_i));
+    if (node && node->As<CCaseStmt>()) _fForms.Note(forms::kCase, nb::int_(word_i));
+    return node;
+}
+
+// `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
+CNodeRef CNewerParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def,
+                                             const CPositions& positions, Py_ssize_t word_i) {
     try {
         return CPGenParserImpl::_ParseSpecialCases(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
         if (!error.matches(ParseErrorClass())) throw;
-        const Py_ssize_t word_i = _FindNextNonSkipIndex(toks, -1);
         if (!IsToken(toks, _FindNextNonSkipIndex(toks, word_i), "[")) throw;
         try {
             return _ParseToksToNodeImpl(toks, in_async_def, positions);

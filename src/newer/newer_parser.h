@@ -48,7 +48,10 @@ class CNewerParser : public CPGenParserImpl {
     }
 
   private:
-    CNodeRef _ParseMatchOrCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions);
+    CNodeRef _ParseMatchOrCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                               Py_ssize_t word_i);
+    CNodeRef _ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                                   Py_ssize_t word_i);
     CNodeRef _ParseDecorator(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                              Py_ssize_t at_i);
     bool _FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i);
