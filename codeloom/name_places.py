@@ -4,6 +4,7 @@ Records carry no place. `PlaceFinder` is a walker like the engine's own that kee
 records, the tokens that each of them comes from.
 """
 
+from bisect import bisect_left
 from collections import defaultdict, deque
 from collections.abc import Iterable, Iterator
 from typing import Any, NamedTuple
@@ -112,8 +113,8 @@ class PlaceFinder(CNodeWalker):
     def _LeafIndex(self, leaf: CNode) -> int | None:
         """The index of a leaf's token; None when it can't be told."""
         toks, context = self._fLine.fToks, leaf.fContext
-        if isinstance(context, tuple) and context in self._fLine.fPositions:
-            context = self._fLine.fPositions.index(context)
+        if isinstance(context, tuple):  # a position; they ascend
+            context = bisect_left(self._fLine.fPositions, context)
         elif isinstance(context, int):
             context += self._fFirst
         is_index = isinstance(context, int) and 0 <= context < len(toks)
