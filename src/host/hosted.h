@@ -46,6 +46,17 @@ class CHosted {
 // Raises the host's AttributeError of an operation on none.
 [[noreturn]] void RaiseNoneUsed(const std::type_info& wanted);
 
+// True when the class of `candidate` is T or derived from it.
+template <class T>
+bool IsOfClass(nb::handle candidate) {
+    static PyTypeObject* const type = reinterpret_cast<PyTypeObject*>(nb::type<T>().ptr());
+    if constexpr (requires { typename T::CAnyOfKind; }) {
+        // Every native class derived from it inherits this slot, and no other class has it.
+        if (Py_TYPE(candidate.ptr())->tp_traverse == type->tp_traverse) return true;
+    }
+    return PyObject_TypeCheck(candidate.ptr(), type);
+}
+
 // The object of class T inside `candidate`; null when it is of another class or not yet constructed. Classes
 // whose common base, `CAnyOfKind`, knows which one it is of are told apart by that.
 template <class T>
@@ -56,8 +67,7 @@ T* TryInstance(nb::handle candidate) {
             return base == nullptr ? nullptr : base->template As<T>();
         }
     }
-    static PyTypeObject* const type = reinterpret_cast<PyTypeObject*>(nb::type<T>().ptr());
-    if (!PyObject_TypeCheck(candidate.ptr(), type) || !nb::inst_ready(candidate)) return nullptr;
+    if (!IsOfClass<T>(candidate) || !nb::inst_ready(candidate)) return nullptr;
     return nb::inst_ptr<T>(candidate);
 }
 
