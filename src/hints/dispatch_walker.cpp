@@ -8,11 +8,13 @@ namespace codeloom {
 void CDispatchWalker::Init(nb::object dispatch_dict) {
     if (!dispatch_dict.is_none() && !nb::isinstance<nb::dict>(dispatch_dict))
         RaiseWrongType("dict", dispatch_dict);
+    _fIsNative = !nb::inst_python_derived(Self());
     _fDispatch.Set(std::move(dispatch_dict));
 }
 
 void CDispatchWalker::InitWithVisits(nb::dict dispatch_dict, std::vector<CNativeVisit> native_visits) {
     for (const CNativeVisit& visit : native_visits) dispatch_dict[visit.node_class] = visit.callable;
+    _fIsNative = !nb::inst_python_derived(Self());
     _fDispatch.Set(std::move(dispatch_dict), std::move(native_visits));
 }
 
@@ -58,7 +60,24 @@ void CDispatchWalker::_VisitChildren(const CNodeRef& node) {
     if (!node) return;
     const nb::object children = node->fChildren;
     if (children.is_none()) return;
-    for (Py_ssize_t i = 0; i < ListSize(children); ++i) _VisitNode(CNodeRef::FromHost(ListItem(children, i)));
+    for (Py_ssize_t i = 0; i < ListSize(children); ++i) {
+        const nb::handle child = ListItem(children, i);
+        if (_IsIdleLeaf(child)) {
+            _fLimits.CountVisit();
+            CVisitLimits::CheckDepth(static_cast<Py_ssize_t>(_fNodeStack.size()) + 1);
+        } else {
+            _VisitNode(CNodeRef::FromHost(child));
+        }
+    }
+}
+
+// True for a leaf whose visit would do nothing but count. More than half of all nodes are such.
+bool CDispatchWalker::_IsIdleLeaf(nb::handle child) {
+    if (!_fIsNative) return false;
+    const CNode* const node = TryInstance<CNode>(child);
+    if (node == nullptr || !node->fChildren.is_none()) return false;
+    const CDispatchTable::EAction action = _fDispatch.Find(child.type()).action;
+    return action == CDispatchTable::EAction::kVisitChildren || action == CDispatchTable::EAction::kSkip;
 }
 
 nb::list CDispatchWalker::GetNodeStack() const {

@@ -44,10 +44,12 @@ class CDispatchWalker : public CHosted {
     void InitWithVisits(nb::dict dispatch_dict, std::vector<CNativeVisit> native_visits);
 
   private:
+    bool _IsIdleLeaf(nb::handle child);
     bool _AreChildrenWanted(const CNodeRef& node);
     void _VisitChildren(const CNodeRef& node);
 
     CDispatchTable _fDispatch;
+    bool _fIsNative = false;  // no host subclass, whose override of _VisitNode wants every node
     CVisitLimits _fLimits;
     std::vector<CNodeRef> _fNodeStack;  // from the root to the node now visited
 };
