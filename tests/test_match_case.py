@@ -283,6 +283,24 @@ case a: b +
            ^
 match a, b c:
            ^
+match *a:
+      ^
+match yield a:
+      ^
+match a for a in b:
+      ^
+case def:
+     ^
+case [a, is]:
+         ^
+case a.in.b:
+       ^
+case def(a):
+     ^
+case 1 | if:
+         ^
+case [1 | 2 |, 3]:
+             ^
 """
 
 

@@ -73,6 +73,7 @@ NEW_IN = {
     @(lambda f: f)\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
     @a.b(c)(d)\nclass A: pass  #! a decorator that is no name or call of one needs Python 3.9
     @lambda a, b: c\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
+    @...\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
     @a := b\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
     with (a as b, c): d  #! a `with` whose items stand in brackets needs Python 3.9
     with (a as b, c as d,): e  #! a `with` whose items stand in brackets needs Python 3.9
@@ -104,7 +105,7 @@ NEW_IN = {
     """,
     # 695, 701
     "3.12": r"""
-    type A = int  #! `type` needs Python 3.12
+    type A = ...  #! `type` needs Python 3.12
     type A[T] = list[T]  #! `type` needs Python 3.12
     type type = type; type match = case  #! `type` needs Python 3.12
     def f[T: int, *Ts, **P](a: T) -> T: pass  #! a list of type parameters needs Python 3.12
@@ -116,7 +117,7 @@ NEW_IN = {
     """,
     # 696
     "3.13": r"""
-    def f[T = int](): pass  #! a default of a type parameter needs Python 3.13
+    def f[T = ...](): pass  #! a default of a type parameter needs Python 3.13
     class A[T: int = bool, *B = *b, **P = [int]]: pass  #! a default of a type parameter needs Python 3.13
     type A[T = list[int], U = T] = B[T, U]  #! a default of a type parameter needs Python 3.13
     """,
@@ -165,6 +166,38 @@ def test_rows_say_the_truth_of_this_interpreter(since, statement, told):
         assert not is_known
     else:
         assert is_known
+
+
+NEVER = r"""
+    with a, b,: c
+    with (a as b), c: d
+    with (a as b) as c: d
+    async with (a as b, c: d
+    @a, b\ndef f(): pass
+    @*a\ndef f(): pass
+    @yield\ndef f(): pass
+    @a = b\ndef f(): pass
+    @a for a in b\ndef f(): pass
+    @\ndef f(): pass
+    type A
+    type A = b, c
+    type A = b = c
+    type A[B]
+    type in = b
+    type A: int = b
+    def f[A = ](): pass
+    def f[A = b, c = d = e](): pass
+    def f[A = b, c for c in d](): pass
+    class A[= b]: pass
+    try: a\nexcept B, C as d: e
+    try: a\nexcept* B, C as d: e
+    [*a or b]
+"""
+
+
+@pytest.mark.parametrize("statement", [statement for statement, _ in Rows(NEVER)])
+def test_what_is_never_sound(statement):
+    assert all(Messages(statement, version) for version in VERSIONS)
 
 
 @pytest.mark.parametrize("statement", [statement for statement, _ in Rows(ONLY_IN_2_7)])

@@ -15,6 +15,13 @@ namespace {
 
 constexpr Py_ssize_t kPatternIndex = 1;  // of the first token behind `case`
 
+// What stands in the invented brackets needs none: no comprehension, no `yield`, no lone star.
+bool IsSubject(const CNode& node) {
+    if (node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield")) return false;
+    CTestListStarExpr* const list = node.As<CTestListStarExpr>();
+    return list == nullptr || list->IsTuple();
+}
+
 }  // namespace
 
 CNodeRef CNewerMatchCaseParser::ParseMatchStmt(nb::tuple toks, nb::tuple positions) {
@@ -34,6 +41,8 @@ CNodeRef CNewerMatchCaseParser::_ParseMatchStmtImpl() {
     return _MatchStmt([this] {
         CNodeRef node = _Parse(
             InParentheses(nb::borrow<nb::tuple>(_fLineToks), _IndexInLine(0), _IndexInLine(_TokCount() - 1)));
+        const CNode* const subject = node ? node->TryChild<CNode>(1) : nullptr;
+        if (subject && !IsSubject(*subject)) _FailAt(1);
         // `...` is no expression by itself.
         return node && node->IsToken(1, "...") ? node : WithoutParentheses(std::move(node));
     });
@@ -58,11 +67,24 @@ CNodeRef CNewerMatchCaseParser::_NodeForPattern(Py_ssize_t start_i, Py_ssize_t e
 
 void CNewerMatchCaseParser::DoPatternStep(CPatternWork& work, const CPatternStep& step) {
     const bool is_pattern = step.kind == CPatternStep::EKind::kPattern;
+    if (is_pattern) _RefuseWhatNoPatternIs(step);
+    if (step.kind == CPatternStep::EKind::kToken && !_IsTok(step.start_i, "as")) _RefuseKeyword(step.start_i);
     if (is_pattern && _IsOpenSequence(step)) return _PlanOpenSequence(CPlan(work), step.start_i, step.end_i);
     if (is_pattern && _BeginsWithStrings(step)) return _PlanStrings(CPlan(work), step.start_i, step.end_i);
     if (is_pattern && _IsEmptySequence(step))
         return CPlan(work).Part(CPatternStep::EKind::kSequence, step.start_i, step.end_i);
     CMatchCaseStatementParser::DoPatternStep(work, step);
+}
+
+// The parser beneath takes keywords for names, and a bar at the end.
+void CNewerMatchCaseParser::_RefuseWhatNoPatternIs(const CPatternStep& step) {
+    if (step.start_i + 1 == step.end_i) _RefuseKeyword(step.start_i);
+    if (step.start_i + 1 < step.end_i && _IsTok(step.end_i - 1, "|")) _FailAt(step.end_i);
+}
+
+void CNewerMatchCaseParser::_RefuseKeyword(Py_ssize_t tok_i) {
+    const nb::object tok = _Tok(tok_i);
+    if (_fPGenParser->IsKeyword(tok) && !TextIsOneOf(tok, "None", "True", "False")) _FailAt(tok_i);
 }
 
 // Of the ranges that begin behind `case`, the whole pattern is the only one with a comma outside brackets.

@@ -29,6 +29,8 @@ class CNewerMatchCaseParser : public CMatchCaseStatementParser {
     }
 
   private:
+    void _RefuseWhatNoPatternIs(const CPatternStep& step);
+    void _RefuseKeyword(Py_ssize_t tok_i);
     bool _IsOpenSequence(const CPatternStep& step);
     bool _BeginsWithStrings(const CPatternStep& step);
     bool _IsEmptySequence(const CPatternStep& step) const;

@@ -113,6 +113,7 @@ CNodeRef CNewerParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_asyn
 //   with (a), (b):   with (a)[0]:    with (x := f()) as y:    with (yield):    none
 CNodeRef CNewerParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def,
                                                           CPositions positions, Py_ssize_t i) {
+    _RefuseLastComma(toks, i);
     const Py_ssize_t open_i = _FindNextNonSkipIndex(toks, i);
     if (!IsToken(toks, open_i, "(")) return CNodeRef();
     const Py_ssize_t close_i = _NonNestedFindTokenIndex(nb::str(")"), toks, open_i + 1, TupleSize(toks));
@@ -122,6 +123,17 @@ CNodeRef CNewerParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool i
     if (contents.has_target) _fForms.Note(forms::kWithBrackets, nb::int_(open_i));
     return CPGenParserImpl::_ParseSpecialCaseParenthesizedWith(std::move(toks), in_async_def,
                                                                std::move(positions), i);
+}
+
+//   with a, b,:
+//             ^    stands within brackets only, which are off when the grammar reads the items
+void CNewerParser::_RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i) {
+    bool is_behind_comma = false;
+    ForEachOutsideBrackets(toks, with_i + 1, TupleSize(toks), [&](Py_ssize_t i, std::string_view text) {
+        if (is_behind_comma && text == ":") _RaiseParseError(nb::int_(i));
+        is_behind_comma = text == ",";
+        return text != ":";
+    });
 }
 
 //   except A, B:         may lack its brackets (PEP 758)
@@ -256,15 +268,16 @@ CNodeRef CNewerParser::_ParseDefault(const nb::tuple& toks, bool in_async_def, c
 
 // A ParseError at what makes more of a node than one expression: a comma, a comprehension, `=`, `yield`, `*`.
 void CNewerParser::_RequireSingle(const CNode& node) {
-    const bool is_list = node.As<CTestListStarExpr>() || !node.As<CExpression>();
-    if (is_list && ListedCount(node) > 1) _RaiseParseError(node.ChildAt(1).fContext);
-    if (is_list || node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield"))
+    const bool is_leaf = node.fChildren.is_none();  // `...` is no CExpression
+    const bool is_list = node.As<CTestListStarExpr>() || (!is_leaf && !node.As<CExpression>());
+    if (is_list) _RaiseParseError(node.ChildAt(1).fContext);
+    if (node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield"))
         _RaiseParseError(node.fContext);
 }
 
 // A name that is no keyword.
 bool CNewerParser::_IsPlainName(const nb::tuple& toks, Py_ssize_t i) const {
-    return i < TupleSize(toks) && IsName(toks, i) && !DictContains(_fKeywords, TupleItem(toks, i));
+    return i < TupleSize(toks) && IsName(toks, i) && !IsKeyword(TupleItem(toks, i));
 }
 
 void BindNewerParser(nb::module_& module) {

@@ -52,6 +52,7 @@ class CNewerParser : public CPGenParserImpl {
                                Py_ssize_t word_i);
     CNodeRef _ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                                    Py_ssize_t word_i);
+    void _RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i);
     CNodeRef _ParseDecorator(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                              Py_ssize_t at_i);
     bool _FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i);

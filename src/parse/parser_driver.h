@@ -65,6 +65,8 @@ class CPGenParserImpl : public CPGenAnalyzer {
         visit(_fMatchCaseStatementParser);
     }
 
+    bool IsKeyword(nb::handle tok) const { return DictContains(_fKeywords, tok); }
+
     nb::object _fVersionTriple = nb::none();  // the Python version analysed
     bool _fAsyncAlwaysKeyword = false;        // `async` and `await` are keywords everywhere
     CRef<CMatchCaseStatementParser> _fMatchCaseStatementParser;
