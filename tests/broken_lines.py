@@ -104,6 +104,8 @@ def IsBroken(line: str) -> bool:
         before = "try: pass\n"
     elif word.startswith("try"):
         behind = "\nfinally: pass"
+    elif word == "case":
+        before = "match x:\n "
     elif word.startswith("@"):
         behind = "\ndef function(): pass"
     if line.endswith(":"):
