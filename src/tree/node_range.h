@@ -22,7 +22,15 @@ class CNodeRange {
         return CRef<T>(Instance<T>(ListItem(_fList, _fStart + i)));
     }
 
-    CNodeRange First(Py_ssize_t count) const { return CNodeRange(_fList, _fStart, _fStart + count); }
+    CNodeRange First(Py_ssize_t count) const { return Between(0, count); }
+    CNodeRange Between(Py_ssize_t start, Py_ssize_t end) const {
+        return CNodeRange(_fList, _fStart + start, _fStart + end);
+    }
+
+    // True for a range that begins at the same item of the same list.
+    bool BeginsLike(const CNodeRange& other) const {
+        return _fList.is(other._fList) && _fStart == other._fStart;
+    }
 
     nb::list AsList() const { return Size() == 0 ? nb::list() : ListSlice(_fList, _fStart, _fEnd); }
 

@@ -157,11 +157,14 @@ bool CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(std::string& text, 
     const CNodeTextOptions atom_options{options.dotted_name_only, discard_simple_parens,
                                         options.literal_only};
     if (!AppendTextForNode(text, atom, atom_options)) return false;
-    for (Py_ssize_t i = 0; i < trailers.Size(); ++i) {
-        const CRef<CTrailer> trailer = trailers.At<CTrailer>(i);
-        if (!_AppendTrailer(text, *trailer, options)) break;
-    }
+    AppendTextForTrailers(text, trailers, options);
     return true;
+}
+
+void CNodeToTextConverterImpl::AppendTextForTrailers(std::string& text, const CNodeRange& trailers,
+                                                     const CNodeTextOptions& options) {
+    for (Py_ssize_t i = 0; i < trailers.Size(); ++i)
+        if (!_AppendTrailer(text, *trailers.At<CTrailer>(i), options)) return;
 }
 
 // False for a trailer that ends a dotted name.

@@ -63,6 +63,10 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
     virtual bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, const CNodeRange& trailers,
                                                const CNodeTextOptions& options = {});
 
+    // Appends what the trailers behind a text add to it.
+    void AppendTextForTrailers(std::string& text, const CNodeRange& trailers,
+                               const CNodeTextOptions& options = {});
+
     bool _fIncludeBracketText = false;     // what stands in `[...]`, `{...}` and `(...)`
     bool _fIncludeStringContents = false;  // strings of harmless characters as they stand
     bool _fIncludeArgText = false;         // the arguments of a call

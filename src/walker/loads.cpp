@@ -1,6 +1,7 @@
 // Names that are read: alone, in chains, in calls, in comprehensions and decorators.
 #include "analysis/syntax_error.h"
 #include "host/errors.h"
+#include "host/restore.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/symbolinfo/info_bytes.h"
@@ -35,23 +36,25 @@ bool IsStarred(const CArgument& argument) {
 void CNodeWalker::_VisitNameLiteral(CNameLiteral& node, CNodeRef atom_node,
                                     std::optional<CNodeRange> all_trailers, int trailer_i) {
     if (IsValueName(node)) return;
-    nb::object name = node.fText;
-    bool more_follows = false;
-    if (all_trailers) {
-        const Py_ssize_t count = Py_ssize_t{trailer_i} + 1;
-        if (trailer_i >= 0) {
-            std::string text;
-            if (!_fToText->AppendTextForAtomPlusTrailers(text, *atom_node, all_trailers->First(count)))
-                return;
-            name = TextFromUtf8(text);
-        }
-        more_follows = count < all_trailers->Size();
+    const Py_ssize_t count = Py_ssize_t{trailer_i} + 1;
+    const bool more_follows = all_trailers && count < all_trailers->Size();
+    const bool is_load = _fLoadNameContext || more_follows;
+    if (!is_load && !_fStoreWithinSubExpr) return;
+    CTextOrNone name = node.fText;
+    if (all_trailers && trailer_i >= 0) {
+        name = _NameInChain(*atom_node, *all_trailers, count);
+        if (name.is_none()) return;
     }
-    if (_fLoadNameContext || more_follows) {
+    if (is_load) {
         _ProcessLoadName(name);
-    } else if (_fStoreWithinSubExpr) {
+    } else {
         _fNames.AddStore(name, WithinExprEquiv(node));
     }
+}
+
+CTextOrNone CNodeWalker::_NameInChain(CNode& atom, const CNodeRange& trailers, Py_ssize_t count) {
+    if (_fChainText != nullptr && _fChainText->IsOf(atom, trailers)) return _fChainText->UpTo(count);
+    return CChainText(*_fToText, atom, trailers).UpTo(count);
 }
 
 void CNodeWalker::_VisitDottedName(CDottedName& node) {
@@ -83,6 +86,8 @@ void CNodeWalker::_VisitAtomPlusTrailers(CNode& atom_node, const CNodeRange& all
     } else {
         _VisitNode(atom_node);
     }
+    CChainText chain_text(*_fToText, atom_node, all_trailers);
+    const CRestoreOnExit visited(_fChainText, &chain_text);
     for (Py_ssize_t i = 0; i < all_trailers.Size(); ++i) _VisitTrailer(atom_node, all_trailers, i);
 }
 

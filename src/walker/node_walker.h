@@ -21,6 +21,7 @@
 #include "tree/argument_info.h"
 #include "tree/node_classes.h"
 #include "tree/node_to_text.h"
+#include "walker/chain_text.h"
 #include "walker/names_found.h"
 #include "walker/walk_limits.h"
 
@@ -109,6 +110,7 @@ class CNodeWalker : public CHosted {
     // What stands for an instance of a class, or of each class of a tuple, as far as they have names.
     std::vector<CTextOrUtf8> _InstanceNamesFor(CNode& class_or_tuple);
 
+    CTextOrNone _NameInChain(CNode& atom, const CNodeRange& trailers, Py_ssize_t count);
     void _VisitTrailer(CNode& atom_node, const CNodeRange& all_trailers, Py_ssize_t i);
     void _RaiseIfBareGenerator(const CArgument& argument);
     CBytesOrNone _TextForArguments(const CArgumentList& arg_list);
@@ -133,6 +135,7 @@ class CNodeWalker : public CHosted {
     bool _fStoreWithinSubExpr = false;  // below a target: one of a comprehension or a lambda
     // What parentheses that are no tuple's hold. So nested ones are told from a tuple's but once.
     const CNode* _fInnerGrouping = nullptr;
+    CChainText* _fChainText = nullptr;  // of the chain that is being visited
     CNamesFound _fNames;
     CVisitLimits _fVisits;
     int _fRecurseCount = 0;
