@@ -11,6 +11,9 @@ import pytest
 
 from codeloom.check import CheckText
 from codeloom.languages import LANGUAGE_NAMES
+from codeloom.records import FormatRecord, RecordsOfLogical
+from codeloom.treesift import CNewerAnalyzer
+from codeloom.utils import GetLogicalsFromText
 
 ONLY_IN_2_7 = r"""
     print 'a', b
@@ -154,6 +157,27 @@ def test_accepted_from_its_version_on_and_named_before(since, statement, told):
         assert Messages(statement, version) == [], version
     if told:
         assert told in Messages(statement, VERSIONS[first - 1])
+
+
+@pytest.mark.parametrize(
+    ("statement", "records"),
+    [
+        ("def f() -> ...: pass", ["set  f", "arg hint return  ..."]),
+        ("a, b = ..., 1", ["set  a", "set  b", "literal b  int: 1"]),
+        (
+            "isinstance(a, (..., B))",
+            [
+                "is   a  B:",
+                "called isinstance  (a,(..., B))",
+                *map("get  {}".format, ("isinstance", "a", "B")),
+            ],
+        ),
+    ],
+)
+def test_three_dots_are_an_expression(statement, records):
+    (logical,) = GetLogicalsFromText(statement)
+    assert CNewerAnalyzer((3, 14)).AnalyzeSingleLogical(logical, False) is None
+    assert [FormatRecord(record) for record in RecordsOfLogical(logical)] == records
 
 
 @pytest.mark.filterwarnings("ignore")

@@ -63,10 +63,12 @@ CNodeRef CNewerParser::ParseToNode(CLogicalLine& logical, bool in_async_def) {
     _fForms.Raise(logical);
 }
 
-// A star before any expression has a rule of its own in the grammar, since `star_expr` takes less.
+// A star before any expression has a rule of its own in the grammar, since `star_expr` takes less. And `...`
+// is an expression, so that what holds one loses no records.
 nb::list CNewerParser::_BuildClsForStateList() {
     nb::list classes = CPGenParserImpl::_BuildClsForStateList();
     if (_HasSymbol("star_test")) classes[_NumberOfSymbol("star_test")] = nb::type<CStarExpression>();
+    classes[static_cast<int>(kTokenId_ELLIPSIS)] = nb::type<CExpression>();
     return classes;
 }
 
