@@ -1,82 +1,24 @@
 """`codeloom hints`: each def with its arguments, their types, and what it gives back."""
 
-import argparse
 import json
-from abc import ABC, abstractmethod
 from collections.abc import Iterable, Iterator, Mapping
 from dataclasses import asdict
+from typing import ClassVar
 
-from codeloom.cli.command import AddFalseHintsArgument, AddSourceArguments, Command, ExitStatus
-from codeloom.cli.console import Colour, Console, PrintablePath
-from codeloom.cli.files import ReadFiles
+from codeloom.cli.console import Colour, PrintablePath
+from codeloom.cli.item_command import ItemCommand, ItemFormat
 from codeloom.excerpt import Printable
+from codeloom.languages import Language
 from codeloom.signatures import Argument, Signature, SignaturesInBytes, Value
 
 _INDENT = "    "
 _CUT = "..."
 
 
-class HintsCommand(Command):
-    """Prints the signatures of each file."""
-
-    NAME = "hints"
-    HELP = "show each def with the types of its arguments and what it gives back"
-    DESCRIPTION = (
-        "Show each def with its arguments: their types from annotations or comments, their defaults, "
-        "and what `return` and `yield` are known to give. A def that isn't sound stands in its place "
-        "with its fault; other faults are the business of `codeloom check`. The exit status is 0 when "
-        "all defs are sound, 1 when some aren't, 2 on wrong use or when a file can't be read."
-    )
-
-    def __init__(self) -> None:
-        self._fConsole = Console()
-        self._fStatus = ExitStatus.SOUND
-
-    @staticmethod
-    def AddArguments(parser: argparse.ArgumentParser) -> None:
-        """Add the command's own arguments."""
-        AddSourceArguments(parser)
-        AddFalseHintsArgument(parser)
-        parser.add_argument(
-            "--format",
-            choices=FORMATS,
-            default="text",
-            help="text; or jsonl, with an object for each def on a row (default: %(default)s)",
-        )
-
-    def Run(self, arguments: argparse.Namespace) -> ExitStatus:
-        """Print all files; one that can't be read is told, and the others are printed."""
-        hints_format = FORMATS[arguments.format](self._fConsole)
-        for path, data in ReadFiles(arguments.paths, self._OnFailure):
-            for signature in SignaturesInBytes(
-                data, arguments.language, path, false_hints=arguments.false_hints
-            ):
-                hints_format.Add(signature)
-                if signature.problem is not None:
-                    self._fStatus = max(self._fStatus, ExitStatus.PROBLEMS)
-            self._fConsole.Flush()
-        return self._fStatus
-
-    def _OnFailure(self, path: str, error: OSError) -> None:
-        self._fStatus = ExitStatus.FAILURE
-        self._fConsole.PrintFailure(path, error)
-
-
-class HintsFormat(ABC):
-    """Prints signatures one after another."""
-
-    def __init__(self, console: Console) -> None:
-        self._fConsole = console
-
-    @abstractmethod
-    def Add(self, signature: Signature) -> None:
-        """Print one signature."""
-
-
-class TextFormat(HintsFormat):
+class TextFormat(ItemFormat[Signature]):
     """For people: the def's place and names, and below it a row for whatever has a type."""
 
-    def Add(self, signature: Signature) -> None:
+    def Add(self, signature: Signature, /) -> None:
         """Print one signature, or what is wrong with its line."""
         if signature.problem is not None:
             self._fConsole.PrintProblem(signature.problem)
@@ -130,10 +72,10 @@ def _Shown(value: Value) -> str:
     return value.type if value.text is None else f"{value.type} {value.text}"
 
 
-class JsonLinesFormat(HintsFormat):
+class JsonLinesFormat(ItemFormat[Signature]):
     """For programs: an object for each def on a row of its own."""
 
-    def Add(self, signature: Signature) -> None:
+    def Add(self, signature: Signature, /) -> None:
         """The fields of the signature, with its fault as `error`."""
         fields = asdict(signature)
         problem = fields.pop("problem")
@@ -141,4 +83,23 @@ class JsonLinesFormat(HintsFormat):
         self._fConsole.PrintRow(json.dumps(fields))
 
 
-FORMATS: Mapping[str, type[HintsFormat]] = {"text": TextFormat, "jsonl": JsonLinesFormat}
+class HintsCommand(ItemCommand[Signature]):
+    """Prints the signatures of each file."""
+
+    NAME = "hints"
+    HELP = "show each def with the types of its arguments and what it gives back"
+    DESCRIPTION = (
+        "Show each def with its arguments: their types from annotations or comments, their defaults, "
+        "and what `return` and `yield` are known to give. A def that isn't sound stands in its place "
+        "with its fault; other faults are the business of `codeloom check`. The exit status is 0 when "
+        "all defs are sound, 1 when some aren't, 2 on wrong use or when a file can't be read."
+    )
+    FORMATS: ClassVar[Mapping[str, type[ItemFormat[Signature]]]] = {
+        "text": TextFormat,
+        "jsonl": JsonLinesFormat,
+    }
+    FORMAT_HELP = "text; or jsonl, with an object for each def on a row"
+
+    def Items(self, data: bytes, language: Language, path: str, false_hints: bool) -> list[Signature]:
+        """The signatures of a file."""
+        return SignaturesInBytes(data, language, path, false_hints=false_hints)

@@ -1,16 +1,15 @@
 """`codeloom names`: what each logical line reads and binds, and what it says of these names."""
 
-import argparse
+from collections.abc import Iterator
 
-from codeloom.cli.command import AddFalseHintsArgument, AddSourceArguments, Command, ExitStatus
-from codeloom.cli.console import Console
-from codeloom.cli.files import ReadFiles
-from codeloom.cli.names_formats import FORMATS
-from codeloom.line_names import NamesInBytes
+from codeloom.cli import names_formats
+from codeloom.cli.item_command import ItemCommand
+from codeloom.languages import Language
+from codeloom.line_names import LineNames, NamesInBytes
 
 
-class NamesCommand(Command):
-    """Prints the names of each logical line, one file after the other."""
+class NamesCommand(ItemCommand[LineNames]):
+    """Prints the names of each logical line."""
 
     NAME = "names"
     HELP = "show what each logical line reads and binds, and what it says of these names"
@@ -20,34 +19,9 @@ class NamesCommand(Command):
         "fault. The exit status is 0 when all are sound, 1 when some aren't, 2 on wrong use or when "
         "a file can't be read."
     )
+    FORMATS = names_formats.FORMATS
+    FORMAT_HELP = "text; or jsonl, with an object for each record on a row"
 
-    def __init__(self) -> None:
-        self._fConsole = Console()
-        self._fStatus = ExitStatus.SOUND
-
-    @staticmethod
-    def AddArguments(parser: argparse.ArgumentParser) -> None:
-        """Add the command's own arguments."""
-        AddSourceArguments(parser)
-        AddFalseHintsArgument(parser)
-        parser.add_argument(
-            "--format",
-            choices=FORMATS,
-            default="text",
-            help="text; or jsonl, with an object for each record on a row (default: %(default)s)",
-        )
-
-    def Run(self, arguments: argparse.Namespace) -> ExitStatus:
-        """Print all files; one that can't be read is told, and the others are printed."""
-        names_format = FORMATS[arguments.format](self._fConsole)
-        for path, data in ReadFiles(arguments.paths, self._OnFailure):
-            for line in NamesInBytes(data, arguments.language, path, false_hints=arguments.false_hints):
-                names_format.Add(line)
-                if line.problem is not None:
-                    self._fStatus = max(self._fStatus, ExitStatus.PROBLEMS)
-            self._fConsole.Flush()
-        return self._fStatus
-
-    def _OnFailure(self, path: str, error: OSError) -> None:
-        self._fStatus = ExitStatus.FAILURE
-        self._fConsole.PrintFailure(path, error)
+    def Items(self, data: bytes, language: Language, path: str, false_hints: bool) -> Iterator[LineNames]:
+        """The logical lines of a file."""
+        return NamesInBytes(data, language, path, false_hints=false_hints)

@@ -1,13 +1,13 @@
 """The forms in which `codeloom names` prints what lines say of names."""
 
 import json
-from abc import ABC, abstractmethod
 from collections.abc import Iterable, Iterator, Mapping
 from dataclasses import astuple
 from itertools import chain
 from typing import Any
 
 from codeloom.cli.console import Colour, Console, PrintablePath
+from codeloom.cli.item_command import ItemFormat
 from codeloom.cli.names_in_words import Statements
 from codeloom.excerpt import Printable
 from codeloom.line_names import LineNames, PlacedRecord
@@ -17,25 +17,14 @@ _LABEL_WIDTH = 9
 _CUT = "..."
 
 
-class NamesFormat(ABC):
-    """Prints lines one after another."""
-
-    def __init__(self, console: Console) -> None:
-        self._fConsole = console
-
-    @abstractmethod
-    def Add(self, line: LineNames) -> None:
-        """Print one line."""
-
-
-class TextFormat(NamesFormat):
+class TextFormat(ItemFormat[LineNames]):
     """For people: the line's place and first row, and what it does with names below."""
 
     def __init__(self, console: Console) -> None:
         super().__init__(console)
         self._fRoom = console.width - _LABEL_WIDTH
 
-    def Add(self, line: LineNames) -> None:
+    def Add(self, line: LineNames, /) -> None:
         """Print one line, unless it says nothing."""
         if line.problem is not None:
             self._fConsole.PrintProblem(line.problem)
@@ -72,10 +61,10 @@ class TextFormat(NamesFormat):
         return text if len(text) <= self._fRoom else text[: self._fRoom - len(_CUT)] + _CUT
 
 
-class JsonLinesFormat(NamesFormat):
+class JsonLinesFormat(ItemFormat[LineNames]):
     """For programs: an object for each record on a row of its own."""
 
-    def Add(self, line: LineNames) -> None:
+    def Add(self, line: LineNames, /) -> None:
         """The line's records, or what is wrong with it; limits go to the standard error."""
         for placed in line.records:
             self._fConsole.PrintRow(json.dumps(_Fields(line, placed)))
@@ -85,7 +74,7 @@ class JsonLinesFormat(NamesFormat):
             self._fConsole.PrintError(f"{PrintablePath(line.path)}:{line.row}: {limit}")
 
 
-FORMATS: Mapping[str, type[NamesFormat]] = {"text": TextFormat, "jsonl": JsonLinesFormat}
+FORMATS: Mapping[str, type[ItemFormat[LineNames]]] = {"text": TextFormat, "jsonl": JsonLinesFormat}
 
 
 def _Fields(line: LineNames, placed: PlacedRecord) -> dict[str, Any]:
