@@ -9,12 +9,12 @@ void CDispatchTable::Set(nb::object dict, std::vector<CNativeVisit> native_visit
 }
 
 void CDispatchTable::_Forget() {
-    _fEntries.fill(CEntry());
+    _fEntries.Clear();
     _fVersion = DictVersion(_fDict);
 }
 
 CDispatchTable::CEntry CDispatchTable::_Read(nb::handle node_class) const {
-    CEntry entry{node_class.ptr(), EAction::kVisitChildren, nullptr, nb::handle()};
+    CEntry entry;
     const nb::object visit = FindInDict(_fDict, node_class);
     if (!visit.is_valid() || visit.is_none()) return entry;
     entry.action = visit.is(Py_False) ? EAction::kSkip : EAction::kCallHost;

@@ -4,13 +4,13 @@
 //   keeps  one entry for each class that was asked for, until the dictionary changes
 #pragma once
 
-#include <array>
 #include <cstdint>
 #include <vector>
 
 #include <nanobind/nanobind.h>
 
 #include "host/collections.h"
+#include "tree/class_cache.h"
 #include "tree/node.h"
 
 namespace codeloom {
@@ -32,7 +32,6 @@ class CDispatchTable {
     enum class EAction : uint8_t { kVisitChildren, kSkip, kCallNative, kCallHost };
 
     struct CEntry {
-        PyObject* node_class = nullptr;  // for comparison only
         EAction action = EAction::kVisitChildren;
         CNativeVisit::Function function = nullptr;
         nb::handle callable;  // the dictionary holds it
@@ -44,9 +43,8 @@ class CDispatchTable {
     // Good until host code runs.
     const CEntry& Find(nb::handle node_class) {
         if (_fVersion != DictVersion(_fDict)) _Forget();
-        CEntry& entry = _fEntries[_Slot(node_class)];
-        if (entry.node_class != node_class.ptr()) entry = _Read(node_class);
-        return entry;
+        const CEntry* const entry = _fEntries.Find(node_class);
+        return entry != nullptr ? *entry : _fEntries.Put(node_class, _Read(node_class));
     }
 
     const nb::object& Dict() const { return _fDict; }
@@ -58,21 +56,13 @@ class CDispatchTable {
     }
 
   private:
-    static constexpr size_t kSlotBits = 6;
-
-    static size_t _Slot(nb::handle node_class) {
-        constexpr uint64_t kSpread = 0x9E3779B97F4A7C15;
-        return static_cast<size_t>((reinterpret_cast<uintptr_t>(node_class.ptr()) * kSpread) >>
-                                   (64 - kSlotBits));
-    }
-
     void _Forget();
     CEntry _Read(nb::handle node_class) const;
 
     nb::object _fDict = nb::none();
     std::vector<CNativeVisit> _fNativeVisits;
-    uint64_t _fVersion = 0;  // of the dictionary that the entries were read from
-    std::array<CEntry, size_t{1} << kSlotBits> _fEntries{};
+    uint64_t _fVersion = 0;            // of the dictionary that the entries were read from
+    CClassCache<CEntry, 6> _fEntries;  // a class that went and came back has no other answer
 };
 
 }  // namespace codeloom

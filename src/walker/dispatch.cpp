@@ -1,7 +1,6 @@
 #include "walker/dispatch.h"
 
-#include <array>
-#include <cstdint>
+#include "tree/class_cache.h"
 
 namespace codeloom {
 
@@ -75,41 +74,15 @@ CVisit FirstMatch(const CNode& node) {
     return &VisitAny;
 }
 
-// Native classes live as long as the process, so their addresses may be keys. It never grows beyond the
-// number of these classes, a third of its size.
-class CVisitByClass {
-  public:
-    CVisit Find(const CNode& node) {
-        const nb::handle type = node.Self().type();
-        CEntry& entry = _EntryOf(type.ptr());
-        if (entry.type == type.ptr()) return entry.visit;
-        const CVisit visit = FirstMatch(node);
-        if (!nb::inst_python_derived(node.Self())) entry = {type.ptr(), visit};
-        return visit;
-    }
-
-  private:
-    struct CEntry {
-        const void* type = nullptr;
-        CVisit visit = nullptr;
-    };
-
-    // The entry of a class, or the free one that it would take.
-    CEntry& _EntryOf(const void* type) {
-        size_t i = (reinterpret_cast<uintptr_t>(type) * 0x9E3779B97F4A7C15U) >> (64 - kSizeBits);
-        while (_fEntries[i].type != nullptr && _fEntries[i].type != type) i = (i + 1) % _fEntries.size();
-        return _fEntries[i];
-    }
-
-    static constexpr int kSizeBits = 8;
-    std::array<CEntry, size_t{1} << kSizeBits> _fEntries;
-};
-
 }  // namespace
 
 CVisit VisitFor(const CNode& node) {
-    static CVisitByClass visits;
-    return visits.Find(node);
+    static CClassCache<CVisit, 8> visits;
+    const nb::handle node_class = node.Self().type();
+    if (const CVisit* const visit = visits.Find(node_class)) return *visit;
+    const CVisit visit = FirstMatch(node);
+    // Native classes live as long as the process.
+    return nb::inst_python_derived(node.Self()) ? visit : visits.Put(node_class, visit);
 }
 
 }  // namespace codeloom
