@@ -19,9 +19,9 @@ inline bool TextIs(nb::handle candidate, std::string_view constant) {
 }
 
 // True when `candidate` equals one of the constants.
-template <class... Constants>
-bool TextIsOneOf(nb::handle candidate, const Constants&... constants) {
-    return (TextIs(candidate, constants) || ...);
+template <size_t... sizes>
+bool TextIsOneOf(nb::handle candidate, const char (&... constants)[sizes]) {
+    return (TextIs(candidate, std::string_view(constants, sizes - 1)) || ...);
 }
 
 }  // namespace codeloom
