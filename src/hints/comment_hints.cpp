@@ -116,7 +116,7 @@ CNodeRef CTypeHintWalker::_ParseHint(nb::str hint, Py_ssize_t tok_i, bool call_g
     const nb::object logicals = kGetLogicalsFromText(hint);
     if (nb::len(logicals) != 1) return CNodeRef();
     const CRef<CLogicalLine> logical(Instance<CLogicalLine>(nb::object(logicals[0])));
-    const CNodeRef node = _Parsed(
+    CNodeRef node = _Parsed(
         tok_i, [&] { return _fHintParser->ParseToNode(*logical, false); },
         [&](Py_ssize_t context) {  // an invented token stands for the last real one
             return ColumnOf(*logical, std::min<Py_ssize_t>(context, logical->fTokenCount - 1));

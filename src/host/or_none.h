@@ -11,7 +11,8 @@ namespace codeloom {
 template <class Kind>
 class TOrNone : public nb::object {
   public:
-    static constexpr auto Name = Kind::Name + nb::detail::const_name(" | None");
+    static constexpr auto Name =
+        Kind::Name + nb::detail::const_name(" | None");  // NOLINT: the binding wants the name
 
     TOrNone() : nb::object(nb::none()) {}
     TOrNone(nb::object value) : nb::object(std::move(value)) {}
@@ -24,7 +25,7 @@ class TOrNone : public nb::object {
 // A text string, or its UTF-8 form as a byte string.
 class CTextOrUtf8 : public nb::object {
   public:
-    static constexpr auto Name = nb::detail::const_name("str | bytes");
+    static constexpr auto Name = nb::detail::const_name("str | bytes");  // NOLINT: likewise
 
     CTextOrUtf8() = default;
     CTextOrUtf8(nb::handle value) : nb::object(nb::borrow<nb::object>(value)) {}

@@ -11,7 +11,7 @@
 namespace nanobind::detail {
 
 template <class Struct, class First, class Second>
-struct pair_caster {
+struct pair_caster {  // NOLINT: named as the others of its kind are
     NB_TYPE_CASTER(Struct, (make_caster<std::pair<First, Second>>::Name))
 
     bool from_python(handle source, uint32_t flags, cleanup_list* cleanup) noexcept {

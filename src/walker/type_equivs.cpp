@@ -131,7 +131,7 @@ CBytesOrNone CNodeWalker::_EquivForNumber(CNumberLiteral& number, std::string_vi
 }
 
 CBytesOrNone CNodeWalker::_EquivForString(CStringLiteral& literal) {
-    const CBytesOrNone instance_name = _InstanceNameForString(literal);
+    CBytesOrNone instance_name = _InstanceNameForString(literal);
     if (!_fIncludeExprText) return instance_name;
     std::string storage;
     const CUtf8 text(literal.fText);
