@@ -7,14 +7,11 @@ tree. Run it with `make bench`.
     python benchmarks/bench_hints.py [--files N] [--rounds N]
 """
 
-import argparse
 import io
 import logging
-import statistics
-from collections.abc import Callable
 from contextlib import redirect_stdout
 
-from bench_analyze import ANALYZER, Analyze, Corpus, Time
+from measuring import ANALYZER, Analyze, Corpus, Options, Quietly, Ratio, Unmark
 
 from codeloom.logicalline import CLogicalLine, kComment
 from codeloom.treesift import CDispatchWalker, CExprStmt, CForStmt, CFuncdefStmt, CNode, CWithStmt
@@ -47,17 +44,8 @@ def Walk(walker: CDispatchWalker, lines: Lines) -> None:
         walk(tree, logical, False)
 
 
-def Ratio(name: str, ours: Callable[[], object], other: Callable[[], object], rounds: int) -> None:
-    """Print how many times as long as `other` `ours` takes: the median of pairs timed in turn."""
-    ratios = [Time(ours) / Time(other) for _ in range(rounds)]
-    print(f"{name:64} {statistics.median(ratios):6.2f}  ({min(ratios):.2f} to {max(ratios):.2f})")
-
-
 def main() -> None:
-    parser = argparse.ArgumentParser(description=__doc__.splitlines()[0])
-    parser.add_argument("--files", type=int, default=60)
-    parser.add_argument("--rounds", type=int, default=9)
-    options = parser.parse_args()
+    options = Options(__doc__, files=60, rounds=9)
     logging.disable()
     rounds = options.rounds
     texts = Corpus(options.files)
@@ -67,17 +55,12 @@ def main() -> None:
     logicals = [logical for _, logical in lines]
     print(f"{len(texts)} files, {len(lines)} lines; how many times as long, median (lowest to highest)")
 
-    def Again() -> None:
-        for logical in logicals:
-            logical.MarkParsed(False)
-
-    ratios = []
-    with redirect_stdout(io.StringIO()):
-        for _ in range(rounds):
-            Again()
-            ratios.append(Time(lambda: Walk(WALKER, lines)) / Time(lambda: Analyze(logicals)))
-    print(
-        f"{'the walk for hints, against the whole analysis of its lines':64} {statistics.median(ratios):6.2f}"
+    Ratio(
+        "the walk for hints, against the whole analysis of its lines",
+        Quietly(lambda: Walk(WALKER, lines)),
+        Quietly(lambda: Analyze(logicals)),
+        rounds,
+        before=lambda: Unmark(logicals),
     )
     with redirect_stdout(io.StringIO()):
         Walk(WALKER, plain)

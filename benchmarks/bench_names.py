@@ -5,17 +5,10 @@ Every figure is a ratio of two things timed in turn in one run on the same text.
     python benchmarks/bench_names.py [--files N] [--rounds N]
 """
 
-import argparse
 import ast
-import io
-import statistics
 import symtable
-from collections.abc import Callable
-from contextlib import redirect_stdout
 
-from bench_analyze import Analyze, Corpus, Time
-
-from codeloom.utils import GetLogicalsFromText
+from measuring import LibraryWork, Options, Quietly, Ratio
 
 
 class NameCollector(ast.NodeVisitor):
@@ -51,67 +44,27 @@ class NameCollector(ast.NodeVisitor):
 
 
 def main() -> None:
-    parser = argparse.ArgumentParser(description=__doc__.splitlines()[0])
-    parser.add_argument("--files", type=int, default=150)
-    parser.add_argument("--rounds", type=int, default=7)
-    options = parser.parse_args()
-    texts = Corpus(options.files)
-    print(f"{len(texts)} files; times faster than the peer, median (lowest to highest)")
-
-    def Parse() -> None:
-        for text in texts:
-            ast.parse(text)
+    options = Options(__doc__, files=150, rounds=7)
+    work = LibraryWork(options.files)
+    print(f"{len(work.texts)} files; times faster than the peer, median (lowest to highest)")
 
     def ParseAndCollect() -> None:
-        for text in texts:
+        for text in work.texts:
             NameCollector().visit(ast.parse(text))
 
     def MakeSymbolTables() -> None:
-        for text in texts:
+        for text in work.texts:
             symtable.symtable(text, "<string>", "exec")
 
-    def FromText() -> None:
-        for text in texts:
-            Analyze(GetLogicalsFromText(text))
-
-    prepared = [GetLogicalsFromText(text) for text in texts]
-
-    def Unmark() -> None:
-        for logicals in prepared:
-            for logical in logicals:
-                logical.MarkParsed(False)
-                logical.ClearDerivedInfo()
-
-    def FromLogicals() -> None:
-        for logicals in prepared:
-            Analyze(logicals)
-
-    def Ratio(name: str, peer: Callable[[], None], ours: Callable[[], None]) -> None:
-        ratios = []
-        for _ in range(options.rounds):
-            Unmark()
-            ratios.append(Time(peer) / Time(ours))
-        print(f"{name:58} {statistics.median(ratios):6.2f}  ({min(ratios):.2f} to {max(ratios):.2f})")
-
-    limits = io.StringIO()
-    with redirect_stdout(limits):
-        FromText()  # fills the free lists
-    told = len(limits.getvalue().splitlines())
-    print(f"{told} walks hit a limit in the whole of it")
-
-    def Quietly(action: Callable[[], None]) -> Callable[[], None]:
-        def Run() -> None:
-            with redirect_stdout(limits):
-                action()
-
-        return Run
-
-    from_logicals, from_text = Quietly(FromLogicals), Quietly(FromText)
-    Ratio("prepared logicals to records, against ast.parse", Parse, from_logicals)
-    Ratio("  the same, against ast.parse and a visitor", ParseAndCollect, from_logicals)
-    Ratio("text to records, against ast.parse", Parse, from_text)
-    Ratio("  the same, against ast.parse and a visitor", ParseAndCollect, from_text)
-    Ratio("  the same, against symtable.symtable", MakeSymbolTables, from_text)
+    from_logicals, from_text = Quietly(work.AnalyzePrepared), Quietly(work.AnalyzeTexts)
+    for name, peer, ours in [
+        ("prepared logicals to records, against ast.parse", work.Parse, from_logicals),
+        ("  the same, against ast.parse and a visitor", ParseAndCollect, from_logicals),
+        ("text to records, against ast.parse", work.Parse, from_text),
+        ("  the same, against ast.parse and a visitor", ParseAndCollect, from_text),
+        ("  the same, against symtable.symtable", MakeSymbolTables, from_text),
+    ]:
+        Ratio(name, peer, ours, options.rounds, before=work.Prepare)
 
 
 if __name__ == "__main__":
