@@ -95,6 +95,7 @@ NEW_IN = {
     match a:\n  case *a, b: c\n  case (): d\n  case a,: e  #! `match` needs Python 3.10
     match a:\n  case 'b' 'c': d\n  case {'b' r'c': 'd' 'e' | 'f'}: g  #! `match` needs Python 3.10
     match a:\n  case A(b, c=[d, *_]) | {1: -2j, **e} as f if g: h  #! `match` needs Python 3.10
+    match a:\n  case b if lambda c=lambda: 1, *d: c: e  #! `match` needs Python 3.10
     a[b := c]  #! `:=` without brackets of its own in a subscript needs Python 3.10
     a[b := c, d]  #! `:=` without brackets of its own in a subscript needs Python 3.10
     """,

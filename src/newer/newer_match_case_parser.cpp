@@ -58,6 +58,20 @@ CNodeRef CNewerMatchCaseParser::_ParseCaseStmtImpl() {
     });
 }
 
+// `case x if lambda: 1:`, each lambda of a guard has a colon of its own.
+Py_ssize_t CNewerMatchCaseParser::_FindCaseColon() {
+    int lambda_count = 0;
+    Py_ssize_t start_i = kPatternIndex;
+    for (;;) {
+        const Py_ssize_t colon_i = _Find(":", start_i, _TokCount());
+        if (colon_i == -1) return -1;
+        for (Py_ssize_t i = _Find("lambda", start_i, colon_i); i != -1; i = _Find("lambda", i + 1, colon_i))
+            ++lambda_count;
+        if (lambda_count-- == 0) return colon_i;
+        start_i = colon_i + 1;
+    }
+}
+
 CNodeRef CNewerMatchCaseParser::_NodeForPattern(Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as) {
     const CRecursionScope recursion;  // for overrides, which call one another
     CPatternWork work;

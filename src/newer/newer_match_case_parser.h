@@ -28,6 +28,9 @@ class CNewerMatchCaseParser : public CMatchCaseStatementParser {
         visit(_fLinePositions);
     }
 
+  protected:
+    Py_ssize_t _FindCaseColon() override;
+
   private:
     void _RefuseWhatNoPatternIs(const CPatternStep& step);
     void _RefuseKeyword(Py_ssize_t tok_i);

@@ -106,7 +106,7 @@ CNodeRef CMatchCaseStatementParser::_CaseStmt(
     const std::function<CNodeRef(Py_ssize_t start_i, Py_ssize_t end_i)>& parse_range) {
     if (!_IsStatementOfType(gLogicalTypes.kCase)) return CNodeRef();
     const Py_ssize_t count = _TokCount();
-    const Py_ssize_t colon_i = _Find(":", 1, count);
+    const Py_ssize_t colon_i = _FindCaseColon();
     if (colon_i == -1) return CNodeRef();
     const Py_ssize_t if_i = _Find("if", 1, colon_i);
     const CNodeRef pattern = _NodeForPattern(1, if_i == -1 ? colon_i : if_i);
@@ -116,6 +116,10 @@ CNodeRef CMatchCaseStatementParser::_CaseStmt(
     children.push_back(_TokNode(colon_i));
     if (colon_i + 1 < count) children.push_back(parse_range(colon_i + 1, count));
     return NewPseudoNode<CCaseStmt>(children);
+}
+
+Py_ssize_t CMatchCaseStatementParser::_FindCaseColon() {
+    return _Find(":", 1, _TokCount());
 }
 
 CNodeRef CMatchCaseStatementParser::_TokNode(Py_ssize_t tok_i) {

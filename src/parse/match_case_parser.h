@@ -68,6 +68,8 @@ class CMatchCaseStatementParser : public CHosted {
 
     // Plans the patterns in [start_i, end_i) with the commas between them.
     void _PlanPatterns(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    // Where the header of a `case` ends; -1 when it doesn't.
+    virtual Py_ssize_t _FindCaseColon();
     // The node that the steps which are left lead to.
     CNodeRef _Finish(CPatternWork& work);
 
