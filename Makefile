@@ -28,7 +28,7 @@ $(STAMP): $(SOURCES) $(VENV)/.tools
 	touch $@
 
 run: build
-	@$(BIN)/codeloom check examples || true
+	@$(BIN)/codeloom check --python 3.14 examples || true
 	@$(BIN)/codeloom check $(STDLIB) | tail -n 1
 
 test: build
