@@ -5,9 +5,8 @@ from dataclasses import dataclass
 from os import PathLike, fspath
 from pathlib import Path
 
-from codeloom.engine import Analysis, AnalyzerOf, Complaint, ComplaintOf, IsSpoiled
+from codeloom.engine import Analysis, Complaint, ComplaintOf, IsSpoiled, LineAnalyzer
 from codeloom.excerpt import Excerpt
-from codeloom.false_hints import FalseHintRemover
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.line_length import TooLong
 from codeloom.logicalline import CLogicalLine
@@ -77,7 +76,7 @@ def CheckBytes(data: bytes, language: Language | str, path: str, *, false_hints:
 def _Check(source: Source, language: Language | str, path: str, false_hints: bool) -> Report:
     language = LanguageOf(source.text, language)
     logicals = GetLogicalsFromText(source.text)
-    complaints = _Complaints(logicals, source, language, FalseHintRemover(source.text, keep=false_hints))
+    complaints = _Complaints(logicals, source, LineAnalyzer(source.text, language, false_hints))
     if not complaints and not source.faults:
         return Report((), len(logicals))
     found = [(fault.row, fault.column, fault.message) for fault in source.faults]
@@ -91,11 +90,8 @@ def _Check(source: Source, language: Language | str, path: str, false_hints: boo
     return Report(problems, len(logicals))
 
 
-def _Complaints(
-    logicals: Iterable[CLogicalLine], source: Source, language: Language, false_hints: FalseHintRemover
-) -> list[Complaint]:
+def _Complaints(logicals: Iterable[CLogicalLine], source: Source, analyzer: LineAnalyzer) -> list[Complaint]:
     """What is wrong with logical lines, false hints and unreadable places apart."""
-    analyze = AnalyzerOf(language).AnalyzeSingleLogical
     complaints = []
     with Analysis():
         for logical in logicals:
@@ -103,8 +99,7 @@ def _Complaints(
             if too_long is not None:
                 complaints.append(too_long)
                 continue
-            plain = false_hints.Without(logical) or logical
-            error = analyze(plain, logical.fInAsyncDef, logical.fFirstInDef)
+            plain, error = analyzer.Analyze(logical)
             if error is not None and not IsSpoiled(logical, source.spoiled_rows):
                 complaints.append(ComplaintOf(error, plain))
     return complaints

@@ -8,6 +8,7 @@ from io import StringIO
 from typing import NamedTuple
 
 from codeloom import logicalline
+from codeloom.false_hints import FalseHintRemover
 from codeloom.languages import Language
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
@@ -52,6 +53,22 @@ def Analysis() -> Iterator[StringIO]:
     """
     with _gLock, redirect_stdout(StringIO()) as printed:
         yield printed
+
+
+class LineAnalyzer:
+    """Analyses the lines of one text without its false hints. Use it within `Analysis` only.
+
+    With `false_hints` they stay, and all is as the engine itself sees it.
+    """
+
+    def __init__(self, text: str, language: Language, false_hints: bool) -> None:
+        self._fAnalyze = AnalyzerOf(language).AnalyzeSingleLogical
+        self._fFalseHints = FalseHintRemover(text, keep=false_hints)
+
+    def Analyze(self, logical: CLogicalLine) -> tuple[CLogicalLine, SyntaxError | None]:
+        """The line as it was analysed, which has the records, and what is wrong with it."""
+        plain = self._fFalseHints.Without(logical) or logical
+        return plain, self._fAnalyze(plain, logical.fInAsyncDef, logical.fFirstInDef)
 
 
 def ComplaintOf(error: SyntaxError, logical: CLogicalLine) -> Complaint:

@@ -14,10 +14,10 @@ from functools import cached_property
 from codeloom import logicalline
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
+from codeloom.source import RowTexts
 
 _MARK = "type:"
 _BLANKS = " " * len(_MARK)
-_ROW_END = re.compile(r"\r\n|\r|\n")
 
 _OPERATORS = r"(?:and|or|not|in|is|if|else)\b"
 
@@ -84,7 +84,7 @@ class FalseHintRemover:
         """The rows that hold the mark of a hint."""
         if _MARK not in self._fText:
             return []
-        return [row for row, text in enumerate(_ROW_END.split(self._fText)) if _MARK in text]
+        return [row for row, text in enumerate(RowTexts(self._fText)) if _MARK in text]
 
     def _HasMark(self, logical: CLogicalLine) -> bool:
         """True when a row of the line holds the mark; most lines are told apart without a look at them."""

@@ -9,16 +9,14 @@ from pathlib import Path
 
 from codeloom import logicalline
 from codeloom.check import Problem
-from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf
-from codeloom.false_hints import FalseHintRemover
+from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, LineAnalyzer
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
-from codeloom.line_length import TooLong
-from codeloom.line_reader import LineReader, RowsOf, RowTexts
+from codeloom.line_reader import LineReader
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
 from codeloom.name_places import NamePlaces, PlaceFinder, Tokens
 from codeloom.records import CRecord, RecordsOfLogical
-from codeloom.source import Source, SourceFromBytes, SourceFromText
+from codeloom.source import RowTexts, Source, SourceFromBytes, SourceFromText
 from codeloom.utils import GetLogicalsFromText
 
 
@@ -96,7 +94,7 @@ def NamesInBytes(
 
 def _Names(source: Source, language: Language | str, path: str, false_hints: bool) -> Iterator[LineNames]:
     language = LanguageOf(source.text, language)
-    reader = _NameReader(source, language, path, FalseHintRemover(source.text, keep=false_hints))
+    reader = _NameReader(source, language, path, false_hints)
     return map(reader.Read, GetLogicalsFromText(source.text))
 
 
@@ -108,19 +106,16 @@ def _PlaceFinderOf(language: Language) -> PlaceFinder:
 class _NameReader(LineReader):
     """Analyses the logical lines of one text."""
 
-    def __init__(self, source: Source, language: Language, path: str, false_hints: FalseHintRemover) -> None:
+    def __init__(self, source: Source, language: Language, path: str, false_hints: bool) -> None:
         super().__init__(source, path)
-        self._fFalseHints = false_hints
+        self._fAnalyzer = LineAnalyzer(source.text, language, false_hints)
         self._fLanguage = language
 
     def Read(self, logical: CLogicalLine) -> LineNames:
         """The names in a line, or what is wrong with it."""
         origin = logical.fFirstLine, 0
         head = self._fPath, *self._FirstPlace(logical, origin), TextFromTokens(logical).lstrip()
-        problem = self._Fault(RowsOf(logical, origin[0]))
-        if problem is None:
-            too_long = TooLong(logical)
-            problem = too_long and self._Problem(too_long)
+        problem = self._Hindrance(logical, logical.fFirstLine)
         if problem is not None:
             return LineNames(*head, problem=problem)
         with Analysis() as printed:
@@ -129,9 +124,7 @@ class _NameReader(LineReader):
     def _Analyzed(
         self, head: tuple[str, int, int, str], logical: CLogicalLine, printed: StringIO
     ) -> LineNames:
-        plain = self._fFalseHints.Without(logical) or logical
-        analyzer = AnalyzerOf(self._fLanguage)
-        error = analyzer.AnalyzeSingleLogical(plain, logical.fInAsyncDef, logical.fFirstInDef)
+        plain, error = self._fAnalyzer.Analyze(logical)
         if error is not None:
             return LineNames(*head, problem=self._Problem(ComplaintOf(error, plain)))
         records = RecordsOfLogical(plain)

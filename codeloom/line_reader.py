@@ -1,13 +1,10 @@
 """What readers of single lines share: the rows a line stands on, its places in the file, faults there."""
 
-import re
-
 from codeloom.check import Problem
 from codeloom.engine import Complaint
+from codeloom.line_length import TooLong
 from codeloom.logicalline import CLogicalLine
-from codeloom.source import RowMap, Source
-
-_ROW_END = re.compile(r"\r\n|\r|\n")
+from codeloom.source import RowMap, RowTexts, Source
 
 
 class LineReader:
@@ -17,6 +14,14 @@ class LineReader:
         self._fPath = path
         self._fFaults = source.faults
         self._fRowMap = RowMap(source.text)
+
+    def _Hindrance(self, logical: CLogicalLine, first_row: int) -> Problem | None:
+        """Why a logical that begins on a row, counted from zero, can't be handed to the engine."""
+        problem = self._Fault(RowsOf(logical, first_row))
+        if problem is not None:
+            return problem
+        too_long = TooLong(logical)
+        return too_long and self._Problem(too_long)
 
     def _Fault(self, rows: range) -> Problem | None:
         """What can't be read on these rows, which count from zero."""
@@ -47,11 +52,6 @@ def RowsOf(logical: CLogicalLine, first_row: int) -> range:
         return range(first_row, first_row)
     last_row = logical.fPositions[-1][0] + len(RowTexts(logical.fToks[-1]))
     return range(first_row + logical.fPositions[0][0], first_row + last_row)
-
-
-def RowTexts(text: str) -> list[str]:
-    """The rows of a text, without their ends."""
-    return _ROW_END.split(text)
 
 
 def CountRows(text: str) -> int:

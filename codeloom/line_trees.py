@@ -7,7 +7,6 @@ from codeloom import logicalline
 from codeloom.check import Problem
 from codeloom.engine import NewParser
 from codeloom.languages import Language, LanguageOf
-from codeloom.line_length import TooLong
 from codeloom.line_reader import LineReader, RowsOf
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
@@ -56,7 +55,7 @@ class _TreeReader(LineReader):
 
     def Read(self, logical: CLogicalLine, origin: tuple[int, int], in_async_def: bool) -> LineTree:
         """The tree of a logical whose text begins at `origin`: row and UTF-8 column, from zero."""
-        tree, problem = None, self._Fault(RowsOf(logical, origin[0])) or self._TooLong(logical)
+        tree, problem = None, self._Hindrance(logical, origin[0])
         if problem is None:
             try:
                 tree = self._fParser.ParseToNode(logical, in_async_def)
@@ -67,10 +66,6 @@ class _TreeReader(LineReader):
                 problem = self._Refusal(error, origin)
         row, column = self._FirstPlace(logical, origin)
         return LineTree(self._fPath, row, column, TextFromTokens(logical).lstrip(), tree, problem)
-
-    def _TooLong(self, logical: CLogicalLine) -> Problem | None:
-        complaint = TooLong(logical)
-        return complaint and self._Problem(complaint)
 
     def _Refusal(self, error: SyntaxError, origin: tuple[int, int]) -> Problem:
         assert error.lineno is not None and error.offset is not None

@@ -177,9 +177,11 @@ class PlaceFinder(CNodeWalker):
 
     def _VisitDottedName(self, node: CDottedName) -> None:
         children = node.fChildren
-        for child in children[::2]:
-            name = "".join(part.fText for part in children[: children.index(child) + 1])
-            self._fLoads.setdefault(name, self._TokensOf(node, child))
+        name = ""
+        for i, child in enumerate(children):
+            name += child.fText
+            if i % 2 == 0:
+                self._fLoads.setdefault(name, self._TokensOf(node, child))
         super()._VisitDottedName(node)
 
     def _ProcessLoadName(self, name: str | None) -> None:

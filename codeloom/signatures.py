@@ -9,11 +9,10 @@ from typing import Any
 
 from codeloom import logicalline
 from codeloom.check import Problem
-from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf
-from codeloom.false_hints import FalseHintRemover
+from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, LineAnalyzer
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.line_length import TooLong
-from codeloom.line_reader import LineReader, RowsOf
+from codeloom.line_reader import LineReader
 from codeloom.logicalline import CLogicalLine
 from codeloom.records import CRecord, RecordsOfLogical
 from codeloom.source import Source, SourceFromBytes, SourceFromText
@@ -105,7 +104,7 @@ def SignaturesInBytes(
 
 def _Signatures(source: Source, language: Language | str, path: str, false_hints: bool) -> list[Signature]:
     language = LanguageOf(source.text, language)
-    reader = _SignatureReader(source, language, path, FalseHintRemover(source.text, keep=false_hints))
+    reader = _SignatureReader(source, language, path, false_hints)
     with Analysis():
         for logical in GetLogicalsFromText(source.text):
             reader.Read(logical)
@@ -130,10 +129,10 @@ class _Outcomes:
 class _SignatureReader(LineReader):
     """Reads the logical lines of one text in their order."""
 
-    def __init__(self, source: Source, language: Language, path: str, false_hints: FalseHintRemover) -> None:
+    def __init__(self, source: Source, language: Language, path: str, false_hints: bool) -> None:
         super().__init__(source, path)
-        self._fAnalyzer = AnalyzerOf(language)
-        self._fFalseHints = false_hints
+        self._fAnalyzer = LineAnalyzer(source.text, language, false_hints)
+        self._fParse = AnalyzerOf(language).ParseToNode
         self._fSignatures: list[Signature] = []
         self._fOutcomes: list[_Outcomes] = []
         self._fScopes: list[_Scope] = []
@@ -187,10 +186,7 @@ class _SignatureReader(LineReader):
             self._fPath, row, column, ".".join(scope.name for scope in self._fScopes),
             is_async=logical.fToks[0] == "async",
         )  # fmt: skip
-        problem = self._Fault(RowsOf(logical, logical.fFirstLine))
-        too_long = TooLong(logical)
-        if problem is None and too_long is not None:
-            problem = self._Problem(too_long)
+        problem = self._Hindrance(logical, logical.fFirstLine)
         self._fOutcomes.append(_Outcomes())
         self._fSignatures.append(
             self._Analyzed(signature, logical, is_method)
@@ -199,11 +195,10 @@ class _SignatureReader(LineReader):
         )
 
     def _Analyzed(self, signature: Signature, logical: CLogicalLine, is_method: bool) -> Signature:
-        plain = self._fFalseHints.Without(logical) or logical
-        error = self._fAnalyzer.AnalyzeSingleLogical(plain, logical.fInAsyncDef, logical.fFirstInDef)
+        plain, error = self._fAnalyzer.Analyze(logical)
         if error is not None:
             return replace(signature, problem=self._Problem(ComplaintOf(error, plain)))
-        tree = self._fAnalyzer.ParseToNode(plain, logical.fInAsyncDef)
+        tree = self._fParse(plain, logical.fInAsyncDef)
         if tree is None:
             return signature
         may_lack_self = is_method and _HasFunctionHint(plain)
@@ -216,8 +211,8 @@ class _SignatureReader(LineReader):
         scope = self._fScopes[-1]
         if scope.of_def is None:
             return
-        plain = self._fFalseHints.Without(logical) or logical
-        if self._fAnalyzer.AnalyzeSingleLogical(plain, logical.fInAsyncDef, logical.fFirstInDef) is not None:
+        plain, error = self._fAnalyzer.Analyze(logical)
+        if error is not None:
             return
         records = RecordsOfLogical(plain)
         if logical.fType == logicalline.kComment:

@@ -51,6 +51,11 @@ class Source:
     spoiled_rows: frozenset[int] = frozenset()
 
 
+def RowTexts(text: str) -> list[str]:
+    """The rows of a text, without their ends."""
+    return _ROW_END_IN_TEXT.split(text)
+
+
 class RowMap:
     """The rows of a text, counted from zero. They end at LF, CR LF and CR, and at nothing else."""
 
@@ -159,7 +164,7 @@ def _WithoutUnusable(text: str, encoding: _Encoding | None) -> Source:
     if "\0" not in text and _IsEncodable(text):
         return Source(text)
     faults: dict[int, SourceFault] = {}
-    for row, row_text in enumerate(_ROW_END_IN_TEXT.split(text)):
+    for row, row_text in enumerate(RowTexts(text)):
         match = _UNUSABLE.search(row_text)
         if match:
             message = _FaultMessage(match[0], encoding)
