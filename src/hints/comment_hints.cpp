@@ -37,7 +37,7 @@ Py_ssize_t ColumnOf(CLogicalLine& logical, Py_ssize_t tok_i) {
 }
 
 bool IsComment(nb::handle tok) {
-    return IsText(tok) && std::string_view(CUtf8(tok)).starts_with('#');
+    return IsText(tok) && CUtf8(tok)->starts_with('#');
 }
 
 // The row on which a leaf starts: that of its token, or its own position. An invented token stands where the
@@ -51,7 +51,7 @@ Py_ssize_t StartRow(CLogicalLine& logical, const CNode& leaf) {
 
 Py_ssize_t RowCount(const CNode& leaf) {
     if (!IsText(leaf.fText)) RaiseWrongType("str", leaf.fText);
-    if (std::string_view(CUtf8(leaf.fText)).find('\n') == std::string_view::npos) return 1;
+    if (CUtf8(leaf.fText)->find('\n') == std::string_view::npos) return 1;
     return static_cast<Py_ssize_t>(nb::len(leaf.fText.attr("splitlines")()));
 }
 

@@ -67,7 +67,7 @@ class CDefRewriter {
 }  // namespace
 
 bool HoldsTypeMark(nb::handle comment) {
-    return IsText(comment) && std::string_view(CUtf8(comment)).find(kTypeMark) != std::string_view::npos;
+    return IsText(comment) && CUtf8(comment)->find(kTypeMark) != std::string_view::npos;
 }
 
 CTextOrNone HintInComment(const nb::str& comment) {

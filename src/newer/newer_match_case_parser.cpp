@@ -43,8 +43,7 @@ CNodeRef CNewerMatchCaseParser::_ParseMatchStmtImpl() {
             InParentheses(nb::borrow<nb::tuple>(_fLineToks), _IndexInLine(0), _IndexInLine(_TokCount() - 1)));
         const CNode* const subject = node ? node->TryChild<CNode>(1) : nullptr;
         if (subject && !IsSubject(*subject)) _FailAt(1);
-        // `...` is no expression by itself.
-        return node && node->IsToken(1, "...") ? node : WithoutParentheses(std::move(node));
+        return WithoutParentheses(std::move(node));
     });
 }
 

@@ -270,9 +270,7 @@ CNodeRef CNewerParser::_ParseDefault(const nb::tuple& toks, bool in_async_def, c
 
 // A ParseError at what makes more of a node than one expression: a comma, a comprehension, `=`, `yield`, `*`.
 void CNewerParser::_RequireSingle(const CNode& node) {
-    const bool is_leaf = node.fChildren.is_none();  // `...` is no CExpression
-    const bool is_list = node.As<CTestListStarExpr>() || (!is_leaf && !node.As<CExpression>());
-    if (is_list) _RaiseParseError(node.ChildAt(1).fContext);
+    if (node.As<CTestListStarExpr>() || !node.As<CExpression>()) _RaiseParseError(node.ChildAt(1).fContext);
     if (node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield"))
         _RaiseParseError(node.fContext);
 }
