@@ -73,7 +73,7 @@ leaks: build
 	$(BIN)/python tests/leaks.py
 
 fuzz: build
-	$(BIN)/python tests/fuzz.py --seconds $(or $(SECONDS),60)
+	$(BIN)/python tests/fuzz.py --seconds $(or $(SECONDS),60) $(SEED:%=--seed %)
 
 bench: build
 	$(BIN)/python benchmarks/bench_accessors.py

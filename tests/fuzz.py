@@ -1,7 +1,8 @@
 """Feeds odd text to the tokenizer and the analyzer. Run with `make fuzz`.
 
-Whatever the text says, analysis ends, swallows no exception, loses no character, and leaves the
-next line sound. A failure prints the seed and the text.
+A text is a row of odd pieces, a part of a real file with pieces strewn in, or statements made from a
+grammar with words swapped. Whatever it says, analysis ends, swallows no exception, loses no
+character, and leaves the next line sound. A failure prints the seed and the text.
 """
 
 import argparse
@@ -11,11 +12,17 @@ import re
 import sys
 import sysconfig
 import time
+from collections.abc import Callable
 from contextlib import redirect_stdout
 from pathlib import Path
 
+from sentences import COMMENTS, WORDS, Sentences
+
 from codeloom import treesift
-from codeloom.treesift import CNewerAnalyzer, CPGenAnalyzerImpl
+from codeloom.engine import LineAnalyzer
+from codeloom.languages import LanguageNamed
+from codeloom.logicalline import CLogicalLine
+from codeloom.treesift import CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
 
 PIECES = [
@@ -117,8 +124,15 @@ PIECES = [
 ]
 
 
-# In the engine's own trees three dots are no expression, and what wants one refuses them.
-_REFUSED_DOTS = re.compile(r"CExpression.*logical tokens: .*\.\.\.", re.DOTALL)
+# The roads of a line: as the upper layers send it, and as the engine alone takes it.
+LANGUAGES = ["2.7", "3.5", "3.8", "3.11", "3.14"]
+ENGINE = "the engine alone"
+
+# What the engine alone swallows: in its trees three dots are no expression, and what wants one refuses
+# them; and a hint has arguments although the `def` has none.
+_SWALLOWED_BY_ENGINE = re.compile(
+    r"CExpression.*logical tokens: .*\.\.\.|the def has no records of its arguments", re.DOTALL
+)
 
 
 class Fuzzer:
@@ -128,18 +142,16 @@ class Fuzzer:
         self.random = random.Random(seed)
         library = Path(sysconfig.get_path("stdlib"))
         self.files = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
-        self.analyzers = [
-            CNewerAnalyzer((3, 11, 0)),
-            CNewerAnalyzer((3, 14, 0)),
-            CPGenAnalyzerImpl((3, 11, 0)),
-            CPGenAnalyzerImpl((3, 5, 0)),
-            CPGenAnalyzerImpl((2, 7, 18), "Python-Grammar-2.7", ["print", "exec", "if"], False),
-        ]
+        words = {**WORDS, "NEWLINE": ["\n", *COMMENTS]}
+        self.sentences = [Sentences(version, self.random, words) for version in ("2.7", "3.8", "3.14")]
+        self.engine = CPGenAnalyzerImpl((3, 11, 0))
 
     def Text(self) -> str:
-        """Pieces in any order, or a part of a real file with pieces strewn in."""
+        kind = self.random.random()
+        if kind < 0.3:
+            return self._Sentences()
         pieces = self.random.choices(PIECES, k=self.random.randrange(1, 60))
-        if self.random.random() < 0.4:
+        if kind < 0.6:
             return self.random.choice(["", " "]).join(pieces)
         text = self.random.choice(self.files).read_text("utf-8", "replace")
         start = self.random.randrange(len(text) + 1)
@@ -149,22 +161,39 @@ class Fuzzer:
             text = text[:at] + piece + text[at + self.random.randrange(3) :]
         return text
 
+    def _Sentences(self) -> str:
+        """Up to three of one grammar; in half of the texts a word is doubled, or one taken for another."""
+        sentences = self.random.choice(self.sentences)
+        words = "".join(sentences.Text() for _ in range(self.random.randrange(1, 4))).split(" ")
+        if self.random.random() < 0.5:
+            at = self.random.randrange(len(words))
+            words[at : at + self.random.randrange(2)] = [self.random.choice(words)]
+        return " ".join(words)
+
     def Check(self, text: str) -> None:
         """Raise AssertionError when something is wrong."""
         logicals = GetLogicalsFromText(text)
         kept = "".join(token for logical in logicals for token in logical.fToks)
         assert _Solid(kept) == _Solid(text), "characters were lost"
-        self.analyzer = analyzer = self.random.choice(self.analyzers)
+        self.road = self.random.choice([*LANGUAGES, ENGINE])
+        analyze = self._Engine if self.road == ENGINE else self._UpperLayers(text)
         for logical in logicals:
-            error = analyzer.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
+            error = analyze(logical)
             assert error is None or 1 <= error.lineno <= text.count("\n") + text.count("\r") + 1
         (sound,) = GetLogicalsFromText("x = f(1)")
-        assert analyzer.AnalyzeSingleLogical(sound, False) is None
+        assert analyze(sound) is None
+
+    def _Engine(self, logical: CLogicalLine) -> SyntaxError | None:
+        return self.engine.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
+
+    def _UpperLayers(self, text: str) -> Callable[[CLogicalLine], SyntaxError | None]:
+        analyzer = LineAnalyzer(text, LanguageNamed(self.road), false_hints=False)
+        return lambda logical: analyzer.Analyze(logical)[1]
 
     def OnSwallowed(self, suppress_gui: bool = False) -> None:
-        """Raise what an analysis wants to log, but for what is known of the engine's own trees."""
+        """Raise what an analysis wants to log, but for what is known of the engine alone."""
         error = sys.exc_info()[1]
-        if isinstance(self.analyzer, CNewerAnalyzer) or not _REFUSED_DOTS.search(str(error)):
+        if self.road != ENGINE or not _SWALLOWED_BY_ENGINE.search(str(error)):
             raise AssertionError("an exception was swallowed") from error
 
 

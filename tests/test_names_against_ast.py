@@ -7,12 +7,14 @@ a comment.
 """
 
 import ast
+import random
 import unicodedata
 from bisect import bisect_right
 from contextlib import redirect_stdout, suppress
 from io import StringIO
 
 import pytest
+from sentences import Sentences
 from test_library import LibraryTexts
 
 from codeloom.engine import AnalyzerOf
@@ -109,6 +111,8 @@ class Facts(ast.NodeVisitor):
                 self.VisitWithinTarget(function, True)
                 for arg in [*args, *keywords]:
                     self.VisitWithinTarget(arg)
+            case ast.JoinedStr():
+                self.visit(node)
             case _:
                 for child in ast.iter_child_nodes(node):
                     self.VisitWithinTarget(child)
@@ -186,8 +190,13 @@ class Facts(ast.NodeVisitor):
         self.VisitSuite(node)
 
     def VisitSuite(self, node):
-        # The suite of a definition isn't entered where it stands on the line of its header.
-        self.VisitAll([statement for statement in node.body if self.Line(statement) != self.Line(node)])
+        # The suite of a definition isn't entered where it stands on the line of its header, but the fields
+        # of its f-strings are lines of their own.
+        for statement in node.body:
+            if self.Line(statement) != self.Line(node):
+                self.visit(statement)
+            else:
+                self.VisitAll([each for each in ast.walk(statement) if isinstance(each, ast.JoinedStr)])
 
     def visit_Import(self, node):
         # The module's first name is bound, and none is read.
@@ -287,23 +296,43 @@ def Start(logical):
     return logical.fFirstLine + row + 1, col
 
 
+def FactsOfLines(text, module):
+    """For each line its row, our facts or None, and those of the interpreter's tree of the text."""
+    logicals = GetLogicalsFromText(text)
+    facts = Facts(text, logicals)
+    facts.visit(module)
+    false_hints = FalseHintRemover(text)
+    for logical, theirs in zip(logicals, facts.found, strict=True):
+        yield logical.fFirstLine, OurFacts(logical, false_hints), theirs
+
+
 @pytest.mark.parametrize(
     ("count", "seed"), [(100, 1), pytest.param(None, None, marks=pytest.mark.slow)], ids=["some", "all"]
 )
 def test_the_library(count, seed):
-    differences = []
-    compared = left_out = 0
+    differences, compared, left_out = [], 0, 0
     for path, text, module in LibraryTexts(count, seed):
-        logicals = GetLogicalsFromText(text)
-        facts = Facts(text, logicals)
-        facts.visit(module)
-        false_hints = FalseHintRemover(text)
-        for logical, theirs in zip(logicals, facts.found, strict=True):
-            ours = OurFacts(logical, false_hints)
+        for row, ours, theirs in FactsOfLines(text, module):
             compared += ours is not None
             left_out += ours is None
             if ours is not None and ours != theirs:
-                place = f"{path}:{logical.fFirstLine + 1}"
-                differences.append((place, sorted(ours - theirs), sorted(theirs - ours)))
+                differences.append((f"{path}:{row + 1}", sorted(ours - theirs), sorted(theirs - ours)))
     assert not differences[:20]
     assert compared > 100 * (count or 1000) and left_out < compared / 1000
+
+
+@pytest.mark.parametrize("seed", range(4))
+def test_sentences_of_the_grammar(seed):
+    sentences = Sentences("3.14", random.Random(seed))
+    differences, compared = [], 0
+    for text in (sentences.Text() for _ in range(1000)):
+        try:
+            module = ast.parse(text)
+        except SyntaxError:
+            continue  # the grammar holds more than the interpreter's parser
+        for _, ours, theirs in FactsOfLines(text, module):
+            compared += 1
+            if ours != theirs:
+                differences.append((text, ours and sorted(ours - theirs), ours and sorted(theirs - ours)))
+    assert not differences[:20]
+    assert compared > 500
