@@ -45,6 +45,8 @@ _LITERAL_ALIAS = re.compile(r"\bLiteral\s+as\s+(\w+)")
 # The return type of a function's hint in brackets of its own; those of a tuple can't be done without.
 _BRACKETED_RESULT = re.compile(r"->\s*\((?P<type>[^(),]*)\)\s*$")
 _TUPLE_RESULT = re.compile(r"->\s*\([^()]*,")
+# A type that says nothing; the trees of 2.7 have no place for it.
+_DOTS_RESULT = re.compile(r"->\s*\.\.\.\s*$")
 _HINT_WITH_ARGUMENTS = re.compile(r"\(\s*(?!\)|\.\.\.)")
 
 
@@ -151,6 +153,9 @@ def _ReadableFunctionHint(hint: str) -> str:
     result = _BRACKETED_RESULT.search(hint)
     if result is not None:
         chars[result.start("type") - 1] = chars[result.end("type")] = " "
+    dots = _DOTS_RESULT.search(hint)
+    if dots is not None:
+        chars[dots.start() : dots.end()] = " " * len(dots.group())
     return "".join(chars)
 
 

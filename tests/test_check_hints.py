@@ -60,6 +60,7 @@ def test_other_comments_are_left_alone(comment):
     [
         ("# type: (int, *str, ** List[*Ts]) -> a  # why", "# type: (int,  str,    List[*Ts]) -> a  # why"),
         ("# type: ( *a) -> ( b[c] ) ", "# type: (  a) ->   b[c]   "),
+        ("# type: (a) -> ... # why", "# type: (a)        # why"),
     ],
 )
 def test_forms_of_hints_that_the_engine_does_not_know(comment, readable):

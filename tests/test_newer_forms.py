@@ -32,6 +32,7 @@ NEW_IN = {
     try: a\nexcept B as b: c\nelse: d\nfinally: e
     x = yield a
     with a as b, c as (d, e): f
+    with lambda a,: b, (lambda c, *d: e): f
     {a: b for c in d}; {a for b in c}; {a, b}
     0o17 + 0b1
     class A: pass
@@ -164,6 +165,10 @@ def test_accepted_from_its_version_on_and_named_before(since, statement, told):
     ("statement", "records"),
     [
         ("def f() -> ...: pass", ["set  f", "arg hint return  ..."]),
+        (
+            "def f(a):  # type: (b) -> ...",
+            ["set  f", "get  b", "arg set  a", "arg hint a  b", "arg hint return  ..."],
+        ),
         ("a, b = ..., 1", ["set  a", "set  b", "literal b  int: 1"]),
         (
             "isinstance(a, (..., B))",

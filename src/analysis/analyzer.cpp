@@ -39,12 +39,12 @@ CHostError InspectionFailure(const CLogicalLine& logical, CHostError error) {
 }  // namespace
 
 CAnalyzerParts PartsAround(CRef<CPGenParserImpl> parser, nb::object version_triple,
-                           nb::object hint_grammar_file) {
+                           CRef<CPGenParserImpl> hint_parser) {
     CAnalyzerParts parts;
     parts.parser = std::move(parser);
     parts.node_walker = NewInstance<CNodeWalker>(version_triple);
-    parts.type_hint_walker =
-        NewInstance<CTypeHintWalker>(version_triple, hint_grammar_file, parts.node_walker.AsHost());
+    parts.type_hint_walker = MakeInstance<CTypeHintWalker>();
+    parts.type_hint_walker->InitWithParser(std::move(hint_parser), parts.node_walker);
     return parts;
 }
 
@@ -52,7 +52,8 @@ void CPGenAnalyzerImpl::Init(nb::object version_triple, nb::object grammar_file,
                              nb::object py3_grammar, nb::object hint_grammar_file) {
     CRef<CPGenParserImpl> parser =
         NewInstance<CPGenParserImpl>(version_triple, grammar_file, keyword_seq, py3_grammar);
-    InitFromParts(PartsAround(std::move(parser), version_triple, hint_grammar_file));
+    CRef<CPGenParserImpl> hint_parser = NewInstance<CPGenParserImpl>(version_triple, hint_grammar_file);
+    InitFromParts(PartsAround(std::move(parser), version_triple, std::move(hint_parser)));
 }
 
 void CPGenAnalyzerImpl::InitFromParts(CAnalyzerParts parts) {

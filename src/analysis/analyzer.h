@@ -22,9 +22,9 @@ struct CAnalyzerParts {
     CRef<CTypeHintWalker> type_hint_walker;
 };
 
-// The parts around a parser: the walkers of the system.
+// The parts around two parsers: the walkers of the system.
 CAnalyzerParts PartsAround(CRef<CPGenParserImpl> parser, nb::object version_triple,
-                           nb::object hint_grammar_file);
+                           CRef<CPGenParserImpl> hint_parser);
 
 class CPGenAnalyzerImpl : public CPGenAnalyzer {
   public:

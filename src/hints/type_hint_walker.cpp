@@ -52,6 +52,12 @@ CNodeRef SubExpr(const CNodeRef& node, int i) {
 
 void CTypeHintWalker::Init(nb::object version_triple, nb::object grammar_file,
                            CRef<CNodeWalker> general_node_walker) {
+    InitWithParser(NewInstance<CPGenParserImpl>(std::move(version_triple), std::move(grammar_file)),
+                   std::move(general_node_walker));
+}
+
+void CTypeHintWalker::InitWithParser(CRef<CPGenParserImpl> hint_parser,
+                                     CRef<CNodeWalker> general_node_walker) {
     nb::dict visits;
     visits[nb::type<CNameLiteral>()] = false;  // a leaf that can hold no hint
     InitWithVisits(visits, {Visit<CFuncdefStmt, &CTypeHintWalker::_VisitFuncdefStmt>(),
@@ -61,7 +67,7 @@ void CTypeHintWalker::Init(nb::object version_triple, nb::object grammar_file,
     _fNameConv = NewInstance<CNodeToTextConverterImpl>();
     _fHintConv = NewInstance<CNodeToTextConverterImpl>(true, true);
     _fGeneralNodeWalker = std::move(general_node_walker);
-    _fHintParser = NewInstance<CPGenParserImpl>(std::move(version_triple), std::move(grammar_file));
+    _fHintParser = std::move(hint_parser);
 }
 
 void CTypeHintWalker::Walk(CNodeRef node, CLogicalLine& logical, bool first_in_def) {

@@ -37,6 +37,7 @@ class CTypeHintWalker : public CDispatchWalker {
     // `grammar_file` is the grammar of hints, which may be another than that of the code. The names that
     // hints in comments use go to `general_node_walker`; with none they go nowhere.
     void Init(nb::object version_triple, nb::object grammar_file, CRef<CNodeWalker> general_node_walker);
+    void InitWithParser(CRef<CPGenParserImpl> hint_parser, CRef<CNodeWalker> general_node_walker);
 
     void Walk(CNodeRef node, CLogicalLine& logical, bool first_in_def) override;
 

@@ -8,7 +8,11 @@ void CNewerAnalyzer::Init(nb::object version_triple, nb::object grammar_file, nb
                           nb::object py3_grammar, nb::object hint_grammar_file) {
     const CRef<CNewerParser> parser =
         NewInstance<CNewerParser>(version_triple, grammar_file, keyword_seq, py3_grammar);
-    InitFromParts(PartsAround(CRef<CPGenParserImpl>(parser.get()), version_triple, hint_grammar_file));
+    // Hints in comments are read by type checkers, which know the forms of all versions.
+    const CRef<CNewerParser> hint_parser = NewInstance<CNewerParser>(version_triple, hint_grammar_file);
+    hint_parser->TakeAllForms();
+    InitFromParts(PartsAround(CRef<CPGenParserImpl>(parser.get()), version_triple,
+                              CRef<CPGenParserImpl>(hint_parser.get())));
 }
 
 void BindNewerAnalyzer(nb::module_& module) {

@@ -26,6 +26,9 @@ class CNewerParser : public CPGenParserImpl {
     void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
               nb::object py3_grammar);
 
+    // Forms of every version are taken from now on.
+    void TakeAllForms() { _fForms.SetVersion(nb::none()); }
+
     nb::object convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
                        nb::handle children) override;
     nb::list _BuildClsForStateList() override;

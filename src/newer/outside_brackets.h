@@ -8,17 +8,24 @@
 namespace codeloom {
 
 // Calls visit(index, text) for each token in [start, end) outside brackets, closing brackets not among them,
-// until it returns false. Comments, backslashes and removed tokens are passed over.
+// until it returns false. Comments, backslashes and removed tokens are passed over, and what stands between
+// a `lambda` and its `:`.
 template <class Visit>
 void ForEachOutsideBrackets(const nb::tuple& toks, Py_ssize_t start, Py_ssize_t end, Visit visit) {
-    int depth = 0;
+    int depth = 0, lambda_count = 0;
     for (Py_ssize_t i = start; i < end; ++i) {
         const nb::handle tok = TupleItem(toks, i);
         if (tok.is_none()) continue;
         const CUtf8 text(tok);
         if (text->empty() || text->front() == '#' || text->front() == '\\') continue;
         const int step = DepthStep(text);
-        if (depth == 0 && step >= 0 && !visit(i, static_cast<std::string_view>(text))) return;
+        if (depth == 0 && text == "lambda") {
+            ++lambda_count;
+        } else if (depth == 0 && lambda_count != 0) {
+            lambda_count -= text == ":";
+        } else if (depth == 0 && step >= 0 && !visit(i, static_cast<std::string_view>(text))) {
+            return;
+        }
         depth += step;
     }
 }
