@@ -315,7 +315,7 @@ class ParserImpl(Parser):
     within one another.
     """
 
-    def __init__(self, grammar: Grammar, node_converter: NodeConverter | None | None=None, promotesinglechild: bool=True) -> None:
+    def __init__(self, grammar: Grammar, node_converter: NodeConverter | None=None, promotesinglechild: bool=True) -> None:
         ...
 
     def setup(self, start: object | None=None) -> None:
@@ -342,7 +342,7 @@ class ParserImpl(Parser):
         Raises ParseError when the start symbol isn't complete, RuntimeError when no parse is going on.
         """
 
-def CreateParser(grammar: Grammar, node_converter: NodeConverter | None | None=None, promotesinglechild: bool=True) -> Parser | None:
+def CreateParser(grammar: Grammar, node_converter: NodeConverter | None=None, promotesinglechild: bool=True) -> Parser | None:
     """
     A Parser for a grammar, whose nodes `node_converter` makes. See ParserImpl.
     """

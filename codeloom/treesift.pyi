@@ -320,7 +320,7 @@ class CNodeClassInfo:
 class CNode:
     """Base of all syntax tree nodes."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     @property
@@ -373,7 +373,7 @@ class CNode:
 class CExpression(CNode):
     """Base class for all expressions."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetSubExpr(self, i: int) -> CExpression | None:
@@ -389,14 +389,14 @@ class CExpression(CNode):
 class CIfElseExpression(CExpression):
     """E if condition else E."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
     kSupportedRules: list[typing.Any] = ...
 
 class COperatorExpression(CExpression):
     """op T, T op T, T op T op T expressions."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetOperatorStr(self, operator_i: int) -> str | None:
@@ -416,7 +416,7 @@ class COperatorExpression(CExpression):
 class CStarExpression(CExpression):
     """*n used as an expression."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetStarredExpression(self) -> CExpression | None:
@@ -426,14 +426,14 @@ class CStarExpression(CExpression):
 class CDottedName(CExpression):
     """a.b.c in decorators and imports."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
     kSupportedRules: list[typing.Any] = ["dotted_name: NAME ('.' NAME)*"]
 
 class CLambdaExpr(CExpression):
     """Lambda."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetArgumentsNode(self) -> CNode | None:
@@ -445,13 +445,13 @@ class CLambdaExpr(CExpression):
 class CTestExpr(CExpression):
     """Declared, with no rule and no state."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CYieldExpr(CExpression):
     """Yield."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetValue(self) -> CNode | None:
@@ -464,7 +464,7 @@ class CYieldExpr(CExpression):
 class CTestListStarExpr(CExpression):
     """Comma lists of expressions."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetSubExpr(self, i: int) -> CExpression | None:
@@ -487,7 +487,7 @@ class CTestListStarExpr(CExpression):
 class CAtomExpr(CExpression):
     """[await] atom trailer*."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetPrefix(self) -> CNode | None:
@@ -505,7 +505,7 @@ class CAtomExpr(CExpression):
 class CPower(CExpression):
     """Atom, trailers and exponent."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetAtom(self) -> CNode | None:
@@ -521,7 +521,7 @@ class CPower(CExpression):
 class CFactorExpr(CExpression):
     """Unary +, -, ~."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetUnaryOperator(self) -> str | None:
@@ -530,7 +530,7 @@ class CFactorExpr(CExpression):
 class CNamedExpr(CExpression):
     """:= expression."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetAssignedName(self) -> CNode | None:
@@ -543,13 +543,13 @@ class CNamedExpr(CExpression):
 class CBinaryOp(CNode):
     """Declared, with no rule and no state."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CYieldArg(CNode):
     """Argument of yield."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetValue(self) -> CNode | None:
@@ -564,7 +564,7 @@ class CCompForNode(CNode):
     A 'for' clause in a generator expression, and list comprehension in the 2.7 grammar.
     """
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def IsAsync(self) -> bool:
@@ -582,7 +582,7 @@ class CCompForNode(CNode):
 class CListmakerNode(CNode):
     """Contents of a list display in the 2.7 grammar."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetSubExprCount(self) -> int:
@@ -597,7 +597,7 @@ class CListmakerNode(CNode):
 class CTrailer(CNode):
     """(), [] or .name after an atom."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetDotName(self) -> str | None:
@@ -616,7 +616,7 @@ class CTrailer(CNode):
 class CAtom(CExpression):
     """Bracketed atoms and adjacent strings."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetSubExpr(self, i: int) -> CExpression | None:
@@ -646,19 +646,19 @@ class CAtom(CExpression):
 class CNameLiteral(CExpression):
     """A name token."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CKeywordLiteral(CExpression):
     """A keyword token."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CNumberLiteral(CExpression):
     """A number token."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def IsFloat(self) -> bool:
@@ -674,7 +674,7 @@ class CNumberLiteral(CExpression):
 class CStringLiteral(CExpression):
     """A string token."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def IsUnicode(self) -> bool:
@@ -724,12 +724,12 @@ def GetTokenEndIndex(node: CNode) -> int:
     The index of the token behind the node's last one; TypeError when that isn't known by an index.
     """
 
-def GetDefiningArgInfoList(node: CNode | None | None) -> list[CArgInfo]:
+def GetDefiningArgInfoList(node: CNode | None) -> list[CArgInfo]:
     """
     A new list of CArgInfo, one for each parameter of a definition: `node` is its parameter list, with or without brackets, or a lone parameter. A parameter that is a tuple of names (Python 2) is a list of the same kind. AssertionError for a child that is no parameter.
     """
 
-def GetUsedArgInfoList(node: CNode | None | None) -> list[CArgInfo]:
+def GetUsedArgInfoList(node: CNode | None) -> list[CArgInfo]:
     """
     A new list of CArgInfo, one for each argument of a call: `node` is its argument list, or a lone argument, whose prefix isn't told.
     """
@@ -745,7 +745,7 @@ class CAsName:
         """The name as written, with its dots."""
 
     @module_name.setter
-    def module_name(self, arg: str | None | None, /) -> None:
+    def module_name(self, arg: str | None, /) -> None:
         ...
 
     @property
@@ -761,12 +761,12 @@ def _GetMatchingChildToken(node: CNode, text: str) -> int:
     The index of the first child of `node` whose text is `text`; -1 when there is none.
     """
 
-def _ProcessAsNamesList(node: CNode | None | None) -> list[CAsName]:
+def _ProcessAsNamesList(node: CNode | None) -> list[CAsName]:
     """
     A new list of CAsName, one for each name of a list, or the one of `node` itself when that isn't a list.
     """
 
-def _ProcessSingleModuleNameAs(node: CNode | None | None) -> CAsName | None:
+def _ProcessSingleModuleNameAs(node: CNode | None) -> CAsName | None:
     """The CAsName of `name as name` or of a name."""
 
 def _TextForImportName(node_list: list[CNode]) -> str:
@@ -777,7 +777,7 @@ def _TextForImportName(node_list: list[CNode]) -> str:
 class CImportNamesStmt(CNode):
     """import a, b."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetAsNameList(self) -> list[CAsName]:
@@ -786,7 +786,7 @@ class CImportNamesStmt(CNode):
 class CFromImportStmt(CNode):
     """from a import b."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetFromString(self) -> str | None:
@@ -808,7 +808,7 @@ class CFromImportStmt(CNode):
 class CSingleUsedArgumentNode(CNode):
     """One argument of a call."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetPrefix(self) -> str | None:
@@ -832,7 +832,7 @@ class CSingleUsedArgumentNode(CNode):
 class CFunctionParameterDef(CNode):
     """One parameter definition with a possible annotation."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetNestedListNode(self) -> CNode | None:
@@ -850,32 +850,32 @@ class CFunctionParameterDef(CNode):
 class CDefiningArglistNode(CNode):
     """Parameter list of a definition."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
     kSupportedRules: list[typing.Any] = ["fplist: fpdef (',' fpdef)* [',']"]
 
 class CUsedArglistNode(CNode):
     """Argument list of a call."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CParametersNode(CNode):
     """( typedargslist )."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CStmt(CNode):
     """Base class for all statements."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CClassdefStmt(CStmt):
     """Class statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetClassName(self) -> str | None:
@@ -889,7 +889,7 @@ class CClassdefStmt(CStmt):
 class CFuncdefStmt(CStmt):
     """def statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetFunctionName(self) -> str | None:
@@ -907,7 +907,7 @@ class CFuncdefStmt(CStmt):
 class CIfStmt(CStmt):
     """If statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetTestExpression(self) -> CExpression | None:
@@ -917,7 +917,7 @@ class CIfStmt(CStmt):
 class CMatchStmt(CStmt):
     """Match statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetTestExpression(self) -> CExpression | None:
@@ -926,7 +926,7 @@ class CMatchStmt(CStmt):
 class CCaseStmt(CStmt):
     """Case statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetPattern(self) -> CNode | None:
@@ -943,7 +943,7 @@ class CCaseStmt(CStmt):
 class CDelStmt(CStmt):
     """Del statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetExpressions(self) -> list[CNode]:
@@ -955,7 +955,7 @@ class CDelStmt(CStmt):
 class CGlobalStmt(CStmt):
     """Global statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetUtf8NameList(self) -> list[str]:
@@ -964,7 +964,7 @@ class CGlobalStmt(CStmt):
 class CNonlocalStmt(CStmt):
     """Nonlocal statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetUtf8NameList(self) -> list[str]:
@@ -973,7 +973,7 @@ class CNonlocalStmt(CStmt):
 class CForStmt(CStmt):
     """For statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetTarget(self) -> CNode | None:
@@ -991,7 +991,7 @@ class CForStmt(CStmt):
 class CWithItem(CNode):
     """One item of a with statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetExpression(self) -> CNode | None:
@@ -1003,7 +1003,7 @@ class CWithItem(CNode):
 class CWithStmt(CStmt):
     """With statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetWithItems(self) -> list[CWithItem]:
@@ -1012,13 +1012,13 @@ class CWithStmt(CStmt):
 class CPassStmt(CStmt):
     """Pass statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CAnnotatedAssignNode(CNode):
     """Tail of an annotated assignment."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetTypeHintNode(self) -> CNode | None:
@@ -1031,7 +1031,7 @@ class CAnnotatedAssignNode(CNode):
 class CExprStmt(CStmt):
     """Expression, assignment and annotated assignment."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetEqualCount(self) -> int:
@@ -1058,7 +1058,7 @@ class CExprStmt(CStmt):
 class CReturnStmt(CStmt):
     """Return statement."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetValue(self) -> CNode | None:
@@ -1072,7 +1072,7 @@ class CWithTypeParameters(CStmt):
        being parameterized (assignment, classdef, or funcdef as of Sept 2023)
     """
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetTypeParameters(self) -> list[CNode]:
@@ -1084,7 +1084,7 @@ class CWithTypeParameters(CStmt):
 class CSingleDecorator(CNode):
     """One decorator."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetDottedName(self) -> CNode | None:
@@ -1097,14 +1097,14 @@ class CSingleDecorator(CNode):
 class CMultipleDecorators(CNode):
     """A decorator list."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
     kSupportedRules: list[typing.Any] = ['decorators: decorator+']
 
 class CExceptClause(CNode):
     """Except clause."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetExceptionType(self) -> CNode | None:
@@ -1122,7 +1122,7 @@ class CTypeParameter(CNode):
        fChildren is [prefix] name [: expr]
     """
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
     def GetName(self) -> str | None:
@@ -1137,31 +1137,31 @@ class CTypeParameter(CNode):
 class CPatternNode(CNode):
     """Base class for the patterns of a case."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CSequencePatternNode(CPatternNode):
     """[a, b] as a pattern."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CMappingPatternNode(CPatternNode):
     """{'key': a} as a pattern."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CClassArgumentPatternNode(CPatternNode):
     """name=a in a class pattern."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CClassPatternNode(CPatternNode):
     """Name(a, name=b) as a pattern."""
 
-    def __init__(self, cls_info: CNodeClassInfo | None | None=None) -> None:
+    def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
 
 class CNodeFactory:
@@ -1282,7 +1282,7 @@ class CMatchCaseStatementParser:
     Parses match and case statements by hand, since the grammar files don't know them.
     """
 
-    def __init__(self, pgen_parser: CPGenParserImpl | None | None) -> None:
+    def __init__(self, pgen_parser: CPGenParserImpl | None) -> None:
         ...
 
     def _NonNestedFindTokenIndex(self, tok: str, start: int, end: int) -> int:
@@ -1383,10 +1383,10 @@ class CPGenParserImpl(CPGenAnalyzer):
         refuses. Give it back with DiscardNode.
         """
 
-    def ParseToksToNode(self, toks: object, in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None) -> CNode | None:
+    def ParseToksToNode(self, toks: object, in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """ParseToNode for a tuple of tokens and their positions."""
 
-    def _ParseToksToNodeImpl(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None) -> CNode | None:
+    def _ParseToksToNodeImpl(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """Parse by the grammar alone, without the special cases."""
 
     def _FindNextNonSkipIndex(self, toks: tuple[typing.Any, ...], index: int) -> int:
@@ -1400,34 +1400,34 @@ class CPGenParserImpl(CPGenAnalyzer):
         The index in [start, end) of the token `target` outside brackets; -1 when there is none.
         """
 
-    def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None) -> CNode | None:
+    def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """
         The node of a statement that is parsed by hand; None for the ordinary road.
         """
 
-    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `with` whose items stand in parentheses, with `i` the index of `with`; None when they don't.
         """
 
-    def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.
         """
 
-    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of
         its keyword; None for the ordinary road.
         """
 
-    def _NodesForTypeParameters(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, start: int, end: int, raise_errors: bool) -> list[typing.Any]:
+    def _NodesForTypeParameters(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> list[typing.Any]:
         """
         The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors`
         malformed parameters are dropped.
         """
 
-    def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, start: int, end: int, raise_errors: bool) -> CNode | None:
+    def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:
         """The node of the one type parameter in [start, end), or None."""
 
     def _RaiseParseError(self, tok_i: object) -> None:
@@ -1439,7 +1439,7 @@ class CPGenParserImpl(CPGenAnalyzer):
     def _AddTokenList(self, toks: list[typing.Any], tok_i: int) -> None:
         """Feed each token text to the parser, all with the context `tok_i`."""
 
-    def _ShouldSkipSlash(self, tok_i: int, positions: tuple[tuple[int, int], ...] | None | None) -> bool:
+    def _ShouldSkipSlash(self, tok_i: int, positions: tuple[tuple[int, int], ...] | None) -> bool:
         """
         Utility method to determine if slash (\\) token at tok_i --
                can be relatively slow since slashes are uncommon and is usually called
@@ -1497,7 +1497,7 @@ class CNodeWalker:
     def _fToText(self) -> CNodeToTextConverterImpl | None:
         """The converter for all text that is recorded."""
 
-    def Walk(self, node: CNode | None | None, logical: codeloom._neighbours.CLogicalLine) -> None:
+    def Walk(self, node: CNode | None, logical: codeloom._neighbours.CLogicalLine) -> None:
         """
         Walk the tree of a logical line and record on the line what it says. A walk of too many visits or too deep ends with a line on the standard output. ValueError while a walk is under way, SyntaxError for what parses but isn't allowed.
         """
@@ -1529,7 +1529,7 @@ class CNodeWalker:
     def _VisitCompForNode(self, node: CCompForNode) -> None:
         """A `for` clause of a comprehension and the clauses behind it."""
 
-    def _VisitNameLiteral(self, node: CNameLiteral, atom_node: CNode | None | None=None, all_trailers: list[CNode] | None=None, trailer_i: int=-1) -> None:
+    def _VisitNameLiteral(self, node: CNameLiteral, atom_node: CNode | None=None, all_trailers: list[CNode] | None=None, trailer_i: int=-1) -> None:
         """
         A name: alone, or of a chain of `atom_node` and `all_trailers`, in the trailer at `trailer_i` or, with -1, as the atom itself.
         """
@@ -1537,7 +1537,7 @@ class CNodeWalker:
     def _VisitDottedName(self, node: CDottedName) -> None:
         """Each prefix of `a.b.c` is read: `a`, `a.b`, `a.b.c`."""
 
-    def _ProcessLoadName(self, name: str | None | None) -> None:
+    def _ProcessLoadName(self, name: str | None) -> None:
         """Note a name, a text string, as read."""
 
     def _VisitImportNames(self, node: CImportNamesStmt) -> None:
@@ -1583,7 +1583,7 @@ class CNodeWalker:
     def _VisitForStmt(self, node: CForStmt) -> None:
         """A `for` line."""
 
-    def _ProcessTargets(self, lhs: CNode, rhs: CNode | None | None, extra_trailer: bytes | None | None=None) -> None:
+    def _ProcessTargets(self, lhs: CNode, rhs: CNode | None, extra_trailer: bytes | None=None) -> None:
         """
         Pair the names of a target with what they receive of `rhs`, be it ((a, b), c) = ... or a, *b = ... `extra_trailer`, bytes, tells which part of `rhs` the whole target receives.
         """
@@ -1612,7 +1612,7 @@ class CNodeWalker:
     def _VisitCall(self, atom: CNode, prev_trailers: list[CNode], arglist: CNode) -> None:
         """The call of what an atom and the trailers behind it give."""
 
-    def _ProcessFunctionCall(self, func_name: bytes | None | None, arg_list: list[CArgInfo]) -> None:
+    def _ProcessFunctionCall(self, func_name: bytes | None, arg_list: list[CArgInfo]) -> None:
         """
         Visit the arguments of a call, a list of CArgInfo, and record the call of `func_name`, UTF-8 or None. SyntaxError for a bare generator beside another argument.
         """
@@ -1629,20 +1629,20 @@ class CNodeWalker:
     def _VisitExceptClause(self, exc_clause: CExceptClause) -> None:
         """An `except` line. SyntaxError for a target that isn't a name."""
 
-    def _AppendEquivNode(self, name_node: CNode, equiv_node: CNode | None | None, extra_trailer: bytes | None | None=None) -> None:
+    def _AppendEquivNode(self, name_node: CNode, equiv_node: CNode | None, extra_trailer: bytes | None=None) -> None:
         """
         Record a name as bound, unless its text holds "[", and what its value stands for.
         """
 
-    def _AppendSubscriptedEquivNode(self, name_node: CNode, equiv_node: CNode | None | None, subscript: int=-1) -> None:
+    def _AppendSubscriptedEquivNode(self, name_node: CNode, equiv_node: CNode | None, subscript: int=-1) -> None:
         """
         Record a name as bound, and as the item `subscript` of a value; -1 is any item.
         """
 
-    def _AddNodeInfoStr(self, name_node: CNode, istr: str | bytes | None | None) -> None:
+    def _AddNodeInfoStr(self, name_node: CNode, istr: str | bytes | None) -> None:
         """Record `istr` for the name that a node shows."""
 
-    def _TypeEquivForNode(self, node: CNode, extra_trailer: bytes | None | None=None) -> bytes | None:
+    def _TypeEquivForNode(self, node: CNode, extra_trailer: bytes | None=None) -> bytes | None:
         """
         What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, stands behind it where a part of the value is meant.
         """
@@ -1703,12 +1703,12 @@ class CDispatchWalker:
     def _fNodeStack(self) -> list[typing.Any]:
         """The nodes from the root to the one now visited, as a new list."""
 
-    def Walk(self, node: CNode | None | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
+    def Walk(self, node: CNode | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
         """
         Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous. ValueError while a walk is under way.
         """
 
-    def _VisitNode(self, node: CNode | None | None) -> None:
+    def _VisitNode(self, node: CNode | None) -> None:
         """
         Visit the node and all children. Dispatches to a visit method based on node type.
         """
@@ -1718,7 +1718,7 @@ class CTypeHintWalker(CDispatchWalker):
     Records the type hints of a logical line: annotations, and hints in comments.
     """
 
-    def __init__(self, version_triple: object | None, grammar_file: object, general_node_walker: CNodeWalker | None | None) -> None:
+    def __init__(self, version_triple: object | None, grammar_file: object, general_node_walker: CNodeWalker | None) -> None:
         ...
 
     @property
@@ -1743,7 +1743,7 @@ class CTypeHintWalker(CDispatchWalker):
     def _fGeneralNodeWalker(self) -> CNodeWalker | None:
         """Records the names that hints in comments use."""
 
-    def Walk(self, node: CNode | None | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
+    def Walk(self, node: CNode | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
         """
         Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous. ValueError while a walk is under way.
         """
@@ -1756,7 +1756,7 @@ class CTypeHintWalker(CDispatchWalker):
         Rewrite the function hint in a comment so that it parses: the tokens of a `def` with dummy names, and for each the offset to report a syntax error at.
         """
 
-    def _ProcessFuncdefComment(self, hint: str, tok_i: int, funcdef_logical: codeloom._neighbours.CLogicalLine | None | None, is_arg: bool) -> None:
+    def _ProcessFuncdefComment(self, hint: str, tok_i: int, funcdef_logical: codeloom._neighbours.CLogicalLine | None, is_arg: bool) -> None:
         """
         Record a hint for a `def`. `funcdef_logical` is None for a comment in the body: then the arguments go by their indexes. TypeError when it has no records of arguments to name them by.
         """
@@ -1775,10 +1775,10 @@ class CTypeHintWalker(CDispatchWalker):
     def _VisitExprStmt(self, node: CExprStmt) -> typing.Any:
         """Record the annotation or the comment hint of an assignment."""
 
-    def _ProcessTarget(self, node: CNode, target: CNode | None | None) -> None:
+    def _ProcessTarget(self, node: CNode, target: CNode | None) -> None:
         """Record the hint in the comment at the end of `node` for `target`."""
 
-    def _ProcessNameAndHintNodes(self, name_node: CNode | None | None, hint_node: CNode | None | None, is_arg: bool=False) -> None:
+    def _ProcessNameAndHintNodes(self, name_node: CNode | None, hint_node: CNode | None, is_arg: bool=False) -> None:
         """
         Record a hint for a name. Tuples are paired item by item; what has no partner is passed over.
         """
@@ -1801,12 +1801,12 @@ class CTypeHintWalker(CDispatchWalker):
         True for letters and digits alone that begin with a letter, and for nothing.
         """
 
-    def _FindComment(self, row: int, logical: codeloom._neighbours.CLogicalLine | None | None=None) -> tuple[str | None, int]:
+    def _FindComment(self, row: int, logical: codeloom._neighbours.CLogicalLine | None=None) -> tuple[str | None, int]:
         """
         The comment on a row of `logical`, by default of the one that is walked, and the index of its token; (None, -1) when there is none.
         """
 
-    def _GetHintInfoStr(self, node: CNode | None | None) -> bytes | None:
+    def _GetHintInfoStr(self, node: CNode | None) -> bytes | None:
         """The record of a hint; None when it has no text."""
 
     def _AddSymInfo(self, name: object, istr: object, is_arg: bool) -> None:
@@ -1868,7 +1868,7 @@ class CPGenAnalyzerImpl(CPGenAnalyzer):
                unparsable logical
         """
 
-    def _InspectEmbeddedExpressions(self, logical: codeloom._neighbours.CLogicalLine, node: CNode | None | None, in_async_def: bool, first_in_def: bool) -> None:
+    def _InspectEmbeddedExpressions(self, logical: codeloom._neighbours.CLogicalLine, node: CNode | None, in_async_def: bool, first_in_def: bool) -> None:
         """
         Inspect all embedded expressions.  Will raise exceptions on parse errors
         """
@@ -1878,7 +1878,7 @@ class CNewerMatchCaseParser(CMatchCaseStatementParser):
     Parses match and case statements, open and empty sequences and adjacent strings included.
     """
 
-    def __init__(self, pgen_parser: CPGenParserImpl | None | None) -> None:
+    def __init__(self, pgen_parser: CPGenParserImpl | None) -> None:
         ...
 
     def ParseMatchStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
@@ -1931,28 +1931,28 @@ class CNewerParser(CPGenParserImpl):
         refuses. Give it back with DiscardNode.
         """
 
-    def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None) -> CNode | None:
+    def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """
         The node of a statement that is parsed by hand; None for the ordinary road.
         """
 
-    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `with` whose items stand in parentheses, with `i` the index of `with`; None when they don't.
         """
 
-    def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.
         """
 
-    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of
         its keyword; None for the ordinary road.
         """
 
-    def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None | None, start: int, end: int, raise_errors: bool) -> CNode | None:
+    def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:
         """The node of the one type parameter in [start, end), or None."""
 
 class CNewerAnalyzer(CPGenAnalyzerImpl):

@@ -201,4 +201,8 @@ struct type_caster<codeloom::CRef<T>> {
     }
 };
 
+// As an argument that may be none: the signature says so by itself.
+template <class T>
+struct remove_opt_mono<codeloom::CRef<T>> : remove_opt_mono<T> {};
+
 }  // namespace nanobind::detail

@@ -43,3 +43,11 @@ using CBytesOrNone = TOrNone<nb::bytes>;
 using CTextOrUtf8OrNone = TOrNone<CTextOrUtf8>;
 
 }  // namespace codeloom
+
+namespace nanobind::detail {
+
+// As an argument: the signature says by itself that it may be none.
+template <class Kind>
+struct remove_opt_mono<codeloom::TOrNone<Kind>> : remove_opt_mono<Kind> {};
+
+}  // namespace nanobind::detail

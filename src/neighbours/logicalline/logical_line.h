@@ -119,7 +119,7 @@ namespace nanobind::detail {
 
 template <>
 struct type_caster<codeloom::CPositions> {
-    NB_TYPE_CASTER(codeloom::CPositions, const_name("tuple[tuple[int, int], ...] | None"))
+    NB_TYPE_CASTER(codeloom::CPositions, const_name("tuple[tuple[int, int], ...]"))
 
     bool from_python(handle source, uint32_t, cleanup_list*) noexcept {
         if (!source.is_none() && !PyTuple_Check(source.ptr())) return false;
