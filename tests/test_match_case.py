@@ -13,7 +13,7 @@ from hypothesis import given, settings
 from hypothesis import strategies as st
 
 from codeloom import treesift
-from codeloom.logicalline import CLogicalLine, kCase, kMatch, kUnknown
+from codeloom.logicalline import kCase, kMatch, kUnknown
 from codeloom.optpgen import ParseError
 from codeloom.treesift import (
     CAtomExpr,
@@ -526,13 +526,13 @@ def test_tokens_are_kept_during_a_parse_only():
 
 def test_skipped_tokens():
     remove = CMatchCaseStatementParser(None)._RemoveSkipToks
-    toks, rows = ("case", "# a", "\\", "1", "\\", ":", "\\"), (0, 0, 1, 2, 2, 2, 2)
+    toks, rows = ("case", "# a", "\\", "1", "\\", ":", "\\", None), (0, 0, 1, 2, 2, 2, 2, 2)
     positions = tuple((row, i) for i, row in enumerate(rows))
     assert remove(toks, positions) == (
         ("case", "1", "\\", ":", "\\"),
         ((0, 0), (2, 3), (2, 4), (2, 5), (2, 6)),
     )
-    for toks, failure in [((None,), TypeError), (("",), IndexError), (("a", "b"), IndexError)]:
+    for toks, failure in [((1,), TypeError), (("",), IndexError), (("a", "b"), IndexError)]:
         with pytest.raises(failure):
             remove(toks, ((0, 0),))
 
@@ -571,9 +571,6 @@ def test_driver_and_parser_are_collected():
     assert gone() is None
 
 
-def test_removed_tokens_are_no_tokens_of_these_statements():
-    logical = CLogicalLine(kCase, ("case", None, "1", ":"), ((0, 0), (0, 5), (0, 6), (0, 7)))
-    with pytest.raises(TypeError):
-        DRIVER.ParseToNode(logical)
+def test_these_statements_need_positions():
     with pytest.raises(TypeError):
         DRIVER.ParseToksToNode(("case", "1", ":"), False, None)
