@@ -27,6 +27,7 @@ from codeloom.treesift import (
     CPatternNode,
     CStarExpression,
     CTestListStarExpr,
+    DropSimpleParens,
 )
 
 
@@ -131,9 +132,9 @@ class PlaceFinder(CNodeWalker):
             self._fPlaces.of_names.setdefault(name, tokens)
 
     def _DefineByText(self, node: CNode) -> None:
-        tokens = self._TokensOf(node)
-        if tokens is not None:
-            self._Define(tokens.text, tokens)
+        text = self._fToText.TextForNode(node)
+        if text is not None:
+            self._Define(AsStr(text), self._TokensOf(DropSimpleParens(node)))
 
     def _Enter(self, tokens: Tokens | None) -> None:
         """Remember where the walk is, and what name stands there."""
