@@ -24,8 +24,10 @@ class CChainText {
         if (count < _fCount || _fText.empty()) {
             _fText.clear();
             _fCount = count;
-            if (!_fConverter.AppendTextForAtomPlusTrailers(_fText, _fAtom, _fTrailers.First(count)))
+            if (!_fConverter.AppendTextForAtomPlusTrailers(_fText, _fAtom, _fTrailers.First(count))) {
+                _fText.clear();  // it may hold an unfinished piece
                 return CTextOrNone();
+            }
         }
         _fConverter.AppendTextForTrailers(_fText, _fTrailers.Between(_fCount, count));
         _fCount = count;

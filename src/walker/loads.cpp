@@ -1,4 +1,6 @@
 // Names that are read: alone, in chains, in calls, in comprehensions and decorators.
+#include <algorithm>
+
 #include "analysis/syntax_error.h"
 #include "host/errors.h"
 #include "host/restore.h"
@@ -53,6 +55,7 @@ void CNodeWalker::_VisitNameLiteral(CNameLiteral& node, CNodeRef atom_node,
 }
 
 CTextOrNone CNodeWalker::_NameInChain(CNode& atom, const CNodeRange& trailers, Py_ssize_t count) {
+    count = std::min(count, trailers.Size());
     if (_fChainText != nullptr && _fChainText->IsOf(atom, trailers)) return _fChainText->UpTo(count);
     return CChainText(*_fToText, atom, trailers).UpTo(count);
 }
@@ -138,7 +141,7 @@ CBytesOrNone CNodeWalker::_TextForArguments(const CArgumentList& arg_list) {
     std::string text = "(";
     for (const CArgument& argument : arg_list) {
         if (!argument.value || argument.name || IsStarred(argument)) return CBytesOrNone();
-        if (text.size() != 1) text += ',';
+        if (&argument != &arg_list.front()) text += ',';
         if (!_fToText->AppendTextForNode(text, *argument.value)) return CBytesOrNone();
     }
     return CBytesOrNone(JoinUtf8({text, ")"}));
@@ -164,7 +167,7 @@ std::vector<CTextOrUtf8> CNodeWalker::_InstanceNamesFor(CNode& class_or_tuple) {
     add(class_or_tuple);
     if (!names.empty()) return names;
     for (const CNodeRef& element : ExpandSeqLiteral(class_or_tuple).value_or(std::vector<CNodeRef>()))
-        add(*element);
+        if (element) add(*element);  // a generator has none
     return names;
 }
 
