@@ -1204,7 +1204,7 @@ class CNodeFactory:
     def RecursiveConvert(self, raw: tuple[typing.Any, ...]) -> CNode | None:
         """Convert a raw tree of (type, text, context, children) tuples."""
 
-def DropSimpleParens(node: CNode) -> CNode | None:
+def DropSimpleParens(node: CNode) -> CNode:
     """
     If node is a parenthesized expression ( test ), return the
        inner test node.  Otherwise, return the original node.
@@ -1494,7 +1494,7 @@ class CNodeWalker:
         ...
 
     @property
-    def _fToText(self) -> CNodeToTextConverterImpl | None:
+    def _fToText(self) -> CNodeToTextConverterImpl:
         """The converter for all text that is recorded."""
 
     def Walk(self, node: CNode | None, logical: codeloom._neighbours.CLogicalLine) -> None:

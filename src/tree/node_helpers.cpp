@@ -100,6 +100,7 @@ bool IsTupleLiteralNode(CNode& node) {
 void BindNodeHelpers(nb::module_& module) {
     module.def(
         "DropSimpleParens", &DropSimpleParens, "node"_a,
+        nb::sig("def DropSimpleParens(node: CNode) -> CNode"),
         " If node is a parenthesized expression ( test ), return the\n    inner test node.  Otherwise, "
         "return the original node. ");
     module.def("IsSetLiteral", &IsSetLiteral, "atom_node"_a,

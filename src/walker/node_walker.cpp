@@ -128,7 +128,9 @@ void BindNodeWalker(nb::module_& module) {
         .def_rw("_fMaxOperatorExpressionLength", &CNodeWalker::_fMaxOperatorExpressionLength,
                 "Kept for hosts; the limit of 120 bytes doesn't follow it.")
         .def_rw("_fPy3", &CNodeWalker::_fPy3, "True when the analysed language level is 3.0 or later.")
-        .def_ro("_fToText", &CNodeWalker::_fToText, "The converter for all text that is recorded.");
+        .def_ro("_fToText", &CNodeWalker::_fToText,
+                nb::for_getter(nb::sig("def _fToText(self) -> CNodeToTextConverterImpl")),
+                "The converter for all text that is recorded.");
     BindOperations(binding);
 }
 
