@@ -12,6 +12,7 @@ from codeloom.false_hints import FalseHintRemover
 from codeloom.languages import Language
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
+from codeloom.rows import RowTexts
 from codeloom.source import REPLACEMENT
 from codeloom.treesift import CNewerAnalyzer, CNewerParser, CPGenAnalyzerImpl, CPGenParserImpl
 
@@ -83,7 +84,7 @@ def IsSpoiled(logical: CLogicalLine, spoiled_rows: frozenset[int]) -> bool:
     for token, (row, _) in zip(logical.fToks, logical.fPositions, strict=True):
         if token and REPLACEMENT in token:
             first_row = logical.fFirstLine + row
-            if not spoiled_rows.isdisjoint(range(first_row, first_row + len(token.splitlines()))):
+            if not spoiled_rows.isdisjoint(range(first_row, first_row + len(RowTexts(token)))):
                 return True
     return False
 

@@ -14,7 +14,7 @@ from functools import cached_property
 from codeloom import logicalline
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
-from codeloom.source import RowTexts
+from codeloom.rows import RowTexts
 
 _MARK = "type:"
 _BLANKS = " " * len(_MARK)

@@ -16,7 +16,8 @@ from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine
 from codeloom.name_places import NamePlaces, PlaceFinder, Tokens
 from codeloom.records import CRecord, RecordsOfLogical
-from codeloom.source import RowTexts, Source, SourceFromBytes, SourceFromText
+from codeloom.rows import RowTexts
+from codeloom.source import Source, SourceFromBytes, SourceFromText
 from codeloom.utils import GetLogicalsFromText
 
 

@@ -4,7 +4,8 @@ from codeloom.check import Problem
 from codeloom.engine import Complaint
 from codeloom.line_length import TooLong
 from codeloom.logicalline import CLogicalLine
-from codeloom.source import RowMap, RowTexts, Source
+from codeloom.rows import RowTexts
+from codeloom.source import RowMap, Source
 
 
 class LineReader:

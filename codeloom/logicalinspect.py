@@ -1,6 +1,7 @@
 """Looking at logical lines."""
 
 from codeloom._neighbours import CLogicalLine
+from codeloom.rows import RowTexts
 
 
 def TextFromTokens(logical: CLogicalLine) -> str:
@@ -24,7 +25,7 @@ def TextFromTokens(logical: CLogicalLine) -> str:
 
 def _Behind(token: str, row: int, col: int) -> tuple[int, int]:
     """The place just behind a token that starts at (row, col)."""
-    *rows_above, last_row = token.splitlines() or [""]
+    *rows_above, last_row = RowTexts(token)
     if rows_above:
         col = 0
     return row + len(rows_above), col + len(last_row.encode("utf-8", "surrogatepass"))

@@ -9,6 +9,8 @@ import re
 from bisect import bisect_right
 from dataclasses import dataclass
 
+from codeloom.rows import ROW_END, RowTexts
+
 REPLACEMENT = "\N{REPLACEMENT CHARACTER}"
 
 # One fault is reported for a row, up to this many rows; the last one tells of the rest.
@@ -16,8 +18,7 @@ MOST_FAULTY_ROWS = 20
 
 _COOKIE = re.compile(rb"[ \t\f]*#.*?coding[:=][ \t]*([-\w.]+)")
 _BLANK_OR_COMMENT = re.compile(rb"[ \t\f]*(?:#|$)")
-_ROW_END = re.compile(rb"\r\n|\r|\n")
-_ROW_END_IN_TEXT = re.compile(_ROW_END.pattern.decode())
+_ROW_END = re.compile(ROW_END.pattern.encode())
 _UNUSABLE = re.compile("[\0\ud800-\udfff]")
 
 # The 32-bit marks come first: one of them begins with a 16-bit mark.
@@ -49,11 +50,6 @@ class Source:
     text: str
     faults: tuple[SourceFault, ...] = ()
     spoiled_rows: frozenset[int] = frozenset()
-
-
-def RowTexts(text: str) -> list[str]:
-    """The rows of a text, without their ends."""
-    return _ROW_END_IN_TEXT.split(text)
 
 
 class RowMap:

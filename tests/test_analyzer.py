@@ -76,6 +76,7 @@ def Raising(error):
         ("else x", 1, 6),
         ("@ = 1", 1, 3),
         ("try: x = = 1", 1, 10),
+        ("x = '\u2028\x0b' y", 1, 12),  # neither of them ends a row
     ],
 )
 def test_place_of_a_syntax_error(text, row, offset):
@@ -222,6 +223,38 @@ def test_embedded_logicals_have_no_embedded_logicals_of_their_own():
     assert Analyze(ByHand("x = 1", exp_logicals=(inner,))) is None
 
 
+def test_records_may_change_while_they_are_lifted():
+    class Line(CLogicalLine):
+        def GetExpLogicals(self):
+            return (self.inner or self,)
+
+        def AppendTypeEquiv(self, name, equiv):
+            if self.inner:
+                self.inner.ClearDerivedInfo()
+            super().AppendTypeEquiv(name, equiv)
+
+    class Analyzer(CPGenAnalyzerImpl):
+        def _InspectSingleLogical(self, logical, *arguments):
+            logical.AppendTypeEquiv(b"x", b"y")
+            assert len(logical.fTypeEquivs) < 3  # now they are a list of the host's
+            return logical.fToks == ("a",) or super()._InspectSingleLogical(logical, *arguments)
+
+    for inner, count in ((None, 4), (ByHand("a"), 2)):
+        logical = Line(kAssignment, ("1",), ((0, 0),))
+        logical.inner = inner
+        assert Analyzer(VERSION).AnalyzeSingleLogical(logical, False) is None
+        assert logical.fTypeEquivs == [(b"x", b"y")] * count
+
+
+def test_logicals_far_apart_and_deep():
+    inner = ByHand("a b", kFstringFieldExp, first_line=2**31 - 1)
+    assert Analyze(ByHand("x", first_line=-(2**31), exp_logicals=(inner,))).lineno == 2**32
+    for _ in range(100_000):
+        inner = ByHand("a", exp_logicals=(inner,))
+    with pytest.raises(RecursionError):
+        inner.ClearDerivedInfo()
+
+
 def test_exp_logicals_must_be_a_tuple(caplog):
     class Odd(CLogicalLine):
         def GetExpLogicals(self):
@@ -329,6 +362,7 @@ def test_wrong_types_are_refused():
         lambda: CLogicalLine(kComment, [], []),
         lambda: CLogicalLine(kComment, (1,), ((0, 0),)),
         lambda: CLogicalLine(kComment, (), (), 0, ("x",)),
+        lambda: CLogicalLine(kComment, ("x",), ((0, 0),), tok_types=("x",)).GetTokenType(0),
     ]:
         with pytest.raises(TypeError):
             call()

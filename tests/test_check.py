@@ -65,7 +65,6 @@ def test_places(text, found):
     assert Found(text) == found
 
 
-NOT_WALKED_YET = pytest.mark.xfail(strict=True, reason="the walkers find no faults yet")
 HINT = "invalid syntax in stringified type hint"
 
 
@@ -111,6 +110,7 @@ def test_places_of_commented_hints():
         ("é = \0\n", ["1:5 a NUL"]),
         # A replacement character that the file itself holds spoils nothing.
         ("x = '\ufffd')\n'\0'", ["1:8", "2:2 a NUL"]),
+        ("x = '\ufffd\u2028')\n'\0'", ["1:9", "2:2 a NUL"]),
     ],
 )
 def test_a_line_with_unreadable_characters_has_that_problem_alone(text, found):

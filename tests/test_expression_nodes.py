@@ -189,7 +189,7 @@ def test_overrides_answer_for_their_node_wherever_it_stands():
     atom = Node(CAtom, Leaf("("), Node(List), Leaf(")"))
     assert atom.GetSubExprCount() == 7 and atom.GetSubExpr(3).fText == "item 3"
     List.GetSubExpr = lambda self, i: 5
-    with pytest.raises(TypeError, match="CExpression, int found"):
+    with pytest.raises(TypeError, match=r"List\.GetSubExpr must return CExpression, not int"):
         atom.GetSubExpr(3)
     del List.GetSubExprCount
     assert atom.GetSubExprCount() == 0 and atom.GetSubExpr(3) is None

@@ -506,6 +506,18 @@ def test_what_overrides_may_answer():
             parser.ParseCaseStmt((), ())
 
 
+def test_searches_that_go_back_are_refused():
+    def Back(self, target, *arguments):
+        return {",": 2, ":": 6, "]": 6}.get(target, -1)
+
+    for base, search in [
+        (CMatchCaseStatementParser, lambda cls: cls(DRIVER).ParseCaseStmt(*Tuples("case [a, b]:"))),
+        (CPGenParserImpl, lambda cls: Parse("def f[T, U](): pass", driver=cls(VERSION))),
+    ]:
+        with pytest.raises(ValueError, match=r"return -1 or an index in \[\d, \d\), not 2"):
+            search(type("Parser", (base,), {"_NonNestedFindTokenIndex": Back}))
+
+
 def test_tokens_are_kept_during_a_parse_only():
     class Parser(CMatchCaseStatementParser):
         def _NodeForPattern(self, start_i, end_i, allow_as=True):

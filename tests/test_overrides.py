@@ -127,7 +127,7 @@ def test_results_of_a_wrong_kind_are_type_errors():
             return self.result
 
     driver = Driver(VERSION)
-    with pytest.raises(TypeError, match="CNode, str found"):
+    with pytest.raises(TypeError, match=r"^Driver\.ParseToksToNode must return CNode, not str$"):
         driver.ParseToNode(Logical("x"), False)
     Driver.result = None
     assert driver.ParseToNode(Logical("x"), False) is None

@@ -21,7 +21,7 @@ const char* MessageFor(const CLogicalLine& exp_logical) {
 void RaiseEmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_logical, nb::handle context) {
     const nb::str message(MessageFor(exp_logical));
     const nb::object inner = CreateSyntaxError(message, exp_logical.Self(), context, nb::none());
-    const nb::int_ rows_down(exp_logical.fFirstLine - logical.fFirstLine);
+    const nb::int_ rows_down(int64_t{exp_logical.fFirstLine} - logical.fFirstLine);
     // The message stands in the place of the file name too.
     RaiseHostError(nb::borrow(PyExc_SyntaxError)(
         message,

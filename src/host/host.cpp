@@ -19,6 +19,7 @@ namespace {
 
 // The name of a class as the host knows it: `codeloom::CNode` is CNode, `CRef<CNode>` is CNode too.
 std::string HostName(const std::type_info& type) {
+    if (type == typeid(Py_ssize_t)) return "int";
     char* const demangled = abi::__cxa_demangle(type.name(), nullptr, nullptr, nullptr);
     std::string name = demangled == nullptr ? type.name() : demangled;
     std::free(demangled);
@@ -177,6 +178,13 @@ nb::object CHostOperation::Call(PyObject* const* stack, size_t count) const {
     PyObject* const result = PyObject_VectorcallMethod(_fName, stack, count + 1, nullptr);
     if (result == nullptr) throw nb::python_error();
     return nb::steal<nb::object>(result);
+}
+
+void CHostOperation::RaiseWrongResult(nb::handle self, const std::type_info& wanted,
+                                      nb::handle result) const {
+    PyErr_Format(PyExc_TypeError, "%s.%U must return %s, not %s", Py_TYPE(self.ptr())->tp_name, _fName,
+                 HostName(wanted).c_str(), Py_TYPE(result.ptr())->tp_name);
+    throw nb::python_error();
 }
 
 // collections.h

@@ -40,22 +40,20 @@ class CHostOperation {
     // `self`.
     nb::object Call(PyObject* const* stack, size_t count) const;
 
+    // Raises the host's TypeError, "<class>.<operation> must return <wanted>, not <class of result>".
+    [[noreturn]] void RaiseWrongResult(nb::handle self, const std::type_info& wanted,
+                                       nb::handle result) const;
+
   private:
     PyObject* _fName;  // interned, for the life of the process
 };
 
-// What an override returned, as a T; a wrong kind is the host's TypeError.
+// A value of the host's as a T; a wrong kind is the host's TypeError.
 template <class T>
 T ResultFromHost(const nb::object& result) {
-    if constexpr (std::is_void_v<T>) {
-        return;
-    } else if constexpr (std::is_base_of_v<nb::handle, T>) {
-        return T(result);
-    } else {
-        T value{};
-        if (!nb::try_cast<T>(result, value)) RaiseWrongType(typeid(T), result);
-        return value;
-    }
+    T value{};
+    if (!nb::try_cast<T>(result, value)) RaiseWrongType(typeid(T), result);
+    return value;
 }
 
 template <class Result, class... Arguments>
@@ -63,7 +61,14 @@ Result CallOverride(const CHostOperation& operation, nb::handle self, Arguments&
     nb::object owners[] = {nb::borrow<nb::object>(self), nb::cast(std::forward<Arguments>(arguments))...};
     PyObject* stack[sizeof...(Arguments) + 1];
     for (size_t i = 0; i <= sizeof...(Arguments); ++i) stack[i] = owners[i].ptr();
-    return ResultFromHost<Result>(operation.Call(stack, sizeof...(Arguments)));
+    const nb::object result = operation.Call(stack, sizeof...(Arguments));
+    if constexpr (std::is_base_of_v<nb::handle, Result>) {
+        return Result(result);
+    } else if constexpr (!std::is_void_v<Result>) {
+        Result value{};
+        if (!nb::try_cast<Result>(result, value)) operation.RaiseWrongResult(self, typeid(Result), result);
+        return value;
+    }
 }
 
 // The parts of an operation's type.

@@ -186,7 +186,7 @@ bool CMatchCaseStatementParser::_IsSign(Py_ssize_t tok_i) const {
 }
 
 Py_ssize_t CMatchCaseStatementParser::_Find(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i) {
-    return _NonNestedFindTokenIndex(nb::str(tok), start_i, end_i);
+    return CheckedIndex(_NonNestedFindTokenIndex(nb::str(tok), start_i, end_i), start_i, end_i);
 }
 
 Py_ssize_t CMatchCaseStatementParser::_FindOrEnd(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i) {

@@ -1,5 +1,7 @@
 #include "parse/parser_driver.h"
 
+#include <algorithm>
+
 #include "host/errors.h"
 #include "host/neighbour_call.h"
 #include "host/text.h"
@@ -146,7 +148,7 @@ CNodeRef CPGenParserImpl::_PeelRoot(nb::object parsed, bool is_decorator) {
 
 Py_ssize_t CPGenParserImpl::_FindNextNonSkipIndex(nb::tuple toks, Py_ssize_t index) {
     const Py_ssize_t count = TupleSize(toks);
-    for (++index; index < count; ++index) {
+    for (index = std::min(index, count) + 1; index < count; ++index) {
         const nb::handle tok = TupleItem(toks, index);
         if (tok.is_none()) continue;
         const CUtf8 text(tok);

@@ -95,7 +95,7 @@ nb::list CPGenParserImpl::_NodesForTypeParameters(nb::tuple toks, bool in_async_
                                                   Py_ssize_t start, Py_ssize_t end, bool raise_errors) {
     nb::list nodes;
     for (Py_ssize_t i = start + 1; i < end;) {
-        Py_ssize_t comma = _NonNestedFindTokenIndex(nb::str(","), toks, i, end);
+        Py_ssize_t comma = CheckedIndex(_NonNestedFindTokenIndex(nb::str(","), toks, i, end), i, end);
         if (comma == -1) comma = end;
         CNodeRef node = _CreateSingleTypeParameterNode(toks, in_async_def, positions, i, comma, raise_errors);
         if (node) nodes.append(node.Release());

@@ -40,6 +40,14 @@ Py_ssize_t FindOutsideBrackets(std::string_view target, nb::handle toks, Py_ssiz
     return -1;
 }
 
+Py_ssize_t CheckedIndex(Py_ssize_t found, Py_ssize_t start, Py_ssize_t end) {
+    if (found == -1 || (start <= found && found < end)) return found;
+    PyErr_Format(PyExc_ValueError,
+                 "_NonNestedFindTokenIndex must return -1 or an index in [%zd, %zd), not %zd", start, end,
+                 found);
+    throw nb::python_error();
+}
+
 CBracketSteps::CBracketSteps(nb::handle toks) {
     const Py_ssize_t count = TupleSize(toks);
     _fNext.resize(static_cast<size_t>(count), count);

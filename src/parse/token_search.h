@@ -25,8 +25,12 @@ bool IsName(nb::handle toks, Py_ssize_t i);
 Py_ssize_t FindOutsideBrackets(std::string_view target, nb::handle toks, Py_ssize_t start, Py_ssize_t end,
                                int depth = 0);
 
-// The same for many searches in one tuple of tokens: each takes one step over a whole bracket, so that nested
-// brackets cost no more than flat ones.
+// `found` itself when it is -1 or in [start, end); ValueError for what else an override may answer, since a
+// search that goes back never ends.
+Py_ssize_t CheckedIndex(Py_ssize_t found, Py_ssize_t start, Py_ssize_t end);
+
+// FindOutsideBrackets for many searches in one tuple of tokens: each takes one step over a whole bracket, so
+// that nested brackets cost no more than flat ones.
 class CBracketSteps {
   public:
     CBracketSteps() = default;

@@ -46,7 +46,7 @@ void CLogicalLine::InitFromTokens(nb::object type, nb::tuple toks, std::unique_p
 }
 
 int CLogicalLine::GetTokenType(Py_ssize_t i) {
-    if (_fPlaces == nullptr) return nb::cast<int>(nb::object(GetTokTypes()[i]));
+    if (_fPlaces == nullptr) return ResultFromHost<int>(nb::object(GetTokTypes()[i]));
     if (i < 0) i += fTokenCount;
     if (i < 0 || i >= fTokenCount) RaiseIndexError("token index out of range");
     return _fPlaces[i].type;
@@ -68,8 +68,10 @@ void CLogicalLine::ClearDerivedInfo() {
     fTypeEquivs.Clear();
     fArgTypeEquivs.Clear();
     if (_fExpLogicals.is_none()) return;
-    for (nb::handle exp_logical : nb::borrow<nb::tuple>(_fExpLogicals))
+    for (nb::handle exp_logical : nb::borrow<nb::tuple>(_fExpLogicals)) {
+        const CRecursionScope recursion;  // a host may nest them without end
         Instance<CLogicalLine>(exp_logical)->ClearDerivedInfo();
+    }
 }
 
 nb::object CLogicalLine::GetExpLogicals() {

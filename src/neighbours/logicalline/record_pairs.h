@@ -39,8 +39,9 @@ class CRecordPairs {
   private:
     template <class Visit>
     void _ForEachOfHost(Visit visit) const {
-        for (Py_ssize_t i = 0; i < ListSize(_fHostPairs); ++i) {
-            const nb::tuple pair(nb::borrow(ListItem(_fHostPairs, i)));
+        // A copy: what is visited may append to the records, or drop them.
+        for (nb::handle item : ListSlice(_fHostPairs, 0, ListSize(_fHostPairs))) {
+            const nb::tuple pair(nb::borrow(item));
             if (pair.size() != 2)
                 throw nb::value_error("a record of a line must be a pair of name and equiv");
             visit(nb::object(pair[0]), nb::object(pair[1]));
