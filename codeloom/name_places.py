@@ -98,6 +98,8 @@ class PlaceFinder(CNodeWalker):
         self._fDefined: dict[str, Tokens] = {}
         self._fLoads: dict[str, Tokens | None] = {}
         self._fByContext: dict[object, Tokens | None] = {}
+        # In their order, since a line may bind the same name twice.
+        self._fImported: deque[Tokens] = deque()
         # Innermost last.
         self._fCalls: list[Tokens | None] = []
         self._fYields: list[Tokens | None] = []
@@ -128,7 +130,7 @@ class PlaceFinder(CNodeWalker):
 
     def _Define(self, name: str | None, tokens: Tokens | None) -> None:
         if name is not None and tokens is not None:
-            self._fDefined.setdefault(name, tokens)
+            self._fDefined[name] = tokens
             self._fPlaces.of_names.setdefault(name, tokens)
 
     def _DefineByText(self, node: CNode) -> None:
@@ -258,17 +260,21 @@ class PlaceFinder(CNodeWalker):
         super()._VisitClassdef(classdef_node)
 
     def _VisitImportNames(self, node: Any) -> None:
-        self._DefineImports()
+        self._fImported.extend(self._Imported())
         super()._VisitImportNames(node)
 
     def _VisitFromImport(self, node: Any) -> None:
-        self._DefineImports()
+        self._fImported.extend(self._Imported())
+        if node.GetImportStar():
+            self._Define("*", self._fImported.popleft())
         super()._VisitFromImport(node)
 
-    def _DefineToken(self, i: int) -> None:
-        self._Define(self._fLine.fToks[i], Tokens(self._fLine, i, i))
+    def _AddNameDefined(self, name: str | bytes) -> None:
+        if self._fImported:
+            self._Define(AsStr(name), self._fImported.popleft())
+        super()._AddNameDefined(name)
 
-    def _DefineImports(self) -> None:
+    def _Imported(self) -> Iterator[Tokens]:
         """A name is bound by the first token behind `import` or a comma, or by the one behind `as`."""
         before, first = "", None
         for i, token in self._Visible(self._fLine.fToks.index("import")):
@@ -276,11 +282,11 @@ class PlaceFinder(CNodeWalker):
                 continue
             if before in ("import", ",", "as"):
                 if first is not None and before != "as":
-                    self._DefineToken(first)
+                    yield Tokens(self._fLine, first, first)
                 first = i
             before = token
         if first is not None:
-            self._DefineToken(first)
+            yield Tokens(self._fLine, first, first)
 
     def _VisitGlobalStmt(self, node: Any) -> None:
         self._DefineEach(node.fChildren[1:])
