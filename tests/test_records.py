@@ -8,14 +8,12 @@ from hypothesis import given
 from hypothesis import strategies as st
 
 from codeloom import symbolinfo
-from codeloom.logicalline import CLogicalLine, kUnknown
 from codeloom.records import (
     CRecord,
     FormatRecord,
     FormatRecords,
     ParseRecord,
     RecordOfPair,
-    RecordsOfLogical,
     kRecordKinds,
 )
 
@@ -26,49 +24,14 @@ KINDS = {kind.name: kind for kind in kRecordKinds}
 @pytest.mark.parametrize("kind", kRecordKinds, ids=lambda kind: kind.name)
 def test_each_kind_has_a_line_that_reads_back(kind):
     record = ParseRecord(kind.example)
-    assert record.kind is kind and str(record) == kind.example
+    assert record.kind is kind and FormatRecords([record] * 2) == f"{kind.example}\n" * 2
     name, ibytes = record.ToPair()
     assert symbolinfo.GetInfoBytesKind(ibytes) == kind.kind
     assert RecordOfPair(name, ibytes, record.of_arg) == record
     assert bool(record.payload) == (kind.payload != "none")
 
 
-def test_the_lines_are_these():
-    logical = CLogicalLine(kUnknown, (), ())
-    for name, ibytes in [
-        (b"f", symbolinfo.kSetPrefix),
-        (b"x", symbolinfo.kGetPrefix),
-        (b"x", symbolinfo.kTypeHintPrefix + b"int"),
-        (b"y", b"x.z"),
-        ("é".encode(), symbolinfo.BuildLiteralInfo("str", "'a  b'")),
-    ]:
-        logical.AppendTypeEquiv(name, ibytes)
-    logical.AppendArgTypeEquiv(b"a", symbolinfo.kSetPrefix)
-    lines = "set  f\nget  x\nhint x  int\nis   y  x.z\nliteral é  str: 'a  b'\narg set  a\n"
-    assert FormatRecords(RecordsOfLogical(logical)) == lines
-    assert [ParseRecord(line) for line in lines.splitlines()] == RecordsOfLogical(logical)
-    assert RecordsOfLogical(CLogicalLine(kUnknown, (), ())) == []
-
-
-PIECES = st.lists(
-    st.sampled_from(
-        [
-            b"a",
-            b" ",
-            b"  ",
-            b":",
-            b"s",
-            b"'",
-            b'"',
-            b"b'",
-            b"\\",
-            b"\n",
-            b"\xc3\xa9",
-            b"\xff",
-            b"\0",
-        ]
-    )
-).map(b"".join)
+PIECES = st.lists(st.sampled_from(b"a|b'| |  |:|s|'|\"|\\|\n|\xc3\xa9|\xff|\0".split(b"|"))).map(b"".join)
 RECORDS = PIECES | st.builds(bytes.__add__, st.sampled_from([k.prefix for k in kRecordKinds]), PIECES)
 
 
