@@ -6,6 +6,7 @@ The node layouts are in trees/statements_match.tree; which words are keywords is
 import ast
 import gc
 import weakref
+from pathlib import Path
 
 import pytest
 from hand_made import Parse, Tokens
@@ -48,10 +49,10 @@ def Tuples(text):
     return logical.fToks, logical.fPositions
 
 
-def ByHand(text):
-    """Tokens with blanks between them, brackets of any kind among them; each has its index as column."""
+def ByHand(text, *between):
+    """Tokens with blanks between them, brackets of any kind among them, each with its index as column."""
     toks = tuple(text.split())
-    return toks, tuple((0, i) for i in range(len(toks)))
+    return toks, *between, tuple((0, i) for i in range(len(toks)))
 
 
 # Patterns against those of the interpreter
@@ -161,166 +162,28 @@ def test_open_sequences_have_it_too(patterns):
     assert ("sequence", *parts) == ExpectedForm(tree.body[0].cases[0].pattern)
 
 
-# Bad patterns, each with the place of its fault
-
-BAD_PATTERNS = """
-case a as 1:
-          ^
-case a as b.c:
-       ^
-case a as b as c:
-       ^
-case ():
-      ^
-case a, b:
-      ^
-case *a, b:
-     ^
-case "a" "b":
-     ^
-case é b:
-       ^
-case a b:
-       ^
-case a.b.:
-        ^
-case a..b:
-       ^
-case a.1:
-      ^
-case a[0]:
-      ^
-case a := 1:
-       ^
-case not a:
-         ^
-case ...:
-     ^
-case ~1:
-     ^
-case -:
-     ^
-case -a:
-      ^
-case 1 * 2:
-       ^
-case 1 2:
-       ^
-case 1 + a:
-         ^
-case 1 + 2 + 3:
-           ^
-case a | | b:
-         ^
-case (a | 1 b):
-            ^
-case [a, , b]:
-         ^
-case [a b]:
-        ^
-case [*1]:
-      ^
-case [*a.b]:
-      ^
-case [a for a in b]:
-        ^
-case {"a"}:
-      ^
-case {"a": 1, "b"}:
-              ^
-case {"a": }:
-           ^
-case {: 1}:
-      ^
-case {a, b: 1}:
-       ^
-case {**a, "b": 1}:
-      ^
-case {**}:
-        ^
-case A(a.b=0):
-          ^
-case A(=0):
-       ^
-case A(a=):
-         ^
-case A(,):
-       ^
-case A(a)(b):
-        ^
-case A(a=1) b:
-          ^
-case A(a).b:
-        ^
-"""
-
-# Those of them that the newer parser takes, and what else is bad for it.
+# Bad patterns, each with the place of its fault: those of bad_patterns.places that the newer parser takes.
 NO_LONGER_BAD = {"case ():", "case a, b:", "case *a, b:", 'case "a" "b":'}
-BAD_FOR_NEWER = """
-case a,, b:
-       ^
-case *a, 1 b:
-           ^
-case a, b as 1:
-             ^
-case a, b as c, d e:
-                  ^
-case "a" b:
-         ^
-case "a" "b" "c" d | e:
-                 ^
-case [a, "b" 1]:
-             ^
-case (,):
-      ^
-case {a, b: 1}, c:
-       ^
-case a if b c:
-            ^
-case a, b if c: d e
-                  ^
-case a: b +
-           ^
-match a, b c:
-           ^
-match *a:
-      ^
-match yield a:
-      ^
-match a for a in b:
-      ^
-case def:
-     ^
-case [a, is]:
-         ^
-case a.in.b:
-       ^
-case def(a):
-     ^
-case 1 | if:
-         ^
-case [1 | 2 |, 3]:
-             ^
-"""
 
 
-def PlacesIn(table):
-    rows = table.strip("\n").split("\n")
+def PlacesIn(file):
+    """Lines, each with the place of the caret beneath it."""
+    rows = (Path(__file__).parent / "snippets" / f"{file}.places").read_text("utf-8").splitlines()
     for text, caret in zip(rows[::2], rows[1::2], strict=True):
         yield text, (1, len(text[: caret.index("^")].encode()) + 1)
 
 
-def Tables(*tables):
-    pairs = [pair for table in tables for pair in PlacesIn(table)]
+def Tables(*files):
+    pairs = [pair for file in files for pair in PlacesIn(file)]
     return pytest.mark.parametrize(("text", "place"), pairs, ids=[text for text, _ in pairs])
 
 
-@Tables(BAD_PATTERNS)
+@Tables("bad_patterns")
 def test_the_place_of_the_fault(text, place):
     assert Place(text) == place
 
 
-@Tables(BAD_PATTERNS, BAD_FOR_NEWER)
+@Tables("bad_patterns", "bad_for_newer")
 def test_the_place_of_the_fault_for_the_newer_parser(text, place):
     assert Place(text, NEWER_ANALYZER) == (None if text in NO_LONGER_BAD else place)
 
@@ -342,62 +205,33 @@ def test_places_in_lines_of_several_rows():
 def test_brackets_of_unlike_kinds():
     lines = {"case [ a ) :": 3, "case ( a , b ] :": 5, "case ( a ] :": 3, "case { 1 : a ] :": 5}
     for line, error_i in lines.items():
-        toks, positions = ByHand(line)
-        with pytest.raises(ParseError, match="Invalid syntax") as caught:
-            DRIVER.ParseToksToNode(toks, False, positions)
-        error = caught.value
-        assert (error.type, error.value, error.context) == (0, toks[error_i], positions[error_i])
-
-
-def test_places_beside_the_pattern():
-    assert Place("match a b:") == (1, 9)
-    assert Place("match a: pass") == (1, 8)
-    assert Place("match a") == (1, 7) and Place("case 1") == (1, 6)  # taken for names
-    # Guard and body are parsed as slices of the line, and their tokens are counted from the slice's first.
-    assert Place("case a if b c:") == (1, 8)
-    assert Place("case a: b c") == (1, 6)
-
-
-def test_what_the_interpreter_refuses_is_taken():
-    for text in ["a |", "+1", "*a", "def", "A(a=0, b)", "A(1=0)", "{**1}", "[*a, *b]", "a | b"]:
-        assert Place(f"case {text}:") is None, text
+        with pytest.raises(ParseError) as caught:
+            DRIVER.ParseToksToNode(*ByHand(line, False))
+        assert caught.value.args == ("Invalid syntax", 0, line.split()[error_i], (0, error_i))
 
 
 # Statements
 
 
-def test_the_subject():
+def test_the_subject_and_the_body():
     for text, subject in [
-        ("match *a, b:", "* a , b"),
         ("match (a)[0]:  # one", "( a ) [ 0 ]"),
         ("match (a,\n  # one\n  b) \\\n :", "( a , b )"),
-        ("match lambda: 0:", "lambda : 0"),
         ("match await a:", "await a"),
-        ("match a := 1:", "a := 1"),
         ("match (a).b + (c):", "( a ) . b + ( c )"),
     ]:
         assert Tokens(Parse(text).GetTestExpression()) == subject
-
-
-def test_a_subject_in_two_brackets_stays_whole():
-    toks, positions = ByHand("match a ) + ( b :")
-    node = DRIVER.ParseToksToNode(toks, False, positions)
-    assert Tokens(node.GetTestExpression()) == "( a ) + ( b )"
-
-
-def test_comments_are_no_body():
+    node = DRIVER.ParseToksToNode(*ByHand("match a ) + ( b :", False))
+    assert Tokens(node.GetTestExpression()) == "( a ) + ( b )"  # in two brackets it stays whole
     assert Parse("case 1:  # c").GetBody() is None
     assert Tokens(Parse("case a if b: c  # d").GetBody()) == "c"
 
 
 def test_names_take_the_ordinary_road():
+    parser = DRIVER._fMatchCaseStatementParser
     for text in ["match = 3", "match(x)", "case.x", "match[x]: y"]:
-        (logical,) = GetLogicalsFromText(text)
-        parser = DRIVER._fMatchCaseStatementParser
-        for parse in (parser.ParseMatchStmt, parser.ParseCaseStmt):
-            assert parse(logical.fToks, logical.fPositions) is None
+        assert parser.ParseMatchStmt(*Tuples(text)) is parser.ParseCaseStmt(*Tuples(text)) is None
         assert Place(text) is None
-    assert type(Parse("match(x)")) is CAtomExpr
 
 
 def test_the_decision_is_looked_up_at_the_call(monkeypatch):
@@ -420,48 +254,31 @@ def test_the_decision_is_looked_up_at_the_call(monkeypatch):
 # The parser as the host sees it
 
 
-class Recording(CMatchCaseStatementParser):
-    def __init__(self, driver=DRIVER):
-        super().__init__(driver)
-        self.calls = []
-
-
-def _Recorded(name):
+def Recorded(name, calls):
     def Operation(self, *arguments):
-        self.calls.append((name, *arguments))
+        calls.append((name, *arguments))
         return getattr(CMatchCaseStatementParser, name)(self, *arguments)
 
     return Operation
 
 
-for _name in [name for name in vars(CMatchCaseStatementParser) if "__" not in name]:
-    setattr(Recording, _name, _Recorded(_name))
-
-
 def test_overrides_at_every_depth():
-    parser = Recording()
+    names = {name for name in vars(CMatchCaseStatementParser) if "__" not in name}
+    calls = []
+    operations = {name: Recorded(name, calls) for name in names}
+    parser = type("Recording", (CMatchCaseStatementParser,), operations)(DRIVER)
     parser.ParseCaseStmt(*Tuples("case A(a.b, c=-1) | [d, {'e': _}]:"))
-    assert [call for call in parser.calls if call[0].startswith("_NodeFor")] == [
-        ("_NodeForPattern", 1, 22, True),
-        ("_NodeForPattern", 1, 12, False),
-        ("_NodeForClassPattern", 1, 12),
-        ("_NodeForDottedNameValue", 1, 2),
-        ("_NodeForPattern", 3, 6, True),
-        ("_NodeForDottedNameValue", 3, 6),
-        ("_NodeForPattern", 9, 11, True),
-        ("_NodeForNumberPattern", 9, 11),
-        ("_NodeForPattern", 13, 22, False),
-        ("_NodeForSequencePattern", 13, 22),
-        ("_NodeForPattern", 14, 15, True),
-        ("_NodeForPattern", 16, 21, True),
-        ("_NodeForMappingPattern", 16, 21),
-        ("_NodeForPattern", 17, 18, True),
-        ("_NodeForPattern", 19, 20, True),
-    ]
+    patterns = [call for call in calls if call[0].startswith("_NodeFor")]
+    assert " ".join(f"{name[8:]} {start_i}-{end_i}" for name, start_i, end_i, *_ in patterns) == (
+        "Pattern 1-22 Pattern 1-12 ClassPattern 1-12 DottedNameValue 1-2 Pattern 3-6 DottedNameValue 3-6 "
+        "Pattern 9-11 NumberPattern 9-11 Pattern 13-22 SequencePattern 13-22 Pattern 14-15 Pattern 16-21 "
+        "MappingPattern 16-21 Pattern 17-18 Pattern 19-20"
+    )
+    assert [start_i for _, start_i, *_, allow_as in patterns if allow_as is False] == [1, 13]
     with pytest.raises(ParseError):
         parser.ParseCaseStmt(*Tuples("case 1 2:"))
     parser.ParseMatchStmt(*Tuples("match a:"))
-    assert {name for name, *_ in parser.calls} == {name for name in vars(Recording) if "__" not in name}
+    assert {name for name, *_ in calls} == names
 
 
 def test_overrides_of_the_newer_parser():
@@ -483,27 +300,21 @@ def test_overrides_of_the_newer_parser():
     assert [Tokens(part) for part in (node.GetGuard(), node.GetBody())] == ["if g : pass", "h"]
 
 
-def test_what_overrides_may_answer():
-    class Parser(CMatchCaseStatementParser):
-        def _RemoveSkipToks(self, toks, positions):
-            return self.answer
-
-        def _ParseExceptionAt(self, error_i):
-            return self.error
-
-    parser = Parser(DRIVER)
-    for answer, failure in [(None, TypeError), (((),), ValueError), (([], ()), TypeError), (((), ()), None)]:
-        parser.answer = answer
-        if failure is None:
-            assert parser.ParseCaseStmt((), ()) is None
-        else:
-            with pytest.raises(failure):
-                parser.ParseCaseStmt((), ())
-    parser.answer = Tuples("case ...:")
-    for error, failure in [(KeyError("odd"), KeyError), (None, TypeError), (KeyError, TypeError)]:
-        parser.error = error
-        with pytest.raises(failure):
-            parser.ParseCaseStmt((), ())
+@pytest.mark.parametrize(
+    ("operation", "answer", "failure"),
+    [
+        ("_RemoveSkipToks", None, TypeError),
+        ("_RemoveSkipToks", ((),), ValueError),
+        ("_RemoveSkipToks", ([], ()), TypeError),
+        ("_ParseExceptionAt", KeyError("odd"), KeyError),
+        ("_ParseExceptionAt", None, TypeError),
+        ("_ParseExceptionAt", KeyError, TypeError),
+    ],
+)
+def test_answers_of_overrides_that_do_not_fit(operation, answer, failure):
+    parser = type("Parser", (CMatchCaseStatementParser,), {operation: lambda *_: answer})(DRIVER)
+    with pytest.raises(failure):
+        parser.ParseCaseStmt(*Tuples("case ...:"))
 
 
 def test_searches_that_go_back_are_refused():
@@ -572,11 +383,7 @@ def test_a_parser_without_a_driver():
 
 
 def test_driver_and_parser_are_collected():
-    class Driver(CPGenParserImpl):
-        pass
-
-    driver = Driver(VERSION)
-    assert type(driver._fMatchCaseStatementParser) is CMatchCaseStatementParser
+    driver = type("Driver", (CPGenParserImpl,), {})(VERSION)
     gone = weakref.ref(driver)
     del driver
     gc.collect()
