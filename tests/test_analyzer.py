@@ -1,6 +1,5 @@
 """The analyzer's error policy, embedded expressions, and syntax errors with their places."""
 
-import logging
 from types import SimpleNamespace
 
 import pytest
@@ -14,7 +13,7 @@ from codeloom.logicalline import (
     kFstringFieldExp,
     kStringifiedTypeHint,
 )
-from codeloom.treesift import CNodeWalker, CPGenAnalyzerImpl, CreateSyntaxError
+from codeloom.treesift import CPGenAnalyzerImpl, CreateSyntaxError
 from codeloom.utils import GetLogicalsFromText
 
 VERSION = (3, 8, 0)
@@ -42,24 +41,18 @@ def Place(error):
 
 
 class Failing(CPGenAnalyzerImpl):
-    """An analyzer whose walk raises or does what a test says."""
+    """An analyzer whose walk leaves a record and then raises an error."""
 
-    def __init__(self, action):
+    def __init__(self, error=None):
         super().__init__(VERSION)
-        self.action = action
+        self.error = error
         self.seen = []
 
     def _InspectEmbeddedExpressions(self, logical, node, in_async_def, first_in_def):
         self.seen.append((logical, node))
-        self.action(logical)
-
-
-def Raising(error):
-    def Action(logical):
         logical.AppendTypeEquiv(b"x", b"y")
-        raise error
-
-    return Failing(Action)
+        if self.error is not None:
+            raise self.error
 
 
 @pytest.mark.parametrize(
@@ -101,89 +94,49 @@ def test_an_analyzed_logical_is_left_alone():
 
 
 def test_logicals_of_nothing():
-    for logical in (
-        CLogicalLine(kAssignment, (), ()),
-        CLogicalLine(kAssignment, (None, None), ((0, 0), (0, 1))),
-    ):
-        assert Analyze(logical) is None
+    for toks, positions in (((), ()), ((None, None), ((0, 0), (0, 1)))):
+        assert Analyze(CLogicalLine(kAssignment, toks, positions)) is None
 
 
 def test_a_comment_is_not_parsed_but_inspected():
-    analyzer = Failing(lambda logical: None)
-    comment = Logical("# = = =")
+    analyzer, comment = Failing(), Logical("# = = =")
     assert analyzer.AnalyzeSingleLogical(comment, False) is None
     assert analyzer.seen == [(comment, None)]
 
 
-@pytest.mark.parametrize("error", [TypeError("odd"), KeyboardInterrupt(), RuntimeError("x")])
-def test_other_failures_are_logged_and_swallowed(error, caplog):
-    logical = Logical("x = 1")
-    with caplog.at_level(logging.ERROR, logger="codeloom"):
-        assert Raising(error).AnalyzeSingleLogical(logical, False) is None
-    (record,) = caplog.records
-    assert record.exc_info[1] is not None and record.exc_info[2] is not None
-    assert logical.fTypeEquivs is None
-    if isinstance(error, Exception):
-        assert str(record.exc_info[1]) == (
-            f"Could not analyze logical -- inner exception is {error!r}\n  logical tokens: x = 1"
+@pytest.mark.parametrize("error", [TypeError("odd"), KeyboardInterrupt(), SyntaxError("rejected"), None])
+def test_the_outcome_of_a_walk(error, caplog):
+    analyzer, logical = Failing(error), Logical("x = f(1)")
+    is_returned = isinstance(error, SyntaxError)
+    assert analyzer.AnalyzeSingleLogical(logical, False) is (error if is_returned else None)
+    assert (logical.fTypeEquivs is None) == (error is not None)
+    ((_, node),) = analyzer.seen  # it has gone back in any case
+    assert (node.fText, node.fChildren) == (None, None) and node.fClsInfo.fFirstFree is node
+    logged = [record.exc_info for record in caplog.records]
+    assert len(logged) == (error is not None and not is_returned)
+    if isinstance(error, TypeError):
+        assert str(logged[0][1]) == (
+            "Could not analyze logical -- inner exception is TypeError('odd')\n  logical tokens: x = f ( 1 )"
         )
-        assert caplog.text.count("in Action") == 2  # the outer exception has the inner traceback
-
-
-def test_a_syntax_error_of_a_walk_is_returned_as_it_is():
-    error = SyntaxError("rejected")
-    logical = Logical("x = 1")
-    assert Raising(error).AnalyzeSingleLogical(logical, False) is error
-    assert logical.fTypeEquivs is None
+        assert caplog.text.count("in _InspectEmbeddedExpressions") == 2  # the outer one has its traceback
 
 
 def test_a_removed_token_spoils_the_log_text(caplog):
     logical = CLogicalLine(kAssignment, ("x", None, "=", "1"), ((0, 0), (0, 1), (0, 2), (0, 4)))
-    assert Raising(ValueError("odd")).AnalyzeSingleLogical(logical, False) is None
+    assert Failing(ValueError("odd")).AnalyzeSingleLogical(logical, False) is None
     assert isinstance(caplog.records[0].exc_info[1], TypeError)
 
 
-def test_the_report_is_looked_up_at_the_call(monkeypatch):
-    calls = []
-    fake = SimpleNamespace(
-        ReportCurrentException=lambda **options: calls.append(options),
-        RaiseWithTraceback=treesift.reflect.RaiseWithTraceback,
-    )
-    monkeypatch.setattr(treesift, "reflect", fake)
-    assert Raising(TypeError()).AnalyzeSingleLogical(Logical("x"), False) is None
-    assert calls == [{"suppress_gui": True}]
-
-
-def test_a_failure_of_a_handler_is_raised(monkeypatch):
+def test_the_report_is_looked_up_at_the_call_and_its_failure_is_raised(monkeypatch):
     def Report(**options):
-        raise OSError("no log")
+        raise OSError(options)
 
     monkeypatch.setattr(treesift, "reflect", SimpleNamespace(ReportCurrentException=Report))
-    with pytest.raises(OSError, match="no log"):
-        Raising(KeyboardInterrupt()).AnalyzeSingleLogical(Logical("x"), False)
-
-
-def test_nodes_go_back_on_every_road():
-    for action in (lambda logical: None, lambda logical: 1 / 0, lambda logical: exec("raise SyntaxError")):
-        analyzer = Failing(action)
-        analyzer.AnalyzeSingleLogical(Logical("x = f(1)"), False)
-        ((_, node),) = analyzer.seen
-        assert (node.fText, node.fChildren) == (None, None)
-        assert node.fClsInfo.fFirstFree is node
-
-
-def test_after_an_error_the_next_logical_is_sound():
-    for text in ("x = (", "x = 'a", "def f(:", "x y z"):
-        assert Analyze(Logical(text)) is not None
-        assert Analyze(Logical("x = (1, 2)")) is None
+    with pytest.raises(OSError, match=r"{'suppress_gui': True}"):
+        Failing(KeyboardInterrupt()).AnalyzeSingleLogical(Logical("x"), False)
 
 
 # Embedded expressions
-
-
-def test_a_broken_field_of_an_fstring():
-    error = Analyze(Logical("x = f'''a\n{b c}'''"))
-    assert Place(error) == ("invalid syntax", 2, 3, "b c")
 
 
 @pytest.mark.parametrize(
@@ -272,31 +225,33 @@ def Attributes(**changed):
     return SimpleNamespace(**logical | changed)
 
 
+SAME_ROW = SimpleNamespace(lineno=0, utf8_col=2)
+LATER_ROW = SimpleNamespace(lineno=2, utf8_col=1)
+
+
 @pytest.mark.parametrize(
-    ("context", "lineno", "offset"),
-    [(0, 1, 1), (1, 1, 4), (2, 1, 9), (99, 1, 9), ((4, 2), 5, 3), (-1, 1, 4)],
+    ("context", "place_in_token", "lineno", "offset"),
+    [
+        (0, None, 1, 1),
+        (1, None, 1, 4),
+        (-1, None, 1, 4),
+        (2, None, 1, 9),
+        (99, None, 1, 9),
+        ((4, 2), None, 5, 3),
+        (1, SAME_ROW, 1, 6),
+        (1, LATER_ROW, 3, 2),
+        ((4, 2), LATER_ROW, 5, 3),  # a given place isn't refined
+        (2, LATER_ROW, 1, 9),  # nor is the end
+    ],
 )
-def test_create_syntax_error(context, lineno, offset):
-    error = CreateSyntaxError("message", Attributes(), context)
-    assert (error.msg, error.filename, error.lineno, error.offset) == ("message", "<string>", lineno, offset)
-
-
-def test_places_within_a_token():
-    same_row = SimpleNamespace(lineno=0, utf8_col=2)
-    later_row = SimpleNamespace(lineno=2, utf8_col=1)
-    for context, info, place in [
-        (1, same_row, (1, 6)),
-        (1, later_row, (3, 2)),
-        ((4, 2), later_row, (5, 3)),  # a given place isn't refined
-        (2, later_row, (1, 9)),  # nor is the end
-    ]:
-        error = CreateSyntaxError("m", Attributes(), context, info)
-        assert (error.lineno, error.offset) == place
+def test_create_syntax_error(context, place_in_token, lineno, offset):
+    error = CreateSyntaxError("message", Attributes(), context, place_in_token)
+    assert error.msg == "message" and Place(error) == ("<string>", lineno, offset, "ab é\ncd")
 
 
 def test_an_empty_logical_is_at_its_start():
     error = CreateSyntaxError("m", Attributes(fToks=(), fPositions=(), fTokenCount=0), None)
-    assert (error.lineno, error.offset, error.text) == (1, 1, "")
+    assert Place(error) == ("<string>", 1, 1, "")
 
 
 @pytest.mark.parametrize(
@@ -313,39 +268,6 @@ def test_an_empty_logical_is_at_its_start():
 def test_broken_places(logical, context, failure):
     with pytest.raises(failure):
         CreateSyntaxError("m", logical, context)
-
-
-# Walks
-
-
-def test_limits_end_a_walk_with_a_printed_line(capsys):
-    walker_limits = [
-        ("x = " + "(" * 60 + "1,1" + ",)" * 60, "recurse count"),
-        ("f(" + "1, " * 10_000 + ")", "number of calls"),
-    ]
-    for text, limit in walker_limits:
-        logical = Logical(text)
-        assert Analyze(logical) is None
-        assert (
-            f"RuntimeError raised in CNodeWalker.Walk: RuntimeError('Maximum {limit}"
-            in capsys.readouterr().out
-        )
-        assert Analyze(Logical("x = 1")) is None and capsys.readouterr().out == ""
-
-
-def test_only_one_walk_at_a_time():
-    class Walker(CNodeWalker):
-        def _VisitNode(self, node):
-            with pytest.raises(ValueError, match="Only one logical may be walked at a time"):
-                self.Walk(node, logical)
-            with pytest.raises(ValueError):
-                self.Walk(None, logical)
-            return super()._VisitNode(node)
-
-    logical = Logical("x = 1")
-    tree = ANALYZER.ParseToNode(logical)
-    Walker(VERSION).Walk(tree, logical)
-    Walker(VERSION).Walk(None, logical)
 
 
 def test_wrong_types_are_refused():
