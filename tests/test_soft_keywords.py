@@ -15,7 +15,6 @@ from hypothesis import given, settings
 from hypothesis import strategies as st
 
 from codeloom.logicalline import FindMatchOrCaseType, kCase, kMatch, kUnknown
-from codeloom.treesift import CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
 
 pytestmark = pytest.mark.filterwarnings("ignore")  # of the interpreter, for what it parses here
@@ -201,17 +200,3 @@ def test_library(count):
     for path in LibraryFiles(count):
         for logical, true_type in LinesOf(path):
             assert Decision(logical.fToks) == true_type, (path, logical.fToks)
-
-
-def test_the_tests_of_patterns():
-    """Of the interpreter's own tests, sequences without brackets and `()` are refused, and nothing else."""
-    analyzer, refused = CPGenAnalyzerImpl((3, 11, 0)), []
-    for logical, true_type in LinesOf(LIBRARY / "test" / "test_patma.py"):
-        assert Decision(logical.fToks) == true_type
-        if analyzer.AnalyzeSingleLogical(logical, False, False) is not None:
-            refused.append(logical.fToks)
-    for toks in refused:
-        pattern = ast.parse(f"match x:\n {' '.join(toks)} pass").body[0].cases[0].pattern
-        assert isinstance(pattern, ast.MatchSequence), toks
-        assert toks[1:3] == ("(", ")") or toks[1] not in "[(" or toks[-2] not in "])"
-    assert len(refused) == 16
