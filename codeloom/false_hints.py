@@ -24,17 +24,20 @@ _OPERATORS = r"(?:and|or|not|in|is|if|else)\b"
 # "ignore" and more behind it that doesn't continue the word, such as a code in brackets.
 _IGNORE_WITH_MORE = re.compile(r"ignore\W")
 _STRING_LITERAL = re.compile(r"""(?<!\w)[a-zA-Z]{0,2}("[^"]*"|'[^']*')""")
-# Two words in a row that no operator joins, a character that no expression holds, or a beginning
-# that no expression has: that of a statement among others.
+# Two words in a row that no operator joins, a word directly behind a closing bracket, dots behind a word, a
+# quote within one, a character that no expression holds, or a beginning that no expression has: that of a
+# statement among others.
 _STATEMENT = (
     r"(?:assert|break|class|continue|def|del|except|finally|for|from|global|import|nonlocal|pass|raise"
     r"|return|try|while|with|yield)\b|[\w.]+\s*=(?!=)"
 )
 _PROSE = re.compile(
     rf"\b(?!{_OPERATORS}|lambda\b)\w+\s+(?!{_OPERATORS})\w"
-    r"|[?!$;]"
-    rf"|^(?:[<>=/%&|^@,:)\]}}]|{_STATEMENT})"
+    rf"|[)\]}}]\s*(?!{_OPERATORS})\w|\w\s*\.\.|\w'"
+    r"|[?!$;`…–—→]"
+    rf"|^(?:[<>=/%&|^@,:)\]}}\\]|(?!not\b){_OPERATORS}|{_STATEMENT})"
 )
+_CONDITION = re.compile(r"\b(?:if|else)\b")
 # In quotes a sentence: such words in front of any bracket and three of them in all, or the mark at
 # its end. What is shorter is taken for a hint with a fault.
 _QUOTED_PROSE = re.compile(
@@ -135,7 +138,9 @@ def _WithoutFalseHint(token: str | None, takes_nothing: bool) -> str | None:
 def _IsFalse(hint: str) -> bool:
     if _IGNORE_WITH_MORE.match(hint) or _TUPLE_RESULT.search(hint):
         return True
-    return _PROSE.search(_STRING_LITERAL.sub("text", hint)) is not None
+    text = _STRING_LITERAL.sub("text", hint)
+    conditions = _CONDITION.findall(text)
+    return _PROSE.search(text) is not None or conditions.count("if") > conditions.count("else")
 
 
 def _ReadableFunctionHint(hint: str) -> str:

@@ -19,6 +19,13 @@ FALSE_COMMENTS = [
     "# type: return",
     "# type: kind = a",
     "# type: (int) -> (str, bool)",
+    "# type: (int, str) pairs",
+    "# type: or None",
+    "# type: it's",
+    "# type: int – or not",
+    "# type: str...",
+    "# type: str or None if a",
+    "# type: \\",
 ]
 TRUE_COMMENTS = [
     "# type: int",
@@ -27,6 +34,7 @@ TRUE_COMMENTS = [
     "# type: List[int]  # a list of them",
     "# type: Optional['a b'] or not None",
     "# type: (int, List[*Ts], a ** b) -> Dict[str, (int)]",
+    "# type: (Callable[..., a], Tuple[(b), ...]) if a else f()in b",
     "# type: List[",
     "# note: no type: int at all",
     "# typed",
