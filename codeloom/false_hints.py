@@ -34,7 +34,7 @@ _STATEMENT = (
 _PROSE = re.compile(
     rf"\b(?!{_OPERATORS}|lambda\b)\w+\s+(?!{_OPERATORS})\w"
     rf"|[)\]}}]\s*(?!{_OPERATORS})\w|\w\s*\.\.|\w'"
-    r"|[?!$;`…–—→]"
+    r"|[?!$;`\u2013\u2014\u2026\u2192]"
     rf"|^(?:[<>=/%&|^@,:)\]}}\\]|(?!not\b){_OPERATORS}|{_STATEMENT})"
 )
 _CONDITION = re.compile(r"\b(?:if|else)\b")

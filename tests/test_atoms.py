@@ -20,10 +20,6 @@ from codeloom.treesift import (
 )
 
 
-def Number(text):
-    return Leaf(text, cls=CNumberLiteral)
-
-
 def String(text):
     return Leaf(text, cls=CStringLiteral)
 
@@ -32,83 +28,48 @@ def Brackets(brackets, *contents, cls=CAtom):
     return Node(cls, Leaf(brackets[0]), *contents, Leaf(brackets[1]))
 
 
-def test_numbers():
-    for text, is_float, value in [
-        ("1.", True, 1.0),
-        (".5e-3", True, 0.0005),
-        ("1_0.0", True, 10.0),
-        ("1__0", False, None),
-        ("1.5j", True, None),
-        ("0xE0", True, None),
-        ("0o7", False, None),
-        ("٣", False, 3),
-        ("", False, None),
-        ("1" * 5000, False, None),  # the host refuses to convert so many digits
-        ("1e999", True, float("inf")),
-    ]:
-        node = Number(text)
-        assert node.IsFloat() is is_float, text
-        assert (node.GetNumericValue(), type(node.GetNumericValue())) == (value, type(value)), text
-
-
-def test_the_kind_of_a_string():
-    for text, is_unicode, is_bytes in [
-        ("u'x'", True, False),
-        ("U'x'", True, False),
-        ("ru'x'", True, False),
-        ("br'x'", False, True),
-        ("RB'x'", False, True),
-        ("fb'x'", False, False),
-        ("rrb'x'", False, False),
-        ("'b'", False, False),
-        ("", False, False),
-    ]:
-        assert (String(text).IsUnicode(), String(text).IsBytes()) == (is_unicode, is_bytes), text
-    with pytest.raises(IndexError):
-        String("r").IsBytes()
-
-
-def test_the_contents_of_a_string():
-    for text, contents in [
-        ("'abc", "abc"),
-        ('"""`', "`"),
-        ('"""', ""),
-        ("''''", ""),
-        ("'", ""),
-        ("''", ""),
-        ("'a\"", 'a"'),
-        ("'''a''", "a''"),
-        ("bFrUbfru'x'", "x"),
-        ("t'x'", ""),
-        ("b", IndexError),
-        ("", IndexError),
-        ("'\ud800€'", "\ud800€"),
-    ]:
-        if contents is IndexError:
-            with pytest.raises(IndexError):
-                String(text).GetStringContents()
-        else:
-            assert String(text).GetStringContents() == contents, text
-
-
-def test_the_value_of_a_string():
+def test_odd_numbers():
     for text, value in [
-        ("'a\\n'", "a\n"),
-        ("rb'a\\n'", b"a\\n"),
-        ("F'{a}'", None),
-        ("rf'a'", None),
-        ("bfr'a'", None),
-        ("'f'", "f"),
-    ]:
-        assert String(text).GetStringValue() == value, text
+        ("1__0", None),
+        ("٣", 3),
+        ("", None),
+        ("1" * 5000, None),
+    ]:  # the host's limit of digits
+        assert Leaf(text, cls=CNumberLiteral).GetNumericValue() == value, text
 
-
-def test_the_text_of_an_override_counts():
     class Literal(CNumberLiteral):
         def IsFloat(self):
             return True
 
     assert type(Leaf("7", cls=Literal).GetNumericValue()) is float
+
+
+def test_odd_strings():
+    for text, is_unicode, is_bytes, contents in [
+        ("ru'x'", True, False, "x"),
+        ("fb'x'", False, False, "x"),
+        ("rrb'x'", False, False, "x"),
+        ("bFrUbfru'x'", False, True, "x"),
+        ("t'x'", False, False, ""),
+        ("'abc", False, False, "abc"),
+        ("'a\"", False, False, 'a"'),
+        ("'''a''", False, False, "a''"),
+        ('"""`', False, False, "`"),
+        ('"""', False, False, ""),
+        ("''''", False, False, ""),
+        ("'", False, False, ""),
+        ("'\ud800€'", False, False, "\ud800€"),
+    ]:
+        node = String(text)
+        assert (node.IsUnicode(), node.IsBytes(), node.GetStringContents()) == (
+            is_unicode,
+            is_bytes,
+            contents,
+        )
+    assert not String("").IsUnicode() and String("bfr'a'").GetStringValue() is None
+    for ask in (String("r").IsBytes, String("b").GetStringContents, String("").GetStringContents):
+        with pytest.raises(IndexError):
+            ask()
 
 
 def test_comprehensions_of_both_shapes():

@@ -22,7 +22,7 @@ FALSE_COMMENTS = [
     "# type: (int, str) pairs",
     "# type: or None",
     "# type: it's",
-    "# type: int – or not",
+    "# type: `int`",
     "# type: str...",
     "# type: str or None if a",
     "# type: \\",

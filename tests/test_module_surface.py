@@ -13,10 +13,6 @@ from codeloom import _fastaccess, _neighbours, logicalline, strutils, symbolinfo
 ROOT = Path(__file__).parent.parent
 
 
-def Names(text: str) -> list[str]:
-    return text.split()
-
-
 INSTANCE_CONSTANTS = {
     "kListInstanceName": b"list",
     "kDictInstanceName": b"dict",
@@ -29,34 +25,7 @@ INSTANCE_CONSTANTS = {
     "kFloatLiteralName": b"float",
 }
 CONSTANTS = ["kPy2DefaultGrammar", "kPy3DefaultGrammar", "kLiteralPrefix", *INSTANCE_CONSTANTS]
-MODULES = Names("""
-    keyword re sys token os time pgen _fastaccess strutils config logicalline symbolinfo
-    logicalinspect reflect optpgen utils
-""")
-IMPORTED_CLASSES = Names("""
-    Parser CWritableByteBuffer CEncodedByteBufferReader _CTextPosInfo CLogger CStringTokenizer
-    CNonNestedSearch CLogicalLine _CHandlerRecord _CEmissionStackItem CDestroyable
-    CSingleResolvedInfo CLocationCache CFullyScopedName CDefInfo CArgTextInfo CInfoBytesBuilder
-""")
-FUNCTIONS = Names("""
-    CreateSyntaxError DropSimpleParens FinishedWithNode NotCompiledFinishedWithNode
-    GetDefiningArgInfoList GetUsedArgInfoList GetTokenEndIndex IsGenExpression IsSetLiteral
-    IsTupleLiteralNode _GetBuiltinInstanceName _GetMatchingChildToken _ProcessAsNamesList
-    _ProcessSingleModuleNameAs _TextForImportName
-""")
-PRIMITIVES = Names("""
-    OrdAt Utf8Concat2 Utf8Concat3 Utf8Concat4 GetUtf8Ptr AdjustUtf8Pos Ucs4CharAtUtf8Pos
-    IsSpaceAtUtf8Pos IsDigitAtUtf8Pos IsAlnumAtUtf8Pos IsIdentifierCharAtUtf8Pos PtrFindByte
-    BytesFindByte StrInStr IsAlnum IsDigit ULongLongValueForDoubleBits DoubleValueForULongLongBits
-    DoubleValueForPyIntBits GetNowTime OutOfTime LocationsEqual IsDefKind GetInfoBytesKind
-    IsTopLevelModuleScope IsDefLineScope IsParentOfDefLineScope NextNonNestedUtf8PtrIndex
-""")
-NEIGHBOUR_FUNCTIONS = Names("""
-    AsUtf8 AsStr BytesForInteger Utf8Concat5 Utf8Len IsUtf8LeadByte _NonInlineUcs4CharAtUtf8Pos
-    TextPosInfo GetTokenType _FindStringEndNonNested BuildLiteralInfo BuildArgInfo
-    EnsureScopeNameIndicies GetInstanceNameForClass ObjectForStringLiteral EncodeStringLiteral
-    JoinTokens _NonInlineNextNonNestedUtf8PtrIndex
-""")
+STANDARD_MODULES = {"keyword", "re", "sys", "token", "os", "time", "pgen"}
 VOCABULARY = [*symbolinfo._SymbolConstants(), "gInfoBytesBuilder", "CKindFilter"]
 LOGICAL_TYPES = [name for name in logicalline.__all__ if name.startswith("k")]
 
@@ -66,20 +35,6 @@ def Visible() -> dict[str, object]:
 
 
 # What is there
-
-
-def test_exactly_the_listed_names_are_visible():
-    own_classes = {
-        name
-        for name, value in Visible().items()
-        if isinstance(value, type) and value.__module__ == "codeloom.treesift"
-    }
-    listed = {
-        *(CONSTANTS + MODULES + IMPORTED_CLASSES + FUNCTIONS + PRIMITIVES + NEIGHBOUR_FUNCTIONS),
-        *(VOCABULARY + LOGICAL_TYPES),
-    }
-    assert set(Visible()) == listed | own_classes
-    assert all(name.startswith("C") for name in own_classes)
 
 
 @pytest.mark.parametrize(
@@ -227,16 +182,11 @@ def test_the_stubs_are_up_to_date():
         )
 
 
-def test_the_stubs_name_everything_that_is_visible():
-    text = (ROOT / "codeloom/treesift.pyi").read_text(encoding="utf-8")
-    named = {
-        name
-        for node in ast.walk(ast.parse(text))
-        for name in (
-            getattr(node, "name", None),
-            getattr(node, "asname", None),
-            getattr(getattr(node, "target", None), "id", None),
-        )
-    }
-    standard = {"keyword", "re", "sys", "token", "os", "time", "pgen"}
-    assert set(Visible()) - standard - {"config", "reflect"} <= named
+def test_the_stubs_name_exactly_what_is_visible():
+    named = set()
+    for statement in ast.parse((ROOT / "codeloom/treesift.pyi").read_text(encoding="utf-8")).body:
+        if isinstance(statement, ast.Import | ast.ImportFrom):
+            named |= {alias.asname for alias in statement.names}
+        else:
+            named.add(getattr(statement, "name", None) or statement.target.id)
+    assert named - {None} == set(Visible()) - STANDARD_MODULES

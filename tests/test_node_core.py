@@ -49,22 +49,15 @@ def FreeNodes(info):
     return nodes
 
 
-def test_leaf_has_no_children():
-    leaf = Leaf("x")
-    assert (leaf.GetChildCount(), leaf.GetChild(0), leaf.GetChildText(0)) == (0, None, None)
-    assert not leaf._DoesChildTextMatch("x")
-    assert leaf.GetChild(-1) is None and leaf.GetChildText(-1) is None
-
-
 def test_children_by_index():
     factory = MakeFactory()
     a, b = factory.NewNameNode("a", 0), factory.NewNameNode("b", 1)
     node = factory.NewNode(Info(factory), 0, None, 0, [a, b])
-    assert node.GetChildCount() == 2
-    assert node.GetChild(0) is a and node.GetChild(-1) is b
-    assert node.GetChild(2) is None and node.GetChildText(5) is None
-    assert (node.GetChildText(1), node.GetChildText(-2)) == ("b", "a")
-    assert node._DoesChildTextMatch("b") and not node._DoesChildTextMatch("c")
+    assert (node.GetChildCount(), a.GetChildCount()) == (2, 0)
+    assert [node.GetChild(i) for i in (0, -1, 2)] == [a, b, None]
+    assert [node.GetChildText(i) for i in (1, -2, 5)] == ["b", "a", None]
+    assert [node._DoesChildTextMatch(text) for text in "bc"] == [True, False]
+    assert a.GetChild(-1) is a.GetChildText(0) is None and not a._DoesChildTextMatch("a")
     for below in (node.GetChild, node.GetChildText):
         with pytest.raises(IndexError):
             below(-3)
@@ -130,15 +123,13 @@ def test_convert_collapses_a_statement_and_its_newline():
     assert factory.ConvertSingleNode(EXPR, None, 0, [a, b, newline]).GetChildCount() == 3
 
 
-@pytest.mark.parametrize("children", [[], [CNode()]])
-def test_convert_asserts_two_children(children):
+def test_what_is_asserted():
+    factory = MakeFactory()
+    for children in ([], [CNode()]):
+        with pytest.raises(AssertionError):
+            factory.ConvertSingleNode(EXPR, None, 0, children)
     with pytest.raises(AssertionError):
-        MakeFactory().ConvertSingleNode(EXPR, None, 0, children)
-
-
-def test_text_must_be_text():
-    with pytest.raises(AssertionError):
-        MakeFactory().NewNameNode(b"x", 0)
+        factory.NewNameNode(b"x", 0)
 
 
 def test_operator_nodes():
@@ -170,17 +161,11 @@ def test_recycling_gives_the_same_objects_again():
     first = {id(node) for node in Nodes(tree)}
     FinishedWithNode(tree)
     assert (tree.fText, tree.fContext, tree.fChildren) == (None, None, None)
+    assert FreeNodes(Info(factory))[-1] is tree  # deeper nodes stand nearer to the head
     tree = Chain(factory, 5)
     assert {id(node) for node in Nodes(tree)} == first
     NotCompiledFinishedWithNode(tree)
     assert {id(node) for info in factory._fClassInfoList for node in FreeNodes(info)} == first
-
-
-def test_deeper_nodes_stand_nearer_the_head():
-    factory = MakeFactory()
-    tree = Chain(factory, 3)
-    FinishedWithNode(tree)
-    assert FreeNodes(Info(factory))[-1] is tree
 
 
 def test_recycling_stops_below_a_hundred_levels(capsys):
@@ -212,13 +197,8 @@ def test_odd_trees_of_the_host_end():
 
 def test_recursive_convert():
     factory = MakeFactory()
-    raw = (
-        EXPR,
-        None,
-        0,
-        [(NAME, "a", 0, None), (EXPR, None, 1, [(NAME, "b", 1, None), (NEWLINE, "\n", 2, None)])],
-    )
-    node = factory.RecursiveConvert(raw)
+    line = EXPR, None, 1, [(NAME, "b", 1, None), (NEWLINE, "\n", 2, None)]
+    node = factory.RecursiveConvert((EXPR, None, 0, [(NAME, "a", 0, None), line]))
     assert [child.fText for child in node.fChildren] == ["a", "b"]
     for broken, error in [
         ((1, "a", 0), ValueError),

@@ -1,6 +1,12 @@
-"""Nodes as text: every option, under both grammars, and what a host overrides."""
+"""Nodes as text, and what a host overrides.
+
+Golden files in texts/ hold expressions with their texts, each behind it the options that give it.
+"""
+
+from pathlib import Path
 
 import pytest
+from golden import Cases, Check
 from hand_made import Leaf, Node, Parse
 
 from codeloom.symbolinfo import EncodeStringLiteral
@@ -18,100 +24,48 @@ from codeloom.treesift import (
 
 SHORT = CNodeToTextConverterImpl()
 FULL = CNodeToTextConverterImpl(True, True, True)
-WITH_ARGS = CNodeToTextConverterImpl(include_arg_text=True)
-WITH_BRACKETS = CNodeToTextConverterImpl(include_bracket_text=True)
-WITH_STRINGS = CNodeToTextConverterImpl(include_string_contents=True)
-
-# A source, its short and its full text, its dotted name, its text as a literal.
-TEXTS = """
-a               | a          | a             | a     | -
-a.b.c           | a.b.c      | a.b.c         | a.b.c | -
-a.b().c         | a.b().c    | a.b().c       | a.b   | -
-f(x)            | f()        | f(x)          | f     | -
-f(x, y=1, *z)   | f()        | f(x, y=1, *z) | f     | -
-f(g(x)[0])      | f()        | f(g(x)[0])    | f     | -
-a[i]            | a[]        | a[i]          | a     | -
-a[1:2]          | a[]        | a[1: 2]       | a     | -
-a[...].b        | a[].b      | a[...].b      | a     | -
-a.b ** c        | a.b        | a.b           | a.b   | -
-(a)             | a          | a             | a     | -
-((a.b))         | a.b        | a.b           | a.b   | -
-(a).b           | -          | (a).b         | -     | (a).b
-()              | -          | ( )           | -     | ( )
-[]              | []         | []            | -     | []
-{}              | {}         | {}            | -     | {}
-[1]             | []         | [1]           | -     | [1]
-[a]             | []         | [a]           | -     | [a]
-{1: 2}          | {}         | {1: 2}        | -     | {1: 2}
-{1, 2}          | {}         | {1, 2}        | -     | {1, 2}
-(a, b)          | -          | (a, b)        | -     | (a, b)
-a, b            | -          | a, b          | -     | a, b
-1               | 1          | 1             | -     | 1
-'ab c'          | ''         | 'ab c'        | -     | 'ab c'
-'a;b'           | ''         | ''            | -     | ''
-b'x'            | ''         | b'x'          | -     | b'x'
-b'a;b'          | ''         | b''           | -     | b''
-u'a;b'          | u''        | u''           | -     | u''
-ur'x'           | u''        | ur'x'         | -     | ur'x'
-r"a\\b"         | ''         | ''            | -     | ''
-'a' 'b;'        | ''         | 'a'           | -     | 'a'
-'äß٣²'          | ''         | 'äß٣²'        | -     | 'äß٣²'
-'→'             | ''         | ''            | -     | ''
-'a'.join(x)     | ''.join()  | 'a'.join(x)   | -     | 'a'.join(x)
--a              | -          | -a            | -     | -a
-not a           | -          | not a         | -     | not a
-a + (b)         | -          | a + b         | -     | a + b
-a not in b      | -          | a not in b    | -     | a not in b
-a if b else c   | -          | a if b else c | -     | a if b else c
-lambda x: x     | -          | lambda x: x   | -     | lambda x: x
-[a for b in c]  | []         | [a for b in c] | -    | [a for b in c]
-"""
-ROWS = [[cell.strip() for cell in row.split("|")] for row in TEXTS.strip().splitlines()]
+FORMS = {
+    "short": (SHORT, {}),
+    "args": (CNodeToTextConverterImpl(include_arg_text=True), {}),
+    "brackets": (CNodeToTextConverterImpl(include_bracket_text=[0]), {}),
+    "strings": (CNodeToTextConverterImpl(include_string_contents=1), {}),
+    "full": (FULL, {}),
+    "dotted": (FULL, {"dotted_name_only": True}),
+    "literal": (FULL, {"literal_only": True}),
+    "operand": (FULL, {"add_parens_if_operator": True}),
+    "parens": (FULL, {"discard_simple_parens": False}),
+}
 
 
-def Bytes(text):
-    return None if text == "-" else text.encode()
+def Texts(node):
+    """A row for each text, with the forms that give it."""
+    forms = {}
+    for name, (converter, options) in FORMS.items():
+        text = converter.TextForNode(node, **options)
+        forms.setdefault("none" if text is None else text.decode(), []).append(name)
+    return [f"    {text:<20} {', '.join(names)}" for text, names in forms.items()]
 
 
-@pytest.mark.parametrize("version", ["3.8", "2.7"])
-@pytest.mark.parametrize("row", ROWS, ids=[row[0] for row in ROWS])
-def test_texts(row, version):
-    source, short, full, dotted_name, literal = row
-    node = Parse(source, version)
-    assert SHORT.TextForNode(node) == Bytes(short)
-    assert FULL.TextForNode(node) == Bytes(full)
-    assert FULL.TextForNode(node, dotted_name_only=True) == Bytes(dotted_name)
-    assert FULL.TextForNode(node, literal_only=True) == Bytes(literal)
+def Output(source):
+    rows = ["---"]
+    for expression in source.splitlines():
+        texts, old_texts = (Texts(Parse(expression, version)) for version in ("3.8", "2.7"))
+        rows += [expression, *texts]
+        if old_texts != texts:
+            rows += ["  2.7", *old_texts]
+    return "\n".join(rows)
 
 
-def test_each_option_alone():
-    node = Parse("f([x], 'y', a[z])['w']")
-    assert WITH_ARGS.TextForNode(node) == b"f()[]"  # arguments in a list need the join of what is bracketed
-    assert WITH_BRACKETS.TextForNode(node) == b"f()['']"
-    assert WITH_STRINGS.TextForNode(node) == b"f()[]"
-    assert WITH_ARGS.TextForNode(Parse("f(x)(y.z)")) == b"f(x)(y.z)"
-    assert CNodeToTextConverterImpl(1, "", [0])._fIncludeArgText is True
-    assert SHORT._fIncludeArgText is False
+@pytest.mark.parametrize("case", Cases(Path(__file__).parent / "texts", ".texts"))
+def test_texts(case, rewrite):
+    Check(case, Output(case.source), rewrite)
+
+
+def test_options():
+    assert FULL._fIncludeArgText is True and SHORT._fIncludeArgText is False
     with pytest.raises(AttributeError):
         SHORT._fIncludeArgText = True
-
-
-def test_names_that_are_literals():
-    for text in ("None", "True", "False"):
-        for version in ("3.8", "2.7"):  # a keyword in one grammar, a name in the other
-            assert SHORT.TextForNode(Parse(text, version), literal_only=True) == text.encode()
-    assert SHORT.TextForNode(Parse("None", "2.7"), dotted_name_only=True) == b"None"
-    assert SHORT.TextForNode(Parse("None"), dotted_name_only=True) is None
     assert FULL.TextForNode(Parse("[a]"), False, True, True) == b"[a]"  # within brackets it is no matter
-
-
-def test_parentheses():
-    group = Parse("(a)")
-    assert FULL.TextForNode(group, discard_simple_parens=False) == b"(a)"
-    assert SHORT.TextForNode(group, discard_simple_parens=False) is None
-    operator = Parse("a + b")
-    assert FULL.TextForNode(operator, add_parens_if_operator=True) == b"(a + b)"
-    assert FULL.TextForNode(Parse("a.b"), add_parens_if_operator=True) == b"a.b"
     lone = Node(COperatorExpression, Leaf("a", cls=CNameLiteral))
     assert FULL.TextForNode(lone, add_parens_if_operator=True) == b"a"
     assert FULL.TextForNode(Node(CNode), add_parens_if_operator=True) == b"()"

@@ -1,4 +1,4 @@
-"""CTypeHintWalker: the hints recorded, the places of their faults, overrides, nodes that go back."""
+"""CTypeHintWalker beyond the golden records: its parts, overrides, nodes that go back."""
 
 import gc
 import sysconfig
@@ -14,6 +14,7 @@ from codeloom.symbolinfo import kPrefixLen, kSetPrefix, kTypeHintPrefix
 from codeloom.treesift import (
     CFuncdefStmt,
     CNode,
+    CNodeClassInfo,
     CNodeFactory,
     CNodeWalker,
     CParametersNode,
@@ -27,17 +28,15 @@ VERSION = (3, 8, 0)
 WALKER = CTypeHintWalker(VERSION, kPy3DefaultGrammar, None)
 
 
-def Logical(text, arg_names=()):
+def Logical(text, arg_names=""):
     (logical,) = GetLogicalsFromText(text)
-    for name in arg_names:
+    for name in arg_names.split():
         logical.AppendArgTypeEquiv(name.encode(), kSetPrefix)
     return logical
 
 
-def Tree(logical, version="3.8"):
-    if logical.fType == kComment:
-        return None
-    return DRIVERS[version].ParseToNode(logical, in_async_def=True)
+def Tree(logical):
+    return None if logical.fType == kComment else DRIVERS["3.8"].ParseToNode(logical)
 
 
 def Hints(pairs):
@@ -49,174 +48,29 @@ def Hints(pairs):
     ]
 
 
-def Walked(text, arg_names=(), walker=WALKER, first_in_def=False, version="3.8"):
+def Walked(text, arg_names="", walker=WALKER):
     """The hints of names and those of arguments."""
-    logical = Logical(text, arg_names.split() if arg_names else ())
-    walker.Walk(Tree(logical, version), logical, first_in_def)
+    logical = Logical(text, arg_names)
+    walker.Walk(Tree(logical), logical, False)
     return Hints(logical.fTypeEquivs), Hints(logical.fArgTypeEquivs)
 
 
-@pytest.mark.parametrize(
-    ("text", "hints"),
-    [
-        ("x: int", ["x: int"]),
-        ("x: 'Foo' = 1", ["x: Foo"]),
-        ("(x): List[ int,str ] = y", ["x: List[int, str]"]),
-        ("self.a.b: a.b | None", ["self.a.b: a.b | None"]),
-        ("x[0]: int = 1", ["x: int"]),
-        ("x: Literal['a b', 'c-d']", ["x: Literal['a b', '']"]),
-        ("if a: x: int = 1", ["x: int"]),
-        ("x: int = 1  # type: str", ["x: int"]),  # the node of an annotation counts no `=`
-        ("x = 1  # type: int", ["x: int"]),
-        ("x = y = 1  # type: int", ["x: int"]),
-        ("x = 1  #type:int # why", ["x: int"]),
-        ("x = 1  ## type: 'a b'", ["x: a b"]),
-        ("x = 1  # note type: int", []),
-        ("x = 1  # type:ignore", []),
-        ("x = 1  # type: ignore # why", []),
-        ("x = 1  # type: ignore[a]", ["x: ignore[a]"]),
-        ("x = 1  # type:", []),
-        ("x = 1  # type: a; b", []),  # two lines are no hint
-        ("x = 1  # type: pass", ["x: pass"]),
-        ("x = [  # type: int\n  1]", []),  # the comment stands on another row than the end
-        ("x = [1,\n  2]  # type: int", ["x: int"]),
-        ("x = '''\n\n'''  # type: int", ["x: int"]),
-        ("x = a + \\\n  b  # type: int", ["x: int"]),
-        ("x += 1  # type: int", []),
-        ("x  # type: int", []),
-        ("a, b = f()  # type: int, str", ["a: int", "b: str"]),
-        ("a, b = f()  # type: int", []),
-        ("a, b, c = f()  # type: int, str", ["a: int", "b: str"]),
-        ("a, b = f()  # type: int, str, c", ["a: int", "b: str"]),
-        ("(a, [b, c.d]), e = f()  # type: (x, (y, z)), w", ["a: x", "b: y", "c.d: z", "e: w"]),
-        ("a, *b = f()  # type: int, str", ["a: int"]),
-        ("for i in x:  # type: int", ["i: int"]),
-        ("async for i, j in x:  # type: int, str", ["i: int", "j: str"]),
-        ("for i in x: y: int = 1", []),
-        ("with a as b, c as d:  # type: int", ["b: int", "d: int"]),
-        ("with (a as b, c,\n d as (e, f)):  # type: int, str", ["b: int, str", "e: int", "f: str"]),
-        ("return x  # type: int", []),
-    ],
-)
-def test_hints_of_names(text, hints):
-    assert Walked(text) == (hints, [])
-
-
-@pytest.mark.parametrize(
-    ("text", "arg_names", "hints"),
-    [
-        ("def f(a: int, *b: 'B c', c: C[1] = 3, **d) -> None: pass", "", ["a: int", "b: B c", "c: C[1]",
-                                                                       "return: None"]),
-        ("async def f(a) -> 'x': pass", "", ["return: x"]),
-        ("def f[T](a: T): pass", "", ["a: T"]),
-        ("def f(a): x: int = 1", "", []),
-        ("def f(a, b):  # type: (int, Dict[str, int]) -> str", "a b",
-         ["a: int", "b: Dict[str, int]", "return: str"]),
-        ("def f(a, b):  # type: (...) -> int", "a b", ["return: int"]),
-        ("def f(a, b):  # type: (int, str)", "a b", ["a: int", "b: str"]),
-        ("def f(a):  # type: ([int], List[str,]) -> T[()]", "a",
-         ["a: [int]", ":a:1: List[str,]", "return: T[( )]"]),
-        ("def f(a):  # type: () -> int", "", ["return: int"]),
-        ("def f(\n  a, b\n):  # type: (int, int) -> int", "a b", ["a: int", "b: int", "return: int"]),
-        ("def f(a):\\\n  # type: (int) -> int", "a", ["a: int", "return: int"]),
-        # A comment for each argument.
-        ("def f(a,  # type: int\n  b=(1),  # type: str\n  *c,  # type: d\n): pass", "",
-         ["a: int", "b: str", "c: d"]),
-        ("def f(a  # type: int\n): pass", "", ["a: int"]),
-        ("def f(a: int,  # type: str\n b=2  # type: (b)\n): pass", "", ["a: int", "b: b"]),
-        ("def f(a,\n  # type: int\n b): pass", "", ["a: int"]),
-        ("def f(a,  # type: int\n b):  # type: str", "", ["a: int", "b: str"]),
-        ("def f(a,  # type: int\n b):  # type: (...) -> str", "", ["a: int", "return: str"]),
-        ("def f(*, a,  # type: int\n b): pass", "", ["a: int"]),
-    ],
-)  # fmt: skip
-def test_hints_of_arguments(text, arg_names, hints):
-    assert Walked(text, arg_names) == ([], hints)
-
-
-def test_a_tuple_of_parameters_is_passed_over():
-    text = "def f(a, (b, c), d):  # type: (int, str) -> e"
-    assert Walked(text, "a b c d", version="2.7") == ([], ["a: int", "b: str", "return: e"])
-
-
-def test_a_comment_of_its_own_row_counts_first_in_a_def():
-    comment = "# type: (int, *str) -> bool".replace("*", "")
-    assert Walked(comment, first_in_def=True) == ([":a:0: int", ":a:1: str", "return: bool"], [])
-    assert Walked(comment) == Walked("# note type: int", first_in_def=True) == ([], [])
-
-
-def test_a_def_without_records_of_its_arguments_fails():
-    with pytest.raises(TypeError, match="no records of its arguments"):
-        Walked("def f(a):  # type: (int) -> str")
-    assert Walked("def f():  # type: (...) -> str") == ([], ["return: str"])
-
-
-@pytest.mark.parametrize(
-    ("text", "place"),
-    [
-        ("x = 1  # type: List[", (1, 20)),  # at the end: the last token
-        ("x = 1  # type: a b", (1, 18)),
-        ("é = 1  #\té type: 1", None),
-        ("é = 'é'  #\ttype:\t'é' é", (1, 25)),
-        ("x = (1 + \\\n  2)  # type: List[a b]", (2, 22)),
-        ("é = \\\n  é  # type: é é", (2, 18)),
-        ("with a as b: pass  # type: )", (1, 28)),
-        ("def f(a):  # type: (int] -> str", (1, 24)),
-        ("def f(é):  # type: (é, List[é é]) -> str", (1, 34)),
-        ("def f(a):  # type: (int", (1, 24)),
-        ("def f(a):  # type: int", (1, 20)),
-        ("def f(a):  # type: (*int) -> str", (1, 21)),
-        ("def f(a):  # type: () -> ", (1, 25)),
-        ("def f(a,  # type: int\n  b,\n\té,  # type: s[\n): pass", (3, 16)),
-        ("def f(\n  é, b=[\n\t'é'],  # type: é é\n): pass", (3, 21)),
-    ],
-)
-def test_places_of_faults(text, place):
-    """Rows and columns in UTF-8 bytes, both from 1."""
-    if place is None:
-        assert Walked(text) == ([], [])
-        return
-    with pytest.raises(SyntaxError) as caught:
-        Walked(text)
-    assert (caught.value.lineno, caught.value.offset, caught.value.msg) == (*place, "invalid syntax")
-    assert Walked("x = 1  # type: int") == (["x: int"], [])
-
-
-def test_a_fault_on_the_first_row_of_a_def():
-    logical = Logical("  # type: (int, a b) -> str")
-    error = CPGenAnalyzerImpl(VERSION).AnalyzeSingleLogical(logical, False, True)
-    assert (error.lineno, error.offset) == (1, 19)
-
-
-@pytest.mark.parametrize(
-    ("hint", "tokens", "offsets"),
-    [
-        (" (int, c) -> b", "def function ( a : int , a : c ) -> b :", "-13 -9 1 2 2 2 5 7 7 7 8 10 13 14"),
-        ("(...) -> b", "def function ( ) -> b :", "-13 -9 0 4 6 9 10"),
-        ("(..., c)", "def function ( , a : c ) :", "-13 -9 0 4 6 6 6 7 8"),
-        ("([é], {1, 2}, *é)", "def function ( a : [ é ] , a : { 1 , 2 } , a : * é ) :", None),
-        ("(a) -> (b, c)", "def function ( a : a ) -> ( a : b , a : c ) :", None),
-        ("((a, b), c)", "def function ( ( a , b ) , a : c ) :", None),
-        ("", "def function :", "-13 -9 0"),
-    ],
-)  # fmt: skip
-def test_rewriting(hint, tokens, offsets):
-    toks, utf8_offsets = WALKER._RewriteFuncdefCommentHint(hint)
-    assert " ".join(toks) == tokens and len(utf8_offsets) == len(toks)
-    assert offsets is None or utf8_offsets == [int(offset) for offset in offsets.split()]
+def test_rewriting():
+    for hint, tokens, offsets in [
+        (" (int, c) -> b", "( a : int , a : c ) -> b :", "1 2 2 2 5 7 7 7 8 10 13 14"),
+        ("(...) -> b", "( ) -> b :", "0 4 6 9 10"),
+        ("(é, ..., *c)", "( a : é , a : ... , a : * c ) :", "0 1 1 1 3 5 5 5 8 10 10 10 11 12 13"),
+        ("([a], {1, 2})", "( a : [ a ] , a : { 1 , 2 } ) :", "0 1 1 1 2 3 4 6 6 6 7 8 10 11 12 13"),
+        ("(...,) -> (b)", "( , ) -> ( a : b ) :", "0 4 5 7 10 11 11 11 12 13"),
+    ]:
+        toks, utf8_offsets = WALKER._RewriteFuncdefCommentHint(hint)
+        assert " ".join(toks) == f"def function {tokens}"
+        assert " ".join(map(str, utf8_offsets)) == f"-13 -9 {offsets}"
 
 
 def test_a_hint_keeps_the_offsets_of_its_comment():
-    for comment, hint in [
-        ("# type: int  # why", " " * 8 + "int"),
-        ("#\xa0type:\xa0\u3000é ", " " * 8 + "\xa0\u3000é"),
-        ("# type:", ""),
-        ("# type: ignore", None),
-        ("# type: ignored", " " * 8 + "ignored"),
-        ("# é type: int", None),
-        ("int", None),
-    ]:
-        assert WALKER._GetHintFromComment(comment) == hint
+    assert WALKER._GetHintFromComment("#\xa0type:\xa0\u3000é ") == " " * 8 + "\xa0\u3000é"
+    assert WALKER._GetHintFromComment("# type: ignored") == " " * 8 + "ignored"
 
 
 def test_dotted_names_as_hosts_know_them():
@@ -224,38 +78,14 @@ def test_dotted_names_as_hosts_know_them():
     assert [WALKER._IsDottedName(name) for name in names] == [True] * 3 + [False] * 5
 
 
-def test_rows():
-    for text, row_range in [("x = 1", (0, 1)), ("x = '''\n\n'''", (0, 3)), ("f(\n\n a,\n)", (0, 4))]:
-        logical = Logical(text)
-        ranges = []
-
-        class Walker(CTypeHintWalker):
-            def _VisitNode(self, node, ranges=ranges):
-                ranges.append(self._GetRowRange(node))
-
-        Walker(VERSION, kPy3DefaultGrammar, None).Walk(Tree(logical), logical, False)
-        assert ranges == [row_range]
-
-
-# Names that hints use
-
-
-def test_the_general_walker_gets_the_hints_of_comments():
-    class General(CNodeWalker):
-        def Walk(self, node, logical):
-            texts.append((WALKER._fHintConv.TextForNode(node), logical))
-
-    walker = CTypeHintWalker(VERSION, kPy3DefaultGrammar, General(VERSION))
-    for text, expected in [
-        ("x: a = 1", []),
-        ("a, b = f()  # type: c, d", [b"c, d"]),
-        ("def f(a, b):  # type: (c, d) -> e", [b"c", b"d", b"e"]),
-        ("def f(a,  # type: c\n b): pass", [b"c"]),
-    ]:
-        texts = []
-        logical = Logical(text, ["a", "b"])
-        walker.Walk(Tree(logical), logical, False)
-        assert texts == [(text, logical) for text in expected]
+@pytest.mark.parametrize(
+    ("text", "row_range"), [("x = 1", (0, 1)), ("x = '''\n\n'''", (0, 3)), ("f(\n\n a,\n)", (0, 4))]
+)
+def test_rows(text, row_range):
+    ranges = []
+    walker = Overriding("_VisitNode", lambda self, node: ranges.append(self._GetRowRange(node)))
+    Walked(text, walker=walker)
+    assert ranges == [row_range]
 
 
 # Overrides
@@ -269,18 +99,17 @@ LINES = [
     ("x: a.b = 1", ""),
     ("f(a)[b]", ""),
 ]
-OPERATIONS = [
-    "Walk", "_VisitNode", "_VisitFuncdefStmt", "_RewriteFuncdefCommentHint", "_ProcessFuncdefComment",
-    "_ProcessArgSpecificComment", "_VisitForStmt", "_VisitWithStmt", "_VisitExprStmt", "_ProcessTarget",
-    "_ProcessNameAndHintNodes", "_FindEndingTypeComment", "_GetHintFromComment", "_GetRowRange",
-    "_FindComment", "_GetHintInfoStr", "_AddSymInfo", "_ParseHint", "_RaiseHintSyntaxError",
-    "_ParseFuncdefCommentHint",
-]  # fmt: skip
+OPERATIONS = sorted(
+    name
+    for name in dir(CTypeHintWalker)
+    if callable(getattr(CTypeHintWalker, name)) and not name.startswith("__")
+    if name != "_IsDottedName"  # which nothing calls
+)
 
 
 def Overriding(operation, override):
     cls = type("Walker", (CTypeHintWalker,), {operation: override})
-    return cls(VERSION, kPy3DefaultGrammar, CNodeWalker(VERSION))
+    return cls(VERSION, kPy3DefaultGrammar, type("General", (CNodeWalker,), {})(VERSION))
 
 
 @pytest.mark.parametrize("operation", OPERATIONS)
@@ -299,7 +128,7 @@ def test_an_override_is_called_and_may_leave_all_to_its_base(operation):
 
 
 @pytest.mark.parametrize(
-    "result", [None, 7, "x", (), (1, 2), ([], []), CNode(None), Leaf(), object()], ids=repr
+    "result", [None, 7, 2**70, "x", (), (1, 2), ([], []), CNode(None), Leaf(), object()], ids=repr
 )
 @pytest.mark.parametrize("operation", OPERATIONS)
 def test_an_override_may_give_anything(operation, result):
@@ -308,6 +137,11 @@ def test_an_override_may_give_anything(operation, result):
         with suppress(TypeError, ValueError, AttributeError, IndexError, SyntaxError):
             Walked(text, arg_names, walker)
         assert walker._fLogical is None and walker._fCommentHintCount == 0
+
+
+def test_a_result_of_a_wrong_kind_is_told_as_signatures_write_it():
+    with pytest.raises(TypeError, match=r"_GetRowRange must return tuple\[int, int\], not int$"):
+        Walked("x = 1  # type: int", walker=Overriding("_GetRowRange", lambda *_: 7))
 
 
 def test_a_visit_that_wants_the_children_gets_them():
@@ -348,6 +182,7 @@ def test_a_second_walk_is_refused_and_the_first_goes_on():
         lambda: CTypeHintWalker(VERSION, kPy3DefaultGrammar, 7),
         lambda: CTypeHintWalker(VERSION, None, None),
         lambda: WALKER.Walk(None, None, False),
+        lambda: Walked("def f(a):  # type: (int) -> str"),  # no records of its arguments
         lambda: WALKER._ProcessArgSpecificComment(Leaf()),
         lambda: WALKER._VisitExprStmt(Leaf()),
         lambda: WALKER._AddSymInfo(b"x", None, False),
@@ -380,10 +215,7 @@ def FreeNodes(parser):
     """The ids of all nodes on the free lists of a parser."""
     (factory,) = [held for held in gc.get_referents(parser) if isinstance(held, CNodeFactory)]
     nodes = []
-    for info in {
-        *factory._fClassInfoList,
-        *(x for x in gc.get_referents(factory) if hasattr(x, "fFirstFree")),
-    }:
+    for info in {held for held in gc.get_referents(factory) if isinstance(held, CNodeClassInfo)}:
         node = info.fFirstFree
         while node is not None:
             nodes.append(id(node))
@@ -392,41 +224,17 @@ def FreeNodes(parser):
     return nodes
 
 
-class Failing(CTypeHintWalker):
-    """Its operations, and its walker for names, fail when they are told to."""
+@pytest.mark.parametrize("failing", ["_ProcessNameAndHintNodes", "_AddSymInfo", "Walk"])
+def test_hint_nodes_go_back_on_every_road(failing):
+    def Fail(*_):
+        raise KeyError
 
-    failing = None
-
-    def __init__(self):
-        super().__init__(VERSION, kPy3DefaultGrammar, FailingGeneral(VERSION))
-
-    def _ProcessNameAndHintNodes(self, name_node, hint_node, is_arg=False):
-        self._Fail("pairing")
-        super()._ProcessNameAndHintNodes(name_node, hint_node, is_arg)
-
-    def _AddSymInfo(self, name, istr, is_arg):
-        self._Fail("recording")
-        super()._AddSymInfo(name, istr, is_arg)
-
-    @classmethod
-    def _Fail(cls, road):
-        if cls.failing == road:
-            raise KeyError
-
-
-class FailingGeneral(CNodeWalker):
-    def Walk(self, node, logical):
-        Failing._Fail("names")
-        super().Walk(node, logical)
-
-
-@pytest.mark.parametrize("road", ["pairing", "recording", "names"])
-def test_hint_nodes_go_back_on_every_road(road, monkeypatch):
-    walker = Failing()
+    walker = Overriding("_IsDottedName", Fail)  # which nothing calls
     for line in LINES:
         Walked(*line, walker)
     free = FreeNodes(walker._fHintParser)
-    monkeypatch.setattr(Failing, "failing", road)
+    failing_class = type(walker._fGeneralNodeWalker if failing == "Walk" else walker)
+    setattr(failing_class, failing, Fail)
     for line in LINES[:1] + LINES[2:5]:
         with pytest.raises(KeyError):
             Walked(*line, walker)

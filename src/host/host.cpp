@@ -17,17 +17,6 @@ namespace codeloom {
 
 namespace {
 
-// The name of a class as the host knows it: `codeloom::CNode` is CNode, `CRef<CNode>` is CNode too.
-std::string HostName(const std::type_info& type) {
-    if (type == typeid(Py_ssize_t)) return "int";
-    char* const demangled = abi::__cxa_demangle(type.name(), nullptr, nullptr, nullptr);
-    std::string name = demangled == nullptr ? type.name() : demangled;
-    std::free(demangled);
-    if (const size_t start = name.rfind("::"); start != std::string::npos) name.erase(0, start + 2);
-    if (name.ends_with('>')) name.pop_back();
-    return name;
-}
-
 // Borrowed; null without an exception when the type has no such attribute.
 PyObject* TypeAttribute(nb::handle type, PyObject* name) {
     return _PyType_Lookup(reinterpret_cast<PyTypeObject*>(type.ptr()), name);
@@ -53,13 +42,18 @@ nb::handle HostClass(const nb::builtin_exception& error) {
 
 }  // namespace
 
+std::string HostName(const std::type_info& type) {
+    char* const demangled = abi::__cxa_demangle(type.name(), nullptr, nullptr, nullptr);
+    std::string name = demangled == nullptr ? type.name() : demangled;
+    std::free(demangled);
+    if (const size_t start = name.rfind("::"); start != std::string::npos) name.erase(0, start + 2);
+    if (name.ends_with('>')) name.pop_back();
+    return name;
+}
+
 void RaiseWrongType(const char* expected, nb::handle found) {
     PyErr_Format(PyExc_TypeError, "expected %s, %s found", expected, Py_TYPE(found.ptr())->tp_name);
     throw nb::python_error();
-}
-
-void RaiseWrongType(const std::type_info& expected, nb::handle found) {
-    RaiseWrongType(HostName(expected).c_str(), found);
 }
 
 void RaiseNoneUsed(const std::type_info& wanted) {
@@ -180,10 +174,9 @@ nb::object CHostOperation::Call(PyObject* const* stack, size_t count) const {
     return nb::steal<nb::object>(result);
 }
 
-void CHostOperation::RaiseWrongResult(nb::handle self, const std::type_info& wanted,
-                                      nb::handle result) const {
+void CHostOperation::RaiseWrongResult(nb::handle self, const std::string& wanted, nb::handle result) const {
     PyErr_Format(PyExc_TypeError, "%s.%U must return %s, not %s", Py_TYPE(self.ptr())->tp_name, _fName,
-                 HostName(wanted).c_str(), Py_TYPE(result.ptr())->tp_name);
+                 wanted.c_str(), Py_TYPE(result.ptr())->tp_name);
     throw nb::python_error();
 }
 

@@ -7,6 +7,7 @@
 // An object of the system lives inside its host object: the host object owns it, CRef owns the host object.
 #pragma once
 
+#include <string>
 #include <tuple>
 #include <utility>
 
@@ -41,7 +42,8 @@ class CHosted {
 // Raises the host's TypeError, "expected <class>, <class of found> found".
 [[noreturn]] void RaiseWrongType(const char* expected, nb::handle found);
 
-[[noreturn]] void RaiseWrongType(const std::type_info& expected, nb::handle found);
+// The name of a class as the host knows it: `codeloom::CNode` is CNode, `CRef<CNode>` is CNode too.
+std::string HostName(const std::type_info& type);
 
 // Raises the host's AttributeError of an operation on none.
 [[noreturn]] void RaiseNoneUsed(const std::type_info& wanted);

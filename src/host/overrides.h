@@ -20,6 +20,9 @@
 // subclass later is honoured, and one put into an instance's own dictionary isn't seen.
 #pragma once
 
+#include <string>
+#include <string_view>
+
 #include <nanobind/nanobind.h>
 
 #include "host/hosted.h"
@@ -41,18 +44,26 @@ class CHostOperation {
     nb::object Call(PyObject* const* stack, size_t count) const;
 
     // Raises the host's TypeError, "<class>.<operation> must return <wanted>, not <class of result>".
-    [[noreturn]] void RaiseWrongResult(nb::handle self, const std::type_info& wanted,
-                                       nb::handle result) const;
+    [[noreturn]] void RaiseWrongResult(nb::handle self, const std::string& wanted, nb::handle result) const;
 
   private:
     PyObject* _fName;  // interned, for the life of the process
 };
 
+// What a T is to the host: the name of a class, or the type as signatures write it, where "%" stands for a
+// class. Of an integer its size tells why one may not do.
+template <class T>
+std::string HostTypeName() {
+    constexpr std::string_view name = nb::detail::make_caster<T>::Name.text;
+    if (std::is_integral_v<T> && sizeof(T) > 1) return "int of " + std::to_string(8 * sizeof(T)) + " bits";
+    return name.find('%') == std::string_view::npos ? std::string(name) : HostName(typeid(T));
+}
+
 // A value of the host's as a T; a wrong kind is the host's TypeError.
 template <class T>
 T ResultFromHost(const nb::object& result) {
     T value{};
-    if (!nb::try_cast<T>(result, value)) RaiseWrongType(typeid(T), result);
+    if (!nb::try_cast<T>(result, value)) RaiseWrongType(HostTypeName<T>().c_str(), result);
     return value;
 }
 
@@ -66,7 +77,7 @@ Result CallOverride(const CHostOperation& operation, nb::handle self, Arguments&
         return Result(result);
     } else if constexpr (!std::is_void_v<Result>) {
         Result value{};
-        if (!nb::try_cast<Result>(result, value)) operation.RaiseWrongResult(self, typeid(Result), result);
+        if (!nb::try_cast<Result>(result, value)) operation.RaiseWrongResult(self, HostTypeName<Result>(), result);
         return value;
     }
 }
