@@ -3,7 +3,7 @@
 import sys
 
 import pytest
-from hand_made import Leaf, Node, Parse, Tokens
+from hand_made import Leaf, Node, Parse
 
 from codeloom.treesift import (
     CAtom,
@@ -108,37 +108,11 @@ def test_two_strings_are_for_hosts_to_tell():
     assert Node(Strings, String("'a'"), String("'b'")).IsTwoPlusStringLiterals()
 
 
-@pytest.mark.parametrize("version", ["3.8", "2.7"])
-def test_questions_about_brackets(version):
-    for source, is_set, is_tuple, dropped in [
-        ("{a}", True, False, "{ a }"),
-        ("{a, b}", True, False, "{ a , b }"),
-        ("{a for a in b}", True, False, "{ a for a in b }"),
-        ("{a: b}", False, False, "{ a : b }"),
-        ("{}", False, False, "{ }"),
-        ("[a, b]", False, False, "[ a , b ]"),
-        ("()", False, True, "( )"),
-        ("(a)", False, False, "a"),
-        ("((a))", False, False, "a"),
-        ("((a, b))", False, True, "( a , b )"),
-        ("((()))", False, True, "( )"),
-        ("(a,)", False, True, "( a , )"),
-        ("(a for a in b)", False, False, "( a for a in b )"),
-        ("((yield))", False, False, "yield"),
-        ("([a])", False, False, "[ a ]"),
-    ]:
-        node = Parse(source, version)
-        assert IsSetLiteral(node) is is_set, source
-        assert IsTupleLiteralNode(node) is is_tuple, source
-        assert IsGenExpression(node) is False, source
-        assert Tokens(DropSimpleParens(node)) == dropped, source
-    for source, is_tuple in [("a, b", True), ("a", False), ("a + b", False)]:
-        assert IsTupleLiteralNode(Parse(source, version)) is is_tuple
-        assert DropSimpleParens(Parse(source, version)).GetChildCount() != 1
-
-
 def test_questions_about_odd_brackets():
     x = Leaf("x")
+    for source, is_tuple in [("a, b", True), ("a", False), ("a + b", False)]:
+        node = Parse(source)
+        assert IsTupleLiteralNode(node) is is_tuple and DropSimpleParens(node) is node
     flat_generator = Node(CNode, x, Leaf("for"), x, Leaf("in"), x)
     assert IsGenExpression(Brackets("()", flat_generator))
     assert not IsGenExpression(Brackets("[]", flat_generator))

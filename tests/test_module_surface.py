@@ -13,18 +13,6 @@ from codeloom import _fastaccess, _neighbours, logicalline, strutils, symbolinfo
 ROOT = Path(__file__).parent.parent
 
 
-INSTANCE_CONSTANTS = {
-    "kListInstanceName": b"list",
-    "kDictInstanceName": b"dict",
-    "kSetInstanceName": b"set",
-    "kTupleInstanceName": b"tuple",
-    "kStringInstanceName": b"str",
-    "kUnicodeInstanceName": b"unicode",
-    "kBytesInstanceName": b"bytes",
-    "kIntLiteralName": b"int",
-    "kFloatLiteralName": b"float",
-}
-CONSTANTS = ["kPy2DefaultGrammar", "kPy3DefaultGrammar", "kLiteralPrefix", *INSTANCE_CONSTANTS]
 STANDARD_MODULES = {"keyword", "re", "sys", "token", "os", "time", "pgen"}
 VOCABULARY = [*symbolinfo._SymbolConstants(), "gInfoBytesBuilder", "CKindFilter"]
 LOGICAL_TYPES = [name for name in logicalline.__all__ if name.startswith("k")]
@@ -52,16 +40,22 @@ def test_imported_names_are_the_neighbours(neighbour, names):
         assert getattr(treesift, name) is getattr(neighbour, name)
 
 
+CONSTANTS = """
+    kPy2DefaultGrammar kPy3DefaultGrammar kLiteralPrefix kListInstanceName kDictInstanceName
+    kSetInstanceName kTupleInstanceName kStringInstanceName kUnicodeInstanceName kBytesInstanceName
+    kIntLiteralName kFloatLiteralName
+"""
+
+
 def test_constants_are_set_in_their_order():
-    names = [name for name in Visible() if name in CONSTANTS]
-    assert names == CONSTANTS
-    assert treesift.kPy2DefaultGrammar == "Python-Grammar-2.7"
-    assert treesift.kPy3DefaultGrammar == "Python-Grammar-3.8"
-    assert treesift.kLiteralPrefix == symbolinfo.kTypedLiteralPrefix
-    for name, cls_name in INSTANCE_CONSTANTS.items():
-        equiv = symbolinfo.kTypedLiteralPrefix + cls_name + symbolinfo.kClassInstanceSuffix
-        assert getattr(treesift, name) == equiv
-        assert treesift._GetBuiltinInstanceName(cls_name.decode()) == equiv
+    names = CONSTANTS.split()
+    assert [name for name in Visible() if name in names] == names
+    prefix, suffix = symbolinfo.kTypedLiteralPrefix, symbolinfo.kClassInstanceSuffix
+    classes = b"list dict set tuple str unicode bytes int float".split()
+    values = [getattr(treesift, name) for name in names]
+    assert values[:3] == ["Python-Grammar-2.7", "Python-Grammar-3.8", prefix]
+    assert values[3:] == [prefix + cls + suffix for cls in classes]
+    assert values[3:] == [treesift._GetBuiltinInstanceName(cls.decode()) for cls in classes]
 
 
 def test_class_attributes_are_made_while_loading():

@@ -1,10 +1,10 @@
 """The trees of statements and the answers of their accessors, against golden files in trees/.
 
 A row of a tree shows a node: its class, the grammar state, the text of a leaf, the index of its first
-token. Beneath it, behind dots, stand the answers to what its class can be asked, a node as its tokens;
-None, False and an empty list aren't shown. An operation that takes an index is asked for one after another.
-Behind `---` stand the grammars; where both give the same tree it is there once. The files in trees/newer/
-hold what the newer parser alone takes.
+token. Beneath it, behind dots, stand the answers to what its class can be asked, and for brackets those of
+the functions, a node as its tokens; None, False, an empty list and the node itself aren't shown. An operation
+that takes an index is asked for one after another. Behind `---` stand the grammars; where both give the same
+tree it is there once. The files in trees/newer/ hold what the newer parser alone takes.
 """
 
 import re
@@ -17,7 +17,16 @@ from hand_made import DRIVERS, Parse, Tokens
 
 from codeloom import treesift
 from codeloom.optpgen import ParseError
-from codeloom.treesift import CExpression, CNewerParser, CNode
+from codeloom.treesift import (
+    CAtom,
+    CExpression,
+    CNewerParser,
+    CNode,
+    DropSimpleParens,
+    IsGenExpression,
+    IsSetLiteral,
+    IsTupleLiteralNode,
+)
 
 
 def TokensInARow(node):
@@ -75,6 +84,14 @@ def Answers(node):
             answers = list(IndexedAnswers(ask, node.GetChildCount()))
             if answers:
                 yield f"{name}: {' | '.join(answers)}"
+    for question in QUESTIONS if isinstance(node, CAtom) else ():
+        answer = question(node)
+        if answer is not False and answer is not node:
+            yield f"{question.__name__}: {Readable(answer)}"
+
+
+# What can be asked of brackets beside their accessors.
+QUESTIONS = DropSimpleParens, IsSetLiteral, IsGenExpression, IsTupleLiteralNode
 
 
 def Rows(node, indent=""):
