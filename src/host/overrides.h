@@ -77,7 +77,8 @@ Result CallOverride(const CHostOperation& operation, nb::handle self, Arguments&
         return Result(result);
     } else if constexpr (!std::is_void_v<Result>) {
         Result value{};
-        if (!nb::try_cast<Result>(result, value)) operation.RaiseWrongResult(self, HostTypeName<Result>(), result);
+        if (!nb::try_cast<Result>(result, value))
+            operation.RaiseWrongResult(self, HostTypeName<Result>(), result);
         return value;
     }
 }
