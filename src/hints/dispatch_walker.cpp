@@ -58,25 +58,21 @@ bool CDispatchWalker::_AreChildrenWanted(const CNodeRef& node) {
 
 void CDispatchWalker::_VisitChildren(const CNodeRef& node) {
     if (!node) return;
-    const nb::object children = node->fChildren;
-    if (children.is_none()) return;
-    for (Py_ssize_t i = 0; i < ListSize(children); ++i) {
-        const nb::handle child = ListItem(children, i);
-        if (_IsIdleLeaf(child)) {
+    for (Py_ssize_t i = 0; i < node->fChildren.Size(); ++i) {
+        const CNode* const child = node->fChildren.TryAt(i);
+        if (child != nullptr && _IsIdleLeaf(*child)) {
             _fLimits.CountVisit();
             CVisitLimits::CheckDepth(static_cast<Py_ssize_t>(_fNodeStack.size()) + 1);
         } else {
-            _VisitNode(CNodeRef::FromHost(child));
+            _VisitNode(node->fChildren.RefAt<CNode>(i));
         }
     }
 }
 
 // True for a leaf whose visit would do nothing but count. More than half of all nodes are such.
-bool CDispatchWalker::_IsIdleLeaf(nb::handle child) {
-    if (!_fIsNative) return false;
-    const CNode* const node = TryInstance<CNode>(child);
-    if (node == nullptr || !node->fChildren.is_none()) return false;
-    const CDispatchTable::EAction action = _fDispatch.Find(child.type()).action;
+bool CDispatchWalker::_IsIdleLeaf(const CNode& node) {
+    if (!_fIsNative || !node.fChildren.IsNone()) return false;
+    const CDispatchTable::EAction action = _fDispatch.Find(node.Self().type()).action;
     return action == CDispatchTable::EAction::kVisitChildren || action == CDispatchTable::EAction::kSkip;
 }
 

@@ -44,7 +44,7 @@ class CDispatchWalker : public CHosted {
     void InitWithVisits(nb::dict dispatch_dict, std::vector<CNativeVisit> native_visits);
 
   private:
-    bool _IsIdleLeaf(nb::handle child);
+    bool _IsIdleLeaf(const CNode& node);
     bool _AreChildrenWanted(const CNodeRef& node);
     void _VisitChildren(const CNodeRef& node);
 

@@ -14,51 +14,43 @@ namespace {
 
 constexpr int kVersionsOfMajor = 100;  // 3.12 is 312
 
-CNode& Child(nb::handle children, Py_ssize_t i) {
-    return *Instance<CNode>(ListItem(children, i));
-}
-
-// The first child that `matches`, or -1.
-template <class Matches>
-Py_ssize_t FindChild(nb::handle children, Matches matches) {
-    for (Py_ssize_t i = 0; i < ListSize(children); ++i)
-        if (matches(Child(children, i))) return i;
+template <class Class>
+Py_ssize_t FindOfClass(const CNode& node) {
+    for (Py_ssize_t i = 0; i < ListedCount(node); ++i)
+        if (node.TryChild<Class>(i)) return i;
     return -1;
 }
 
-template <class Class>
-Py_ssize_t FindOfClass(nb::handle children) {
-    return FindChild(children, [](const CNode& child) { return child.As<Class>() != nullptr; });
-}
-
 template <Py_ssize_t child_i>
-Py_ssize_t Always(nb::handle) {
+Py_ssize_t Always(const CNode&) {
     return child_i;
 }
 
 template <Py_ssize_t child_i, class Class>
-Py_ssize_t IfOfClass(nb::handle children) {
-    return child_i < ListSize(children) && Child(children, child_i).As<Class>() ? child_i : -1;
+Py_ssize_t IfOfClass(const CNode& node) {
+    return node.TryChild<Class>(child_i) ? child_i : -1;
 }
 
-Py_ssize_t FindSlash(nb::handle children) {
-    return FindChild(children, [](const CNode& child) { return child.HasText("/"); });
+Py_ssize_t FindSlash(const CNode& node) {
+    for (Py_ssize_t i = 0; i < ListedCount(node); ++i)
+        if (node.IsToken(i, "/")) return i;
+    return -1;
 }
 
-Py_ssize_t FindNamedArgument(nb::handle children) {
-    return Child(children, 1).HasText(":=") ? 1 : -1;
+Py_ssize_t FindNamedArgument(const CNode& node) {
+    return node.IsToken(1, ":=") ? 1 : -1;
 }
 
 // In a set of one; the `:=` of `(x := 1)` has its brackets.
-Py_ssize_t FindInBraces(nb::handle children) {
-    return Child(children, 0).HasText("{") ? IfOfClass<1, CNamedExpr>(children) : -1;
+Py_ssize_t FindInBraces(const CNode& node) {
+    return node.IsToken(0, "{") ? IfOfClass<1, CNamedExpr>(node) : -1;
 }
 
 // A comma list that holds a starred expression.
 template <Py_ssize_t child_i>
-Py_ssize_t FindStarInList(nb::handle children) {
-    if (IfOfClass<child_i, CTestListStarExpr>(children) == -1) return -1;
-    return FindOfClass<CStarExpression>(ChildList(Child(children, child_i))) == -1 ? -1 : child_i;
+Py_ssize_t FindStarInList(const CNode& node) {
+    const CTestListStarExpr* const list = node.TryChild<CTestListStarExpr>(child_i);
+    return list && FindOfClass<CStarExpression>(*list) != -1 ? child_i : -1;
 }
 
 // The version of a string literal; null for one that has always been.
@@ -117,16 +109,16 @@ void CNewerForms::_Watch(int type, const CNodeForm* form) {
     _fNodeForm[type_i] = form;
 }
 
-void CNewerForms::_Look(int type, nb::handle value, nb::handle context, nb::handle children) {
+void CNewerForms::NoteNode(int type, const CNode& node) {
     if (type == kTokenId_STRING) {
-        const CForm* const form = FormOfString(CUtf8(value));
-        if (form) Note(*form, context);
+        const CForm* const form = FormOfString(CUtf8(node.fText));
+        if (form) Note(*form, node.fContext);
         return;
     }
-    if (!nb::isinstance<nb::list>(children)) return;
+    if (node.fChildren.IsNone()) return;
     const CNodeForm& node_form = *_fNodeForm[static_cast<size_t>(type)];
-    const Py_ssize_t child_i = node_form.find(children);
-    if (child_i >= 0) Note(node_form.form, Child(children, child_i).fContext);
+    const Py_ssize_t child_i = node_form.find(node);
+    if (child_i >= 0) Note(node_form.form, node.ChildAt(child_i).fContext);
 }
 
 void CNewerForms::Note(const CForm& form, nb::handle context) {

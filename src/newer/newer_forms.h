@@ -1,5 +1,5 @@
 // What a line has that is newer than the version that it is written in.
-//   in     the version, each node as it is made, and what is read by hand
+//   in     the version, each node that is made, and what is read by hand
 //   out    one SyntaxError which names the form, its place and the version that brought it
 #pragma once
 
@@ -9,6 +9,7 @@
 #include <nanobind/nanobind.h>
 
 #include "neighbours/logicalline/logical_line.h"
+#include "tree/node.h"
 
 namespace codeloom {
 
@@ -44,11 +45,11 @@ inline constexpr CForm kTString{"a t-string", 314};
 
 class CNewerForms {
   public:
-    // A form that the children of a node of one grammar state show: the child at fault, or -1.
+    // A form that a node of one grammar state shows: the child at fault, or -1.
     struct CNodeForm {
         const char* state;
         CForm form;
-        Py_ssize_t (*find)(nb::handle children);
+        Py_ssize_t (*find)(const CNode& node);
     };
 
     // Without a version of two integers at least, nothing is newer.
@@ -61,11 +62,11 @@ class CNewerForms {
     void Reset() { _fFound = nullptr; }
     void Note(const CForm& form, nb::handle context);
 
-    // Looks at a node or token that is being made.
-    void NoteNode(int type, nb::handle value, nb::handle context, nb::handle children) {
-        if (static_cast<size_t>(type) < _fWatched.size() && _fWatched[static_cast<size_t>(type)])
-            _Look(type, value, context, children);
+    // True for nodes that NoteNode is to look at.
+    bool AreWatched(int type) const {
+        return static_cast<size_t>(type) < _fWatched.size() && _fWatched[static_cast<size_t>(type)];
     }
+    void NoteNode(int type, const CNode& node);
 
     bool HasFound() const { return _fFound != nullptr; }
 
@@ -80,7 +81,6 @@ class CNewerForms {
   private:
     static const std::vector<CNodeForm>& _NodeForms();
     void _Watch(int type, const CNodeForm* form);
-    void _Look(int type, nb::handle value, nb::handle context, nb::handle children);
 
     int _fVersion = INT32_MAX;
     std::vector<uint8_t> _fWatched;            // by node type, whether nodes of it are looked at

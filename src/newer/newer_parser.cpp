@@ -51,8 +51,16 @@ void CNewerParser::Init(nb::object version_triple, nb::object grammar_file, nb::
 
 nb::object CNewerParser::convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
                                  nb::handle children) {
-    _fForms.NoteNode(type, value, context, children);
-    return CPGenParserImpl::convert(grammar, type, value, context, children);
+    nb::object node = CPGenParserImpl::convert(grammar, type, value, context, children);
+    if (_fForms.AreWatched(type)) _fForms.NoteNode(type, *Instance<CNode>(node));
+    return node;
+}
+
+nb::object CNewerParser::ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+                                     size_t first) {
+    nb::object node = CPGenParserImpl::ConvertRule(grammar, type, context, stack, first);
+    if (_fForms.AreWatched(type)) _fForms.NoteNode(type, *Instance<CNode>(node));
+    return node;
 }
 
 CNodeRef CNewerParser::ParseToNode(CLogicalLine& logical, bool in_async_def) {
@@ -244,14 +252,12 @@ CNodeRef CNewerParser::_CreateSingleTypeParameterNode(nb::tuple toks, bool in_as
     CNodeRef value = _ParseDefault(toks, in_async_def, positions, equal_i, end, raise_errors);
     if (!value) return parameter;
     CNodeRef equal = _fNodeFactory->CreateOperatorNode(nb::str("="), nb::int_(equal_i));
-    nb::list children = nb::borrow<nb::list>(parameter->fChildren);
     if (ListedCount(*parameter) > 2 && parameter->IsToken(-2, ":")) {
-        const CNodeRef bound = parameter->GetChild(-1);
-        DeleteListItem(children, -1);
-        children.append(NewPseudoNode<CNode>({bound, equal, value}).Release());
+        const CNodeRef bound = parameter->fChildren.Remove(-1);
+        parameter->fChildren.Append(NewPseudoNode<CNode>({bound, equal, value}));
     } else {
-        children.append(equal.Release());
-        children.append(value.Release());
+        parameter->fChildren.Append(std::move(equal));
+        parameter->fChildren.Append(std::move(value));
     }
     return parameter;
 }

@@ -31,6 +31,8 @@ class CNewerParser : public CPGenParserImpl {
 
     nb::object convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
                        nb::handle children) override;
+    nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+                           size_t first) override;
     nb::list _BuildClsForStateList() override;
     // SyntaxError for a form that is newer than the version asked for.
     CNodeRef ParseToNode(CLogicalLine& logical, bool in_async_def) override;

@@ -16,8 +16,7 @@ nb::tuple InParentheses(const nb::tuple& toks, Py_ssize_t open_i, Py_ssize_t clo
 CNodeRef WithoutParentheses(CNodeRef node) {
     if (!node || node->GetChildCount() != 3) return node;
     if (!node->GetChildText(0).equal(nb::str("(")) || !node->GetChildText(2).equal(nb::str(")"))) return node;
-    CNodeRef inner = node->GetChild(1);
-    DeleteListItem(node->fChildren, 1);
+    CNodeRef inner = node->fChildren.Remove(1);
     FinishedWithNode(node->Self());
     return inner;
 }

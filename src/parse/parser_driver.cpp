@@ -92,6 +92,13 @@ nb::object CPGenParserImpl::convert(nb::handle, int type, nb::handle value, nb::
     return _fNodeFactory->ConvertSingleNode(type, value, context, children).Release();
 }
 
+nb::object CPGenParserImpl::ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+                                        size_t first) {
+    if (!_fNodeFactory->AreNodes(stack, first))
+        return CPGenAnalyzer::ConvertRule(grammar, type, context, stack, first);
+    return _fNodeFactory->ConvertRule(type, context, stack, first).Release();
+}
+
 void CPGenParserImpl::DiscardNode(nb::handle node) {
     _fNodeFactory->DiscardNodes(node);
 }
@@ -131,8 +138,7 @@ CNodeRef CPGenParserImpl::_PeelRoot(nb::object parsed, bool is_decorator) {
                            : CNodeRef(Instance<CNode>(parsed));
     parsed.reset();
     const auto take_first_child = [this](CNodeRef& parent) {
-        CNodeRef first(Instance<CNode>(ListItem(parent->fChildren, 0)));
-        DeleteListItem(parent->fChildren, 0);
+        CNodeRef first = parent->fChildren.Remove(0);
         _fNodeFactory->DiscardNodes(parent->Self());
         return first;
     };

@@ -23,6 +23,8 @@ class CPGenParserImpl : public CPGenAnalyzer {
 
     nb::object convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
                        nb::handle children) override;
+    nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+                           size_t first) override;
     virtual nb::list _BuildClsForStateList();
     virtual void DiscardNode(nb::handle node);
     virtual CNodeRef ParseToNode(CLogicalLine& logical, bool in_async_def);

@@ -11,7 +11,7 @@ namespace codeloom {
 template <class Node>
 CNodeRef NewPseudoNode(nb::list children) {
     const CRef<Node> node = NewInstance<Node>();
-    node->fChildren = std::move(children);
+    node->fChildren.SetList(std::move(children));
     return CNodeRef(node.get());
 }
 

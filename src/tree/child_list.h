@@ -6,15 +6,10 @@
 
 namespace codeloom {
 
-// The list of children, borrowed; TypeError for a leaf.
-inline nb::handle ChildList(const CNode& node) {
-    if (node.fChildren.is_none()) RaiseHost(PyExc_TypeError, "'NoneType' object is not a list of children");
-    return node.fChildren;
-}
-
 // The number of children; TypeError for a leaf.
 inline Py_ssize_t ListedCount(const CNode& node) {
-    return ListSize(ChildList(node));
+    if (node.fChildren.IsNone()) RaiseHost(PyExc_TypeError, "'NoneType' object is not a list of children");
+    return node.fChildren.Size();
 }
 
 }  // namespace codeloom

@@ -28,7 +28,7 @@ CTextOrNone COperatorExpression::GetOperatorStr(int operator_i) {
 
 // `not in`, `is not`
 CTextOrNone COperatorExpression::_TextOfTwoWords(const CNode& node) {
-    if (node.fChildren.is_none() || ListSize(node.fChildren) != 2) return CTextOrNone();
+    if (node.fChildren.Size() != 2) return CTextOrNone();
     const nb::object first = node.ChildAt(0).fText, second = node.ChildAt(1).fText;
     if (first.is_none() || second.is_none()) return CTextOrNone();
     return first + nb::str(" ") + second;
@@ -91,7 +91,7 @@ CExpressionRef CTestListStarExpr::GetSubExpr(int i) {
     if (child_i >= _GetChildCount()) throw nb::value_error("Not enough expressions in list");
     if (CExpression* const expression = TryChild<CExpression>(child_i)) return CExpressionRef(expression);
     const nb::object message = nb::str("Elenment {} of {} needs to be a CExpression; fChildren = {}")
-                                   .format(child_i, nb::repr(Self()), nb::repr(fChildren));
+                                   .format(child_i, nb::repr(Self()), nb::repr(fChildren.AsHost()));
     RaiseHost(PyExc_ValueError, nb::borrow<nb::str>(message).c_str());
 }
 
@@ -117,12 +117,12 @@ CNodeRef CAtomExpr::GetPrefix() {
 }
 
 CNodeRef CAtomExpr::GetAtom() {
-    return fChildren.is_none() ? CNodeRef() : ChildAs<CNode>(_AtomIndex());
+    return fChildren.IsNone() ? CNodeRef() : ChildAs<CNode>(_AtomIndex());
 }
 
 CNodeRange CAtomExpr::GetTrailers() {
-    if (fChildren.is_none()) return CNodeRange();
-    return CNodeRange(fChildren, _AtomIndex() + 1, _GetChildCount());
+    if (fChildren.IsNone()) return CNodeRange();
+    return CNodeRange(*this, _AtomIndex() + 1, _GetChildCount());
 }
 
 Py_ssize_t CAtomExpr::_AtomIndex() {
@@ -142,7 +142,7 @@ CNodeRange CPower::GetTrailers() {
     const Py_ssize_t child_count = _GetChildCount();
     Py_ssize_t end = 1;
     while (end < child_count && !IsToken(end, "**")) ++end;
-    return CNodeRange(fChildren, 1, end);
+    return CNodeRange(*this, 1, end);
 }
 
 CNodeRef CPower::GetExponentNode() {

@@ -9,9 +9,9 @@ namespace {
 
 void AppendLeafTexts(const CNode& node, nb::list& texts) {
     if (!node.fText.is_none()) return texts.append(node.fText);
-    if (node.fChildren.is_none()) return;
+    if (node.fChildren.IsNone()) return;
     const CRecursionScope recursion;
-    for (Py_ssize_t i = 0; i < ListSize(node.fChildren); ++i) AppendLeafTexts(node.ChildAt(i), texts);
+    for (Py_ssize_t i = 0; i < node.fChildren.Size(); ++i) AppendLeafTexts(node.ChildAt(i), texts);
 }
 
 nb::str Joined(const nb::list& texts) {
@@ -57,8 +57,8 @@ Py_ssize_t CFromImportStmt::_GetImportIndex() {
 }
 
 Py_ssize_t _GetMatchingChildToken(const CNode& node, nb::str text) {
-    if (node.fChildren.is_none()) return -1;
-    for (Py_ssize_t i = 0; i < ListSize(node.fChildren); ++i) {
+    if (node.fChildren.IsNone()) return -1;
+    for (Py_ssize_t i = 0; i < node.fChildren.Size(); ++i) {
         const nb::object child_text = node.ChildAt(i).fText;
         if (child_text.equal(text)) return i;
     }

@@ -22,7 +22,7 @@ Py_ssize_t CNode::GetChildCount() {
 }
 
 Py_ssize_t CNode::_GetChildCount() {
-    return fChildren.is_none() ? 0 : ListSize(fChildren);
+    return fChildren.Size();
 }
 
 CTextOrNone CNode::GetChildText(Py_ssize_t child_i) {
@@ -53,11 +53,6 @@ bool CNode::HasToken(std::string_view token) const {
     for (Py_ssize_t i = 0; _HasItem(i); ++i)
         if (ChildAt(i).HasText(token)) return true;
     return false;
-}
-
-nb::handle CNode::_ItemAt(Py_ssize_t i) const {
-    if (fChildren.is_none()) RaiseHost(PyExc_TypeError, "'NoneType' object is not subscriptable");
-    return ListItem(fChildren, i);
 }
 
 }  // namespace codeloom

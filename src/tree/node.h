@@ -14,6 +14,7 @@
 #include "host/collections.h"
 #include "host/or_none.h"
 #include "host/text_match.h"
+#include "tree/children.h"
 
 namespace codeloom {
 
@@ -105,18 +106,19 @@ class CNode : public CHosted {
     }
 
     // The child at `i`, borrowed. TypeError for a leaf, IndexError outside the list.
-    CNode& ChildAt(Py_ssize_t i) const { return *Instance<CNode>(_ItemAt(i)); }
+    CNode& ChildAt(Py_ssize_t i) const { return fChildren.At(i); }
 
     // The same as a T; TypeError when it is of another class.
     template <class T>
     CRef<T> ChildAs(Py_ssize_t i) const {
-        return CRef<T>::FromHost(_ItemAt(i));
+        return fChildren.RefAt<T>(i);
     }
 
     // The child at `i`, borrowed, when it is a T; null when it isn't, and past the end.
     template <class T>
     T* TryChild(Py_ssize_t i) const {
-        return _HasItem(i) ? TryInstance<T>(ListItem(fChildren, i)) : nullptr;
+        const CNode* const child = _HasItem(i) ? fChildren.TryAt(i) : nullptr;
+        return child == nullptr ? nullptr : child->As<T>();
     }
 
     // The text of the child at `i`; none past the end, and for a child without text.
@@ -136,24 +138,23 @@ class CNode : public CHosted {
 
     template <class Visitor>
     void References(Visitor&& visit) {
-        visit(fChildren);
+        fChildren.VisitReferences(visit);
         visit(fText);
         visit(fContext);
         visit(fClsInfo);
         visit(fNextFree);
     }
 
-    nb::object fChildren = nb::none();  // list of CNode in source order; none for a leaf
-    nb::object fText = nb::none();      // text string; none for a non-terminal
-    nb::object fContext = nb::none();   // by convention the index of the node's (first) token
-    CRef<CNodeClassInfo> fClsInfo;      // the record that made the node
-    CNodeRef fNextFree;                 // link of the free list; stale while the node is in use
+    TChildren<CNode> fChildren;        // in source order; none for a leaf
+    nb::object fText = nb::none();     // text string; none for a non-terminal
+    nb::object fContext = nb::none();  // by convention the index of the node's (first) token
+    CRef<CNodeClassInfo> fClsInfo;     // the record that made the node
+    CNodeRef fNextFree;                // link of the free list; stale while the node is in use
 
   private:
     const CNodeKind* _fKind = &kNodeKind<CNode>;
 
-    bool _HasItem(Py_ssize_t i) const { return !fChildren.is_none() && i < ListSize(fChildren); }
-    nb::handle _ItemAt(Py_ssize_t i) const;
+    bool _HasItem(Py_ssize_t i) const { return i < fChildren.Size() && !fChildren.IsNone(); }
 };
 
 template <class Class>

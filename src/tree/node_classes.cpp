@@ -46,7 +46,9 @@ void BindNode(nb::module_& module) {
     nb::class_<CNode, TNodeOperations<CNode>> binding(module, "CNode", Collected<CNode>(),
                                                       "Base of all syntax tree nodes.");
     binding.def(TInit<CRef<CNodeClassInfo>>(), "cls_info"_a.none() = nb::none())
-        .def_ro("fChildren", &CNode::fChildren, "List of child nodes in source order; None for a leaf.")
+        .def_prop_ro(
+            "fChildren", [](CNode& node) { return node.fChildren.AsHost(); },
+            "List of child nodes in source order; None for a leaf.")
         .def_ro("fText", &CNode::fText, "Token text; None for a non-terminal.")
         .def_ro("fContext", &CNode::fContext, "Token index of the node's (first) token.")
         .def_ro("fClsInfo", &CNode::fClsInfo, "The record that made the node.")

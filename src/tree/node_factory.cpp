@@ -24,11 +24,19 @@ CRef<CNodeClassInfo> NewClassInfo(nb::object cls, int type, nb::object name) {
     return info;
 }
 
+bool IsNewline(const CNode& node) {
+    return node.fClsInfo && node.fClsInfo->fNodeType == kTokenId_NEWLINE;
+}
+
 // A statement and the newline behind it.
 bool IsStatementLine(nb::handle text, nb::handle children) {
-    if (!text.is_none() || children.is_none() || ListSize(children) != 2) return false;
-    const CNode& last = *Instance<CNode>(ListItem(children, 1));
-    return last.fClsInfo && last.fClsInfo->fNodeType == kTokenId_NEWLINE;
+    return text.is_none() && !children.is_none() && ListSize(children) == 2 &&
+           IsNewline(*Instance<CNode>(ListItem(children, 1)));
+}
+
+CNodeRef TakeNode(CObjectStack& stack, size_t i) {
+    CNode* const node = nb::inst_ptr<CNode>(stack.At(i));
+    return CNodeRef::Steal(node, stack.Take(i));
 }
 
 }  // namespace
@@ -64,16 +72,43 @@ CNodeRef CNodeFactory::NewNode(CNodeClassInfo& clsinfo, int, nb::handle text, nb
                                nb::handle children) {
     HostAssert(IsTextOrNone(text));
     nb::object node_list = ListOrNone(children);
-    CNodeRef node = std::move(clsinfo.fFirstFree);
-    if (node) {
-        clsinfo.fFirstFree = node->fNextFree;
-    } else {
-        node = CNodeRef(Instance<CNode>(nb::object(clsinfo.fCls(clsinfo.Self()))));
-    }
+    CNodeRef node = _EmptyNode(clsinfo);
     node->fText = nb::borrow(text);
     node->fContext = nb::borrow(context);
-    node->fChildren = std::move(node_list);
+    node->fChildren.SetList(std::move(node_list));
     return node;
+}
+
+CNodeRef CNodeFactory::_EmptyNode(CNodeClassInfo& clsinfo) {
+    CNodeRef node = std::move(clsinfo.fFirstFree);
+    if (!node) return CNodeRef(Instance<CNode>(nb::object(clsinfo.fCls(clsinfo.Self()))));
+    clsinfo.fFirstFree = node->fNextFree;
+    return node;
+}
+
+CNodeRef CNodeFactory::ConvertRule(int type, nb::handle context, CObjectStack& stack, size_t first) {
+    const size_t count = stack.Size() - first;
+    HostAssert(count >= 2);
+    CNodeClassInfo& record = _ClassInfo(type);
+    CNodeRef node;
+    if (count == 2 && IsNewline(*nb::inst_ptr<CNode>(stack.At(first + 1)))) {
+        DiscardNodes(stack.At(first + 1));
+        stack.Take(first + 1);
+        node = TakeNode(stack, first);
+    } else {
+        node = _EmptyNode(record);
+        node->fText = nb::none();
+        node->fContext = nb::borrow(context);
+        node->fChildren.SetNodes(count, [&](size_t i) { return TakeNode(stack, first + i); });
+    }
+    stack.CutOff(first);
+    return node;
+}
+
+bool CNodeFactory::AreNodes(const CObjectStack& stack, size_t first) {
+    for (size_t i = first; i < stack.Size(); ++i)
+        if (TryInstance<CNode>(stack.At(i)) == nullptr) return false;
+    return true;
 }
 
 CNodeRef CNodeFactory::NewKeywordNode(nb::handle text, nb::handle context) {

@@ -6,6 +6,7 @@
 #include <nanobind/nanobind.h>
 
 #include "host/binding.h"
+#include "neighbours/optpgen/object_stack.h"
 #include "tree/node.h"
 
 namespace codeloom {
@@ -26,6 +27,11 @@ class CNodeFactory : public CHosted {
     virtual void DiscardNodes(nb::handle node);
     virtual CNodeRef RecursiveConvert(nb::tuple raw);
 
+    // ConvertSingleNode for a rule whose children, all of them nodes, stand on a stack from `first` to its
+    // top. They leave it.
+    CNodeRef ConvertRule(int type, nb::handle context, CObjectStack& stack, size_t first);
+    static bool AreNodes(const CObjectStack& stack, size_t first);
+
     nb::list GetClassInfoList() const;
 
     template <class Visitor>
@@ -39,6 +45,7 @@ class CNodeFactory : public CHosted {
     nb::object _fOperatorStrToNumber = nb::none();  // operator text to token type
 
   private:
+    static CNodeRef _EmptyNode(CNodeClassInfo& clsinfo);
     CNodeClassInfo& _ClassInfo(Py_ssize_t type) const;
     CNodeClassInfo& _RecordFor(int type, nb::handle text) const;
 

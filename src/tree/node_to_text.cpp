@@ -132,7 +132,7 @@ bool CNodeToTextConverterImpl::_AppendAtom(std::string& text, CAtom& atom, const
 // Whatever has no form of its own: the texts of its children, joined as tokens are.
 bool CNodeToTextConverterImpl::_AppendJoinedChildren(std::string& text, CNode& node,
                                                      const CNodeTextOptions& options) {
-    if (!_fIncludeBracketText || options.dotted_name_only || node.fChildren.is_none()) return false;
+    if (!_fIncludeBracketText || options.dotted_name_only || node.fChildren.IsNone()) return false;
     const Py_ssize_t child_count = node._GetChildCount();
     const bool has_parens = options.add_parens_if_operator && child_count != 1;
     if (has_parens) text += '(';

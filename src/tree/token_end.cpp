@@ -5,7 +5,7 @@ namespace codeloom {
 namespace {
 
 const CNode* ChildOrNone(const CNode& node, Py_ssize_t child_i) {
-    return node.fChildren.is_none() || ListSize(node.fChildren) == 0 ? nullptr : &node.ChildAt(child_i);
+    return node.fChildren.Size() == 0 ? nullptr : &node.ChildAt(child_i);
 }
 
 // A tree of the host may contain itself: a second walk at half the pace would be caught up with.

@@ -57,10 +57,8 @@ void CNodeWalker::_VisitNode(CNode& node) {
 }
 
 void CNodeWalker::_VisitChildren(CNode& node) {
-    const nb::object children = node.fChildren;
-    if (children.is_none()) return;
-    for (Py_ssize_t i = 0; i < ListSize(children); ++i) {
-        const CNodeRef child(Instance<CNode>(ListItem(children, i)));
+    for (Py_ssize_t i = 0; i < node.fChildren.Size(); ++i) {
+        const CNodeRef child(&node.fChildren.At(i));
         _VisitNode(*child);
     }
 }

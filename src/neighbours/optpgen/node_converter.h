@@ -5,6 +5,7 @@
 #include <nanobind/nanobind.h>
 
 #include "host/overrides.h"
+#include "neighbours/optpgen/object_stack.h"
 
 namespace codeloom {
 
@@ -18,6 +19,13 @@ class NodeConverter : public CHosted {
                                nb::handle children) {
         static_cast<void>(grammar);
         return nb::make_tuple(type, value, context, children);
+    }
+
+    // The same for a rule whose children stand on a stack, from `first` to its top; they leave it. A native
+    // converter that needs no list of them has its own.
+    virtual nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+                                   size_t first) {
+        return convert(grammar, type, nb::none(), context, stack.PopList(first));
     }
 };
 
@@ -33,6 +41,15 @@ class TNodeConverterOperations : public Class {
         "returns the tuple (type, value, context, children).",
         "grammar"_a.none(), "type"_a, "value"_a.none(), "context"_a.none(), "children"_a.none())
     END_OPERATIONS
+
+    // The host knows rules by `convert` alone.
+    nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+                           size_t first) override {
+        static const CHostOperation convert("convert");
+        const bool is_native = !convert.IsOverridden(this->Self(), nb::type<Class>());
+        return is_native ? Class::ConvertRule(grammar, type, context, stack, first)
+                         : NodeConverter::ConvertRule(grammar, type, context, stack, first);
+    }
 };
 
 }  // namespace codeloom

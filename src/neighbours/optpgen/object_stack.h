@@ -32,15 +32,22 @@ class CObjectStack {
         ++_fSize;
     }
 
-    nb::object Pop() { return nb::steal(_Take(--_fSize)); }
+    nb::handle At(size_t i) const { return _fObjects[i]; }
+
+    nb::object Pop() { return Take(--_fSize); }
+
+    // The object at `i`, which leaves its place empty. The place stays, until it is cut off.
+    nb::object Take(size_t i) { return nb::steal(_fObjects[i].release()); }
+    void CutOff(size_t first) { _fSize = first; }
 
     // The objects from `first` to the top as a new host list; they leave the stack.
     nb::object PopList(size_t first) {
         const auto count = static_cast<Py_ssize_t>(_fSize - first);
         nb::object list = nb::steal(PyList_New(count));
         if (!list.is_valid()) throw nb::python_error();
-        for (Py_ssize_t i = 0; i < count; ++i) PyList_SET_ITEM(list.ptr(), i, _Take(first + i));
-        _fSize = first;
+        for (Py_ssize_t i = 0; i < count; ++i)
+            PyList_SET_ITEM(list.ptr(), i, Take(first + i).release().ptr());
+        CutOff(first);
         return list;
     }
 
@@ -56,9 +63,6 @@ class CObjectStack {
     }
 
   private:
-    // The object at `i`, whose place is raw memory from now on.
-    PyObject* _Take(size_t i) { return _fObjects[i].release().ptr(); }
-
     [[gnu::noinline]] void _Grow() {
         const size_t capacity = 2 * _fCapacity + 64;
         nb::object* const objects = std::allocator<nb::object>().allocate(capacity);

@@ -47,7 +47,8 @@ bool ParserImpl::addtoken(int type, nb::handle value, nb::handle context) {
     const CMove& move = _FindMove(_fTokenLabels->Find(type, value), context);
     if (move.kind < EMove::kShift) [[unlikely]]
         RaiseParseError("the grammar doesn't allow this token here", nb::int_(type), value, context);
-    _PushNode(type, value, context, nb::handle(Py_None));
+    _fChildren.Push(
+        [&] { return _fConverter->convert(_fGrammar->Self(), type, value, context, nb::handle(Py_None)); });
     _fFrames.back().row = move.next_row;
     if (move.kind == EMove::kBegin) {
         _OpenFrame({move.new_row, 0, _fChildren.Size() - 1}, context);
@@ -93,14 +94,11 @@ inline const CMove& ParserImpl::_FindMove(int label, nb::handle context) {
 // Makes the node of the rule on top, which then is the single child of the rules around it.
 void ParserImpl::_CompleteRule() {
     CFrame& top = _fFrames.back();
-    const nb::object children = _fChildren.PopList(top.first_child);
-    _PushNode(_fTables->RuleNumber(top.chain), nb::handle(Py_None), _fContexts.Top(), children);
+    nb::object node = _fConverter->ConvertRule(_fGrammar->Self(), _fTables->RuleNumber(top.chain),
+                                               _fContexts.Top(), _fChildren, top.first_child);
+    _fChildren.Push([&] { return std::move(node); });
     top.row = _fTables->RowAround(top.chain);
     if (top.row == CParseTables::kLastRow) _CloseFrame();
-}
-
-inline void ParserImpl::_PushNode(int type, nb::handle value, nb::handle context, nb::handle children) {
-    _fChildren.Push([&] { return _fConverter->convert(_fGrammar->Self(), type, value, context, children); });
 }
 
 inline void ParserImpl::_OpenFrame(const CFrame& frame, nb::handle context) {

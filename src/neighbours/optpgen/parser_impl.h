@@ -55,10 +55,8 @@ class ParserImpl : public Parser {
 
     class CBusyScope;
 
-    // The first three run for every token; as parts of their callers they save a tenth of it.
+    // The first two run for every token; as parts of their callers they save a tenth of it.
     [[gnu::always_inline]] const CMove& _FindMove(int label, nb::handle context);
-    [[gnu::always_inline]] void _PushNode(int type, nb::handle value, nb::handle context,
-                                          nb::handle children);
     [[gnu::always_inline]] void _OpenFrame(const CFrame& frame, nb::handle context);
     void _CompleteRule();
     void _CloseFrame();
