@@ -92,10 +92,8 @@ nb::object CPGenParserImpl::convert(nb::handle, int type, nb::handle value, nb::
     return _fNodeFactory->ConvertSingleNode(type, value, context, children).Release();
 }
 
-nb::object CPGenParserImpl::ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+nb::object CPGenParserImpl::ConvertRule(nb::handle, int type, nb::handle context, CObjectStack& stack,
                                         size_t first) {
-    if (!_fNodeFactory->AreNodes(stack, first))
-        return CPGenAnalyzer::ConvertRule(grammar, type, context, stack, first);
     return _fNodeFactory->ConvertRule(type, context, stack, first).Release();
 }
 

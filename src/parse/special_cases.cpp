@@ -27,6 +27,7 @@ bool IsParseError(const nb::python_error& error) {
 CNodeRef CPGenParserImpl::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
     const Py_ssize_t i = _FindNextNonSkipIndex(toks, -1);
     if (i >= TupleSize(toks)) return CNodeRef();
+    if (!MayBeSpecialCase(TupleItem(toks, i))) return CNodeRef();
     const CUtf8 text(TupleItem(toks, i));
     if (text == "with") return _ParseSpecialCaseParenthesizedWith(toks, in_async_def, positions, i);
     if (text == "match")

@@ -6,12 +6,24 @@
 
 namespace codeloom {
 
+namespace {
+
+// Of a name where `async` and `await` are keywords.
+int AsyncTokenType(std::string_view text) {
+    if (text.size() != 5 || text.front() != 'a') return kTokenId_NAME;
+    if (text == "async") return kTokenId_ASYNC;
+    return text == "await" ? kTokenId_AWAIT : kTokenId_NAME;
+}
+
+}  // namespace
+
 CTokenFeed::CTokenFeed(CPGenParserImpl& driver, const nb::tuple& toks, bool in_async_def,
                        const CPositions& positions, Py_ssize_t start, Py_ssize_t end)
     : _fDriver(driver),
       _fParser(*driver._fParser),
       _fToks(toks),
       _fPositions(positions),
+      _fPlaces(positions.PlacesOf(toks)),
       _fStart(start),
       _fEnd(end),
       _fAsyncIsKeyword(driver._fAsyncAlwaysKeyword || in_async_def) {
@@ -30,9 +42,10 @@ void CTokenFeed::FeedAll() {
 void CTokenFeed::_FeedToken(Py_ssize_t i) {
     nb::handle tok = TupleItem(_fToks, i);
     if (tok.is_none()) return;
-    int type = GetTokenType(CUtf8(tok));
-    if (!_fFirstToken.is_valid()) type = _BeginStatement(tok, type, i);
-    if (type == kTokenId_NAME && _fAsyncIsKeyword) type = _AsyncTokenType(tok, type);
+    const CUtf8 text(tok);
+    int type = _fPlaces != nullptr ? _fPlaces[i].type : GetTokenType(text);
+    if (!_fFirstToken.is_valid()) type = _BeginStatement(tok, text, type, i);
+    if (type == kTokenId_NAME && _fAsyncIsKeyword) type = AsyncTokenType(text);
     if (_IsSkipped(type, i)) return;
     if (type == kTokenId_ELLIPSIS && !_fDriver._fPy3Grammar) return _FeedThreeDots(tok, i);
     _fParser.addtoken(type, tok, nb::int_(i));
@@ -41,11 +54,10 @@ void CTokenFeed::_FeedToken(Py_ssize_t i) {
 }
 
 // Treats a token that may begin the statement; gives its type. `elif` is read as `if` from here on.
-int CTokenFeed::_BeginStatement(nb::handle& tok, int type, Py_ssize_t i) {
+int CTokenFeed::_BeginStatement(nb::handle& tok, std::string_view text, int type, Py_ssize_t i) {
     if (type == kTokenId_AT) _fIsDecorator = true;
     if (type != kTokenId_NAME) return type;
     static const CHostText kIf("if");
-    const CUtf8 text(tok);
     if (text == "elif") {
         tok = kIf;
     } else if (text == "except" || text == "finally") {
@@ -56,13 +68,6 @@ int CTokenFeed::_BeginStatement(nb::handle& tok, int type, Py_ssize_t i) {
         const nb::object next = NextNonRemovedTokenInTuple(_fToks, i);
         if (!next.is_none() && CUtf8(next) == "def") return kTokenId_ASYNC;
     }
-    return type;
-}
-
-int CTokenFeed::_AsyncTokenType(nb::handle tok, int type) const {
-    const CUtf8 text(tok);
-    if (text == "async") return kTokenId_ASYNC;
-    if (text == "await") return kTokenId_AWAIT;
     return type;
 }
 

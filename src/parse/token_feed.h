@@ -24,8 +24,7 @@ class CTokenFeed {
 
   private:
     void _FeedToken(Py_ssize_t i);
-    int _BeginStatement(nb::handle& tok, int type, Py_ssize_t i);
-    int _AsyncTokenType(nb::handle tok, int type) const;
+    int _BeginStatement(nb::handle& tok, std::string_view text, int type, Py_ssize_t i);
     bool _IsSkipped(int type, Py_ssize_t i);
     void _FeedThreeDots(nb::handle tok, Py_ssize_t i);
     void _CompleteStatement();
@@ -36,6 +35,7 @@ class CTokenFeed {
     Parser& _fParser;
     const nb::tuple& _fToks;
     const CPositions& _fPositions;
+    const CLogicalLine::CTokenPlace* const _fPlaces;  // which have the types of the tokens; may be null
     const Py_ssize_t _fStart;
     const Py_ssize_t _fEnd;
     bool _fAsyncIsKeyword;

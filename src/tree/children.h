@@ -75,6 +75,13 @@ class TChildren {
     // The list that the host has; invalid when it hasn't asked for one.
     const nb::object& ListOfHost() const { return _fList; }
 
+    // Gives each native child to take(child), and is those of a leaf afterwards.
+    template <class Take>
+    void TakeAll(Take take) {
+        for (size_t i = 0; i < _fNodes.size(); ++i) take(std::move(_fNodes[i]));
+        SetNone();
+    }
+
     void SetNone() {
         _fIsNone = true;
         _fNodes.clear();

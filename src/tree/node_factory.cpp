@@ -30,8 +30,7 @@ bool IsNewline(const CNode& node) {
 
 // A statement and the newline behind it.
 bool IsStatementLine(nb::handle text, nb::handle children) {
-    return text.is_none() && !children.is_none() && ListSize(children) == 2 &&
-           IsNewline(*Instance<CNode>(ListItem(children, 1)));
+    return text.is_none() && ListSize(children) == 2 && IsNewline(*Instance<CNode>(ListItem(children, 1)));
 }
 
 CNodeRef TakeNode(CObjectStack& stack, size_t i) {
@@ -59,8 +58,9 @@ void CNodeFactory::Init(nb::object gram, nb::object cls_for_nodetype, nb::object
 }
 
 CNodeRef CNodeFactory::ConvertSingleNode(int type, nb::handle text, nb::handle context, nb::handle children) {
+    if (children.is_none()) return NewNode(_RecordFor(type, text), type, text, context, children);
     const nb::object node_list = ListOrNone(children);
-    HostAssert(node_list.is_none() || ListSize(node_list) >= 2);
+    HostAssert(ListSize(node_list) >= 2);
     CNodeClassInfo& record = _RecordFor(type, text);
     if (!IsStatementLine(text, node_list)) return NewNode(record, type, text, context, node_list);
     CNodeRef statement(Instance<CNode>(ListItem(node_list, 0)));
@@ -72,14 +72,15 @@ CNodeRef CNodeFactory::NewNode(CNodeClassInfo& clsinfo, int, nb::handle text, nb
                                nb::handle children) {
     HostAssert(IsTextOrNone(text));
     nb::object node_list = ListOrNone(children);
-    CNodeRef node = _EmptyNode(clsinfo);
+    CNodeRef node = _FreeNode(clsinfo);
     node->fText = nb::borrow(text);
     node->fContext = nb::borrow(context);
-    node->fChildren.SetList(std::move(node_list));
+    // A free node has no children, unless it was given back twice.
+    if (!node_list.is_none() || !node->fChildren.IsNone()) node->fChildren.SetList(std::move(node_list));
     return node;
 }
 
-CNodeRef CNodeFactory::_EmptyNode(CNodeClassInfo& clsinfo) {
+CNodeRef CNodeFactory::_FreeNode(CNodeClassInfo& clsinfo) {
     CNodeRef node = std::move(clsinfo.fFirstFree);
     if (!node) return CNodeRef(Instance<CNode>(nb::object(clsinfo.fCls(clsinfo.Self()))));
     clsinfo.fFirstFree = node->fNextFree;
@@ -96,19 +97,13 @@ CNodeRef CNodeFactory::ConvertRule(int type, nb::handle context, CObjectStack& s
         stack.Take(first + 1);
         node = TakeNode(stack, first);
     } else {
-        node = _EmptyNode(record);
+        node = _FreeNode(record);
         node->fText = nb::none();
         node->fContext = nb::borrow(context);
         node->fChildren.SetNodes(count, [&](size_t i) { return TakeNode(stack, first + i); });
     }
     stack.CutOff(first);
     return node;
-}
-
-bool CNodeFactory::AreNodes(const CObjectStack& stack, size_t first) {
-    for (size_t i = first; i < stack.Size(); ++i)
-        if (TryInstance<CNode>(stack.At(i)) == nullptr) return false;
-    return true;
 }
 
 CNodeRef CNodeFactory::NewKeywordNode(nb::handle text, nb::handle context) {
@@ -163,7 +158,7 @@ CNodeClassInfo& CNodeFactory::_ClassInfo(Py_ssize_t type) const {
 }
 
 CNodeClassInfo& CNodeFactory::_RecordFor(int type, nb::handle text) const {
-    const bool is_keyword = (type == kTokenId_NAME && DictContains(_fKeywords, text)) ||
+    const bool is_keyword = (type == kTokenId_NAME && _fKeywordFilter.Contains(_fKeywords, text)) ||
                             type == kTokenId_AWAIT || type == kTokenId_ASYNC;
     return is_keyword ? *_fKeywordClassInfo : _ClassInfo(type);
 }

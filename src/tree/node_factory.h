@@ -6,6 +6,7 @@
 #include <nanobind/nanobind.h>
 
 #include "host/binding.h"
+#include "host/key_filter.h"
 #include "neighbours/optpgen/object_stack.h"
 #include "tree/node.h"
 
@@ -30,7 +31,6 @@ class CNodeFactory : public CHosted {
     // ConvertSingleNode for a rule whose children, all of them nodes, stand on a stack from `first` to its
     // top. They leave it.
     CNodeRef ConvertRule(int type, nb::handle context, CObjectStack& stack, size_t first);
-    static bool AreNodes(const CObjectStack& stack, size_t first);
 
     nb::list GetClassInfoList() const;
 
@@ -45,13 +45,14 @@ class CNodeFactory : public CHosted {
     nb::object _fOperatorStrToNumber = nb::none();  // operator text to token type
 
   private:
-    static CNodeRef _EmptyNode(CNodeClassInfo& clsinfo);
+    static CNodeRef _FreeNode(CNodeClassInfo& clsinfo);
     CNodeClassInfo& _ClassInfo(Py_ssize_t type) const;
     CNodeClassInfo& _RecordFor(int type, nb::handle text) const;
 
     std::vector<CRef<CNodeClassInfo>> _fClassInfoList;  // by node type: token types and grammar states alike
     CRef<CNodeClassInfo> _fKeywordClassInfo;            // one for all keywords; empty without keywords
     nb::object _fKeywords = nb::none();                 // keyword texts as keys
+    mutable CKeyFilter _fKeywordFilter;                 // of _fKeywords
 };
 
 template <class Class>

@@ -102,6 +102,11 @@ class CPositions {
 
     bool IsNone() const { return _fLogical == nullptr && (!_fPositions.is_valid() || _fPositions.is_none()); }
 
+    // The places of `toks`, when these are those of a logical and the tokenizer found them; or null.
+    const CLogicalLine::CTokenPlace* PlacesOf(const nb::tuple& toks) const {
+        return _fLogical != nullptr && _fLogical->fToks.is(toks) ? _fLogical->Places() : nullptr;
+    }
+
     // The host's tuple, or none.
     nb::object AsHost() const {
         if (_fLogical != nullptr) return _fLogical->GetPositions();

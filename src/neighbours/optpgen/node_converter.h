@@ -22,7 +22,7 @@ class NodeConverter : public CHosted {
     }
 
     // The same for a rule whose children stand on a stack, from `first` to its top; they leave it. A native
-    // converter that needs no list of them has its own.
+    // converter that needs no list of them has its own; all of them come from that converter then.
     virtual nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
                                    size_t first) {
         return convert(grammar, type, nb::none(), context, stack.PopList(first));
@@ -42,13 +42,10 @@ class TNodeConverterOperations : public Class {
         "grammar"_a.none(), "type"_a, "value"_a.none(), "context"_a.none(), "children"_a.none())
     END_OPERATIONS
 
-    // The host knows rules by `convert` alone.
+    // A host subclass knows rules by `convert` alone.
     nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
                            size_t first) override {
-        static const CHostOperation convert("convert");
-        const bool is_native = !convert.IsOverridden(this->Self(), nb::type<Class>());
-        return is_native ? Class::ConvertRule(grammar, type, context, stack, first)
-                         : NodeConverter::ConvertRule(grammar, type, context, stack, first);
+        return NodeConverter::ConvertRule(grammar, type, context, stack, first);
     }
 };
 
