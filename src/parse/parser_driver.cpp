@@ -89,6 +89,7 @@ int CPGenParserImpl::_NumberOfSymbol(const char* symbol) const {
 
 nb::object CPGenParserImpl::convert(nb::handle, int type, nb::handle value, nb::handle context,
                                     nb::handle children) {
+    if (children.is_none()) return _fNodeFactory->ConvertToken(type, value, context).Release();
     return _fNodeFactory->ConvertSingleNode(type, value, context, children).Release();
 }
 

@@ -70,13 +70,18 @@ CNodeRef CNodeFactory::ConvertSingleNode(int type, nb::handle text, nb::handle c
 
 CNodeRef CNodeFactory::NewNode(CNodeClassInfo& clsinfo, int, nb::handle text, nb::handle context,
                                nb::handle children) {
-    HostAssert(IsTextOrNone(text));
     nb::object node_list = ListOrNone(children);
+    CNodeRef node = _NewLeaf(clsinfo, text, context);
+    node->fChildren.SetList(std::move(node_list));
+    return node;
+}
+
+CNodeRef CNodeFactory::_NewLeaf(CNodeClassInfo& clsinfo, nb::handle text, nb::handle context) {
+    HostAssert(IsTextOrNone(text));
     CNodeRef node = _FreeNode(clsinfo);
     node->fText = nb::borrow(text);
     node->fContext = nb::borrow(context);
-    // A free node has no children, unless it was given back twice.
-    if (!node_list.is_none() || !node->fChildren.IsNone()) node->fChildren.SetList(std::move(node_list));
+    if (!node->fChildren.IsNone()) node->fChildren.SetNone();  // it was given back twice
     return node;
 }
 

@@ -28,8 +28,11 @@ class CNodeFactory : public CHosted {
     virtual void DiscardNodes(nb::handle node);
     virtual CNodeRef RecursiveConvert(nb::tuple raw);
 
-    // ConvertSingleNode for a rule whose children, all of them nodes, stand on a stack from `first` to its
-    // top. They leave it.
+    // ConvertSingleNode for native parsers, whose factory has no overrides: for a token, and for a rule whose
+    // children, all of them nodes, stand on a stack from `first` to its top. They leave it.
+    CNodeRef ConvertToken(int type, nb::handle text, nb::handle context) {
+        return _NewLeaf(_RecordFor(type, text), text, context);
+    }
     CNodeRef ConvertRule(int type, nb::handle context, CObjectStack& stack, size_t first);
 
     nb::list GetClassInfoList() const;
@@ -46,6 +49,7 @@ class CNodeFactory : public CHosted {
 
   private:
     static CNodeRef _FreeNode(CNodeClassInfo& clsinfo);
+    static CNodeRef _NewLeaf(CNodeClassInfo& clsinfo, nb::handle text, nb::handle context);
     CNodeClassInfo& _ClassInfo(Py_ssize_t type) const;
     CNodeClassInfo& _RecordFor(int type, nb::handle text) const;
 
