@@ -1,6 +1,6 @@
 """What each logical line of a source says of names: what it reads, binds, and what is known of it."""
 
-from collections.abc import Iterator
+from collections.abc import Iterator, Sequence
 from dataclasses import dataclass
 from functools import cache
 from io import StringIO
@@ -17,6 +17,7 @@ from codeloom.logicalline import CLogicalLine
 from codeloom.name_places import NamePlaces, PlaceFinder, Tokens
 from codeloom.records import CRecord, RecordsOfLogical
 from codeloom.rows import RowTexts
+from codeloom.scopes import ScopeReader, WithSelfLeftOut
 from codeloom.source import Source, SourceFromBytes, SourceFromText
 from codeloom.utils import GetLogicalsFromText
 
@@ -111,9 +112,11 @@ class _NameReader(LineReader):
         super().__init__(source, path)
         self._fAnalyzer = LineAnalyzer(source.text, language, false_hints)
         self._fLanguage = language
+        self._fScopes = ScopeReader(self._fRowMap)
 
     def Read(self, logical: CLogicalLine) -> LineNames:
         """The names in a line, or what is wrong with it."""
+        self._fScopes.Read(logical)
         origin = logical.fFirstLine, 0
         head = self._fPath, *self._FirstPlace(logical, origin), TextFromTokens(logical).lstrip()
         problem = self._Hindrance(logical, logical.fFirstLine)
@@ -128,7 +131,9 @@ class _NameReader(LineReader):
         plain, error = self._fAnalyzer.Analyze(logical)
         if error is not None:
             return LineNames(*head, problem=self._Problem(ComplaintOf(error, plain)))
-        records = RecordsOfLogical(plain)
+        records: Sequence[CRecord] = RecordsOfLogical(plain)
+        if logical.fType == logicalline.kFunctionDef and self._fScopes.is_method:
+            records = WithSelfLeftOut(records, plain)
         limits = tuple(printed.getvalue().splitlines())
         places = self._Places(plain, logical.fInAsyncDef) if records else NamePlaces()
         return LineNames(*head, tuple(self._Placed(records, places)), limits=limits)
@@ -146,7 +151,7 @@ class _NameReader(LineReader):
                     finder.Find(tree, part, places)
         return places
 
-    def _Placed(self, records: list[CRecord], places: NamePlaces) -> Iterator[PlacedRecord]:
+    def _Placed(self, records: Sequence[CRecord], places: NamePlaces) -> Iterator[PlacedRecord]:
         scope = next((record.name for record in records if record.kind.name == "Set"), None)
         for record in records:
             tokens = places.Take(*record.ToPair(), record.of_arg)

@@ -1,7 +1,6 @@
 """The defs of a source: their arguments with types and defaults, and what they are known to give back."""
 
-import re
-from collections.abc import Iterable, Iterator
+from collections.abc import Iterable, Iterator, Sequence
 from dataclasses import dataclass, field, replace
 from os import PathLike, fspath
 from pathlib import Path
@@ -15,6 +14,7 @@ from codeloom.line_length import TooLong
 from codeloom.line_reader import LineReader
 from codeloom.logicalline import CLogicalLine
 from codeloom.records import CRecord, RecordsOfLogical
+from codeloom.scopes import ScopeReader, WithSelfLeftOut
 from codeloom.source import Source, SourceFromBytes, SourceFromText
 from codeloom.symbolinfo import kArgPrefix
 from codeloom.treesift import (
@@ -112,15 +112,6 @@ def _Signatures(source: Source, language: Language | str, path: str, false_hints
 
 
 @dataclass
-class _Scope:
-    """A class or a def whose body is being read; `of_def` is its place among the signatures."""
-
-    indent: int
-    name: str
-    of_def: int | None = None
-
-
-@dataclass
 class _Outcomes:
     returns: list[Value] = field(default_factory=list)
     yields: list[Value] = field(default_factory=list)
@@ -135,7 +126,7 @@ class _SignatureReader(LineReader):
         self._fParse = AnalyzerOf(language).ParseToNode
         self._fSignatures: list[Signature] = []
         self._fOutcomes: list[_Outcomes] = []
-        self._fScopes: list[_Scope] = []
+        self._fScopes = ScopeReader(self._fRowMap)
 
     def Signatures(self) -> list[Signature]:
         """What was read so far."""
@@ -149,88 +140,58 @@ class _SignatureReader(LineReader):
         is_comment = logical.fType == logicalline.kComment
         if not logical.fTokenCount or (is_comment and not logical.fFirstInDef):
             return
-        if not is_comment:
-            self._LeaveScopes(logical)
+        self._fScopes.Read(logical)
         if logical.fType == logicalline.kFunctionDef:
             self._ReadDef(logical)
-        elif logical.fType == logicalline.kClassDef:
-            self._Enter(logical, _NameBehind("class", logical))
-        elif self._fScopes and not TooLong(logical):
+        elif logical.fType != logicalline.kClassDef and not TooLong(logical):
             self._ReadBodyLine(logical)
-
-    # Scopes
-
-    def _LeaveScopes(self, logical: CLogicalLine) -> None:
-        indent = self._Indent(logical)
-        while indent is not None and self._fScopes and self._fScopes[-1].indent >= indent:
-            self._fScopes.pop()
-
-    def _Indent(self, logical: CLogicalLine) -> int | None:
-        """The width of the blanks before a line; None behind another line on the same row."""
-        row, col = logical.fPositions[0]
-        before = self._fRowMap.Text(logical.fFirstLine + row).encode()[:col].decode()
-        return None if before.strip() else len(before.rpartition("\f")[2].expandtabs())
-
-    def _Enter(self, logical: CLogicalLine, name: str, of_def: int | None = None) -> None:
-        self._fScopes.append(_Scope(self._Indent(logical) or 0, name, of_def))
 
     # Lines
 
     def _ReadDef(self, logical: CLogicalLine) -> None:
         """Add the signature of a def, or its fault."""
         row, column = self._FirstPlace(logical, (logical.fFirstLine, 0))
-        name = _NameBehind("def", logical)
-        is_method = bool(self._fScopes) and self._fScopes[-1].of_def is None
-        self._Enter(logical, name, len(self._fSignatures))
         signature = Signature(
-            self._fPath, row, column, ".".join(scope.name for scope in self._fScopes),
-            is_async=logical.fToks[0] == "async",
-        )  # fmt: skip
+            self._fPath, row, column, self._fScopes.name, is_async=logical.fToks[0] == "async"
+        )
         problem = self._Hindrance(logical, logical.fFirstLine)
         self._fOutcomes.append(_Outcomes())
         self._fSignatures.append(
-            self._Analyzed(signature, logical, is_method)
-            if problem is None
-            else replace(signature, problem=problem)
+            self._Analyzed(signature, logical) if problem is None else replace(signature, problem=problem)
         )
 
-    def _Analyzed(self, signature: Signature, logical: CLogicalLine, is_method: bool) -> Signature:
+    def _Analyzed(self, signature: Signature, logical: CLogicalLine) -> Signature:
         plain, error = self._fAnalyzer.Analyze(logical)
         if error is not None:
             return replace(signature, problem=self._Problem(ComplaintOf(error, plain)))
         tree = self._fParse(plain, logical.fInAsyncDef)
         if tree is None:
             return signature
-        may_lack_self = is_method and _HasFunctionHint(plain)
-        filled = _Filled(signature, tree, RecordsOfLogical(plain), may_lack_self)
+        records: Sequence[CRecord] = RecordsOfLogical(plain)
+        if self._fScopes.is_method:
+            records = WithSelfLeftOut(records, plain)
+        filled = _Filled(signature, tree, records)
         FinishedWithNode(tree)
         return filled
 
     def _ReadBodyLine(self, logical: CLogicalLine) -> None:
         """Take what a line in the body of a def gives back, and its hint for the def."""
-        scope = self._fScopes[-1]
-        if scope.of_def is None:
+        scope = self._fScopes.innermost
+        if scope is None or scope.of_def is None:
             return
         plain, error = self._fAnalyzer.Analyze(logical)
         if error is not None:
             return
         records = RecordsOfLogical(plain)
         if logical.fType == logicalline.kComment:
-            is_method = len(self._fScopes) > 1 and self._fScopes[-2].of_def is None
             signature = self._fSignatures[scope.of_def]
-            self._fSignatures[scope.of_def] = _WithHintsOfBody(signature, records, is_method)
+            self._fSignatures[scope.of_def] = _WithHintsOfBody(signature, records, self._fScopes.is_method)
             return
         outcomes = self._fOutcomes[scope.of_def]
         for record in records:
             if record.name in ("return", "yield") and record.kind.name != "Get":
                 values = outcomes.returns if record.name == "return" else outcomes.yields
                 values.append(_ValueOf(record, logical.fFirstLine + 1))
-
-
-def _NameBehind(keyword: str, logical: CLogicalLine) -> str:
-    toks = [tok for tok in logical.fToks if tok and tok[0] not in "#\\"]
-    behind = toks[toks.index(keyword) + 1 :] if keyword in toks else []
-    return behind[0] if behind else "?"
 
 
 def _ValueOf(record: CRecord, row: int) -> Value:
@@ -243,14 +204,9 @@ def _ValueOf(record: CRecord, row: int) -> Value:
 # The signature of one def
 
 _TO_TEXT = CNodeToTextConverterImpl(True, True, True)
-_FUNCTION_HINT = re.compile(r"#\s*type:\s*\(")
 
 
-def _HasFunctionHint(logical: CLogicalLine) -> bool:
-    return any(tok and _FUNCTION_HINT.match(tok) for tok in logical.fToks)
-
-
-def _Filled(signature: Signature, tree: CNode, records: Iterable[CRecord], may_lack_self: bool) -> Signature:
+def _Filled(signature: Signature, tree: CNode, records: Iterable[CRecord]) -> Signature:
     """A signature with what the tree and the records say of its def."""
     of_arguments: dict[str, list[CRecord]] = {}
     for record in records:
@@ -259,11 +215,10 @@ def _Filled(signature: Signature, tree: CNode, records: Iterable[CRecord], may_l
     funcdef = tree
     while not isinstance(funcdef, CFuncdefStmt):  # it stands last behind `async` and type parameters
         funcdef = funcdef.fChildren[-1]
-    arguments = _Arguments(funcdef, of_arguments, signature.row)
     return replace(
         signature,
         type_parameters=tuple(_TypeParameters(of_arguments)),
-        arguments=tuple(_WithSelf(arguments) if may_lack_self else arguments),
+        arguments=tuple(_Arguments(funcdef, of_arguments, signature.row)),
         return_hint=_Hint(of_arguments.get("return", ())),
     )
 
@@ -319,17 +274,6 @@ def _TypeParameters(of_arguments: dict[str, list[CRecord]]) -> Iterator[str]:
                 bound = record.payload.lstrip("* ")
                 stars = record.payload[: len(record.payload) - len(record.payload.lstrip("*"))]
                 yield stars + name + (f": {bound}" if bound else "")
-
-
-def _WithSelf(arguments: list[Argument]) -> list[Argument]:
-    """Arguments of a method whose comment leaves out the first one, as it may."""
-    named = [i for i, argument in enumerate(arguments) if argument.name]
-    hints = [arguments[i].hint for i in named]
-    if not hints or hints[-1] is not None or None in hints[:-1]:
-        return arguments
-    for i, hint in zip(named, [None, *hints], strict=False):
-        arguments[i] = replace(arguments[i], hint=hint)
-    return arguments
 
 
 def _WithHintsOfBody(signature: Signature, records: Iterable[CRecord], is_method: bool) -> Signature:
