@@ -1,9 +1,11 @@
 """A place in a row of source as a terminal shows it: the row, cut where it is long, and a caret."""
 
+import re
 import unicodedata
 from collections.abc import Iterator, Sequence
 
 _TAB_WIDTH = 4
+_ROW_END = re.compile(r"\s*[\r\n]\s*")
 _CUT = "..."
 # What moves the cursor, turns the direction of writing or doesn't stand for a character.
 _UNPRINTABLE = frozenset({"Cc", "Cf", "Cs", "Cn", "Zl", "Zp"})
@@ -38,6 +40,11 @@ def Printable(text: str) -> str:
     return "".join(
         "\N{REPLACEMENT CHARACTER}" if unicodedata.category(char) in _UNPRINTABLE else char for char in text
     )
+
+
+def OnOneRow(text: str) -> str:
+    """`text` with a blank for each end of a row and the blanks around it, as hints in quotes may have."""
+    return _ROW_END.sub(" ", text.strip())
 
 
 def _Cells(chars: str) -> Iterator[tuple[str, int]]:

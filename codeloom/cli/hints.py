@@ -7,7 +7,7 @@ from typing import ClassVar
 
 from codeloom.cli.console import Colour, PrintablePath
 from codeloom.cli.item_command import ItemCommand, ItemFormat
-from codeloom.excerpt import Printable
+from codeloom.excerpt import OnOneRow, Printable
 from codeloom.languages import Language
 from codeloom.signatures import Argument, Signature, SignaturesInBytes, Value
 
@@ -27,7 +27,7 @@ class TextFormat(ItemFormat[Signature]):
         self._fConsole.PrintRow(
             f"{self._fConsole.Coloured(Colour.BOLD, place)} {Printable(_Head(signature))}"
         )
-        rows = [row for row in _Rows(signature) if row[1]]
+        rows = [(label, OnOneRow(text)) for label, text in _Rows(signature) if text]
         width = max((len(label) for label, _ in rows), default=0)
         room = self._fConsole.width - width - 2
         for label, text in rows:

@@ -9,7 +9,7 @@ from typing import Any
 from codeloom.cli.console import Colour, Console, PrintablePath
 from codeloom.cli.item_command import ItemFormat
 from codeloom.cli.names_in_words import Statements
-from codeloom.excerpt import Printable
+from codeloom.excerpt import OnOneRow, Printable
 from codeloom.line_names import LineNames, PlacedRecord
 
 _INDENT = "    "
@@ -49,7 +49,7 @@ class TextFormat(ItemFormat[LineNames]):
     def _Wrapped(self, items: list[str]) -> Iterator[str]:
         """The items on as many rows as they need; one that is too long for a row is cut."""
         row = ""
-        for item in map(self._Shortened, items):
+        for item in map(self._Shortened, map(OnOneRow, items)):
             if row and len(row) + len(item) + 3 > self._fRoom:
                 yield f"{row},"
                 row = item
