@@ -14,6 +14,7 @@ from codeloom.records import FormatRecord, RecordsOfLogical
 from codeloom.treesift import (
     CArgInfo,
     CAtom,
+    CAtomExpr,
     CExprStmt,
     CFactorExpr,
     CNameLiteral,
@@ -21,6 +22,7 @@ from codeloom.treesift import (
     CNodeToTextConverterImpl,
     CNodeWalker,
     COperatorExpression,
+    CPower,
     CSingleUsedArgumentNode,
     CStringLiteral,
     CTrailer,
@@ -276,6 +278,14 @@ def test_the_names_of_a_chain_made_by_hand():
     walker._VisitNameLiteral(name, name, trailers, 9)  # beyond the end
     walker._VisitAtomPlusTrailers(Node(CAtom, Leaf("["), CNode(), Leaf("]")), trailers)  # without a text
     assert Analyzed(walker, "d") == [["get  a.b.c", "get  d"]]
+
+
+@pytest.mark.parametrize("cls", [CAtomExpr, CPower])
+def test_a_chain_that_contains_itself(cls):
+    node = Node(cls, None)
+    node.fChildren[0] = node
+    with pytest.raises(RecursionError):
+        CNodeWalker(VERSION)._VisitCall(node, [], Leaf("x"))
 
 
 def test_a_tree_that_changes_below_the_walk():

@@ -56,6 +56,7 @@ std::optional<std::vector<CNodeRef>> ExpandSeqLiteral(CNode& node) {
 }
 
 bool IsDottedName(CNode& node) {
+    const CRecursionScope recursion;  // a tree that a host made may contain itself
     const CNodeRef shown = DropSimpleParens(node);
     if (shown->As<CNameLiteral>() != nullptr) return true;
     if (CAtomExpr* const chain = shown->As<CAtomExpr>())
