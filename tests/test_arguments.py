@@ -103,8 +103,8 @@ def test_other_shapes():
     assert Written(GetDefiningArgInfoList(Node(CDefiningArglistNode, comma, name, comma))) == ["a"]
     brackets = Leaf("("), name, Leaf(")")
     assert Written(GetDefiningArgInfoList(Node(CDefiningArglistNode, *brackets))) == ["a"]
-    plain = name, Leaf(":"), Leaf("int"), Leaf("="), Leaf("1")
-    assert Written(GetDefiningArgInfoList(Node(CDefiningArglistNode, *plain))) == ["a: int=1"]
+    plain = name, Leaf(":"), Leaf("int"), Leaf("="), Leaf("1"), comma, name
+    assert Written(GetDefiningArgInfoList(Node(CDefiningArglistNode, *plain))) == ["a: int=1", "a"]
     nested = Node(CFunctionParameterDef, Leaf("("), Node(CParametersNode, comma, comma), Leaf(")"))
     assert GetDefiningArgInfoList(nested) == [[]]
     # Between commas of a call a record is made all the same.
