@@ -8,7 +8,7 @@ from typing import Any
 
 from codeloom import logicalline
 from codeloom.check import Problem
-from codeloom.engine import Analysis, AnalyzerOf, ComplaintOf, LineAnalyzer
+from codeloom.engine import Analysis, AnalyzerOf, Complaint, ComplaintOf, LineAnalyzer
 from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
 from codeloom.line_length import TooLong
 from codeloom.line_reader import LineReader
@@ -16,11 +16,13 @@ from codeloom.logicalline import CLogicalLine
 from codeloom.records import CRecord, RecordsOfLogical
 from codeloom.scopes import ScopeReader, WithSelfLeftOut
 from codeloom.source import Source, SourceFromBytes, SourceFromText
-from codeloom.symbolinfo import kArgPrefix
+from codeloom.strutils import AsStr
+from codeloom.symbolinfo import JoinTokens, kArgPrefix
 from codeloom.treesift import (
     CFuncdefStmt,
     CNode,
-    CNodeToTextConverterImpl,
+    CStringLiteral,
+    DropSimpleParens,
     FinishedWithNode,
     GetDefiningArgInfoList,
 )
@@ -170,9 +172,14 @@ class _SignatureReader(LineReader):
         records: Sequence[CRecord] = RecordsOfLogical(plain)
         if self._fScopes.is_method:
             records = WithSelfLeftOut(records, plain)
-        filled = _Filled(signature, tree, records)
-        FinishedWithNode(tree)
-        return filled
+        try:
+            return _Filled(signature, tree, records)
+        except RecursionError:  # as only tuples among the parameters of Python 2 can be nested
+            row, column = logical.fPositions[0]
+            complaint = Complaint(logical.fFirstLine + row, column, "the parameters are nested too deep")
+            return replace(signature, problem=self._Problem(complaint))
+        finally:
+            FinishedWithNode(tree)
 
     def _ReadBodyLine(self, logical: CLogicalLine) -> None:
         """Take what a line in the body of a def gives back, and its hint for the def."""
@@ -203,8 +210,6 @@ def _ValueOf(record: CRecord, row: int) -> Value:
 
 # The signature of one def
 
-_TO_TEXT = CNodeToTextConverterImpl(True, True, True)
-
 
 def _Filled(signature: Signature, tree: CNode, records: Iterable[CRecord]) -> Signature:
     """A signature with what the tree and the records say of its def."""
@@ -219,7 +224,7 @@ def _Filled(signature: Signature, tree: CNode, records: Iterable[CRecord]) -> Si
         signature,
         type_parameters=tuple(_TypeParameters(of_arguments)),
         arguments=tuple(_Arguments(funcdef, of_arguments, signature.row)),
-        return_hint=_Hint(of_arguments.get("return", ())),
+        return_hint=_Hint(funcdef.GetReturnType(), of_arguments.get("return", ())),
     )
 
 
@@ -228,7 +233,8 @@ def _Arguments(funcdef: CFuncdefStmt, of_arguments: dict[str, list[CRecord]], ro
     for info in _Flat(GetDefiningArgInfoList(funcdef.GetParameters())):
         name = None if info.name is None else info.name.fText
         records = of_arguments.get(name, ()) if name else ()
-        arguments.append(Argument(name, info.prefix or "", _Hint(records), _Default(info, records, row)))
+        hint, default = _Hint(info.type_expr, records), _Default(info.value, records, row)
+        arguments.append(Argument(name, info.prefix or "", hint, default))
     slash_i = _SlashIndex(funcdef)
     if slash_i is not None:
         arguments.insert(slash_i, Argument(None, "/"))
@@ -251,20 +257,37 @@ def _Flat(infos: Iterable[Any]) -> Iterator[Any]:
             yield info
 
 
-def _Hint(records: Iterable[CRecord]) -> str | None:
-    return next((record.payload for record in records if record.kind.name == "TypeHint"), None)
+def _Hint(annotation: CNode | None, records: Iterable[CRecord]) -> str | None:
+    """The annotation, without its quotes, or the hint in a comment."""
+    if annotation is None:
+        return next((record.payload for record in records if record.kind.name == "TypeHint"), None)
+    annotation = DropSimpleParens(annotation)
+    if isinstance(annotation, CStringLiteral):
+        return annotation.GetStringContents()
+    return _Written(annotation)
 
 
-def _Default(info: Any, records: Iterable[CRecord], row: int) -> Value | None:
-    if info.value is None:
+def _Default(default: CNode | None, records: Iterable[CRecord], row: int) -> Value | None:
+    if default is None:
         return None
-    text = _TO_TEXT.TextForNode(info.value)
-    value = Value(row, None, None if text is None else text.decode())
+    value = Value(row, None, _Written(default))
     for record in records:
         if record.kind.payload == "literal":
             known = _ValueOf(record, row)
             return known if known.text is not None else replace(value, type=known.type)
     return value
+
+
+def _Written(expression: CNode) -> str:
+    """An expression as it is written, but for its blanks; it may be nested to any depth."""
+    texts, pending = [], [DropSimpleParens(expression)]
+    while pending:
+        node = pending.pop()
+        if node.fChildren is None:
+            texts.append(node.fText)
+        else:
+            pending.extend(reversed(node.fChildren))
+    return AsStr(JoinTokens(texts))
 
 
 def _TypeParameters(of_arguments: dict[str, list[CRecord]]) -> Iterator[str]:

@@ -76,6 +76,14 @@ def test_an_api_of_values(tmp_path):
         SignaturesInFile(tmp_path / "absent.py")
 
 
+def test_depth():
+    text = "[" * 20_000 + "]" * 20_000
+    (signature,) = SignaturesInText(f"def f(a={text}): pass")
+    assert signature.arguments[0].default.text == text
+    (signature,) = SignaturesInText(f"def f({'(' * 20_000}a,{')' * 20_000}): pass", "2.7")
+    assert signature.problem.message == "the parameters are nested too deep"
+
+
 @pytest.mark.parametrize(
     ("arguments", "status", "rows"),
     [
