@@ -69,8 +69,24 @@ def test_backslashes():
     assert PY38.ParseTokenListToNode(["x", "\\", "=", "1"]).GetChildCount() == 3
 
 
+@pytest.mark.parametrize("text", ["x = f ( 1 )", "@ a", "else : x", "\n x"])
+def test_all_nodes_of_a_parse_go_back(text):
+    class Driver(CPGenParserImpl):
+        def convert(self, *arguments):
+            made.append(super().convert(*arguments))
+            return made[-1]
+
+    driver, passes = Driver((3, 8, 0)), []
+    for _ in range(2):
+        made = []
+        if tree := driver.ParseTokenListToNode(text.split(" ")):
+            driver.DiscardNode(tree)
+        passes.append(made)
+    assert set(map(id, passes[0])) == set(map(id, passes[1]))
+
+
 def test_logicals_of_no_statement():
-    assert PY38.ParseTokenListToNode([]) is None
+    assert PY38.ParseTokenListToNode([]) is PY38.ParseTokenListToNode(["\n", "x"]) is None
     removed = CLogicalLine(kUnknown, (None, None), ((0, 0), (0, 1)))
     assert PY38.ParseToNode(removed).fText == "\n"
 
@@ -112,6 +128,7 @@ def test_type_parameters_without_their_statement(text, outcome):
         "T: @",
         "T: else",
         "T: ...",
+        "T: x \\ , U",  # the last token of its bound, as if it went on in the next row
     ],
 )
 def test_bounds_are_the_same_for_a_host_subclass_which_gets_copies(parameters):
