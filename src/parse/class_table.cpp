@@ -82,8 +82,9 @@ nb::list BuildClsForStateList(nb::handle grammar, nb::dict cls_for_state) {
 }
 
 nb::list CPGenParserImpl::_BuildClsForStateList() {
-    return BuildClsForStateList(_fGrammar,
-                                nb::borrow<nb::dict>(nb::type<CPGenParserImpl>().attr("kClsForState")));
+    const nb::object table = nb::type<CPGenParserImpl>().attr("kClsForState");
+    if (!nb::isinstance<nb::dict>(table)) RaiseWrongType("dict", table);
+    return BuildClsForStateList(_fGrammar, nb::borrow<nb::dict>(table));
 }
 
 }  // namespace codeloom
