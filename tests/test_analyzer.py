@@ -149,6 +149,9 @@ def test_messages_of_embedded_errors(type, message):
     error = Analyze(logical)
     assert error.msg == message
     assert Place(error) == (message, 3, 3, "a b")
+    with pytest.raises(SyntaxError, match=message):
+        ANALYZER._InspectSingleLogical(logical, False)
+    assert logical.fTypeEquivs is None
 
 
 def test_commented_hints_are_left_to_the_hint_walker():
@@ -261,7 +264,7 @@ def test_an_empty_logical_is_at_its_start():
         (Attributes(), "x", TypeError),
         (Attributes(), (1, 2, 3), ValueError),
         (Attributes(fPositions=((0, 0), (0, 1, 2))), 1, ValueError),
-        (Attributes(fTokenCount=5), 3, IndexError),
+        (Attributes(fTokenCount=3, fPositions=((0, 0),) * 3), 2, IndexError),
         (SimpleNamespace(), 0, AttributeError),
     ],
 )
