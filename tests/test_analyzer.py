@@ -114,6 +114,8 @@ def test_the_outcome_of_a_walk(error, caplog):
     assert (node.fText, node.fChildren) == (None, None) and node.fClsInfo.fFirstFree is node
     logged = [record.exc_info for record in caplog.records]
     assert len(logged) == (error is not None and not is_returned)
+    if isinstance(error, KeyboardInterrupt):
+        assert logged[0][1] is error  # as it is, like all that is no Exception
     if isinstance(error, TypeError):
         assert str(logged[0][1]) == (
             "Could not analyze logical -- inner exception is TypeError('odd')\n  logical tokens: x = f ( 1 )"
@@ -250,6 +252,12 @@ LATER_ROW = SimpleNamespace(lineno=2, utf8_col=1)
 def test_create_syntax_error(context, place_in_token, lineno, offset):
     error = CreateSyntaxError("message", Attributes(), context, place_in_token)
     assert error.msg == "message" and Place(error) == ("<string>", lineno, offset, "ab é\ncd")
+
+
+def test_a_removed_token_has_its_place():
+    toks, positions = ("x", None, "=", None), ((0, 0), (0, 2), (0, 4), (1, 6))
+    error = Analyze(CLogicalLine(kAssignment, toks, positions))
+    assert Place(error) == ("<string>", 2, 7, "x   =")
 
 
 def test_an_empty_logical_is_at_its_start():

@@ -27,11 +27,11 @@ CPlace Unpack(nb::handle pair) {
     return {items[0], items[1]};
 }
 
-// Just behind the last token.
+// Just behind the last token; a removed one has no length.
 CPlace PlaceAtEnd(nb::handle logical) {
     const nb::object last_token = logical.attr("fToks")[-1];
     CPlace place = Unpack(logical.attr("fPositions")[-1]);
-    place.offset = place.offset + nb::int_(CUtf8(last_token)->size());
+    if (!last_token.is_none()) place.offset = place.offset + nb::int_(CUtf8(last_token)->size());
     return place;
 }
 
