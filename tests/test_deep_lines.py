@@ -117,3 +117,19 @@ def test_recursion_ends_before_the_stack_does(in_small_thread):
         sys.setrecursionlimit(old_limit)
     with pytest.raises(RecursionError, match="maximum recursion depth"):
         DeepPattern()
+
+
+def test_a_tree_is_dropped_without_recursion(in_small_thread):
+    (logical,) = GetLogicalsFromText("(" * DEPTH + "x" + ")" * DEPTH)
+
+    def LookAtAll(node):
+        while node.fChildren is not None:
+            node = node.fChildren[1]
+        return node.fText
+
+    def Drop(look):
+        CPGenParserImpl(VERSION).ParseToNode(logical)
+        return look(CPGenParserImpl(VERSION).ParseToNode(logical))
+
+    assert in_small_thread(lambda: Drop(LookAtAll)) == "x"
+    assert in_small_thread(lambda: Drop(lambda node: node.GetChildCount())) == 3

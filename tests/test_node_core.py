@@ -11,9 +11,11 @@ from codeloom.treesift import (
     CNode,
     CNodeClassInfo,
     CNodeFactory,
+    CPGenParserImpl,
     FinishedWithNode,
     NotCompiledFinishedWithNode,
 )
+from codeloom.utils import GetLogicalsFromText
 
 NAME, NEWLINE, EXPR = 1, 4, 7
 
@@ -61,6 +63,18 @@ def test_children_by_index():
     for below in (node.GetChild, node.GetChildText):
         with pytest.raises(IndexError):
             below(-3)
+
+
+def test_the_list_counts_once_the_host_has_it():
+    (logical,) = GetLogicalsFromText("f(a, b)")
+    node = CPGenParserImpl((3, 11, 0)).ParseToNode(logical)
+    assert node.GetChildText(0) == "f" and node.GetTrailers()[0] is node.GetChild(1)
+    children = node.fChildren
+    assert children is node.fChildren and len(children) == node.GetChildCount() == 2
+    children.reverse()
+    assert node.GetChildText(1) == "f" and node.GetChildText(-1) == "f"
+    children.clear()
+    assert node.GetChildCount() == 0 and node.GetChild(0) is None
 
 
 def test_foreign_children_are_the_hosts_type_error():
