@@ -6,8 +6,10 @@ import itertools
 import pickle
 import random
 import weakref
+from pathlib import Path
 
 import pytest
+from golden import Cases, Check
 from grammar_tools import ORACLE, Feed, LoadOracle, ParseWithOracle, ParseWithOurs
 
 from codeloom import optpgen
@@ -69,46 +71,21 @@ def test_grammar_numbers_its_rules(load):
     assert repr(grammar) == "<Grammar of line: 4 rules, 12 states>"
 
 
-@pytest.mark.parametrize(
-    ("text", "message"),
-    [
-        ("", "1: expected a rule, found the end of the file"),
-        ("# only this\n\n", "3: expected a rule, found the end of the file"),
-        ("a: NAME\n'x': NAME", "2: expected the name of a rule, found 'x'"),
-        ("a NAME", "1: expected ':' behind the name of the rule, found 'NAME'"),
-        ("a:\n", "1: expected a name, a quoted text, '(' or '[', found the end of the row"),
-        ("a: (NAME\n| )", "2: expected a name, a quoted text, '(' or '[', found ')'"),
-        ("a: (NAME\nNAME", "2: expected ')', found the end of the file"),
-        ("a: [NAME)", "1: expected ']', found ')'"),
-        ("a: NAME)", "1: ')' closes no bracket"),
-        ("a: NAME b: NAME", "1: expected the end of the rule, found ':'"),
-        ("\na: 'x\n", "2: expected a closing ' in this row"),
-        ("a: ''", "1: expected a keyword or operator between the quotes"),
-        ("a: NAME ? NAME", "1: expected a name, a quoted text or one of : | [ ] ( ) * +, found '?'"),
-        ("a: " + "(" * 200 + "NAME" + ")" * 200, "1: the brackets are nested too deep"),
-        ("a: NAME\nb: NAME\na: NUMBER", "3: rule 'a' is already defined in row 1"),
-        ("a: b\n", "1: 'b' is neither a rule nor a kind of token"),
-        ("a: NAME\n  (\n TOKEN)", "2: expected the name of a rule, found '('"),
-        ("a: (NAME\n TOKEN)", "2: 'TOKEN' is neither a rule nor a kind of token"),
-        ("a: '+'\nb: '%%'", "2: '%%' is no operator that the tokens know"),
-        ("a: 'not in'", "1: 'not in' is no operator that the tokens know"),
-        ("a: [NAME]", "1: rule 'a' can be empty, but must take a token"),
-        ("a: b\nb: NAME*", "2: rule 'b' can be empty, but must take a token"),
-        ("a: a NAME", "1: rule 'a' begins with itself: a -> a"),
-        ("a: '+' b\nb: c | NAME\nc: b '+'", "2: rule 'b' begins with itself: b -> c -> b"),
-        ("a: b | c\nb: NAME '+'\nc: NAME '-'", "1: rule 'a' leaves a choice: NAME can begin both b and c"),
-        ("a: '+' (NAME b | NAME '+')\nb: '+'", "1: rule 'a' leaves a choice: '+' can begin both b and '+'"),
-    ],
-)
-def test_faults_of_a_grammar_name_their_row(load, tmp_path, text, message):
+@pytest.mark.parametrize("case", Cases(Path(__file__).parent / "grammars", ".grammars"))
+def test_faults_of_a_grammar_name_their_row(load, tmp_path, case, rewrite):
     with pytest.raises(ValueError) as caught:
-        load(text)
-    assert str(caught.value).startswith(f"{tmp_path / 'Grammar'}:{message}")
+        load(f"{case.source}\n")
+    path, _, said = str(caught.value).partition(":")
+    assert path == str(tmp_path / "Grammar")
+    Check(case, f"---\n{said}", rewrite)
 
 
 def test_wrong_files_and_tables(tmp_path, load):
     with pytest.raises(FileNotFoundError, match="no_such_grammar"):
         optpgen.ParserGenerator(tmp_path / "no_such_grammar", NAMES, OPERATORS)
+    for text, fault in [("", "expected a rule"), ("a: " + "(" * 200 + "NAME" + ")" * 200, "nested too deep")]:
+        with pytest.raises(ValueError, match=fault):
+            load(text)
     with pytest.raises(ValueError, match=":1: a keyword needs a kind of token called NAME"):
         load("a: 'if'", {2: "NUMBER"})
     with pytest.raises(ValueError, match=":1: the type of NAME is 256, but must be from 0 to 255"):
