@@ -15,8 +15,10 @@ from codeloom.treesift import (
     CArgInfo,
     CAtom,
     CAtomExpr,
+    CClassArgumentPatternNode,
     CExprStmt,
     CFactorExpr,
+    CForStmt,
     CNameLiteral,
     CNode,
     CNodeToTextConverterImpl,
@@ -278,6 +280,29 @@ def test_the_names_of_a_chain_made_by_hand():
     walker._VisitNameLiteral(name, name, trailers, 9)  # beyond the end
     walker._VisitAtomPlusTrailers(Node(CAtom, Leaf("["), CNode(), Leaf("]")), trailers)  # without a text
     assert Analyzed(walker, "d") == [["get  a.b.c", "get  d"]]
+
+
+def test_what_no_line_of_source_has():
+    class Walker(CNodeWalker):
+        def _VisitExprStmt(self, node):
+            a, b, c, d, e = (Leaf(text, cls=CNameLiteral) for text in "abcde")
+            self._VisitForStmt(Node(CForStmt, Leaf("for"), a, Leaf("in"), b, Leaf(":"), c, Leaf("else"), d))
+            self._VisitPatternNode(Node(CClassArgumentPatternNode, e))
+            self._AddNodeInfoStr(e, "")
+            self._AddTypeEquiv("f", self._TypeEquivForNode(Node(CAtom, Leaf("["), Leaf("]")), b""))
+            with pytest.raises(TypeError):
+                self._TypeEquivForNode(Node(CAtom, CNode()), b"[0]")
+
+    (records,) = Analyzed(Walker(VERSION), "x = 1")
+    assert records == [
+        "set  a",
+        "is   a  b[*]",
+        "set  e",
+        "literal f  list: []",
+        "get  b",
+        "get  c",
+        "get  d",
+    ]
 
 
 @pytest.mark.parametrize("cls", [CAtomExpr, CPower])
