@@ -160,6 +160,12 @@ def test_an_error_leaves_the_walker_idle():
     assert walker.Walk(None, logical) is None
 
 
+def test_an_import_reads_nothing_whatever_was_noted():
+    walker = CNodeWalker(VERSION)
+    walker._ProcessLoadName("z")
+    assert Analyzed(walker, "from a import b\nc") == [["set  b", "from b  a b"], ["get  c"]]
+
+
 # For hosts
 
 
