@@ -5,6 +5,7 @@ What it records of which line stands in the golden files of records/.
 
 import itertools
 import re
+import sys
 from contextlib import suppress
 
 import pytest
@@ -102,14 +103,6 @@ def test_fields():
     assert Analyzed(walker, "x = a + b")[0][1] == "expression x  a + b"
     with pytest.raises(AttributeError):
         walker._fToText = CNodeToTextConverterImpl()
-    for private in (
-        "_fLogical",
-        "_fLoadNameContext",
-        "_fStoreWithinSubExpr",
-        "_fLoadedNames",
-        "_fStoredNames",
-    ):
-        assert not hasattr(walker, private)
 
 
 @pytest.mark.parametrize(
@@ -137,6 +130,11 @@ def test_a_walk_of_too_many_visits_spoils_no_other(capsys):
         "RuntimeError raised in CNodeWalker.Walk: "
         "RuntimeError('Maximum number of calls to _VisitNode exceeded')\n"
     )
+
+
+def test_a_walk_ends_without_a_standard_output_too(monkeypatch):
+    monkeypatch.setattr(sys, "stdout", None)
+    assert Analyzed(CNodeWalker(VERSION), "x = 1 if a else " + "[" * 50 + "]" * 50) == [["set  x"]]
 
 
 def test_a_second_walk_is_refused_and_the_first_goes_on():

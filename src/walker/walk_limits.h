@@ -14,6 +14,9 @@ constexpr int kMaxRecurseCount = 40;
 [[noreturn]] void RaiseTooDeep();
 [[noreturn]] void RaiseWalkInProgress();
 
+// A line on the host's standard output, if there is one.
+void PrintEndOfWalk(nb::handle error);
+
 // The visits of one walk, held against the limits: first their number, then the depth of each.
 class CVisitLimits {
   public:
@@ -39,7 +42,7 @@ void RunLimited(Walk walk) {
         walk();
     } catch (nb::python_error& error) {
         if (!error.matches(PyExc_RuntimeError)) throw;
-        nb::print(nb::str("RuntimeError raised in CNodeWalker.Walk: {}").format(nb::repr(error.value())));
+        PrintEndOfWalk(error.value());
     }
 }
 
