@@ -25,6 +25,9 @@ bool HostAssertionsOn();
 [[noreturn]] void RaiseHost(nb::handle type, const char* message);
 [[noreturn]] void RaiseHost(nb::handle type, nb::handle value);
 
+// Prints a report as the host's print() does, which is silent where there is no standard output.
+void PrintReport(nb::handle line);
+
 // Raises an exception that is made already; TypeError for what is no exception.
 [[noreturn]] void RaiseHostError(nb::handle error);
 

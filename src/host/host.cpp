@@ -78,6 +78,10 @@ void HostAssert(bool condition) {
     if (!HostAssertHolds(condition)) throw nb::python_error();
 }
 
+void PrintReport(nb::handle line) {
+    nb::module_::import_("builtins").attr("print")(line);
+}
+
 void RaiseHost(nb::handle type, const char* message) {
     PyErr_SetString(type.ptr(), message);
     throw nb::python_error();

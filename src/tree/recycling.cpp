@@ -1,5 +1,7 @@
 #include "tree/recycling.h"
 
+#include "host/errors.h"
+
 namespace codeloom {
 
 namespace {
@@ -24,7 +26,7 @@ void FinishChildren(TChildren<CNode>& children, Py_ssize_t depth) {
 
 void __FinishedWithNode(CNodeRef node, Py_ssize_t depth) {
     if (depth > kMaxDepth) {
-        nb::print("depth too great");
+        PrintReport(nb::str("depth too great"));
         return;
     }
     CNode& finished = *node;

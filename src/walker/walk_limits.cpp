@@ -16,9 +16,4 @@ void RaiseWalkInProgress() {
     RaiseHost(PyExc_ValueError, "Only one logical may be walked at a time");
 }
 
-void PrintEndOfWalk(nb::handle error) {
-    const nb::object line = nb::str("RuntimeError raised in CNodeWalker.Walk: {}").format(nb::repr(error));
-    nb::module_::import_("builtins").attr("print")(line);
-}
-
 }  // namespace codeloom

@@ -3,6 +3,8 @@
 
 #include <nanobind/nanobind.h>
 
+#include "host/errors.h"
+
 namespace nb = nanobind;
 
 namespace codeloom {
@@ -13,9 +15,6 @@ constexpr int kMaxRecurseCount = 40;
 [[noreturn]] void RaiseTooManyVisits();
 [[noreturn]] void RaiseTooDeep();
 [[noreturn]] void RaiseWalkInProgress();
-
-// A line on the host's standard output, if there is one.
-void PrintEndOfWalk(nb::handle error);
 
 // The visits of one walk, held against the limits: first their number, then the depth of each.
 class CVisitLimits {
@@ -42,7 +41,7 @@ void RunLimited(Walk walk) {
         walk();
     } catch (nb::python_error& error) {
         if (!error.matches(PyExc_RuntimeError)) throw;
-        PrintEndOfWalk(error.value());
+        PrintReport(nb::str("RuntimeError raised in CNodeWalker.Walk: {}").format(nb::repr(error.value())));
     }
 }
 
