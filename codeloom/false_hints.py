@@ -43,7 +43,7 @@ _CONDITION = re.compile(r"\b(?:if|else)\b")
 _QUOTED_PROSE = re.compile(
     rf"[^][(){{}}]*?\b(?!{_OPERATORS}|lambda\b)\w+\s+(?!{_OPERATORS})\w.*" + r"|.*\w[.!?]\s*", re.DOTALL
 )
-_THREE_WORDS = re.compile(r"(?:\w+\W+){2}\w")
+_THREE_WORDS = re.compile(r"\b(?:\w+\W+){2}\w")
 _LITERAL_ALIAS = re.compile(r"\bLiteral\s+as\s+(\w+)")
 # The return type of a function's hint in brackets of its own; those of a tuple can't be done without.
 _BRACKETED_RESULT = re.compile(r"->\s*\((?P<type>[^(),]*)\)\s*$")

@@ -12,7 +12,7 @@ MOST_TOKENS = 1_000_000
 """The most tokens of a line: some megabytes of text."""
 
 MOST_REPEATED_TEXT = 20_000_000
-"""The most characters that a chain of names or the targets of an assignment may come to in records."""
+"""The most characters that chains of names or the targets of an assignment may come to in records."""
 
 # Lines of fewer tokens can't repeat much.
 _FEW_TOKENS = 200
@@ -23,13 +23,15 @@ _WORDS_BETWEEN = frozenset({"and", "as", "else", "for", "if", "import", "in", "i
 
 
 def TooLong(logical: CLogicalLine) -> Complaint | None:
-    """The complaint about a line that is too long to be analysed; None for any other."""
-    count = logical.fTokenCount
-    if count <= _FEW_TOKENS:
-        return None
+    """The complaint about a line that is too long to be analysed; None for any other.
+
+    The expressions within it count too, as those in f-strings.
+    """
+    parts = [part for part in (logical, *logical.GetExpLogicals()) if part.fTokenCount > _FEW_TOKENS]
+    count = sum(part.fTokenCount for part in parts)
     if count > MOST_TOKENS:
         return _Complaint(logical, f"it has {count:,} tokens, more than {MOST_TOKENS:,}")
-    repeated = max(_TextOfChains(logical.fToks), _TextForTargets(logical.fToks))
+    repeated = sum(max(_TextOfChains(part.fToks), _TextForTargets(part.fToks)) for part in parts)
     if repeated > MOST_REPEATED_TEXT:
         return _Complaint(
             logical,
@@ -46,24 +48,22 @@ def _Complaint(logical: CLogicalLine, reason: str) -> Complaint:
 
 
 def _TextOfChains(toks: tuple[str, ...]) -> int:
-    """The length of the names that the longest chain consists of, all together and at the most."""
-    most = length = 0
-    # Of the chain under way at each depth of brackets: the dots, and where it starts.
-    open_chains = [(0, 0)]
+    """The length of the names that the chains consist of, all together and at the most."""
+    total = length = 0
+    # Where the chain under way starts, at each depth of brackets.
+    starts = [0]
     for token in toks:
-        dots, start = open_chains[-1]
         if token == ".":
-            open_chains[-1] = dots + 1, start
-            most = max(most, (dots + 1) * (length - start))
+            total += length - starts[-1]
         elif token in _OPENING:
-            open_chains.append((0, length + 1))
+            starts.append(length + 1)
         elif token in _CLOSING:
-            if len(open_chains) > 1:
-                open_chains.pop()
+            if len(starts) > 1:
+                starts.pop()
         elif not token.isidentifier() or token in _WORDS_BETWEEN:
-            open_chains[-1] = 0, length
+            starts[-1] = length
         length += len(token)
-    return most
+    return total
 
 
 def _TextForTargets(toks: tuple[str, ...]) -> int:

@@ -137,5 +137,9 @@ def test_values_of_literals_under_another_name(line, count):
     assert len(CheckText(f"from typing import Literal as L\n{line}\n")) == count
 
 
+def test_long_words_in_quotes_take_no_long_time():
+    assert CheckText(f"x: '{'a' * 1_000_000}.' = 1") == []
+
+
 def test_a_name_counts_only_where_the_file_says_so():
     assert len(CheckText("x: L['|O']\n")) == 1

@@ -22,6 +22,10 @@ from codeloom.utils import GetLogicalsFromText
         ("a" + ".b" * 5_000, "parts in a chain"),
         ("a" + ".b(c.d, [e.f])[0]" * 2_000, "parts in a chain"),
         ("f(g(a" + ".b" * 5_000 + "))", "parts in a chain"),
+        ("[" + ", ".join("a" + ".b" * 1_000 for _ in range(21)) + "]", "parts in a chain"),
+        ("f'{a" + ".b" * 5_000 + "}'", "parts in a chain"),
+        ("x: 'a" + ".b" * 5_000 + "'", "parts in a chain"),
+        ("x = 1  # type: a" + ".b" * 5_000, "parts in a chain"),
         ("'" + "x" * 1_000_000 + "'" + ".a" * 100, "parts in a chain"),
         ("x = [" + "a.b.c(1), " * 20_000 + "]", None),
         ("x = " + " or ".join(["a.b.c"] * 5_000), None),
@@ -32,7 +36,7 @@ from codeloom.utils import GetLogicalsFromText
         ("(" * 10_000 + ")" * 10_000, None),
         (")" * 300, None),
     ],
-    ids=range(16),
+    ids=range(20),
 )
 def test_which_lines_are_too_long(text, reason):
     (logical,) = GetLogicalsFromText(text)
