@@ -27,7 +27,10 @@ def TooLong(logical: CLogicalLine) -> Complaint | None:
 
     The expressions within it count too, as those in f-strings.
     """
-    parts = [part for part in (logical, *logical.GetExpLogicals()) if part.fTokenCount > _FEW_TOKENS]
+    exp_logicals = logical.GetExpLogicals()
+    if not exp_logicals and logical.fTokenCount <= _FEW_TOKENS:
+        return None
+    parts = [part for part in (logical, *exp_logicals) if part.fTokenCount > _FEW_TOKENS]
     count = sum(part.fTokenCount for part in parts)
     if count > MOST_TOKENS:
         return _Complaint(logical, f"it has {count:,} tokens, more than {MOST_TOKENS:,}")
