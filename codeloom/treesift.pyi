@@ -1881,6 +1881,11 @@ class CNewerMatchCaseParser(CMatchCaseStatementParser):
     def __init__(self, pgen_parser: CPGenParserImpl | None) -> None:
         ...
 
+    def _RemoveSkipToks(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> tuple[typing.Any, ...]:
+        """
+        The tokens without comments and line continuations, and their positions: a pair of tuples.
+        """
+
     def ParseMatchStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
         """
         The CMatchStmt of a logical line, given as tuples of token texts and (row, column) positions; None when it is no `match` statement (PEP 634). ParseError on a bad subject.
@@ -1931,6 +1936,9 @@ class CNewerParser(CPGenParserImpl):
         refuses. Give it back with DiscardNode.
         """
 
+    def _ParseToksToNodeImpl(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
+        """Parse by the grammar alone, without the special cases."""
+
     def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """
         The node of a statement that is parsed by hand; None for the ordinary road.
@@ -1950,6 +1958,12 @@ class CNewerParser(CPGenParserImpl):
         """
         A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of
         its keyword; None for the ordinary road.
+        """
+
+    def _NodesForTypeParameters(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> list[typing.Any]:
+        """
+        The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors`
+        malformed parameters are dropped.
         """
 
     def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:

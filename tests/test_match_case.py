@@ -349,13 +349,13 @@ def test_tokens_are_kept_during_a_parse_only():
 
 def test_skipped_tokens():
     remove = CMatchCaseStatementParser(None)._RemoveSkipToks
-    toks, rows = ("case", "# a", "\\", "1", "\\", ":", "\\", None), (0, 0, 1, 2, 2, 2, 2, 2)
+    toks, rows = ("case", "# a", "\\", "1", "\\", ":", "\\"), (0, 0, 1, 2, 2, 2, 2)
     positions = tuple((row, i) for i, row in enumerate(rows))
     assert remove(toks, positions) == (
         ("case", "1", "\\", ":", "\\"),
         ((0, 0), (2, 3), (2, 4), (2, 5), (2, 6)),
     )
-    for toks, failure in [((1,), TypeError), (("",), IndexError), (("a", "b"), IndexError)]:
+    for toks, failure in [((None,), TypeError), (("",), IndexError), (("a", "b"), IndexError)]:
         with pytest.raises(failure):
             remove(toks, ((0, 0),))
 

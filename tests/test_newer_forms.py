@@ -23,6 +23,9 @@ ONLY_IN_2_7 = r"""
     x = `y` <> 0777 + 10L
     def f(a, (b, (c, d))=e): pass
     [a for b in 1, 2]
+    x = 0777
+    x = 10L
+    x = ur'a'
 """
 
 NEW_IN = {
@@ -34,7 +37,7 @@ NEW_IN = {
     with a as b, c as (d, e): f
     with lambda a,: b, (lambda c, *d: e): f
     {a: b for c in d}; {a for b in c}; {a, b}
-    0o17 + 0b1
+    0o17 + 0b1 + 00 + 0777.5 + 0777e1 + 0777j
     class A: pass
     @a.b(c)\nclass A: pass
     """,
@@ -112,8 +115,12 @@ NEW_IN = {
     "3.12": r"""
     type A = ...  #! `type` needs Python 3.12
     type A[T] = list[T]  #! `type` needs Python 3.12
+    if a: type A[T] = list[T]; type B = A; b = type  #! `type` needs Python 3.12
+    class A: type B = lambda a=1, *, b: (a, b)  #! `type` needs Python 3.12
+    match a:\n  case b: type A = b  #! `type` needs Python 3.12
     type type = type; type match = case  #! `type` needs Python 3.12
     def f[T: int, *Ts, **P](a: T) -> T: pass  #! a list of type parameters needs Python 3.12
+    def f[T: match.a, U: case](): pass  #! a list of type parameters needs Python 3.12
     async def f[T: (int, str)](): pass  #! a list of type parameters needs Python 3.12
     class A[T](B[T]): pass  #! a list of type parameters needs Python 3.12
     x = f'{f'{a['b']}'}'
@@ -213,6 +220,11 @@ NEVER = r"""
     type A = b, c
     type A = b = c
     type A[B]
+    type A[] = b
+    def f[](): pass
+    if a: type B = c = d; e
+    if a: b: type C = d
+    lambda: type A = b
     type in = b
     type A: int = b
     def f[A = ](): pass
@@ -235,3 +247,16 @@ def test_what_went_with_2_7(statement):
     assert Messages(statement, "2.7") == []
     for version in VERSIONS:
         assert Messages(statement, version)
+
+
+@pytest.mark.parametrize(
+    ("text", "column", "message"),
+    [
+        ("x = 1 + 0777", 9, "an octal number without `0o` ended with Python 2"),
+        ("f'{é + 10l}'", 8, "the suffix `L` of a number ended with Python 2"),
+        ("f(a, uR'b')", 6, "the prefix `ur` of a string ended with Python 2"),
+    ],
+)
+def test_what_ended_with_python_2_is_named(text, column, message):
+    (problem,) = CheckText(text, "3.8")
+    assert (problem.message, problem.column) == (message, column)

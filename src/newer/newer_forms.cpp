@@ -56,10 +56,19 @@ Py_ssize_t FindStarInList(const CNode& node) {
 // The version of a string literal; null for one that has always been.
 const CForm* FormOfString(std::string_view text) {
     const CStringStart start = ReadStringStart(text, 0);
-    if (!start.has_fields) return nullptr;
-    return text.substr(0, start.prefix_length).find_first_of("tT") == std::string_view::npos
-               ? &forms::kFString
-               : &forms::kTString;
+    const auto has = [prefix = text.substr(0, start.prefix_length)](const char* letters) {
+        return prefix.find_first_of(letters) != std::string_view::npos;
+    };
+    if (start.has_fields) return has("tT") ? &forms::kTString : &forms::kFString;
+    return has("uU") && has("rR") ? &forms::kRawUnicode : nullptr;
+}
+
+//   0777  10L       0  00  0_0  0x1F  0777.5  0777e1  0777j
+const CForm* FormOfNumber(std::string_view text) {
+    if (text.back() == 'L' || text.back() == 'l') return &forms::kLongNumber;
+    if (text.front() != '0' || text.find_first_not_of("0123456789_") != std::string_view::npos)
+        return nullptr;
+    return text.find_first_not_of("0_") != std::string_view::npos ? &forms::kOldOctal : nullptr;
 }
 
 int VersionOf(nb::handle version_triple) {
@@ -95,7 +104,8 @@ const std::vector<CNewerForms::CNodeForm>& CNewerForms::_NodeForms() {
 
 void CNewerForms::SetVersion(nb::handle version_triple) {
     _fVersion = VersionOf(version_triple);
-    if (_fVersion < forms::kTString.version) _Watch(kTokenId_STRING, nullptr);
+    _Watch(kTokenId_STRING, nullptr);
+    _Watch(kTokenId_NUMBER, nullptr);
 }
 
 void CNewerForms::_Watch(int type, const CNodeForm* form) {
@@ -110,8 +120,9 @@ void CNewerForms::_Watch(int type, const CNodeForm* form) {
 }
 
 void CNewerForms::NoteNode(int type, const CNode& node) {
-    if (type == kTokenId_STRING) {
-        const CForm* const form = FormOfString(CUtf8(node.fText));
+    if (type == kTokenId_STRING || type == kTokenId_NUMBER) {
+        const CUtf8 text(node.fText);
+        const CForm* const form = type == kTokenId_STRING ? FormOfString(text) : FormOfNumber(text);
         if (form) Note(*form, node.fContext);
         return;
     }
@@ -129,7 +140,9 @@ void CNewerForms::Note(const CForm& form, nb::handle context) {
 
 void CNewerForms::Raise(CLogicalLine& logical) const {
     const int major = _fFound->version / kVersionsOfMajor, minor = _fFound->version % kVersionsOfMajor;
-    const nb::str message = nb::str("{} needs Python {}.{}").format(_fFound->name, major, minor);
+    const nb::str message = _fFound->version == CForm::kNone
+                                ? nb::str("{} ended with Python 2").format(_fFound->name)
+                                : nb::str("{} needs Python {}.{}").format(_fFound->name, major, minor);
     RaiseHostError(CreateSyntaxError(message, logical.Self(), _fContext, nb::none()));
 }
 

@@ -1,4 +1,4 @@
-// What a line has that is newer than the version that it is written in.
+// What a line has that is newer than the version that it is written in, and what no version has any more.
 //   in     the version, each node that is made, and what is read by hand
 //   out    one SyntaxError which names the form, its place and the version that brought it
 #pragma once
@@ -14,8 +14,10 @@
 namespace codeloom {
 
 struct CForm {
+    static constexpr int kNone = INT32_MAX;
+
     const char* name;
-    int version;  // 312 for 3.12
+    int version;  // the first that has it, 312 for 3.12; kNone for what ended with Python 2
 };
 
 namespace forms {
@@ -40,6 +42,10 @@ inline constexpr CForm kTypeParameters{"a list of type parameters", 312};
 inline constexpr CForm kTypeDefault{"a default of a type parameter", 313};
 inline constexpr CForm kBareExcept{"an `except` of several types without brackets", 314};
 inline constexpr CForm kTString{"a t-string", 314};
+
+inline constexpr CForm kOldOctal{"an octal number without `0o`", CForm::kNone};
+inline constexpr CForm kLongNumber{"the suffix `L` of a number", CForm::kNone};
+inline constexpr CForm kRawUnicode{"the prefix `ur` of a string", CForm::kNone};
 
 }  // namespace forms
 

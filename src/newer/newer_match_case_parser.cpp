@@ -24,6 +24,17 @@ bool IsSubject(const CNode& node) {
 
 }  // namespace
 
+// Removed tokens are none of the statement's: those in front of the bound in `def f[T: match.a]()`.
+nb::tuple CNewerMatchCaseParser::_RemoveSkipToks(nb::tuple toks, nb::tuple positions) {
+    nb::list kept_toks, kept_positions;
+    for (Py_ssize_t i = 0; i < TupleSize(toks); ++i) {
+        if (TupleItem(toks, i).is_none()) continue;
+        kept_toks.append(TupleItem(toks, i));
+        kept_positions.append(TupleItem(positions, i));
+    }
+    return CMatchCaseStatementParser::_RemoveSkipToks(nb::tuple(kept_toks), nb::tuple(kept_positions));
+}
+
 CNodeRef CNewerMatchCaseParser::ParseMatchStmt(nb::tuple toks, nb::tuple positions) {
     const CRestoreOnExit<nb::object> line_toks(_fLineToks, toks);
     const CRestoreOnExit<nb::object> line_positions(_fLinePositions, positions);

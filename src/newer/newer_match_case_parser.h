@@ -14,6 +14,7 @@ namespace codeloom {
 
 class CNewerMatchCaseParser : public CMatchCaseStatementParser {
   public:
+    nb::tuple _RemoveSkipToks(nb::tuple toks, nb::tuple positions) override;
     CNodeRef ParseMatchStmt(nb::tuple toks, nb::tuple positions) override;
     CNodeRef _ParseMatchStmtImpl() override;
     CNodeRef ParseCaseStmt(nb::tuple toks, nb::tuple positions) override;

@@ -202,38 +202,11 @@ bool CNewerParser::_FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i) {
     return i >= TupleSize(toks);
 }
 
-// `type` is a name like any other, unless it begins an alias.
-CNodeRef CNewerParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool in_async_def,
-                                                          CPositions positions, Py_ssize_t i) {
-    const bool is_type = IsToken(toks, i, "type");
-    if (is_type && !_BeginsTypeAlias(toks, i)) return CNodeRef();
-    CNodeRef node = CPGenParserImpl::_ParseSpecialCaseWithTypeParameter(toks, in_async_def, positions, i);
-    if (!node) return node;
-    if (is_type) _RequireAlias(*node);
-    const Py_ssize_t behind_name_i = _FindNextNonSkipIndex(toks, _FindNextNonSkipIndex(toks, i));
-    _fForms.Note(is_type ? forms::kTypeAlias : forms::kTypeParameters, nb::int_(is_type ? i : behind_name_i));
-    return node;
-}
-
-//   type X = int    type X[T] = list[T]
-//          ^                  ^             tells it from `type`, the name
-bool CNewerParser::_BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i) {
-    const Py_ssize_t name_i = _FindNextNonSkipIndex(toks, type_i);
-    if (!_IsPlainName(toks, name_i)) return false;
-    Py_ssize_t i = _FindNextNonSkipIndex(toks, name_i);
-    if (IsToken(toks, i, "[")) {
-        i = _NonNestedFindTokenIndex(nb::str("]"), toks, i + 1, TupleSize(toks));
-        if (i == -1) return true;  // the bracket is what is wrong
-        i = _FindNextNonSkipIndex(toks, i);
-    }
-    return IsToken(toks, i, "=");
-}
-
-// The assignment that an alias is parsed as has one `=`, and one expression behind it.
-void CNewerParser::_RequireAlias(const CNode& node) {
-    const CNode& assignment = node.As<CWithTypeParameters>() ? node.ChildAt(-1) : node;
-    if (ListedCount(assignment) > 3) _RaiseParseError(assignment.ChildAt(3).fContext);
-    _RequireSingle(assignment.ChildAt(2));
+//   def f[]():    an empty list is none
+nb::list CNewerParser::_NodesForTypeParameters(nb::tuple toks, bool in_async_def, CPositions positions,
+                                               Py_ssize_t start, Py_ssize_t end, bool raise_errors) {
+    if (raise_errors && _FindNextNonSkipIndex(toks, start) >= end) _RaiseParseError(nb::int_(end));
+    return CPGenParserImpl::_NodesForTypeParameters(toks, in_async_def, positions, start, end, raise_errors);
 }
 
 //   T = int        name '=' default

@@ -8,7 +8,8 @@
 //   with (x := f()) as y:   with (yield):   async with (a as b, c as d):   brackets that are and aren't
 //   items'
 //   @a[0].b                                 any expression as a decorator
-//   type is x                               `type` as a name in front of a keyword
+//   type is x                               `type` as a name in front of a keyword: type_aliases.cpp
+//   if a: type X = int                      an alias in a body on the row of its header
 //   def f[T: int = str]():                  defaults of type parameters
 //   case a, b:                              in newer_match_case_parser.h
 // What a line has that is newer than the version asked for is refused by its name: newer_forms.h.
@@ -36,6 +37,7 @@ class CNewerParser : public CPGenParserImpl {
     nb::list _BuildClsForStateList() override;
     // SyntaxError for a form that is newer than the version asked for.
     CNodeRef ParseToNode(CLogicalLine& logical, bool in_async_def) override;
+    CNodeRef _ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, CPositions positions) override;
     CNodeRef _ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) override;
     CNodeRef _ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def, CPositions positions,
                                                 Py_ssize_t i) override;
@@ -43,6 +45,8 @@ class CNewerParser : public CPGenParserImpl {
                                          Py_ssize_t i) override;
     CNodeRef _ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool in_async_def, CPositions positions,
                                                 Py_ssize_t i) override;
+    nb::list _NodesForTypeParameters(nb::tuple toks, bool in_async_def, CPositions positions,
+                                     Py_ssize_t start, Py_ssize_t end, bool raise_errors) override;
     CNodeRef _CreateSingleTypeParameterNode(nb::tuple toks, bool in_async_def, CPositions positions,
                                             Py_ssize_t start, Py_ssize_t end, bool raise_errors) override;
 
@@ -63,6 +67,7 @@ class CNewerParser : public CPGenParserImpl {
     bool _FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i);
     bool _BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i);
     void _RequireAlias(const CNode& node);
+    nb::tuple _WithoutAliases(const nb::tuple& toks, bool in_async_def, const CPositions& positions);
     bool _IsPlainName(const nb::tuple& toks, Py_ssize_t i) const;
     CNodeRef _ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                            Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors);

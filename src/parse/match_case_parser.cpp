@@ -23,9 +23,8 @@ nb::object Row(const nb::tuple& positions, Py_ssize_t i) {
     return nb::handle(TupleItem(positions, i))[0];
 }
 
-// A removed token, a comment, or a backslash that a later row follows.
+// A comment, or a backslash that a later row follows.
 bool IsSkipped(const nb::tuple& toks, const nb::tuple& positions, Py_ssize_t i) {
-    if (TupleItem(toks, i).is_none()) return true;
     const CUtf8 text(TupleItem(toks, i));
     if (text->empty()) RaiseIndexError("string index out of range");
     if (text->front() == '#') return true;
