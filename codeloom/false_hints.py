@@ -53,6 +53,38 @@ _DOTS_RESULT = re.compile(r"->\s*\.\.\.\s*$")
 _HINT_WITH_ARGUMENTS = re.compile(r"\(\s*(?!\)|\.\.\.)")
 
 
+class _Subscripts:
+    """The names in front of the brackets around the places of a line."""
+
+    def __init__(self, logical: CLogicalLine) -> None:
+        self._fLogical = logical
+
+    def NameAround(self, place: tuple[int, int]) -> str | None:
+        """The token before the innermost bracket around `place`, a row of the file and a column."""
+        i = bisect_left(self._fPlaces, place)
+        return self._fNames[i - 1] if i else None
+
+    @cached_property
+    def _fPlaces(self) -> list[tuple[int, int]]:
+        """The places of the tokens."""
+        return [(self._fLogical.fFirstLine + row, col) for row, col in self._fLogical.fPositions]
+
+    @cached_property
+    def _fNames(self) -> list[str | None]:
+        """For each token what stands before the innermost bracket that is open behind it."""
+        names: list[str | None] = []
+        open_names: list[str | None] = []
+        last_token = None
+        for token in self._fLogical.fToks:
+            if token in ("(", "[", "{"):
+                open_names.append(last_token)
+            elif token in (")", "]", "}") and open_names:
+                open_names.pop()
+            names.append(open_names[-1] if open_names else None)
+            last_token = token
+        return names
+
+
 class FalseHintRemover:
     """Takes the false hints out of the lines of one file; `text` is the whole of it.
 
@@ -77,7 +109,8 @@ class FalseHintRemover:
         if has_mark:
             takes_nothing = logical.fType == logicalline.kFunctionDef and _TakesNothing(toks)
             toks = tuple(_WithoutFalseHint(token, takes_nothing) for token in toks)
-        kept = tuple(exp for exp in exp_logicals if not self._IsFalseQuotedHint(exp, logical))
+        subscripts = _Subscripts(logical)
+        kept = tuple(exp for exp in exp_logicals if not self._IsFalseQuotedHint(exp, subscripts))
         if toks == logical.fToks and len(kept) == len(exp_logicals):
             return None
         return CLogicalLine(
@@ -104,14 +137,14 @@ class FalseHintRemover:
         """The names under which the file knows `Literal`, beside its own."""
         return frozenset(_LITERAL_ALIAS.findall(self._fText))
 
-    def _IsFalseQuotedHint(self, exp_logical: CLogicalLine, logical: CLogicalLine) -> bool:
+    def _IsFalseQuotedHint(self, exp_logical: CLogicalLine, subscripts: _Subscripts) -> bool:
         if exp_logical.fType != logicalline.kStringifiedTypeHint:
             return False
         text = TextFromTokens(exp_logical)
         if _QUOTED_PROSE.fullmatch(text) and (_THREE_WORDS.search(text) or not text.rstrip()[-1].isalnum()):
             return True
         return bool(self._fLiteralNames) and (
-            _SubscriptedName(logical, exp_logical.fOrigin) in self._fLiteralNames
+            subscripts.NameAround(exp_logical.fOrigin) in self._fLiteralNames
         )
 
 
@@ -162,18 +195,3 @@ def _ReadableFunctionHint(hint: str) -> str:
     if dots is not None:
         chars[dots.start() : dots.end()] = " " * len(dots.group())
     return "".join(chars)
-
-
-def _SubscriptedName(logical: CLogicalLine, place: tuple[int, int]) -> str | None:
-    """The token before the innermost bracket around `place`, a row of the file and a column."""
-    heads: list[str | None] = []
-    last_token = None
-    for token, (row, col) in zip(logical.fToks, logical.fPositions, strict=True):
-        if (logical.fFirstLine + row, col) >= place:
-            break
-        if token in ("(", "[", "{"):
-            heads.append(last_token)
-        elif token in (")", "]", "}") and heads:
-            heads.pop()
-        last_token = token
-    return heads[-1] if heads else None
