@@ -1,16 +1,36 @@
 """What several test files share."""
 
 import os
+import random
 import subprocess
 import sys
 from collections.abc import Callable
 from pathlib import Path
 
 import pytest
+from hypothesis import settings
 
 
 def pytest_addoption(parser: pytest.Parser) -> None:
     parser.addoption("--rewrite", action="store_true", help="write what comes out into the golden files")
+    parser.addoption(
+        "--seed", default="1", help="of the tests with random input; `random` for another one each time"
+    )
+
+
+def pytest_configure(config: pytest.Config) -> None:
+    is_random = config.getoption("--seed") == "random"
+    settings.register_profile("seeded", derandomize=not is_random, deadline=None)
+    settings.load_profile("seeded")
+
+
+@pytest.fixture
+def seed(request: pytest.FixtureRequest) -> int:
+    """Of random input: what the option says, or one that is always the same. A failure shows it."""
+    option: str = request.config.getoption("--seed")
+    number = random.randrange(1 << 30) if option == "random" else int(option)
+    print(f"--seed {number}")
+    return number
 
 
 @pytest.fixture

@@ -1,14 +1,11 @@
 """Single broken lines of sound files are found exactly, and their neighbours are untouched."""
 
-import random
-
 import broken_lines
 import pytest
 
 
 @pytest.mark.parametrize("analyzer", broken_lines.ANALYZERS)
-def test_a_broken_line_is_reported_and_no_other(analyzer):
-    seed = random.randrange(1 << 30)
+def test_a_broken_line_is_reported_and_no_other(analyzer, seed):
     cases = broken_lines.Cases(300, seed, broken_lines.ANALYZERS[analyzer])
     missed = [case for case in cases if not case.IsExact()]
     assert len(missed) <= len(cases) * 0.03, (seed, missed)

@@ -5,7 +5,6 @@ Golden files in signatures/ hold sources with what the command prints of them.
 
 import ast
 import json
-import random
 import re
 from contextlib import redirect_stdout
 from io import StringIO
@@ -55,8 +54,7 @@ def Def(signature):
     return signature.row, name, *arguments, ("return", Plain(signature.return_hint))
 
 
-def test_signatures_are_those_of_the_interpreter():
-    seed = random.randrange(1 << 30)
+def test_signatures_are_those_of_the_interpreter(seed):
     for path, text, tree in LibraryTexts(80, seed):
         if "# type:" not in text:
             signatures = SignaturesInText(text)

@@ -74,8 +74,7 @@ SAMPLE_OR_ALL = pytest.mark.parametrize(
 
 
 @SAMPLE_OR_ALL
-def test_no_sound_line_is_refused(count, no_swallowing):
-    seed = random.randrange(1 << 30)
+def test_no_sound_line_is_refused(count, no_swallowing, seed):
     analyzer = CNewerAnalyzer(VERSION)
     refused = [
         (seed, str(path), logical.fFirstLine + error.lineno, error.text)
@@ -97,9 +96,8 @@ def Shape(node):
 
 
 @SAMPLE_OR_ALL
-def test_the_newer_grammar_keeps_the_shape_of_every_tree(count):
+def test_the_newer_grammar_keeps_the_shape_of_every_tree(count, seed):
     older, newer = (CPGenParserImpl(VERSION, f"Python-Grammar-{version}") for version in ("3.8", "3.14"))
-    seed = random.randrange(1 << 30)
     for path, text, _ in LibraryTexts(count, seed):
         for logical in GetLogicalsFromText(text):
             try:

@@ -137,7 +137,7 @@ def Larger(patterns):
     )
 
 
-@settings(max_examples=500, deadline=None)
+@settings(max_examples=500)
 @given(st.recursive(SINGLE, Larger, max_leaves=8))
 def test_patterns_have_the_structure_that_the_interpreter_sees(pattern):
     try:
@@ -148,7 +148,7 @@ def test_patterns_have_the_structure_that_the_interpreter_sees(pattern):
     assert Form(Parse(f"case {pattern}:").GetPattern()) == ExpectedForm(expected)
 
 
-@settings(max_examples=300, deadline=None)
+@settings(max_examples=300)
 @given(st.lists(st.one_of(st.recursive(SINGLE, Larger, max_leaves=4), STARRED), min_size=1, max_size=3))
 def test_open_sequences_have_it_too(patterns):
     pattern = ", ".join(patterns) if len(patterns) > 1 else f"{patterns[0]},"

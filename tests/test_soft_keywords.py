@@ -119,7 +119,7 @@ TAILS = st.one_of(
 )
 
 
-@settings(max_examples=1000, deadline=None)
+@settings(max_examples=1000)
 @given(st.sampled_from(list(STATEMENT)), TAILS)
 def test_generated_lines(word, tail):
     text = f"{word}{tail}"

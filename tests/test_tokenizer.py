@@ -87,7 +87,7 @@ def test_texts_without_lines():
         assert not GetLogicalsFromText(text)
 
 
-@settings(max_examples=400, deadline=None)
+@settings(max_examples=400)
 @given(st.lists(st.sampled_from(PIECES), max_size=40), st.sampled_from(["", " "]))
 def test_nothing_is_lost(pieces, between):
     text = between.join(pieces)
@@ -130,8 +130,7 @@ def FoundTokens(text):
             yield LINE_END
 
 
-def test_the_interpreter_finds_the_same_tokens():
-    seed = random.randrange(1 << 30)
+def test_the_interpreter_finds_the_same_tokens(seed):
     for text in LibraryTexts(30, seed):
         assert list(FoundTokens(text)) == list(ExpectedTokens(text)), seed
 
@@ -191,8 +190,7 @@ class Breaker:
         ("triple quotes", 1, 0.5),  # whose text is code now and then
     ],
 )
-def test_a_fault_spoils_its_own_line_only(kind, fault_count, share):
-    seed = random.randrange(1 << 30)
+def test_a_fault_spoils_its_own_line_only(kind, fault_count, share, seed):
     breakers = [Breaker(text, seed) for text in LibraryTexts(15, seed)]
     results = [breaker.IsIsolated(kind, fault_count) for breaker in breakers for _ in range(10)]
     results = [result for result in results if result is not None]
