@@ -45,7 +45,7 @@ class TNodeConverterOperations : public Class {
     // A host subclass knows rules by `convert` alone.
     nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
                            size_t first) override {
-        return NodeConverter::ConvertRule(grammar, type, context, stack, first);
+        return this->convert(grammar, type, nb::none(), context, stack.PopList(first));
     }
 };
 
