@@ -102,7 +102,8 @@ nb::tuple CNewerParser::_WithoutAliases(const nb::tuple& toks, bool in_async_def
         const Py_ssize_t type_i = _FindNextNonSkipIndex(toks, start - 1);
         if (!IsToken(toks, type_i, "type") || !_BeginsTypeAlias(toks, type_i)) return;
         const nb::tuple alone = WithoutTokens(WithoutTokens(toks, 0, type_i), end, count);
-        DiscardNode(_ParseSpecialCaseWithTypeParameter(alone, in_async_def, positions, type_i).AsHost());
+        const CNodeRef alias = _ParseSpecialCaseWithTypeParameter(alone, in_async_def, positions, type_i);
+        if (alias) DiscardNode(alias.AsHost());
         const Py_ssize_t name_i = _FindNextNonSkipIndex(toks, type_i);
         const Py_ssize_t equal_i = _NonNestedFindTokenIndex(nb::str("="), toks, name_i, end);
         rest = WithoutTokens(WithoutTokens(rest, type_i, name_i), name_i + 1, equal_i);

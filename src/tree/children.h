@@ -63,8 +63,11 @@ class TChildren {
     nb::object AsHost() {
         if (_fIsNone) return nb::none();
         if (_HasList()) return _fList;
-        nb::object list = nb::steal(PyList_New(Size()));
+        const Py_ssize_t count = Size();
+        nb::object list = nb::steal(PyList_New(count));
         if (!list.is_valid()) throw nb::python_error();
+        // A new object may start the collector, which runs host code.
+        if (_HasList() || Size() != count) return AsHost();
         Py_ssize_t i = 0;
         for (CRef<Node>& node : _fNodes) PyList_SET_ITEM(list.ptr(), i++, node.Release().release().ptr());
         _fNodes.clear();
@@ -79,12 +82,16 @@ class TChildren {
     template <class Take>
     void TakeAll(Take take) {
         for (size_t i = 0; i < _fNodes.size(); ++i) take(std::move(_fNodes[i]));
+        _fNodes.clear();  // of places without a node
         SetNone();
     }
 
     void SetNone() {
         _fIsNone = true;
-        _fNodes.clear();
+        while (!_fNodes.empty()) {  // each leaves first, since dropping one may run host code
+            const CRef<Node> dropped = std::move(_fNodes.back());
+            _fNodes.pop_back();
+        }
         if (_fNodes.capacity() > kMostKept) std::vector<CRef<Node>>().swap(_fNodes);
         const nb::object dropped = std::move(_fList);
     }
