@@ -105,7 +105,7 @@ CNodeRef CTypeHintWalker::_Parsed(Py_ssize_t tok_i, Parse parse, OffsetOf offset
     try {
         return parse();
     } catch (const nb::python_error& error) {
-        if (!error.matches(ParseErrorClass())) throw;
+        if (!IsParseError(error)) throw;
         context = nb::borrow(error.value()).attr("context");
     }
     _RaiseHintSyntaxError(tok_i, offset_of(ResultFromHost<Py_ssize_t>(context)));

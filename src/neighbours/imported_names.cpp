@@ -79,6 +79,10 @@ nb::object ParseErrorClass() {
     return kParseError.Find();
 }
 
+bool IsParseError(const nb::python_error& error) {
+    return error.matches(ParseErrorClass());
+}
+
 void RequireNames(const char* module_name, std::initializer_list<const char*> names) {
     const nb::module_ neighbour = nb::module_::import_(module_name);
     for (const char* name : names) NameOf(neighbour, module_name, name);

@@ -35,6 +35,8 @@ extern CPrefixes gPrefixes;
 // `optpgen.ParseError`, looked up on the module at the call.
 nb::object ParseErrorClass();
 
+bool IsParseError(const nb::python_error& error);
+
 // An ImportError which names the neighbour and the name unless the neighbour has all of them.
 void RequireNames(const char* module_name, std::initializer_list<const char*> names);
 

@@ -51,14 +51,15 @@ void CNewerParser::Init(nb::object version_triple, nb::object grammar_file, nb::
 
 nb::object CNewerParser::convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
                                  nb::handle children) {
-    nb::object node = CPGenParserImpl::convert(grammar, type, value, context, children);
-    if (_fForms.AreWatched(type)) _fForms.NoteNode(type, *Instance<CNode>(node));
-    return node;
+    return _Noted(type, CPGenParserImpl::convert(grammar, type, value, context, children));
 }
 
 nb::object CNewerParser::ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
                                      size_t first) {
-    nb::object node = CPGenParserImpl::ConvertRule(grammar, type, context, stack, first);
+    return _Noted(type, CPGenParserImpl::ConvertRule(grammar, type, context, stack, first));
+}
+
+nb::object CNewerParser::_Noted(int type, nb::object node) {
     if (_fForms.AreWatched(type)) _fForms.NoteNode(type, *Instance<CNode>(node));
     return node;
 }
@@ -108,12 +109,12 @@ CNodeRef CNewerParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_asyn
     try {
         return CPGenParserImpl::_ParseSpecialCases(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
-        if (!error.matches(ParseErrorClass())) throw;
+        if (!IsParseError(error)) throw;
         if (!IsToken(toks, _FindNextNonSkipIndex(toks, word_i), "[")) throw;
         try {
             return _ParseToksToNodeImpl(toks, in_async_def, positions);
         } catch (const nb::python_error& second_error) {
-            if (!second_error.matches(ParseErrorClass())) throw;
+            if (!IsParseError(second_error)) throw;
         }
         throw;
     }

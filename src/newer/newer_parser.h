@@ -57,6 +57,8 @@ class CNewerParser : public CPGenParserImpl {
     }
 
   private:
+    // A node of this type, once its form is noted.
+    nb::object _Noted(int type, nb::object node);
     CNodeRef _ParseMatchOrCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                                Py_ssize_t word_i);
     CNodeRef _ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def, const CPositions& positions,

@@ -17,7 +17,7 @@ void ForEachOutsideBrackets(const nb::tuple& toks, Py_ssize_t start, Py_ssize_t 
         const nb::handle tok = TupleItem(toks, i);
         if (tok.is_none()) continue;
         const CUtf8 text(tok);
-        if (text->empty() || text->front() == '#' || text->front() == '\\') continue;
+        if (IsPassedOver(text)) continue;
         const int step = DepthStep(text);
         if (depth == 0 && text == "lambda") {
             ++lambda_count;

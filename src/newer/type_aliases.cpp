@@ -37,7 +37,7 @@ bool IsBehindType(const nb::tuple& toks, Py_ssize_t i) {
         const nb::handle tok = TupleItem(toks, i);
         if (tok.is_none()) continue;
         const CUtf8 text(tok);
-        if (!text->starts_with('#') && !text->starts_with('\\')) return text == "type";
+        if (!IsPassedOver(text)) return text == "type";
     }
     return false;
 }
@@ -83,7 +83,7 @@ CNodeRef CNewerParser::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, C
     try {
         return CPGenParserImpl::_ParseToksToNodeImpl(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
-        if (!error.matches(ParseErrorClass())) throw;
+        if (!IsParseError(error)) throw;
         const nb::object context = error.value().attr("context");
         Py_ssize_t name_i = -1;
         if (!nb::try_cast(context, name_i) || !IsBehindType(toks, name_i)) throw;

@@ -156,8 +156,7 @@ Py_ssize_t CPGenParserImpl::_FindNextNonSkipIndex(nb::tuple toks, Py_ssize_t ind
     for (index = std::min(index, count) + 1; index < count; ++index) {
         const nb::handle tok = TupleItem(toks, index);
         if (tok.is_none()) continue;
-        const CUtf8 text(tok);
-        if (!text->empty() && text->front() != '#' && text->front() != '\\') break;
+        if (!IsPassedOver(CUtf8(tok))) break;
     }
     return index < count ? index : count;
 }

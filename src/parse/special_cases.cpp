@@ -18,10 +18,6 @@ bool MayBeSpecialCase(nb::handle first_tok) {
     return TextIsOneOf(first_tok, "with", "match", "case", "except", "type", "def", "class", "async");
 }
 
-bool IsParseError(const nb::python_error& error) {
-    return error.matches(ParseErrorClass());
-}
-
 }  // namespace
 
 CNodeRef CPGenParserImpl::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {

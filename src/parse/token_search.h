@@ -14,6 +14,11 @@ namespace codeloom {
 // 1 for an opening bracket, -1 for a closing one, 0 for any other token.
 int DepthStep(std::string_view token);
 
+// True for a comment, a backslash and an empty text, which are no part of a statement.
+constexpr bool IsPassedOver(std::string_view token) {
+    return token.empty() || token.front() == '#' || token.front() == '\\';
+}
+
 // True when there is a token at `i`, and it is `text`.
 bool IsToken(nb::handle toks, Py_ssize_t i, std::string_view text);
 
