@@ -2,6 +2,7 @@
 
 #include "_fastaccess/bytes.h"
 #include "_fastaccess/clock.h"
+#include "_fastaccess/non_nested_search.h"
 #include "_fastaccess/numbers.h"
 #include "strutils/arguments.h"
 
@@ -16,9 +17,32 @@ double HostDoubleValueForULongLongBits(nb::handle l) {
     return DoubleValueForULongLongBits(bits);
 }
 
+void BindNonNestedStruct(nb::module_& module) {
+    module.def(
+        "InitNonNestedStruct",
+        [](CNonNestedSearch& structure, const nb::object& search_ptr, nb::handle to_find_bytes,
+           Py_ssize_t start, Py_ssize_t end) {
+            return CheckedResult(structure.InitStruct(search_ptr, to_find_bytes, start, end), -1);
+        },
+        "structure"_a, "search_ptr"_a.none(), "to_find_bytes"_a.none(), "start"_a, "end"_a,
+        nb::sig("def InitNonNestedStruct(structure: CNonNestedSearch, search_ptr: bytes | str | None, "
+                "to_find_bytes: bytes, start: int, end: int) -> int"),
+        "Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`; None is for no\n"
+        "text at all. Returns 0. TypeError for anything else, AssertionError when `start` or `end` lies\n"
+        "outside the text.");
+    module.def(
+        "FindNextNonNestedStruct",
+        [](CNonNestedSearch& structure) {
+            return CheckedResult(structure.FindNextInStruct(), Py_ssize_t{-2});
+        },
+        "structure"_a, nb::sig("def FindNextNonNestedStruct(structure: CNonNestedSearch) -> int"),
+        "The byte offset of the next hit outside brackets and strings; -1 when there is none.");
+}
+
 }  // namespace
 
 void BindFastAccessPrimitives(nb::module_& module) {
+    BindNonNestedStruct(module);
     module.def(
         "StrInStr",
         [](nb::handle sub, nb::handle whole) { return CheckedResult(StrInStr(sub, whole), -1) != 0; },

@@ -10,7 +10,7 @@
 
 #include <nanobind/nanobind.h>
 
-#include "neighbours/tokenizer/char_class.h"  // IsDigit too
+#include "text/char_class.h"  // IsDigit too
 
 namespace nb = nanobind;
 

@@ -8,7 +8,7 @@
 #include "_fastaccess/non_nested_struct.h"
 #include "host/errors.h"
 #include "neighbours/fastaccess/string_end.h"
-#include "neighbours/tokenizer/char_class.h"
+#include "text/char_class.h"
 
 namespace codeloom {
 

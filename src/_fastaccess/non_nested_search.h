@@ -18,10 +18,16 @@ class CNonNestedSearch : public CHosted {
     // TypeError for a subclass of either, otherwise as InitNonNestedStruct.
     int InitWith(nb::handle to_search, nb::handle to_find_bytes, Py_ssize_t start, Py_ssize_t end);
 
+    // The same for any byte or text string; none leaves the search idle.
+    int InitStruct(const nb::object& to_search, nb::handle to_find_bytes, Py_ssize_t start, Py_ssize_t end);
+
+    // The next hit, -1 when there is none; -2 on failure.
+    Py_ssize_t FindNextInStruct() { return FindNextNonNestedStruct(_fSearch); }
+
     // The next hit, -1 when there is none left, which makes the search idle; -2 on failure.
     Py_ssize_t FindNext() {
         if (_fSearched.is_none()) return -1;
-        const Py_ssize_t found = FindNextNonNestedStruct(_fSearch);
+        const Py_ssize_t found = FindNextInStruct();
         if (found == -1) Clear();
         return found;
     }
@@ -37,8 +43,6 @@ class CNonNestedSearch : public CHosted {
     const tNonNestedStruct& Search() const { return _fSearch; }
 
   private:
-    int _InitWithText(nb::handle to_search, nb::handle to_find_bytes, Py_ssize_t start, Py_ssize_t end);
-
     tNonNestedStruct _fSearch;
     nb::object _fSearched = nb::none();  // the string searched; none when idle
     nb::object _fToFind = nb::none();
@@ -47,29 +51,29 @@ class CNonNestedSearch : public CHosted {
 
 inline int CNonNestedSearch::InitWith(nb::handle to_search, nb::handle to_find_bytes, Py_ssize_t start,
                                       Py_ssize_t end) {
-    Clear();
-    if (PyBytes_CheckExact(to_search.ptr()) || PyUnicode_CheckExact(to_search.ptr()))
-        return _InitWithText(to_search, to_find_bytes, start, end);
-    if (PyBytes_Check(to_search.ptr()) || PyUnicode_Check(to_search.ptr())) {
+    const bool is_text = PyBytes_Check(to_search.ptr()) || PyUnicode_Check(to_search.ptr());
+    if (is_text && !PyBytes_CheckExact(to_search.ptr()) && !PyUnicode_CheckExact(to_search.ptr())) {
+        Clear();
         PyErr_Format(PyExc_TypeError, "expected bytes or str itself, %s found",
                      Py_TYPE(to_search.ptr())->tp_name);
         return -1;
     }
-    tNonNestedStruct idle;
-    return InitNonNestedStruct(idle, nullptr, to_find_bytes, start, end);
+    return InitStruct(is_text ? nb::borrow(to_search) : nb::none(), to_find_bytes, start, end);
 }
 
-inline int CNonNestedSearch::_InitWithText(nb::handle to_search, nb::handle to_find_bytes, Py_ssize_t start,
-                                           Py_ssize_t end) {
-    CUtf8 text(to_search);
+inline int CNonNestedSearch::InitStruct(const nb::object& to_search, nb::handle to_find_bytes,
+                                        Py_ssize_t start, Py_ssize_t end) {
+    Clear();
+    CUtf8 text = to_search.is_none() ? CUtf8() : CUtf8(to_search);
     tNonNestedStruct search;
     if (InitNonNestedStruct(search, text->data(), to_find_bytes, start, end) != 0) return -1;
+    if (to_search.is_none()) return 0;
     if (start < 0 || end > static_cast<Py_ssize_t>(text->size())) {
         PyErr_SetString(PyExc_ValueError, "start and end must lie within the text searched");
         return -1;
     }
     _fSearch = search;
-    _fSearched = nb::borrow(to_search);
+    _fSearched = to_search;
     _fToFind = nb::borrow(to_find_bytes);
     _fText = std::move(text);
     return 0;

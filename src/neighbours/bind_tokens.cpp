@@ -1,11 +1,13 @@
+#include <algorithm>
+#include <string>
 #include <vector>
 
 #include "host/collections.h"
 #include "host/text.h"
 #include "neighbours/bind.h"
 #include "neighbours/logicalline/logical_types_host.h"
-#include "neighbours/match_case.h"
-#include "neighbours/token_type.h"
+#include "text/token_type.h"
+#include "tokenizer/match_case.h"
 
 namespace codeloom {
 
@@ -13,11 +15,24 @@ using namespace nb::literals;
 
 namespace {
 
+// The tokens from `first` up to `end`, those there are; a removed one is empty. Their texts go to `text`, one
+// after the other.
+std::vector<CRawToken> TokensOf(const nb::tuple& toks, size_t first, size_t end, std::string& text) {
+    std::vector<CRawToken> tokens;
+    for (size_t i = first; i < std::min(end, nb::len(toks)); ++i) {
+        const nb::handle tok = toks[i];
+        const CUtf8 utf8 = tok.is_none() ? CUtf8() : CUtf8(tok);
+        tokens.push_back(MakeToken(utf8, static_cast<uint32_t>(text.size())));
+        text += utf8;
+    }
+    return tokens;
+}
+
 nb::object HostFindMatchOrCaseType(nb::tuple toks, Py_ssize_t first, Py_ssize_t end) {
-    std::vector<CUtf8> texts;
-    for (nb::handle tok : toks) texts.push_back(tok.is_none() ? CUtf8() : CUtf8(tok));
-    const std::vector<std::string_view> views(texts.begin(), texts.end());
-    return HostText(FindMatchOrCaseType(views, first, end));
+    std::string text;
+    const std::vector<CRawToken> tokens =
+        TokensOf(toks, static_cast<size_t>(first), static_cast<size_t>(end), text);
+    return HostText(FindMatchOrCaseType(tokens, text));
 }
 
 }  // namespace

@@ -1,7 +1,8 @@
 #include "neighbours/imported_names.h"
 
 #include "host/neighbour_call.h"
-#include "neighbours/logical_types.h"
+#include "symbolinfo/constants_by_name.h"
+#include "tokenizer/logical_types.h"
 
 namespace codeloom {
 
@@ -61,6 +62,27 @@ void ImportVocabulary(nb::module_& module) {
          "kTypingModuleSymbolDotAnyStr", "kTypingModuleSymbolDotStr", "gInfoBytesBuilder"});
 }
 
+[[noreturn]] void RefuseVocabulary(const char* name, const char* reason) {
+    PyErr_Format(PyExc_ImportError,
+                 "the engine can't write the records of another vocabulary: codeloom.symbolinfo.%s %s", name,
+                 reason);
+    throw nb::python_error();
+}
+
+// The engine composes records natively. Another vocabulary would be honoured in some and missed in others.
+void RequireVocabulary() {
+    const nb::module_ neighbour = nb::module_::import_("codeloom.symbolinfo");
+    const nb::module_ native = nb::module_::import_("codeloom._neighbours");
+    for (const auto [name, value] : ConstantsByName()) {
+        if (nb::object(neighbour.attr(name)).equal(value)) continue;
+        RefuseVocabulary(nb::str(name).c_str(), nb::str("must be {!r}").format(value).c_str());
+    }
+    for (const char* name :
+         {"BuildLiteralInfo", "EncodeStringLiteral", "GetInstanceNameForClass", "JoinTokens"})
+        if (!nb::object(neighbour.attr(name)).is(native.attr(name)))
+            RefuseVocabulary(name, "must be that of codeloom._neighbours");
+}
+
 void ImportFunctions(nb::module_& module) {
     ImportFrom(module, "codeloom._fastaccess", {"GetTokenType", "_FindStringEndNonNested"});
     ImportFrom(module, "codeloom.strutils",
@@ -93,6 +115,7 @@ void ImportNames(nb::module_& module) {
     ImportLogicalTypes(module);
     ImportVocabulary(module);
     ImportFunctions(module);
+    RequireVocabulary();
 }
 
 }  // namespace codeloom

@@ -3,8 +3,8 @@
 
 #include <nanobind/nanobind.h>
 
+#include "names/record_kinds.h"
 #include "neighbours/logicalline/logical_line.h"
-#include "symbolinfo/record_kinds.h"
 
 namespace codeloom {
 

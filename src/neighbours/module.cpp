@@ -1,7 +1,8 @@
 // codeloom._neighbours: what stands beside the engine. The importable modules are thin Python files over it.
+#include "host/module_entry.h"
 #include "neighbours/bind.h"
 
-NB_MODULE(_neighbours, module) {
+CODELOOM_MODULE(_neighbours, module) {
     // An analyzer that a host still holds when the interpreter ends is no leak; `make leaks` looks for those.
     nanobind::set_leak_warnings(false);
     codeloom::BindTokenTypes(module);

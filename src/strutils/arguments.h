@@ -24,6 +24,14 @@ struct CUtf8Argument {
         PyErr_Format(PyExc_ValueError, "%s %zd lies outside the buffer of %zd bytes", name, size, available);
         throw nb::python_error();
     }
+
+    // False for a position at or after `end_pos`, whatever that is; otherwise ValueError when `end_pos` lies
+    // outside the buffer.
+    bool HasByteAt(Py_ssize_t pos, Py_ssize_t end_pos) const {
+        if (pos >= end_pos) return false;
+        Require("end_pos", end_pos);
+        return pos >= 0;
+    }
 };
 
 // A single byte: an integer from 0 to 255, or a byte or text string of one byte.

@@ -1,5 +1,6 @@
 #include "strutils/bind.h"
 
+#include "host/truth.h"
 #include "strutils/arguments.h"
 #include "strutils/text.h"
 
@@ -7,16 +8,9 @@ namespace codeloom {
 
 namespace {
 
-// A primitive on a stretch of a buffer, with the stretch checked.
-template <auto primitive>
-auto Checked(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize_t end_pos) {
-    utf8_ptr.Require("end_pos", end_pos);
-    return primitive(utf8_ptr.Pointer(), pos, end_pos);
-}
-
 template <auto test>
 bool CheckedTest(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize_t end_pos) {
-    return Checked<test>(utf8_ptr, pos, end_pos) != 0;
+    return utf8_ptr.HasByteAt(pos, end_pos) && test(utf8_ptr.Pointer(), pos, end_pos) != 0;
 }
 
 Py_ssize_t HostAdjustUtf8Pos(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize_t diff,
@@ -26,13 +20,14 @@ Py_ssize_t HostAdjustUtf8Pos(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_s
 }
 
 nb::object HostUcs4CharAtUtf8Pos(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize_t end_pos) {
-    const Py_UCS4 ch = Checked<Ucs4CharAtUtf8Pos>(utf8_ptr, pos, end_pos);
+    const bool has_char = utf8_ptr.HasByteAt(pos, end_pos);
+    const Py_UCS4 ch = has_char ? Ucs4CharAtUtf8Pos(utf8_ptr.Pointer(), pos, end_pos) : 0;
     return nb::steal<nb::object>(PyUnicode_FromOrdinal(static_cast<int>(ch)));
 }
 
 bool HostIsIdentifierCharAtUtf8Pos(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize_t end_pos,
-                                   bool initial) {
-    utf8_ptr.Require("end_pos", end_pos);
+                                   CTruth initial) {
+    if (!utf8_ptr.HasByteAt(pos, end_pos)) return false;
     return CheckedResult(IsIdentifierCharAtUtf8Pos(utf8_ptr.Pointer(), pos, end_pos, initial), -1) != 0;
 }
 

@@ -13,7 +13,7 @@
 #include <Python.h>
 
 #include "neighbours/strutils/text.h"
-#include "neighbours/tokenizer/char_class.h"
+#include "text/char_class.h"
 
 namespace codeloom {
 

@@ -9,7 +9,7 @@ namespace codeloom {
 namespace {
 
 Py_ssize_t HostNextNonNested(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize_t end_pos) {
-    utf8_ptr.Require("end_pos", end_pos);
+    if (!utf8_ptr.HasByteAt(pos, end_pos)) return -1;
     return NextNonNestedUtf8PtrIndex(utf8_ptr.Pointer(), pos, end_pos);
 }
 

@@ -4,7 +4,7 @@
 #include <Python.h>
 
 #include "neighbours/symbolinfo/nested_text.h"
-#include "neighbours/tokenizer/char_class.h"
+#include "text/char_class.h"
 
 namespace codeloom {
 

@@ -2,20 +2,14 @@
 //   in     records, kinds and scopes
 //   out    answers about them
 //   keeps  nothing
-//   start  at the table in record_kinds.h; constants here, questions in predicates.h
+//   start  at the table in names/record_kinds.h; constants here, questions in predicates.h
 #pragma once
 
 #include <string_view>
 
-#include "symbolinfo/record_kinds.h"
+#include "names/record_kinds.h"
 
 namespace codeloom {
-
-// Behind an equiv: what iterating over it gives.
-inline constexpr std::string_view kIterationSubscript = "[*]";
-
-// Behind the name of a class: an instance of it.
-inline constexpr std::string_view kClassInstanceSuffix = ":";
 
 // Scopes are dotted names; the module's own is empty. Behind a name the separator and a number say which
 // definition of that name in its scope is meant, counted from zero.

@@ -6,9 +6,9 @@
 #include "_fastaccess/non_nested_search.h"
 #include "host/binding.h"
 #include "neighbours/bind.h"
-#include "neighbours/fastaccess/string_tokens.h"
 #include "neighbours/strutils/text.h"
 #include "strutils/arguments.h"
+#include "tokenizer/string_tokens.h"
 
 namespace codeloom {
 
@@ -97,9 +97,9 @@ void BindNonNestedSearch(nb::module_& module) {
 }  // namespace
 
 void BindFastAccess(nb::module_& module) {
+    BindNonNestedSearch(module);
     BindFastAccessPrimitives(module);
     BindStringTokenizer(module);
-    BindNonNestedSearch(module);
 }
 
 }  // namespace codeloom

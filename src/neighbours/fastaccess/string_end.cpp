@@ -2,9 +2,9 @@
 
 #include <algorithm>
 
-#include "neighbours/tokenizer/fstring_scanner.h"
-#include "neighbours/tokenizer/lexer.h"
-#include "neighbours/tokenizer/string_lexer.h"
+#include "tokenizer/fstring_scanner.h"
+#include "tokenizer/lexer.h"
+#include "tokenizer/string_lexer.h"
 
 namespace codeloom {
 

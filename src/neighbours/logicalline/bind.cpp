@@ -24,7 +24,9 @@ void BindLogicalLine(nb::module_& module) {
         .def(TInit<nb::object, nb::tuple, nb::tuple, int32_t, nb::tuple, nb::object>(), "type"_a, "toks"_a,
              "positions"_a, "first_line"_a = 0, "exp_logicals"_a = nb::tuple(), "tok_types"_a = nb::none())
         .def_ro("fType", &CLogicalLine::fType, "The logical type, one of the constants of logicalline.")
-        .def_ro("fToks", &CLogicalLine::fToks, "Tuple of token texts; None for a removed token.")
+        .def_prop_ro(
+            "fToks", [](CLogicalLine& logical) { return logical.CLogicalLine::GetToks(); },
+            "Tuple of token texts; None for a removed token.")
         .def_prop_ro("fTokTypes", &CLogicalLine::GetTokTypes, "Tuple of token types, one for each token.")
         .def_prop_ro(
             "fPositions", [](CLogicalLine& logical) { return logical.CLogicalLine::GetPositions(); },

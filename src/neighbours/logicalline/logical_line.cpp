@@ -2,7 +2,9 @@
 
 #include "host/errors.h"
 #include "host/text.h"
-#include "neighbours/token_type.h"
+#include "neighbours/logicalline/logical_types_host.h"
+#include "neighbours/logicalline/token_texts.h"
+#include "text/token_type.h"
 
 namespace codeloom {
 
@@ -15,7 +17,23 @@ nb::object TypesOf(nb::handle toks) {
     });
 }
 
+// A tuple that is made on demand has been made.
+bool IsMade(const nb::object& tuple) {
+    return tuple.is_valid() && !tuple.is_none();
+}
+
+nb::object HostTextOf(const CRawToken& token, std::string_view text) {
+    static CTokenTexts& texts = *new CTokenTexts;  // holds host objects: never destroyed
+    return texts.Get(TextOf(token, text), token.type == kTokenId_NAME);
+}
+
 }  // namespace
+
+nb::object HostLogical(const CRawLogical& raw, const CSourceTextRef& source) {
+    CRef<CLogicalLine> logical = MakeInstance<CLogicalLine>();
+    logical->InitFromRaw(raw, HostText(raw.type), source);
+    return logical.Release();
+}
 
 void CLogicalLine::Init(nb::object type, nb::tuple toks, nb::tuple positions, int32_t first_line,
                         nb::tuple exp_logicals, nb::object tok_types) {
@@ -29,27 +47,28 @@ void CLogicalLine::Init(nb::object type, nb::tuple toks, nb::tuple positions, in
     fFirstLine = first_line;
     fTokenCount = static_cast<int32_t>(nb::len(toks));
     fOrigin = {first_line, 0};
-    fToks = std::move(toks);
+    _fToks = std::move(toks);
     _fPositions = std::move(positions);
     _fTokTypes = std::move(types);
     _fExpLogicals = std::move(exp_logicals);
 }
 
-void CLogicalLine::InitFromTokens(nb::object type, nb::tuple toks, std::unique_ptr<CTokenPlace[]> places,
-                                  int32_t first_line, nb::tuple exp_logicals) {
+void CLogicalLine::InitFromRaw(const CRawLogical& raw, nb::object type, CSourceTextRef source) {
     fType = std::move(type);
-    fTokenCount = static_cast<int32_t>(TupleSize(toks));
-    fFirstLine = first_line;
-    fToks = std::move(toks);
-    _fPlaces = std::move(places);
-    _fExpLogicals = std::move(exp_logicals);
+    fFirstLine = raw.first_row;
+    fTokenCount = static_cast<int32_t>(raw.tokens.size());
+    fOrigin = raw.origin;
+    fInAsyncDef = raw.in_async_def;
+    fFirstInDef = raw.first_in_def;
+    _fSource = std::move(source);
+    _fRaw = raw;
 }
 
 int CLogicalLine::GetTokenType(Py_ssize_t i) {
-    if (_fPlaces == nullptr) return ResultFromHost<int>(nb::object(GetTokTypes()[i]));
+    if (!_fSource) return ResultFromHost<int>(nb::object(GetTokTypes()[i]));
     if (i < 0) i += fTokenCount;
     if (i < 0 || i >= fTokenCount) RaiseIndexError("token index out of range");
-    return _fPlaces[i].type;
+    return _fRaw.tokens[static_cast<size_t>(i)].type;
 }
 
 void CLogicalLine::AppendTypeEquiv(nb::handle name, nb::handle equiv) {
@@ -67,31 +86,66 @@ void CLogicalLine::MarkParsed(bool parsed) {
 void CLogicalLine::ClearDerivedInfo() {
     fTypeEquivs.Clear();
     fArgTypeEquivs.Clear();
-    if (_fExpLogicals.is_none()) return;
+    _fEmbeddedRecords.clear();
+    if (!IsMade(_fExpLogicals)) return;
     for (nb::handle exp_logical : nb::borrow<nb::tuple>(_fExpLogicals)) {
         const CRecursionScope recursion;  // a host may nest them without end
         Instance<CLogicalLine>(exp_logical)->ClearDerivedInfo();
     }
 }
 
-nb::object CLogicalLine::GetExpLogicals() {
-    return _fExpLogicals;
+template <class Make>
+nb::object CLogicalLine::_Made(nb::object& tuple, Make make_item) {
+    if (!IsMade(tuple)) {
+        if (!_fSource) return nb::none();
+        tuple = MakeTuple(fTokenCount,
+                          [&](Py_ssize_t i) { return make_item(_fRaw.tokens[static_cast<size_t>(i)]); });
+    }
+    return tuple;
+}
+
+nb::object CLogicalLine::GetToks() {
+    return _Made(_fToks, [&](const CRawToken& token) { return HostTextOf(token, _fRaw.file_text); });
 }
 
 nb::object CLogicalLine::GetPositions() {
-    if (_fPositions.is_none() && _fPlaces != nullptr)
-        _fPositions = MakeTuple(fTokenCount, [&](Py_ssize_t i) -> nb::object {
-            return nb::make_tuple(_fPlaces[i].position.row, _fPlaces[i].position.col);
-        });
-    return _fPositions;
+    return _Made(_fPositions, [](const CRawToken& token) -> nb::object {
+        return nb::make_tuple(token.position.row, token.position.col);
+    });
 }
 
 nb::object CLogicalLine::GetTokTypes() {
-    if (_fTokTypes.is_none() && _fPlaces != nullptr)
-        _fTokTypes = MakeTuple(fTokenCount, [&](Py_ssize_t i) -> nb::object {
-            return nb::int_(static_cast<int>(_fPlaces[i].type));
+    return _Made(_fTokTypes, [](const CRawToken& token) -> nb::object { return nb::int_(int{token.type}); });
+}
+
+nb::object CLogicalLine::GetExpLogicals() {
+    if (!IsMade(_fExpLogicals)) {
+        if (!_fSource) return nb::none();
+        const std::vector<CRawLogical>& embedded = _fRaw.embedded;
+        _fExpLogicals = MakeTuple(static_cast<Py_ssize_t>(embedded.size()), [&](Py_ssize_t i) {
+            return HostLogical(embedded[static_cast<size_t>(i)], _fSource);
         });
-    return _fTokTypes;
+        _HandOutRecords();
+    }
+    return _fExpLogicals;
+}
+
+void CLogicalLine::SetRecords(CPackedRecords equivs, CPackedRecords arg_equivs,
+                              std::vector<CPackedRecords> embedded) {
+    CLogicalLine::ClearDerivedInfo();
+    fTypeEquivs.Set(std::move(equivs));
+    fArgTypeEquivs.Set(std::move(arg_equivs));
+    _fEmbeddedRecords = std::move(embedded);
+    if (IsMade(_fExpLogicals)) _HandOutRecords();
+}
+
+// Gives the embedded logicals their records.
+void CLogicalLine::_HandOutRecords() {
+    std::vector<CPackedRecords> records = std::move(_fEmbeddedRecords);
+    _fEmbeddedRecords.clear();
+    for (size_t i = 0; i < records.size(); ++i)
+        Instance<CLogicalLine>(TupleItem(_fExpLogicals, static_cast<Py_ssize_t>(i)))
+            ->fTypeEquivs.Set(std::move(records[i]));
 }
 
 }  // namespace codeloom

@@ -1,36 +1,42 @@
 // One logical line: its tokens, and what the analysis has recorded on it.
-//   in     tokens, types and positions, from the tokenizer or by hand
+//   in     a raw logical from the tokenizer; or texts, types and positions, by hand
 //   out    the same to the engine and the host; the host's tuples are made when the host first looks
+//   keeps  the text of the file, which all logicals of it share
 // Everything the engine needs is inline or virtual, since the engine is an extension of its own.
 #pragma once
 
 #include <cstdint>
 #include <memory>
+#include <vector>
 
 #include <nanobind/nanobind.h>
 
 #include "host/binding.h"
 #include "host/collections.h"
 #include "neighbours/logicalline/record_pairs.h"
-#include "neighbours/tokenizer/raw_logical.h"
+#include "neighbours/logicalline/source_text.h"
+#include "tokenizer/raw_logical.h"
 
 namespace codeloom {
 
 class CLogicalLine : public CHosted {
   public:
-    // Where a token starts and what it is, as the tokenizer found it.
-    struct CTokenPlace {
-        CPosition position;
-        int16_t type;
-    };
-
     // A record made by hand. Token types that aren't given are computed, -1 for a removed token.
     void Init(nb::object type, nb::tuple toks, nb::tuple positions, int32_t first_line,
               nb::tuple exp_logicals, nb::object tok_types);
 
-    // A record made by the tokenizer.
-    void InitFromTokens(nb::object type, nb::tuple toks, std::unique_ptr<CTokenPlace[]> places,
-                        int32_t first_line, nb::tuple exp_logicals);
+    // A record made by the tokenizer. `raw` lies in `source`.
+    void InitFromRaw(const CRawLogical& raw, nb::object type, CSourceTextRef source);
+
+    // What the tokenizer found; null for a record made by hand.
+    const CRawLogical* Raw() const { return _fSource ? &_fRaw : nullptr; }
+
+    // The tokens as the tokenizer found them; null for a record made by hand.
+    const CRawToken* Tokens() const { return _fSource ? _fRaw.tokens.data() : nullptr; }
+
+    // The records of an analysis on plain data, in the place of all that were there before: of the line, of
+    // its arguments, and those of each embedded logical. Requires: the tokenizer made the record.
+    void SetRecords(CPackedRecords equivs, CPackedRecords arg_equivs, std::vector<CPackedRecords> embedded);
 
     virtual int GetTokenType(Py_ssize_t i);
     virtual void AppendTypeEquiv(nb::handle name, nb::handle equiv);
@@ -39,17 +45,18 @@ class CLogicalLine : public CHosted {
     virtual void ClearDerivedInfo();
     virtual nb::object GetExpLogicals();
 
-    // The places of the tokens as the tokenizer found them; null for a record made by hand.
-    const CTokenPlace* Places() const { return _fPlaces.get(); }
-
-    // The host's tuples, made on demand.
+    // The host's tuples, made on demand; none in a record whose Init failed.
+    virtual nb::object GetToks();
     virtual nb::object GetPositions();
     virtual nb::object GetTokTypes();
+
+    // `toks` is the tuple that the host sees.
+    bool HasToks(const nb::tuple& toks) const { return _fToks.is(toks); }
 
     template <class Visitor>
     void References(Visitor&& visit) {
         visit(fType);
-        visit(fToks);
+        visit(_fToks);
         fTypeEquivs.References(visit);
         fArgTypeEquivs.References(visit);
         visit(_fExpLogicals);
@@ -58,7 +65,6 @@ class CLogicalLine : public CHosted {
     }
 
     nb::object fType = nb::none();
-    nb::object fToks = nb::none();  // a tuple once Init is through
     bool fParsed = false;
     int32_t fFirstLine = 0;
     int32_t fTokenCount = 0;
@@ -71,11 +77,23 @@ class CLogicalLine : public CHosted {
     bool fFirstInDef = false;
 
   private:
-    nb::object _fExpLogicals = nb::none();
-    std::unique_ptr<CTokenPlace[]> _fPlaces;  // one a token; none in a record made by hand
-    nb::object _fPositions = nb::none();      // none until the host looks
-    nb::object _fTokTypes = nb::none();
+    template <class Make>
+    nb::object _Made(nb::object& tuple, Make make_item);
+    void _HandOutRecords();
+
+    // Of the embedded logicals, until somebody looks at these.
+    std::vector<CPackedRecords> _fEmbeddedRecords;
+
+    CSourceTextRef _fSource;  // null in a record made by hand
+    CRawLogical _fRaw;
+    nb::object _fToks;  // these four are invalid, or none, until somebody looks
+    nb::object _fPositions;
+    nb::object _fTokTypes;
+    nb::object _fExpLogicals;
 };
+
+// The record of a logical that the tokenizer made; it lies in `source`.
+nb::object HostLogical(const CRawLogical& raw, const CSourceTextRef& source);
 
 template <class Class>
 class TLogicalLineOperations : public Class {
@@ -102,9 +120,9 @@ class CPositions {
 
     bool IsNone() const { return _fLogical == nullptr && (!_fPositions.is_valid() || _fPositions.is_none()); }
 
-    // The places of `toks`, when these are those of a logical and the tokenizer found them; or null.
-    const CLogicalLine::CTokenPlace* PlacesOf(const nb::tuple& toks) const {
-        return _fLogical != nullptr && _fLogical->fToks.is(toks) ? _fLogical->Places() : nullptr;
+    // What the tokenizer found for `toks`, when these are those of a logical that it made; or null.
+    const CRawToken* TokensOf(const nb::tuple& toks) const {
+        return _fLogical != nullptr && _fLogical->HasToks(toks) ? _fLogical->Tokens() : nullptr;
     }
 
     // The host's tuple, or none.

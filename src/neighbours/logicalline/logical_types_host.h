@@ -3,7 +3,7 @@
 
 #include <nanobind/nanobind.h>
 
-#include "neighbours/logical_types.h"
+#include "tokenizer/logical_types.h"
 
 namespace nb = nanobind;
 

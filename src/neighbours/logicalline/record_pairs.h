@@ -1,5 +1,5 @@
 // The records of one line: pairs of a name and what is said of it, in order of arrival.
-//   in     byte strings, from the walkers
+//   in     byte strings, from the walkers; or the packed records of an analysis on plain data
 //   out    the same to native readers; to the host a list of tuples, made when it first looks
 // From then on the list is where the records are, since the host may change it.
 #pragma once
@@ -10,6 +10,8 @@
 #include <nanobind/nanobind.h>
 
 #include "host/collections.h"
+#include "host/hosted.h"
+#include "neighbours/logicalline/packed_records.h"
 
 namespace codeloom {
 
@@ -18,16 +20,20 @@ class CRecordPairs {
     void Append(nb::handle name, nb::handle equiv);
     void Clear();
 
+    // Requires: there is no record.
+    void Set(CPackedRecords records);
+
     // The list; none when there is no record.
     nb::object AsHost();
 
-    bool IsEmpty() const { return _fPairs.empty() && _fHostPairs.is_none(); }
+    bool IsEmpty() const { return _fPacked.IsEmpty() && _fPairs.empty() && _fHostPairs.is_none(); }
 
     // Calls visit(name, equiv) for each record that is there now. ValueError for an item of the host's that
     // is no pair.
     template <class Visit>
     void ForEach(Visit visit) const {
         if (!_fHostPairs.is_none()) return _ForEachOfHost(visit);
+        for (const auto& [name, equiv] : _Unpacked()) visit(name, equiv);
         for (const auto& [name, equiv] : std::vector(_fPairs)) visit(name, equiv);
     }
 
@@ -37,6 +43,10 @@ class CRecordPairs {
     }
 
   private:
+    using CPairs = std::vector<std::pair<nb::object, nb::object>>;
+
+    CPairs _Unpacked() const;
+
     template <class Visit>
     void _ForEachOfHost(Visit visit) const {
         // A copy: what is visited may append to the records, or drop them.
@@ -50,7 +60,9 @@ class CRecordPairs {
 
     static constexpr size_t kUsualCount = 8;
 
-    std::vector<std::pair<nb::object, nb::object>> _fPairs;  // empty once the host's list is there
+    // At most one of these holds records.
+    CPackedRecords _fPacked;
+    CPairs _fPairs;
     nb::object _fHostPairs = nb::none();
 };
 

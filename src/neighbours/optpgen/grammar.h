@@ -6,9 +6,9 @@
 
 #include <nanobind/nanobind.h>
 
+#include "grammar/grammar_rules.h"
+#include "grammar/parse_tables.h"
 #include "host/hosted.h"
-#include "neighbours/optpgen/grammar_rules.h"
-#include "neighbours/optpgen/parse_tables.h"
 #include "neighbours/optpgen/token_labels.h"
 
 namespace codeloom {

@@ -10,8 +10,8 @@
 
 #include <nanobind/nanobind.h>
 
-#include "neighbours/optpgen/grammar_rules.h"
-#include "neighbours/optpgen/parse_tables.h"
+#include "grammar/grammar_rules.h"
+#include "grammar/parse_tables.h"
 
 namespace nb = nanobind;
 

@@ -5,8 +5,8 @@
 #include <charconv>
 
 #include "host/text.h"
-#include "neighbours/tokenizer/unicode_names.h"
 #include "strutils/utf8.h"
+#include "text/unicode_names.h"
 
 namespace codeloom {
 

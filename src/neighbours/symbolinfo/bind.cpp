@@ -6,11 +6,13 @@
 #include "host/binding.h"
 #include "host/collections.h"
 #include "host/text.h"
+#include "names/encode_literal.h"
+#include "names/join_tokens.h"
 #include "neighbours/bind.h"
 #include "neighbours/symbolinfo/info_bytes.h"
-#include "neighbours/symbolinfo/join_tokens.h"
 #include "neighbours/symbolinfo/nested_text.h"
 #include "strutils/arguments.h"
+#include "symbolinfo/constants_by_name.h"
 #include "symbolinfo/kind_filter.h"
 #include "symbolinfo/vocabulary.h"
 
@@ -18,48 +20,15 @@ namespace codeloom {
 
 namespace {
 
-nb::object BytesOf(std::string_view text) {
-    return nb::bytes(text.data(), text.size());
-}
-
-nb::object IntegerOf(char byte) {
-    return nb::int_(static_cast<int>(static_cast<unsigned char>(byte)));
-}
-
 // The table as a tuple of tuples, for those who read records.
 nb::tuple RecordKinds() {
     return MakeTuple(kRecordKinds.size(), [](Py_ssize_t i) -> nb::object {
         const CRecordKind& kind = kRecordKinds[static_cast<size_t>(i)];
-        return nb::make_tuple(TextFromUtf8(kind.name), BytesOf(kind.prefix), IntegerOf(kind.kind),
+        return nb::make_tuple(TextFromUtf8(kind.name), BytesFromUtf8(kind.prefix),
+                              nb::int_(static_cast<int>(static_cast<unsigned char>(kind.kind))),
                               TextFromUtf8(kind.word), TextFromUtf8(kind.payload), TextFromUtf8(kind.meaning),
                               TextFromUtf8(kind.source), TextFromUtf8(kind.example));
     });
-}
-
-// The constants by name: the prefixes and kinds, then all others.
-nb::dict SymbolConstants() {
-    nb::dict constants;
-    for (const CRecordKind& kind : kRecordKinds) {
-        const std::string name = "k" + std::string(kind.name);
-        const bool is_plain = kind.kind == kPlainEquivKind;
-        constants[(name + (is_plain ? "Spec" : "Prefix")).c_str()] = BytesOf(kind.prefix);
-        constants[(name + "Kind").c_str()] = IntegerOf(kind.kind);
-    }
-    constants["kPrefixLen"] = kPrefixLen;
-    constants["kIterationSubscript"] = BytesOf(kIterationSubscript);
-    constants["kClassInstanceSuffix"] = BytesOf(kClassInstanceSuffix);
-    constants["kScopeIndexSep"] = TextFromUtf8(kScopeIndexSep);
-    constants["kModuleScopeName"] = TextFromUtf8(kModuleScopeName);
-    constants["kWildcardScope"] = TextFromUtf8(kWildcardScope);
-    constants["kDefLineScopeName"] = TextFromUtf8(kDefLineScopeName);
-    constants["_kDotLineScopeName"] = TextFromUtf8(_kDotLineScopeName);
-    constants["kTypingModuleSymbol"] = BytesOf(kTypingModuleSymbol);
-    constants["kTypingModuleSymbolDot"] = BytesOf(kTypingModuleSymbolDot);
-    constants["kTypingModuleSymbolDotAny"] = BytesOf(kTypingModuleSymbolDotAny);
-    constants["kTypingModuleSymbolStr"] = TextFromUtf8(kTypingModuleSymbol);
-    constants["kTypingModuleSymbolDotStr"] = TextFromUtf8(kTypingModuleSymbolDot);
-    constants["kTypingModuleSymbolDotAnyStr"] = TextFromUtf8(kTypingModuleSymbolDotAny);
-    return constants;
 }
 
 void BindVocabulary(nb::module_& module) {
@@ -68,7 +37,7 @@ void BindVocabulary(nb::module_& module) {
         nb::sig("def _RecordKinds() -> tuple[tuple[str, bytes, int, str, str, str, str, str], ...]"),
         "The kinds of records: name, prefix, kind, word, form of the payload, meaning, a line of source\n"
         "and the record that it yields.");
-    module.def("_SymbolConstants", &SymbolConstants,
+    module.def("_SymbolConstants", &ConstantsByName,
                nb::sig("def _SymbolConstants() -> dict[str, typing.Any]"),
                "The constants of the vocabulary by name.");
 }
@@ -91,14 +60,14 @@ Py_ssize_t HostNextIndex(const CUtf8Argument& utf8_ptr, Py_ssize_t pos, Py_ssize
 
 nb::object HostEncodeStringLiteral(const CUtf8Argument& text) {
     std::string storage;
-    return BytesOf(EncodeStringLiteral(text.text, storage));
+    return BytesFromUtf8(EncodeStringLiteral(text.text, storage));
 }
 
 nb::object HostJoinTokens(nb::handle tokens) {
     const nb::list kept(nb::borrow(tokens));
     const std::vector<CUtf8> texts(kept.begin(), kept.end());
     const std::vector<std::string_view> views(texts.begin(), texts.end());
-    return BytesOf(JoinTokens(views));
+    return BytesFromUtf8(JoinTokens(views));
 }
 
 void BindRecordFunctions(nb::module_& module) {

@@ -16,11 +16,6 @@ namespace codeloom {
 // TypeError when `text` is neither a string nor none.
 nb::object BuildLiteralInfo(std::string_view type_name, nb::handle text);
 
-// The text of a string literal with its prefix and quotes on one row: what ends rows is written as an escape,
-// and a continued row is joined. So the value is the same, but for raw strings, which have no escapes. The
-// result is `text` itself where nothing ends rows, otherwise it lies in `storage`.
-std::string_view EncodeStringLiteral(std::string_view text, std::string& storage);
-
 // A scope with an index behind every name: "A#1.f" gives "A#1.f#0". Wildcards and the names of def line
 // scopes have none, and neither has the module's scope.
 std::string EnsureScopeNameIndicies(std::string_view scope);

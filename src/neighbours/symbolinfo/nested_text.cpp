@@ -4,7 +4,7 @@
 #include <string_view>
 
 #include "neighbours/fastaccess/string_end.h"
-#include "neighbours/tokenizer/char_class.h"
+#include "text/char_class.h"
 
 namespace codeloom {
 

@@ -1,0 +1,83 @@
+// Runs of bytes: how far blanks, names, strings and rows go. They are most of a text, so they are looked at
+// eight bytes at a time where that is less work.
+#pragma once
+
+#include <bit>
+#include <cstddef>
+#include <cstdint>
+#include <cstring>
+#include <string_view>
+
+#include "text/char_class.h"
+
+namespace codeloom {
+
+namespace scan {
+
+inline constexpr size_t kStep = 8;
+inline constexpr uint64_t kEachByte = 0x0101010101010101u;
+inline constexpr uint64_t kHighBits = kEachByte << 7;
+
+// The bytes from `pos` on, the first one lowest. Requires eight bytes there.
+inline uint64_t Load(std::string_view text, size_t pos) {
+    uint64_t bytes;
+    std::memcpy(&bytes, text.data() + pos, kStep);
+    if constexpr (std::endian::native == std::endian::big) bytes = __builtin_bswap64(bytes);
+    return bytes;
+}
+
+// The index of the lowest byte that isn't zero. Requires one.
+inline size_t FirstByte(uint64_t bytes) {
+    return static_cast<size_t>(std::countr_zero(bytes)) / 8;
+}
+
+}  // namespace scan
+
+// The first position from `pos` on whose byte has the trait, or hasn't.
+template <EByteTrait trait, bool has>
+inline size_t FindByte(std::string_view text, size_t pos) {
+    for (; pos + scan::kStep <= text.size(); pos += scan::kStep) {
+        for (size_t i = 0; i < scan::kStep; ++i) {
+            if (HasTrait(text[pos + i], trait) == has) return pos + i;
+        }
+    }
+    while (pos < text.size() && HasTrait(text[pos], trait) != has) ++pos;
+    return pos;
+}
+
+// The end of the ASCII name at `pos`.
+inline size_t SkipNameBytes(std::string_view text, size_t pos) {
+    return FindByte<kContinuesName, false>(text, pos);
+}
+
+// The first position from `pos` on that is no space.
+inline size_t SkipSpaces(std::string_view text, size_t pos) {
+    constexpr uint64_t kSpaces = ' ' * scan::kEachByte;
+    for (; pos + scan::kStep <= text.size(); pos += scan::kStep) {
+        const uint64_t others = scan::Load(text, pos) ^ kSpaces;
+        if (others != 0) return pos + scan::FirstByte(others);
+    }
+    while (pos < text.size() && text[pos] == ' ') ++pos;
+    return pos;
+}
+
+// The end of the row that holds `pos`, its row end left out.
+inline size_t FindRowEnd(std::string_view text, size_t pos) {
+    // Row ends are among the lowest bytes, which are rare in text.
+    constexpr uint64_t kBehindRowEnds = ('\r' + 1) * scan::kEachByte;
+    while (pos + scan::kStep <= text.size()) {
+        const uint64_t bytes = scan::Load(text, pos);
+        const uint64_t low = (bytes - kBehindRowEnds) & ~bytes & scan::kHighBits;
+        if (low == 0) {
+            pos += scan::kStep;
+            continue;
+        }
+        pos += scan::FirstByte(low);
+        if (IsRowEnd(text[pos])) return pos;
+        ++pos;
+    }
+    while (pos < text.size() && !IsRowEnd(text[pos])) ++pos;
+    return pos;
+}
+
+}  // namespace codeloom
