@@ -1,0 +1,56 @@
+// file/: a text through the whole road in one pass.
+//   in     UTF-8 bytes, settings, and what of them was no text
+//   out    a CFileAnalysis: problems, lines, records and limits, each with the bytes of the text it is about
+//   keeps  nothing
+//   start  at AnalyzeFile in file/file_analyzer.h
+#pragma once
+
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "line/line_analyzer.h"
+#include "names/records.h"
+#include "rules/problem.h"
+#include "syntax/language.h"
+#include "tokenizer/logical_types.h"
+
+namespace codeloom {
+
+struct CFileSettings {
+    int version = CLanguage::kNewest;
+    bool false_hints = false;  // take all that looks like a type hint for one
+    bool wants_records = true;
+};
+
+// A logical line: from its first token to the end of its last one, a comment at its end included.
+struct CLine {
+    uint32_t start = 0;
+    uint32_t end = 0;
+    uint32_t first_record = 0;  // up to the first record of the next line
+    ELogicalType type = ELogicalType::kUnknown;
+};
+
+// A line whose walk ended early; it has the records that were found before.
+struct CLineLimit {
+    uint32_t line = 0;
+    ELimit limit = ELimit::kNone;
+};
+
+struct CFileAnalysis {
+    CProblems problems;  // by their place
+    std::vector<CLine> lines;
+    CRecords records;  // empty unless the settings ask for them
+    std::vector<CLineLimit> limits;
+
+    // The records of a line are those from FirstRecord(line_i) up to FirstRecord(line_i + 1).
+    uint32_t FirstRecord(size_t line_i) const {
+        return line_i < lines.size() ? lines[line_i].first_record
+                                     : static_cast<uint32_t>(records.records.size());
+    }
+    uint32_t LineOfRecord(uint32_t record_i) const;
+    // The problems of a line are those from FirstProblem(line_i) up to FirstProblem(line_i + 1).
+    uint32_t FirstProblem(size_t line_i) const;
+};
+
+}  // namespace codeloom

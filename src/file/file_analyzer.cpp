@@ -1,0 +1,181 @@
+#include "file/file_analyzer.h"
+
+#include <algorithm>
+#include <cassert>
+#include <optional>
+
+#include "file/method_hints.h"
+#include "line/fault_words.h"
+#include "line/line_length.h"
+#include "rules/text_checker.h"
+#include "syntax/forms.h"
+#include "tokenizer/tokenizer.h"
+#include "typing/false_hints.h"
+
+namespace codeloom {
+
+namespace {
+
+// More room than a line's own records need, for `items` that grow with the share of the text that is read. So
+// what lies unused at the end is little, where doubling could leave half.
+template <class Items>
+void MakeRoom(Items& items, size_t for_line, size_t read, size_t text_size) {
+    if (items.capacity() - items.size() >= for_line) return;
+    const double share = static_cast<double>(text_size) / static_cast<double>(std::max<size_t>(read, 1));
+    const size_t expected =
+        static_cast<size_t>(static_cast<double>(items.size()) * std::min(share, 2.0) * 1.05);
+    items.reserve(std::max(expected, items.size() + items.size() / 4) + 2 * for_line);
+}
+
+bool ImportsPrintFunction(const CRawLogical& logical) {
+    if (logical.type != ELogicalType::kFromImport) return false;
+    bool is_from_future = false;
+    for (const CRawToken& token : logical.tokens) {
+        if (token.type != kTokenId_NAME) continue;
+        const std::string_view name = logical.Text(token);
+        is_from_future |= name == "__future__";
+        if (is_from_future && name == "print_function") return true;
+    }
+    return false;
+}
+
+ECode CodeOf(const CFault& fault, const CRawLogical& logical) {
+    const ELogicalType part = PartAtFault(fault, logical).type;
+    if (fault.kind == EFault::kNewerForm)
+        return fault.form->version == CForm::kNone ? ECode::kEndedForm : ECode::kNewerForm;
+    const bool is_hint = fault.kind == EFault::kInvalidHint || part == ELogicalType::kStringifiedTypeHint ||
+                         part == ELogicalType::kCommentedTypeHint;
+    return is_hint ? ECode::kInvalidHint : ECode::kInvalidSyntax;
+}
+
+// One analysis of one text.
+class CFileAnalyzer {
+  public:
+    CFileAnalyzer(std::string_view text, const CFileSettings& settings, const CUnreadable& unreadable)
+        : _fText(text),
+          _fSettings(settings),
+          _fUnreadable(unreadable),
+          _fLength(text.size()),
+          _fFalseHints(text),
+          _fChecker(LanguageOf(settings.version), _fResult.problems) {
+        _fAnalyzer.emplace(LanguageOf(settings.version));
+    }
+
+    CFileAnalysis Run();
+
+  private:
+    void _AnalyzeLine(const CRawLogical& logical);
+    CLineResult _Analyze(const CRawLogical& logical, const CLine& line);
+    void _AddUnreadable();
+    void _AddFault(const CRawLogical& logical, const CFault& fault);
+    void _AddProblem(ECode code, uint32_t start, uint32_t end, std::string message);
+    bool _IsUnreadable(const CLine& line) const;
+
+    std::string_view _fText;
+    const CFileSettings& _fSettings;
+    const CUnreadable& _fUnreadable;
+    CLengthLimits _fLength;
+    CFalseHints _fFalseHints;
+    std::optional<CLineAnalyzer> _fAnalyzer;
+    CFileAnalysis _fResult;
+    CTextChecker _fChecker;
+};
+
+CFileAnalysis CFileAnalyzer::Run() {
+    CTokenizer tokenizer(_fText);
+    CRawLogical logical;
+    while (tokenizer.NextLogical(logical)) _AnalyzeLine(logical);
+    _fChecker.Finish();
+    _AddUnreadable();
+    std::stable_sort(_fResult.problems.begin(), _fResult.problems.end(),
+                     [](const CProblem& one, const CProblem& other) { return one.start < other.start; });
+    return std::move(_fResult);
+}
+
+void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
+    assert(!logical.tokens.empty());
+    const auto first_record = static_cast<uint32_t>(_fResult.records.records.size());
+    const CLine line = {logical.StartOf(logical.tokens.front()), logical.EndOf(logical.tokens.back()),
+                        first_record, logical.type};
+    MakeRoom(_fResult.lines, 1, line.start, _fText.size());
+    _fResult.lines.push_back(line);
+    if (_fSettings.version < 300 && ImportsPrintFunction(logical))
+        _fAnalyzer.emplace(LanguageOf(_fSettings.version, true));
+
+    _fChecker.Enter(logical);
+    if (const ETooLong too_long = _fLength.Take(logical); too_long != ETooLong::kNot) [[unlikely]] {
+        _fChecker.Leave(logical, true);
+        const CRawToken& first = logical.tokens.front();
+        return _AddProblem(ECode::kLineTooLong, logical.StartOf(first), logical.EndOf(first),
+                           CLengthLimits::Message(too_long, logical));
+    }
+    const CLineResult result = _Analyze(logical, line);
+    _fChecker.Leave(logical, static_cast<bool>(result.fault));
+    if (result.fault) {
+        if (!_IsUnreadable(line)) _AddFault(logical, result.fault);
+        return;
+    }
+    if (result.limit != ELimit::kNone)
+        _fResult.limits.push_back({static_cast<uint32_t>(_fResult.lines.size() - 1), result.limit});
+    if (_fSettings.wants_records) LeaveSelfOut(logical, _fResult.records, line.first_record);
+}
+
+CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical, const CLine& line) {
+    CRecords* const records = _fSettings.wants_records ? &_fResult.records : nullptr;
+    if (records != nullptr) {
+        MakeRoom(records->records, logical.tokens.size(), line.start, _fText.size());
+        MakeRoom(records->values, line.end - line.start, line.start, _fText.size());
+    }
+    return _fAnalyzer->Analyze(logical, {.in_async_def = logical.in_async_def,
+                                         .first_in_def = logical.first_in_def,
+                                         .records = records,
+                                         .false_hints = _fSettings.false_hints ? nullptr : &_fFalseHints,
+                                         .observer = &_fChecker});
+}
+
+void CFileAnalyzer::_AddFault(const CRawLogical& logical, const CFault& fault) {
+    // `except A, a.b:` binds what isn't a name; in Python 2 that is sound.
+    if (fault.kind == EFault::kExceptTarget && _fSettings.version < 300) return;
+    const CSpan place = PlaceOf(fault, logical);
+    _AddProblem(CodeOf(fault, logical), place.start, place.end, MessageOf(fault, logical));
+}
+
+void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::string message) {
+    _fResult.problems.push_back({code, start, end, std::move(message), {}, {}});
+}
+
+void CFileAnalyzer::_AddUnreadable() {
+    for (const CUnreadable::CFault& fault : _fUnreadable.faults)
+        _AddProblem(ECode::kUnreadable, fault.start, fault.end, fault.message);
+}
+
+bool CFileAnalyzer::_IsUnreadable(const CLine& line) const {
+    const std::vector<uint32_t>& offsets = _fUnreadable.offsets;
+    const auto next = std::lower_bound(offsets.begin(), offsets.end(), line.start);
+    return next != offsets.end() && *next < line.end;
+}
+
+}  // namespace
+
+uint32_t CFileAnalysis::LineOfRecord(uint32_t record_i) const {
+    const auto next = std::upper_bound(lines.begin(), lines.end(), record_i,
+                                       [](uint32_t i, const CLine& line) { return i < line.first_record; });
+    return static_cast<uint32_t>(next - lines.begin()) - 1;
+}
+
+uint32_t CFileAnalysis::FirstProblem(size_t line_i) const {
+    if (line_i >= lines.size()) return static_cast<uint32_t>(problems.size());
+    const uint32_t start = line_i == 0 ? 0 : lines[line_i].start;
+    const auto first =
+        std::lower_bound(problems.begin(), problems.end(), start,
+                         [](const CProblem& problem, uint32_t offset) { return problem.start < offset; });
+    return static_cast<uint32_t>(first - problems.begin());
+}
+
+CFileAnalysis AnalyzeFile(std::string_view text, const CFileSettings& settings,
+                          const CUnreadable& unreadable) {
+    assert(text.size() <= kMaxTextSize);
+    return CFileAnalyzer(text, settings, unreadable).Run();
+}
+
+}  // namespace codeloom

@@ -1,0 +1,55 @@
+// The forms of the language that not every version has.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace codeloom {
+
+struct CForm {
+    static constexpr int kNone = INT32_MAX;
+
+    const char* name;
+    int version;  // the first that has it, 312 for 3.12; kNone for what ended with Python 2
+};
+
+namespace forms {
+
+inline constexpr CForm kFString{"an f-string", 306};
+inline constexpr CForm kVariableAnnotation{"an annotation of a variable", 306};
+inline constexpr CForm kWalrus{"`:=`", 308};
+inline constexpr CForm kStarInResult{"a starred expression without brackets behind `return` or `yield`", 308};
+inline constexpr CForm kPositionalOnly{"`/` among parameters", 308};
+inline constexpr CForm kDecorator{"a decorator that is no name or call of one", 309};
+inline constexpr CForm kWithBrackets{"a `with` whose items stand in brackets", 309};
+inline constexpr CForm kStarInFor{"a starred expression in the list of a `for`", 309};
+inline constexpr CForm kWalrusInSet{"`:=` without brackets of its own in a set", 309};
+inline constexpr CForm kMatch{"`match`", 310};
+inline constexpr CForm kCase{"`case`", 310};
+inline constexpr CForm kWalrusInSubscript{"`:=` without brackets of its own in a subscript", 310};
+inline constexpr CForm kExceptStar{"`except*`", 311};
+inline constexpr CForm kStarInSubscript{"a starred expression in a subscript", 311};
+inline constexpr CForm kStarredAnnotation{"a starred annotation", 311};
+inline constexpr CForm kTypeAlias{"`type`", 312};
+inline constexpr CForm kTypeParameters{"a list of type parameters", 312};
+inline constexpr CForm kTypeDefault{"a default of a type parameter", 313};
+inline constexpr CForm kBareExcept{"an `except` of several types without brackets", 314};
+inline constexpr CForm kTString{"a t-string", 314};
+
+inline constexpr CForm kOldOctal{"an octal number without `0o`", CForm::kNone};
+inline constexpr CForm kLongNumber{"the suffix `L` of a number", CForm::kNone};
+inline constexpr CForm kRawUnicode{"the prefix `ur` of a string", CForm::kNone};
+
+}  // namespace forms
+
+// "`type` needs Python 3.12", "the suffix `L` of a number ended with Python 2"
+std::string MessageOf(const CForm& form);
+
+// The form that the text of a string literal has; null for one that has always been.
+const CForm* FormOfString(std::string_view text);
+
+// The form that the text of a number has; null for one that every version has.
+const CForm* FormOfNumber(std::string_view text);
+
+}  // namespace codeloom
