@@ -1,0 +1,331 @@
+#include "rules/blocks.h"
+
+#include <algorithm>
+#include <string>
+#include <utility>
+
+#include "text/char_class.h"
+
+namespace codeloom {
+
+namespace {
+
+constexpr int32_t kTabSize = 8;
+
+CIndent MeasureIndent(std::string_view blanks) {
+    CIndent indent;
+    for (const char c : blanks) {
+        if (c == ' ') {
+            ++indent.column;
+            ++indent.alt_column;
+        } else if (c == '\t') {
+            indent.column = (indent.column / kTabSize + 1) * kTabSize;
+            ++indent.alt_column;
+        } else if (c == '\f') {
+            indent = {};
+        }
+    }
+    return indent;
+}
+
+std::string Quoted(std::string_view keyword) {
+    return std::string("'").append(keyword).append("'");
+}
+
+bool IsHandler(EClause clause) {
+    return clause == EClause::kExcept || clause == EClause::kBareExcept || clause == EClause::kExceptStar;
+}
+
+bool IsLoop(EClause clause) {
+    return clause == EClause::kFor || clause == EClause::kAsyncFor || clause == EClause::kWhile;
+}
+
+// A clause that goes on with a statement before it.
+bool IsContinuation(EClause clause) {
+    return IsHandler(clause) || clause == EClause::kElif || clause == EClause::kElse ||
+           clause == EClause::kFinally;
+}
+
+bool IsDefinition(EClause clause) {
+    return clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass ||
+           clause == EClause::kDecorator;
+}
+
+// What a clause goes on with, for a message.
+std::string_view WhatComesBefore(EClause clause) {
+    if (clause == EClause::kElif) return "'if'";
+    if (clause == EClause::kElse) return "'if', 'for', 'while' or 'try'";
+    return "'try'";
+}
+
+}  // namespace
+
+void CBlockTracker::Enter(const CRawLogical& logical) {
+    _fHead = ReadStatementHead(logical);
+    _fHasPlaceProblem = false;
+    const CRawToken& first = logical.tokens.front();
+    const uint32_t token_start = logical.StartOf(first);
+    const uint32_t row_start = token_start - static_cast<uint32_t>(first.position.col);
+    const std::string_view before = logical.file_text.substr(row_start, token_start - row_start);
+    _fIsMidRow = std::any_of(before.begin(), before.end(), [](char c) { return !IsBlank(c); });
+    if (!_fIsMidRow) _Place(MeasureIndent(before));
+}
+
+void CBlockTracker::_Place(const CIndent& indent) {
+    CBlock& top = _Top();
+    if (_fOpensBlock && indent.column > top.header_depth) {
+        const bool has_mixed_tabs = !_CheckTabs(indent);
+        _Open(indent, top.previous.clause, _fPreviousHasFault);
+        _Top().has_mixed_tabs = has_mixed_tabs;
+        return;
+    }
+    if (_fOpensBlock && !_fPreviousHasFault) {
+        _ReportMissingBlock(_fHead.start, _fHead.end);
+        top.lacks_block = true;
+        top.lacking_clause = top.previous.clause;
+        top.is_depth_in_doubt |= top.is_first;
+    }
+    if (indent.column > top.indent.column) return _PlaceDeeper(indent);
+    if (indent.column < top.indent.column) return _PlaceOut(indent);
+    _CheckTabs(indent);
+}
+
+void CBlockTracker::_PlaceDeeper(const CIndent& indent) {
+    CBlock& top = _Top();
+    if (top.lacks_block) {
+        top.lacks_block = false;
+        return _Open(indent, top.lacking_clause, false);
+    }
+    if (_fPreviousHasFault) return _Open(indent, EClause::kSimple, true);
+    if (!_fHasPlaceProblem) _Report(ECode::kUnexpectedIndent, _fHead.start, _fHead.end, "unexpected indent");
+    _fHasPlaceProblem = true;
+    _OpenOdd(indent);
+}
+
+// A block that no header opens: that of the same depth which was left last, since a line between may have
+// lost its indentation, or an unknown one.
+void CBlockTracker::_OpenOdd(const CIndent& indent) {
+    CBlock& top = _Top();
+    top.may_follow_anything = true;
+    const int32_t header_depth = top.indent.column;
+    const auto closed = std::find_if(_fClosed.rbegin(), _fClosed.rend(), [&](const CBlock& block) {
+        return block.indent.column == indent.column;
+    });
+    if (closed != _fClosed.rend() && indent.column > header_depth) {
+        CBlock reopened = *closed;
+        reopened.may_follow_anything = true;
+        reopened.is_unknown = true;
+        reopened.header_depth = header_depth;
+        _fBlocks.push_back(std::move(reopened));
+        return;
+    }
+    _Open(indent, EClause::kSimple, true);
+    _Top().header_depth = header_depth;
+}
+
+void CBlockTracker::_PlaceOut(const CIndent& indent) {
+    size_t count = _fBlocks.size();
+    while (_fBlocks[count - 1].indent.column > indent.column) --count;
+    if (_fBlocks[count - 1].indent.column == indent.column) {
+        _CloseTo(count);
+        _CheckTabs(indent);
+        return;
+    }
+    // Between the depths of two blocks: taken for the inner one's.
+    _CloseTo(count + 1);
+    CBlock& inner = _Top();
+    if (inner.odd_column == indent.column) return;
+    if (std::exchange(inner.is_depth_in_doubt, false)) {
+        inner.indent = indent;
+        inner.header_depth = indent.column;
+        return;
+    }
+    if (!_fHasPlaceProblem && !_fPreviousHasFault) {
+        _DropPlacementSince(inner.header.start);
+        _Report(ECode::kUnknownDedent, _fHead.start, _fHead.end,
+                "unindent does not match any outer indentation level");
+    }
+    _fHasPlaceProblem = true;
+    inner.odd_column = indent.column;
+    inner.header_depth = std::min(inner.header_depth, indent.column);
+    inner.may_follow_anything = true;
+}
+
+void CBlockTracker::_Open(const CIndent& indent, EClause clause, bool is_unknown) {
+    CBlock block;
+    block.indent = indent;
+    block.header_depth = indent.column;
+    block.clause = clause;
+    block.is_unknown = is_unknown;
+    block.header = _Top().previous;
+    block.has_mixed_tabs = _Top().has_mixed_tabs;
+    block.is_depth_in_doubt = _fPreviousHasFault || _Top().lacks_block;
+    _fBlocks.push_back(std::move(block));
+    if (_fBlocks.size() > kMostIndents && !std::exchange(_fHasTooMany, true))
+        _Report(ECode::kTooManyIndents, _fHead.start, _fHead.end, "too many levels of indentation");
+}
+
+void CBlockTracker::_CloseTo(size_t count) {
+    while (_fBlocks.size() > count) {
+        _CheckPending(_Top(), _fHead.start, _fHead.end);
+        if (_fClosed.size() < _fBlocks.size()) _fClosed.resize(_fBlocks.size());
+        _fClosed[_fBlocks.size() - 1] = std::move(_fBlocks.back());
+        _fBlocks.pop_back();
+    }
+}
+
+void CBlockTracker::_ReportMissingBlock(uint32_t start, uint32_t end) {
+    const CStatementHead& header = _Top().previous;
+    std::string message = "expected an indented block after ";
+    message += NameOfStatement(header.clause);
+    CProblem& problem = _Report(ECode::kExpectedBlock, start, end, std::move(message));
+    problem.related.push_back({header.start, header.end, "the header that lacks its block"});
+    _fHasPlaceProblem = true;
+}
+
+// False where tabs and blanks disagree about how deep the line lies. Reported once a block.
+bool CBlockTracker::_CheckTabs(const CIndent& indent) {
+    CBlock& block = _Top();
+    const CIndent& other = block.indent;
+    const bool agrees = indent.column == other.column ? indent.alt_column == other.alt_column
+                                                      : indent.alt_column > other.alt_column;
+    if (agrees || block.has_mixed_tabs || _fHasPlaceProblem || _fPreviousHasFault) return agrees;
+    _Report(ECode::kMixedTabs, _fHead.start, _fHead.end,
+            "inconsistent use of tabs and spaces in indentation");
+    block.has_mixed_tabs = true;
+    return false;
+}
+
+// A `try` or a decorator that the end of its block leaves without what belongs to it.
+void CBlockTracker::_CheckPending(CBlock& block, uint32_t start, uint32_t end) {
+    const CStatementHead previous = std::exchange(block.previous, CStatementHead());
+    if (block.may_follow_anything || block.is_unknown || _fHasPlaceProblem) return;
+    if (previous.clause == EClause::kTry) {
+        CProblem& problem =
+            _Report(ECode::kTryWithoutHandler, start, end, "expected 'except' or 'finally' block");
+        problem.related.push_back({previous.start, previous.end, "the 'try' that lacks its handler"});
+        _fHasPlaceProblem = true;
+    } else if (previous.clause == EClause::kDecorator) {
+        CProblem& problem = _Report(ECode::kDecoratorWithoutDefinition, start, end,
+                                    "expected a function or class definition after the decorator");
+        problem.related.push_back({previous.start, previous.end, "the decorator"});
+        _fHasPlaceProblem = true;
+    }
+}
+
+void CBlockTracker::Leave(bool has_fault) {
+    CBlock& block = _Top();
+    if (!has_fault && !_fHasPlaceProblem) {
+        const size_t problem_count = _fProblems.size();
+        _CheckClause(block);
+        has_fault = _fProblems.size() > problem_count;
+    }
+    if (has_fault || _fHasPlaceProblem) {
+        for (CBlock& around : _fBlocks) around.may_follow_anything = around.is_in_doubt = true;
+    } else if (IsDefinition(_fHead.clause)) {
+        for (CBlock& around : _fBlocks) around.is_in_doubt = false;
+    }
+    if (_fIsMidRow) {
+        _fPreviousHasFault |= has_fault;
+        return;
+    }
+    if (_fHead.clause == EClause::kTry) block.bare_except_start = block.bare_except_end = 0;
+    if (_fHead.clause == EClause::kBareExcept) {
+        block.bare_except_start = _fHead.start;
+        block.bare_except_end = _fHead.end;
+    }
+    if (_fHead.clause == EClause::kElse) block.is_of_try = IsHandler(block.previous.clause);
+    block.is_first = block.is_empty;
+    block.is_empty = false;
+    block.previous = _fHead;
+    block.may_follow_anything = has_fault || (_fHasPlaceProblem && !_fHead.IsHeader());
+    if (_fHead.IsHeader() && !_fHasPlaceProblem) block.lacks_block = false;
+    _fPreviousHasFault = has_fault;
+    _fOpensBlock = _fHead.ends_in_colon || (has_fault && _fHead.IsHeader());
+    if (!_fHead.IsHeader() && !has_fault) _fOpensBlock = false;
+}
+
+void CBlockTracker::_CheckClause(CBlock& block) {
+    const EClause clause = _fHead.clause;
+    const EClause before = block.previous.clause;
+    if (_fIsMidRow || block.may_follow_anything) return;
+    if (block.clause == EClause::kMatch && !block.is_unknown && clause != EClause::kCase) {
+        CProblem& problem = _Report(ECode::kStatementInMatch, _fHead.start, _fHead.end,
+                                    "expected a 'case' block in the 'match' statement");
+        problem.related.push_back({block.header.start, block.header.end, "the 'match' statement"});
+        return;
+    }
+    if (clause == EClause::kCase && block.clause != EClause::kMatch && !block.is_unknown) {
+        _Report(ECode::kCaseOutsideMatch, _fHead.start, _fHead.end, "'case' outside a 'match' statement");
+        return;
+    }
+    if (before == EClause::kDecorator && !IsDefinition(clause))
+        return _CheckPending(block, _fHead.start, _fHead.end);
+    const bool ends_try = IsHandler(clause) || clause == EClause::kFinally;
+    if (before == EClause::kTry && !ends_try) return _CheckPending(block, _fHead.start, _fHead.end);
+    if (!IsContinuation(clause)) return;
+    if (!_MayFollow(block, clause)) {
+        std::string message = Quoted(KeywordOf(clause));
+        message += " without a matching ";
+        message += WhatComesBefore(clause);
+        _Report(ECode::kClauseWithoutStatement, _fHead.start, _fHead.end, std::move(message));
+    } else if (IsHandler(clause)) {
+        _CheckExcept(block);
+    }
+}
+
+bool CBlockTracker::_MayFollow(const CBlock& block, EClause clause) const {
+    const EClause before = block.previous.clause;
+    switch (clause) {
+        case EClause::kElif:
+            return before == EClause::kIf || before == EClause::kElif;
+        case EClause::kElse:
+            return before == EClause::kIf || before == EClause::kElif || IsLoop(before) || IsHandler(before);
+        case EClause::kFinally:
+            return before == EClause::kTry || IsHandler(before) ||
+                   (before == EClause::kElse && block.is_of_try);
+        default:
+            return before == EClause::kTry || IsHandler(before);
+    }
+}
+
+void CBlockTracker::_CheckExcept(CBlock& block) {
+    const EClause before = block.previous.clause;
+    if (!IsHandler(before)) return;
+    if ((before == EClause::kExceptStar) != (_fHead.clause == EClause::kExceptStar)) {
+        CProblem& problem = _Report(ECode::kMixedExceptKinds, _fHead.start, _fHead.end,
+                                    "cannot have both 'except' and 'except*' on the same 'try'");
+        problem.related.push_back({block.previous.start, block.previous.end, "the other kind"});
+    } else if (block.bare_except_end > block.bare_except_start) {
+        CProblem& problem = _Report(ECode::kBareExceptNotLast, block.bare_except_start, block.bare_except_end,
+                                    "default 'except:' must be last");
+        problem.related.push_back({_fHead.start, _fHead.end, "a handler after it"});
+        block.bare_except_start = block.bare_except_end;
+    }
+}
+
+void CBlockTracker::Finish(uint32_t end) {
+    _fHead = CStatementHead();
+    _fHasPlaceProblem = false;
+    if (_fOpensBlock && !_fPreviousHasFault) _ReportMissingBlock(end, end);
+    for (size_t i = _fBlocks.size(); i-- > 0;) _CheckPending(_fBlocks[i], end, end);
+}
+
+bool CBlockTracker::IsInDoubt() const {
+    return std::any_of(_fBlocks.begin(), _fBlocks.end(), [](const CBlock& block) {
+        return block.is_unknown || block.lacks_block || block.is_in_doubt;
+    });
+}
+
+// A header that was moved out of its block is what statements in it were blamed for.
+void CBlockTracker::_DropPlacementSince(uint32_t start) {
+    while (!_fProblems.empty() && IsPlacement(_fProblems.back().code) && _fProblems.back().start >= start)
+        _fProblems.pop_back();
+}
+
+CProblem& CBlockTracker::_Report(ECode code, uint32_t start, uint32_t end, std::string message) {
+    _fProblems.push_back({code, start, end, std::move(message), {}, {}});
+    return _fProblems.back();
+}
+
+}  // namespace codeloom

@@ -1,0 +1,104 @@
+// The blocks around each logical line, by indentation, and what is wrong with them.
+//
+// A line at an odd depth is taken as it stands, so that the rows after it aren't blamed:
+//   deeper than its block, after no header    it opens a block of unknown kind, or the one last left at this
+//   depth between two known depths                  it belongs to the inner of the two, whose odd depth is
+//   remembered no deeper than its header                 it belongs to the block around the header; deeper
+//   rows after it
+//                                             are the block that was missing
+// A line with a fault may have been any header: what is deeper belongs to it, and any clause may follow it.
+#pragma once
+
+#include <cstdint>
+#include <vector>
+
+#include "rules/problem.h"
+#include "rules/statement_head.h"
+#include "tokenizer/raw_logical.h"
+
+namespace codeloom {
+
+// Columns of an indentation as the interpreter counts them: tabs to the next multiple of eight, and tabs as
+// one column. Both must agree about what is deeper.
+struct CIndent {
+    int32_t column = 0;
+    int32_t alt_column = 0;
+};
+
+struct CBlock {
+    CIndent indent;
+    int32_t odd_column = -1;   // of lines in it that were dedented to no known depth
+    int32_t header_depth = 0;  // deeper than this is within a header that stands in this block
+    EClause clause =
+        EClause::kSimple;            // of the header; kSimple for the module, and where the header is unknown
+    bool is_unknown = false;         // nothing can be said of its header
+    bool is_depth_in_doubt = false;  // its first line may have been moved
+    bool has_mixed_tabs = false;     // reported once
+    CStatementHead header;
+
+    // The statement before, among those directly in the block.
+    CStatementHead previous;
+    bool may_follow_anything = false;  // the statement before is broken, or lost
+    bool is_empty = true;              // no statement yet
+    bool is_first = false;             // the statement before is its first one
+    bool is_in_doubt = false;          // a fault may have moved what is around it
+    bool lacks_block = false;          // a header before has no block yet
+    bool is_of_try = false;            // the `else` before is that of a `try`
+    EClause lacking_clause = EClause::kSimple;
+    uint32_t bare_except_start = 0, bare_except_end = 0;  // of the `try` under way; equal where it has none
+};
+
+class CBlockTracker {
+  public:
+    explicit CBlockTracker(CProblems& problems) : _fProblems(problems) { _fBlocks.emplace_back(); }
+
+    // Finds the block of a line by its indentation, before the line is analysed. Not for comments.
+    void Enter(const CRawLogical& logical);
+
+    // Takes note of the line that was entered last: whether it has a fault of its own.
+    void Leave(bool has_fault);
+
+    // Call once, after the last line. `end` is the byte after the last row that isn't blank.
+    void Finish(uint32_t end);
+
+    // The blocks around the line, the module first.
+    const std::vector<CBlock>& Blocks() const { return _fBlocks; }
+    const CStatementHead& Head() const { return _fHead; }
+
+    // How deep the line lies: zero in the module.
+    int32_t Depth() const { return static_cast<int32_t>(_fBlocks.size()) - 1; }
+
+    // Nothing can be said about what is around the line: a fault has put it there, or has lost a header.
+    bool IsInDoubt() const;
+
+  private:
+    static constexpr size_t kMostIndents = 100;  // of the interpreter
+
+    CBlock& _Top() { return _fBlocks.back(); }
+    void _Place(const CIndent& indent);
+    void _PlaceDeeper(const CIndent& indent);
+    void _PlaceOut(const CIndent& indent);
+    void _Open(const CIndent& indent, EClause clause, bool is_unknown);
+    void _OpenOdd(const CIndent& indent);
+    void _CloseTo(size_t count);
+    void _ReportMissingBlock(uint32_t start, uint32_t end);
+    bool _CheckTabs(const CIndent& indent);
+    void _CheckPending(CBlock& block, uint32_t start, uint32_t end);
+    void _CheckClause(CBlock& block);
+    bool _MayFollow(const CBlock& block, EClause clause) const;
+    void _CheckExcept(CBlock& block);
+    void _DropPlacementSince(uint32_t start);
+    CProblem& _Report(ECode code, uint32_t start, uint32_t end, std::string message);
+
+    CProblems& _fProblems;
+    std::vector<CBlock> _fBlocks;
+    std::vector<CBlock> _fClosed;  // by depth of the stack, the last block left there
+    CStatementHead _fHead;         // of the line entered last
+    bool _fIsMidRow = false;
+    bool _fHasPlaceProblem = false;
+    bool _fOpensBlock = false;  // the line before is a header without a body on its row
+    bool _fPreviousHasFault = false;
+    bool _fHasTooMany = false;
+};
+
+}  // namespace codeloom

@@ -1,0 +1,83 @@
+// The code of each problem: tokens and encoding 1xx, grammar 2xx, blocks and placement 3xx, targets and
+// arguments 4xx, scopes 5xx, hints 6xx, versions 7xx, limits 9xx. A code that has been released keeps its
+// meaning.
+#pragma once
+
+#include <cstdint>
+
+namespace codeloom {
+
+enum class ECode : uint16_t {
+    kUnreadable = 101,
+    kBytesNotAscii = 121,
+    kMixedBytesAndText = 122,
+
+    kInvalidSyntax = 201,
+
+    kUnexpectedIndent = 301,
+    kExpectedBlock = 302,
+    kUnknownDedent = 303,
+    kMixedTabs = 304,
+    kClauseWithoutStatement = 305,
+    kTryWithoutHandler = 306,
+    kBareExceptNotLast = 307,
+    kMixedExceptKinds = 308,
+    kCaseOutsideMatch = 309,
+    kStatementInMatch = 310,
+    kDecoratorWithoutDefinition = 311,
+    kOutsideFunction = 321,
+    kOutsideAsyncFunction = 322,
+    kYieldFromInAsync = 323,
+    kReturnInAsyncGenerator = 324,
+    kOutsideLoop = 325,
+    kContinueInFinally = 326,
+    kJumpOutOfExceptStar = 327,
+    kImportStarNotInModule = 328,
+    kFutureNotFirst = 329,
+    kUnknownFeature = 330,
+    kNonlocalInModule = 331,
+
+    kCannotAssign = 401,
+    kCannotDelete = 402,
+    kCannotAugment = 403,
+    kCannotAnnotate = 404,
+    kCannotBindName = 405,
+    kMultipleStars = 406,
+    kMisplacedStar = 407,
+    kWalrusTarget = 408,
+    kRepeatedKeyword = 421,
+    kMisplacedArgument = 422,
+    kBareGenerator = 423,
+    kKeywordIsExpression = 424,
+    kRepeatedParameter = 431,
+    kRepeatedTypeParameter = 432,
+    kTypeParameterOrder = 433,
+    kTypeParameterBound = 434,
+    kNotInTypeExpression = 435,
+    kWalrusInIterable = 441,
+    kWalrusRebinds = 442,
+    kWalrusInClassComprehension = 443,
+    kYieldInComprehension = 444,
+    kRepeatedPatternName = 451,
+    kPatternsUnreachable = 452,
+    kPatternNamesDiffer = 453,
+    kRepeatedPatternKey = 454,
+    kRepeatedPatternAttribute = 455,
+    kMisplacedPattern = 456,
+    kPatternNotConstant = 457,
+
+    kInvalidHint = 601,
+
+    kNewerForm = 701,
+    kEndedForm = 702,
+
+    kTooManyIndents = 901,
+    kLineTooLong = 902,
+};
+
+// A statement or an expression that stands where it may not.
+constexpr bool IsPlacement(ECode code) {
+    return code >= ECode::kOutsideFunction && code <= ECode::kNonlocalInModule;
+}
+
+}  // namespace codeloom

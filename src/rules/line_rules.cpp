@@ -1,0 +1,115 @@
+#include "rules/line_rules.h"
+
+#include "rules/arguments.h"
+#include "rules/comprehensions.h"
+#include "rules/literals.h"
+#include "rules/parameters.h"
+#include "rules/patterns.h"
+#include "rules/stars.h"
+#include "rules/targets.h"
+#include "syntax/definitions.h"
+#include "syntax/imports.h"
+#include "syntax/statements.h"
+
+namespace codeloom {
+
+namespace {
+
+constexpr uint64_t BitsOf(std::initializer_list<ENodeKind> kinds) {
+    uint64_t bits = 0;
+    for (const ENodeKind kind : kinds) bits |= CTree::BitOf(kind);
+    return bits;
+}
+
+// Kinds that have a rule; a line with none of them below its statement needs no pass over its nodes.
+constexpr uint64_t kKindsWithRules =
+    BitsOf({ENodeKind::kExprStmt, ENodeKind::kFor, ENodeKind::kCompFor, ENodeKind::kWithItem, ENodeKind::kDel,
+            ENodeKind::kUsedArgument, ENodeKind::kNamedExpr, ENodeKind::kLambda, ENodeKind::kFuncdef,
+            ENodeKind::kClassdef, ENodeKind::kWithTypeParameters, ENodeKind::kCase, ENodeKind::kImportNames,
+            ENodeKind::kFromImport, ENodeKind::kExceptClause});
+
+void CheckDefinition(const CRuleContext& context, const CTreeNode& definition) {
+    CheckBoundName(context, NameOfFuncdef(context.tree, definition));
+    if (definition.Is(ENodeKind::kClassdef)) return CheckBases(context, definition);
+    CheckParameters(context, ParametersOfFuncdef(context.tree, definition));
+}
+
+void CheckLambda(const CRuleContext& context, const CTreeNode& lambda) {
+    if (const CTreeNode* const parameters = ParametersOfLambda(context.tree, lambda))
+        CheckParameters(context, *parameters);
+}
+
+// One with `async` has the clause itself within.
+void CheckClause(const CRuleContext& context, const CTreeNode& clause) {
+    if (!HasWordAt(context.tree, clause, 0, EWord::kAsync))
+        CheckTarget(context, *CompClauseOf(context.tree, clause).target, ETargetUse::kAssign);
+}
+
+void CheckNode(const CRuleContext& context, const CTreeNode& node) {
+    const CTree& tree = context.tree;
+    switch (node.kind) {
+        case ENodeKind::kExprStmt:
+            return CheckAssignment(context, node);
+        case ENodeKind::kFor:
+            return CheckTarget(context, *PartsOfFor(tree, node).target, ETargetUse::kAssign);
+        case ENodeKind::kCompFor:
+            return CheckClause(context, node);
+        case ENodeKind::kWithItem:
+            return CheckTarget(context, TargetOfWithItem(tree, node), ETargetUse::kAssign);
+        case ENodeKind::kDel:
+            return CheckTarget(context, *ExpressionAfterKeyword(tree, node), ETargetUse::kDelete);
+        case ENodeKind::kUsedArglist:
+            return CheckArguments(context, node);
+        case ENodeKind::kUsedArgument:
+            return CheckArgument(context, node);
+        case ENodeKind::kNamedExpr:
+            return CheckWalrus(context, node);
+        case ENodeKind::kLambda:
+            return CheckLambda(context, node);
+        case ENodeKind::kFuncdef:
+        case ENodeKind::kClassdef:
+            return CheckDefinition(context, node);
+        case ENodeKind::kWithTypeParameters:
+            return CheckTypeParameters(context, node);
+        case ENodeKind::kCase:
+            return CheckPattern(context, PatternOfCase(tree, node));
+        case ENodeKind::kImportNames:
+            return CheckImportedNames(context, NamesOfImport(tree, node));
+        case ENodeKind::kFromImport:
+            if (StarOfFromImport(tree, node) == nullptr)
+                CheckImportedNames(context, NamesOfFromImport(tree, node));
+            return;
+        case ENodeKind::kExceptClause:
+            if (const CTreeNode* const target = TargetOfExcept(tree, node))
+                CheckTarget(context, *target, ETargetUse::kAssign);
+            return;
+        default:
+            return;
+    }
+}
+
+// A statement has no other of its kind within it, but expressions do.
+uint64_t KindsBelowRoot(const CTree& tree) {
+    const bool is_statement = tree.fRoot.Is(ENodeKind::kStmt) && !tree.fRoot.IsLeaf();
+    return is_statement ? tree.Kinds() & ~CTree::BitOf(tree.fRoot.kind) : tree.Kinds();
+}
+
+}  // namespace
+
+void CheckLine(const CTree& tree, const CLanguage& language, bool in_class, CProblems& problems) {
+    CheckLiterals(tree.Line(), language, problems);
+    if (tree.fIsEmpty || tree.fRoot.IsLeaf()) return;
+    const CRuleContext context{tree, language, problems};
+    CheckNode(context, tree.fRoot);
+    if ((KindsBelowRoot(tree) & kKindsWithRules) != 0) {
+        for (const CTreeNode& node : tree.NodesBelowRoot())
+            if (!node.IsLeaf() && !tree.IsRoot(node)) CheckNode(context, node);
+    }
+    if (tree.HasKind(ENodeKind::kStar)) CheckStars(context);
+    if (tree.HasKind(ENodeKind::kCompFor)) CheckComprehensions(context, in_class);
+    const bool is_alias = tree.Line().type == ELogicalType::kTypeStatement;
+    if (is_alias && tree.fRoot.Is(ENodeKind::kExprStmt))
+        CheckDeferred(context, ValueOfAssignment(tree, tree.fRoot), "a type alias");
+}
+
+}  // namespace codeloom

@@ -1,0 +1,12 @@
+// Strings and bytes by their tokens.
+#pragma once
+
+#include "rules/problem.h"
+#include "syntax/language.h"
+
+namespace codeloom {
+
+// Requires: the line parses, so that neighbouring strings are one expression.
+void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems);
+
+}  // namespace codeloom

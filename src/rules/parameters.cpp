@@ -1,0 +1,137 @@
+#include "rules/parameters.h"
+
+#include "rules/expression_kinds.h"
+#include "rules/name_set.h"
+#include "rules/targets.h"
+#include "syntax/atoms.h"
+#include "syntax/definitions.h"
+#include "syntax/statements.h"
+
+namespace codeloom {
+
+namespace {
+
+constexpr std::string_view kGeneric = "the definition of a generic";
+
+class CDeferredCheck {
+  public:
+    CDeferredCheck(const CRuleContext& context, std::string_view where)
+        : _fContext(context), _fWhere(where) {}
+
+    void Visit(const CTreeNode& node, bool in_comprehension, int depth) const {
+        if (node.Is(ENodeKind::kLambda) || depth > CRuleContext::kMaxDepth) return;
+        if (IsYield(node)) return _Refuse(node, "yield expression");
+        if (IsWord(node, EWord::kAwait) && node.Is(ENodeKind::kKeywordLiteral))
+            return _Refuse(node, "await expression");
+        if (node.IsLeaf()) return;
+        const CTree& tree = _fContext.tree;
+        if (HasTokenAt(tree, node, 1, kTokenId_COLONEQUAL)) return _RefuseWalrus(node, in_comprehension);
+        in_comprehension |= LastChild(tree, node).Is(ENodeKind::kCompFor);
+        for (const CTreeNode& child : tree.Children(node)) Visit(child, in_comprehension, depth + 1);
+    }
+
+  private:
+    void _Refuse(const CTreeNode& node, std::string_view what) const {
+        _fContext.Report(ECode::kNotInTypeExpression, node, Joined(what, " cannot be used within ", _fWhere));
+    }
+
+    void _RefuseWalrus(const CTreeNode& node, bool in_comprehension) const {
+        if (!in_comprehension) return _Refuse(node, "named expression");
+        _fContext.Report(ECode::kNotInTypeExpression, node,
+                         Joined("assignment expression within a comprehension cannot be used ",
+                                _fWhere == kGeneric ? "within " : "in ", _fWhere));
+    }
+
+    const CRuleContext& _fContext;
+    const std::string_view _fWhere;
+};
+
+// The interpreter's names for the kinds of type parameters.
+std::string_view KindOfTypeParameter(EStars stars) {
+    if (stars == EStars::kNone) return "TypeVar";
+    return stars == EStars::kOne ? "TypeVarTuple" : "ParamSpec";
+}
+
+struct CTypeParameterParts {
+    const CTreeNode* bound = nullptr;
+    const CTreeNode* value = nullptr;  // the default
+};
+
+// With both, they are the first and the last child of a node after the colon.
+CTypeParameterParts PartsOfTypeParameter(const CTree& tree, const CTreeNode& parameter) {
+    const CTreeNode* const spec = SpecOfTypeParameter(tree, parameter);
+    if (spec == nullptr) return {};
+    if (HasTokenAt(tree, parameter, parameter.child_count - 2, kTokenId_EQUAL)) return {nullptr, spec};
+    if (spec->kind == ENodeKind::kNode && HasTokenAt(tree, *spec, 1, kTokenId_EQUAL))
+        return {&tree.Child(*spec, 0), &tree.Child(*spec, 2)};
+    return {spec, nullptr};
+}
+
+void CheckBound(const CRuleContext& context, const CTreeNode& bound, EStars stars) {
+    const bool is_tuple = KindOfExpression(context.tree, bound) == EExpression::kTuple;
+    if (stars != EStars::kNone)
+        return context.Report(
+            ECode::kTypeParameterBound, bound,
+            Joined("cannot use ", is_tuple ? "constraints" : "bound", " with ", KindOfTypeParameter(stars)));
+    CheckDeferred(context, bound, is_tuple ? "a TypeVar constraint" : "a TypeVar bound");
+}
+
+// Annotations, bases and an alias's value are evaluated where the type parameters are known.
+void CheckScopedStatement(const CRuleContext& context, const CTreeNode& statement) {
+    const CTree& tree = context.tree;
+    if (statement.Is(ENodeKind::kClassdef)) {
+        if (const CTreeNode* const bases = BasesOfClassdef(tree, statement))
+            CheckDeferred(context, *bases, kGeneric);
+    } else if (statement.Is(ENodeKind::kFuncdef)) {
+        ForEachParameter(tree, ParametersOfFuncdef(tree, statement), [&](const CParameter& parameter) {
+            if (parameter.type_expr != nullptr) CheckDeferred(context, *parameter.type_expr, kGeneric);
+        });
+        if (const CTreeNode* const result = ReturnTypeOfFuncdef(tree, statement))
+            CheckDeferred(context, *result, kGeneric);
+    } else if (statement.Is(ENodeKind::kExprStmt)) {
+        CheckDeferred(context, LastChild(tree, statement), "a type alias");
+    }
+}
+
+}  // namespace
+
+void CheckDeferred(const CRuleContext& context, const CTreeNode& expression, std::string_view where) {
+    CDeferredCheck(context, where).Visit(expression, false, 0);
+}
+
+void CheckParameters(const CRuleContext& context, const CTreeNode& parameters) {
+    CNameSet names;
+    ForEachParameter(context.tree, parameters, [&](const CParameter& parameter) {
+        if (parameter.name == nullptr) return;
+        CheckBoundName(context, *parameter.name);
+        const std::string_view name = context.tree.Text(*parameter.name);
+        if (!names.Add(name))
+            context.Report(ECode::kRepeatedParameter, *parameter.name,
+                           Joined("duplicate argument '", name, "' in function definition"));
+    });
+}
+
+void CheckTypeParameters(const CRuleContext& context, const CTreeNode& statement) {
+    const CTree& tree = context.tree;
+    CNameSet names;
+    bool has_default = false;
+    for (const CTreeNode& parameter : TypeParametersOf(tree, statement)) {
+        const CTreeNode& name = NameOfTypeParameter(tree, parameter);
+        const EStars stars = StarsOfTypeParameter(tree, parameter);
+        const CTypeParameterParts parts = PartsOfTypeParameter(tree, parameter);
+        if (!names.Add(tree.Text(name)))
+            context.Report(ECode::kRepeatedTypeParameter, name,
+                           Joined("duplicate type parameter '", tree.Text(name), "'"));
+        if (has_default && parts.value == nullptr)
+            context.Report(
+                ECode::kTypeParameterOrder, name,
+                Joined("non-default type parameter '", tree.Text(name), "' follows default type parameter"));
+        has_default |= parts.value != nullptr;
+        if (parts.bound != nullptr) CheckBound(context, *parts.bound, stars);
+        if (parts.value != nullptr)
+            CheckDeferred(context, *parts.value, Joined("a ", KindOfTypeParameter(stars), " default"));
+    }
+    CheckScopedStatement(context, TypeParameterScopedStatementOf(tree, statement));
+}
+
+}  // namespace codeloom

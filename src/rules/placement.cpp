@@ -1,0 +1,395 @@
+#include "rules/placement.h"
+
+#include <algorithm>
+#include <array>
+#include <string>
+#include <string_view>
+
+#include "syntax/expressions.h"
+#include "syntax/imports.h"
+#include "syntax/statements.h"
+
+namespace codeloom {
+
+namespace {
+
+using EScope = CPlacement::EScope;
+
+// Deeper than any text that the interpreter takes.
+constexpr int kMaxDepth = 400;
+
+// Words without which a line has nothing that depends on its place.
+constexpr uint64_t Bit(EWord word) {
+    return uint64_t{1} << static_cast<unsigned>(word);
+}
+constexpr uint64_t kWordsOfInterest = Bit(EWord::kReturn) | Bit(EWord::kYield) | Bit(EWord::kAwait) |
+                                      Bit(EWord::kAsync) | Bit(EWord::kBreak) | Bit(EWord::kContinue) |
+                                      Bit(EWord::kNonlocal) | Bit(EWord::kFrom);
+
+bool HasWordOfInterest(const CRawLogical& logical) {
+    uint64_t words = 0;
+    for (const CRawToken& token : logical.tokens) words |= Bit(token.word);
+    return (words & kWordsOfInterest) != 0;
+}
+
+// A feature of `__future__`, with the version that has it first.
+struct CFeature {
+    std::string_view name;
+    int version;
+};
+
+constexpr auto kFeatures = std::to_array<CFeature>({{"nested_scopes", 0},
+                                                    {"generators", 0},
+                                                    {"division", 0},
+                                                    {"absolute_import", 0},
+                                                    {"with_statement", 0},
+                                                    {"print_function", 0},
+                                                    {"unicode_literals", 0},
+                                                    {"barry_as_FLUFL", 301},
+                                                    {"generator_stop", 305},
+                                                    {"annotations", 307}});
+
+// The statement is a string alone, or imports from `__future__`: what may come before such an import.
+bool MayPrecedeFuture(const CRawLogical& logical, const CTree* tree) {
+    return logical.type == ELogicalType::kStringExpression || tree == nullptr;
+}
+
+bool IsFutureImport(const CTree& tree, const CTreeNode& statement) {
+    if (!statement.Is(ENodeKind::kFromImport)) return false;
+    const std::span<const CTreeNode> module = ModuleOfFromImport(tree, statement);
+    return module.size() == 1 && tree.Text(module[0]) == "__future__";
+}
+
+// What the blocks around a line allow in it.
+CPlacement PlacementIn(const std::vector<CBlock>& blocks) {
+    CPlacement place;
+    for (const CBlock& block : blocks) {
+        switch (block.clause) {
+            case EClause::kDef:
+                place = {.scope = EScope::kFunction};
+                break;
+            case EClause::kAsyncDef:
+                place = {.scope = EScope::kAsyncFunction};
+                break;
+            case EClause::kClass:
+                place = {.scope = EScope::kClass};
+                break;
+            case EClause::kFor:
+            case EClause::kAsyncFor:
+            case EClause::kWhile:
+                place.in_loop = true;
+                place.in_except_star = place.in_finally = false;
+                break;
+            case EClause::kExceptStar:
+                place.in_except_star = true;
+                break;
+            case EClause::kFinally:
+                place.in_finally = true;
+                break;
+            default:
+                break;
+        }
+    }
+    return place;
+}
+
+bool IsAsyncScope(EScope scope) {
+    return scope == EScope::kAsyncFunction;
+}
+
+std::string Outside(std::string_view what, const CPlacement& place) {
+    std::string message = "'";
+    message.append(what).append(place.IsInFunction() ? "' outside async function" : "' outside function");
+    return message;
+}
+
+}  // namespace
+
+void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const CBlockTracker& blocks) {
+    const bool is_future = tree != nullptr && IsFutureImport(*tree, tree->fRoot);
+    _fTree = tree;
+    if (is_future) {
+        _CheckFuture(tree->fRoot, blocks);
+    } else if (!MayPrecedeFuture(logical, tree)) {
+        _fIsPastFutures = true;
+    }
+    if (tree == nullptr || tree->fIsEmpty || blocks.IsInDoubt() || !HasWordOfInterest(logical)) return;
+    CPlacement place = PlacementIn(blocks.Blocks());
+    // A body on the row of its header.
+    place.in_except_star |= blocks.Head().clause == EClause::kExceptStar;
+    place.in_finally |= blocks.Head().clause == EClause::kFinally;
+    _Visit(tree->fRoot, place);
+}
+
+void CPlacementRules::CheckEmbedded(const CTree& tree, const CBlockTracker& blocks) {
+    if (tree.fIsEmpty || blocks.IsInDoubt() || !HasWordOfInterest(tree.Line())) return;
+    _fTree = &tree;
+    _Visit(tree.fRoot, PlacementIn(blocks.Blocks()));
+}
+
+void CPlacementRules::_TrackFunctions(const std::vector<CBlock>& blocks) {
+    const auto is_under_way = [&](const CAsyncFunction& function) {
+        return function.block_i < blocks.size() &&
+               blocks[function.block_i].header.start == function.header_start;
+    };
+    while (!_fFunctions.empty() && !is_under_way(_fFunctions.back())) {
+        _EndFunction(_fFunctions.back());
+        _fFunctions.pop_back();
+    }
+    size_t block_i = _fFunctions.empty() ? 0 : _fFunctions.back().block_i + 1;
+    for (; block_i < blocks.size(); ++block_i)
+        if (blocks[block_i].clause == EClause::kAsyncDef)
+            _fFunctions.push_back({block_i, blocks[block_i].header.start, {}, {}});
+}
+
+void CPlacementRules::_EndFunction(const CAsyncFunction& function) {
+    const CSpan& value = function.first_return;
+    const CSpan& yield = function.first_yield;
+    if (value.start == value.end || yield.start == yield.end) return;
+    _fProblems.push_back({ECode::kReturnInAsyncGenerator,
+                          value.start,
+                          value.end,
+                          "'return' with value in async generator",
+                          {},
+                          {{yield.start, yield.end, "makes the function a generator"}}});
+}
+
+// Imports of features come first in a file, after its docstring.
+void CPlacementRules::_CheckFuture(const CTreeNode& statement, const CBlockTracker& blocks) {
+    const CTree& tree = *_fTree;
+    if (_fIsPastFutures || blocks.Depth() > 0) {
+        const CSpan span = SpanOf(tree, statement);
+        _fProblems.push_back({ECode::kFutureNotFirst,
+                              span.start,
+                              span.end,
+                              "from __future__ imports must occur at the beginning of the file",
+                              {},
+                              {}});
+        return;
+    }
+    if (const CTreeNode* const star = StarOfFromImport(tree, statement)) return _CheckFeature(*star);
+    ForEachImportedName(tree, NamesOfFromImport(tree, statement),
+                        [&](const CImportedName& imported) { _CheckFeature(*imported.name); });
+}
+
+void CPlacementRules::_CheckFeature(const CTreeNode& name) {
+    const std::string_view text = _fTree->Text(name);
+    const auto feature = std::find_if(kFeatures.begin(), kFeatures.end(),
+                                      [&](const CFeature& candidate) { return candidate.name == text; });
+    if (feature != kFeatures.end() && feature->version <= _fLanguage.version) return;
+    const CSpan span = SpanOf(*_fTree, name);
+    std::string message = "future feature ";
+    message.append(text).append(" is not defined");
+    _fProblems.push_back({ECode::kUnknownFeature,
+                          span.start,
+                          span.end,
+                          text == "braces" ? "not a chance" : std::move(message),
+                          {},
+                          {}});
+}
+
+// Nodes
+
+void CPlacementRules::_Visit(const CTreeNode& node, CPlacement place) {
+    if (++place.depth > kMaxDepth) return;
+    switch (node.kind) {
+        case ENodeKind::kFuncdef:
+            return _VisitDefinition(node, place, EScope::kFunction);
+        case ENodeKind::kClassdef:
+            return _VisitDefinition(node, place, EScope::kClass);
+        case ENodeKind::kLambda:
+            return _VisitLambda(node, place);
+        case ENodeKind::kFor:
+            return _VisitLoop(node, place);
+        case ENodeKind::kCompFor:
+            return _VisitComprehension(node, place);
+        case ENodeKind::kReturn:
+            _CheckReturn(node, place);
+            return _VisitAfterKeyword(node, place);
+        case ENodeKind::kYield:
+            _CheckYield(node, place);
+            return _VisitAfterKeyword(node, place);
+        case ENodeKind::kFromImport:
+            return _CheckImportStar(node, place);
+        case ENodeKind::kNonlocal:
+            return _CheckNonlocal(node, place);
+        case ENodeKind::kAtom:
+            return _VisitAtom(node, place);
+        case ENodeKind::kUsedArglist:
+            place.in_display = false;
+            break;
+        case ENodeKind::kUsedArgument:
+            place.in_display = false;
+            return _VisitComprehensionList(node, place);
+        case ENodeKind::kTestList:
+            return _VisitComprehensionList(node, place);
+        case ENodeKind::kKeywordLiteral:
+            return _CheckKeyword(node, place);
+        case ENodeKind::kNode:
+            return _VisitPlainNode(node, place);
+        default:
+            break;
+    }
+    _VisitChildren(node, place);
+}
+
+void CPlacementRules::_VisitChildren(const CTreeNode& node, const CPlacement& place) {
+    for (const CTreeNode& child : _fTree->Children(node)) _Visit(child, place);
+}
+
+// The keyword leaf of a statement stands for one that has nothing else.
+void CPlacementRules::_VisitAfterKeyword(const CTreeNode& node, const CPlacement& place) {
+    for (const CTreeNode& child : _fTree->Children(node).subspan(1)) _Visit(child, place);
+}
+
+// A node of a rule without a class of its own, known by the word that it begins with.
+void CPlacementRules::_VisitPlainNode(const CTreeNode& node, const CPlacement& place) {
+    if (HasWordAt(*_fTree, node, 0, EWord::kAsync)) return _VisitAsync(node, place);
+    if (HasWordAt(*_fTree, node, 0, EWord::kWhile)) return _VisitLoop(node, place);
+    _VisitChildren(node, place);
+}
+
+// `async def`, `async for`, `async with`
+//   child    'async'  statement
+void CPlacementRules::_VisitAsync(const CTreeNode& node, const CPlacement& place) {
+    const CTreeNode& statement = LastChild(*_fTree, node);
+    if (statement.Is(ENodeKind::kFuncdef)) return _VisitDefinition(statement, place, EScope::kAsyncFunction);
+    if (!IsAsyncScope(place.scope)) {
+        const CSpan span = SpanOf(*_fTree, _fTree->Child(node, 0));
+        const std::string_view what = statement.Is(ENodeKind::kFor) ? "async for" : "async with";
+        std::string message = "'";
+        message.append(what).append("' outside async function");
+        _Report(ECode::kOutsideAsyncFunction, span, std::move(message));
+    }
+    _Visit(statement, place);
+}
+
+// The last child is the body, on the row of the header or an invented one.
+void CPlacementRules::_VisitDefinition(const CTreeNode& node, const CPlacement& place, EScope body_scope) {
+    const std::span<const CTreeNode> children = _fTree->Children(node);
+    for (const CTreeNode& child : children.first(children.size() - 1)) _Visit(child, place);
+    _Visit(children.back(), {.scope = body_scope, .depth = place.depth});
+}
+
+// `for` and `while`: the body comes after the first colon, and that of `else` is outside the loop.
+void CPlacementRules::_VisitLoop(const CTreeNode& node, const CPlacement& place) {
+    CPlacement body = place;
+    body.in_loop = true;
+    body.in_except_star = body.in_finally = false;
+    int colon_count = 0;
+    for (const CTreeNode& child : _fTree->Children(node)) {
+        colon_count += IsToken(child, kTokenId_COLON);
+        _Visit(child, colon_count == 1 ? body : place);
+    }
+}
+
+void CPlacementRules::_VisitLambda(const CTreeNode& node, const CPlacement& place) {
+    if (const CTreeNode* const parameters = ParametersOfLambda(*_fTree, node)) _Visit(*parameters, place);
+    _Visit(BodyOfLambda(*_fTree, node), {.scope = EScope::kLambda, .depth = place.depth});
+}
+
+void CPlacementRules::_VisitAtom(const CTreeNode& node, CPlacement place) {
+    place.in_display = !HasTokenAt(*_fTree, node, 0, kTokenId_LPAR);
+    _VisitChildren(node, place);
+}
+
+// A comma list or an argument too, which aren't generator expressions.
+void CPlacementRules::_VisitComprehensionList(const CTreeNode& list, CPlacement place) {
+    if (IsComprehensionList(*_fTree, list) && !place.in_display && !IsAsyncScope(place.scope))
+        place.may_await = place.in_first_clause = true;
+    _VisitChildren(list, place);
+}
+
+void CPlacementRules::_VisitComprehension(const CTreeNode& node, const CPlacement& place) {
+    const CCompClause clause = CompClauseOf(*_fTree, node);
+    if (clause.is_async && place.in_display && !IsAsyncScope(place.scope) && !place.may_await)
+        _Report(ECode::kOutsideAsyncFunction, SpanOf(*_fTree, node),
+                "asynchronous comprehension outside of an asynchronous function");
+    CPlacement inside = place;
+    inside.in_first_clause = false;
+    CPlacement iterable = inside;
+    if (place.in_first_clause) iterable.may_await = false;
+    _Visit(*clause.target, inside);
+    _Visit(*clause.iterable, iterable);
+    if (clause.next != nullptr) _Visit(*clause.next, inside);
+}
+
+// Rules
+
+void CPlacementRules::_CheckReturn(const CTreeNode& node, const CPlacement& place) {
+    const CSpan span = SpanOf(*_fTree, node);
+    if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'return' outside function");
+    if (place.in_except_star) return _ReportInExceptStar(span);
+    if (IsAsyncScope(place.scope) && !node.IsLeaf() && !_fFunctions.empty() &&
+        _fFunctions.back().first_return.end == 0)
+        _fFunctions.back().first_return = span;
+}
+
+void CPlacementRules::_CheckYield(const CTreeNode& node, const CPlacement& place) {
+    const CSpan span = SpanOf(*_fTree, node);
+    if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'yield' outside function");
+    if (!IsAsyncScope(place.scope)) return;
+    if (!node.IsLeaf() && IsYieldFrom(*_fTree, node))
+        return _Report(ECode::kYieldFromInAsync, span, "'yield from' inside async function");
+    if (!_fFunctions.empty() && _fFunctions.back().first_yield.end == 0)
+        _fFunctions.back().first_yield = span;
+}
+
+void CPlacementRules::_CheckKeyword(const CTreeNode& leaf, const CPlacement& place) {
+    switch (leaf.word) {
+        case EWord::kReturn:
+            if (leaf.first_child != CTreeNode::kInventedText) _CheckReturn(leaf, place);
+            break;
+        case EWord::kYield:
+            _CheckYield(leaf, place);
+            break;
+        case EWord::kAwait:
+            if (!IsAsyncScope(place.scope) && !place.may_await)
+                _Report(place.IsInFunction() ? ECode::kOutsideAsyncFunction : ECode::kOutsideFunction,
+                        SpanOf(*_fTree, leaf), Outside("await", place));
+            break;
+        case EWord::kBreak:
+        case EWord::kContinue:
+            _CheckJump(leaf, place);
+            break;
+        default:
+            break;
+    }
+}
+
+void CPlacementRules::_CheckJump(const CTreeNode& leaf, const CPlacement& place) {
+    const CSpan span = SpanOf(*_fTree, leaf);
+    const bool is_break = leaf.word == EWord::kBreak;
+    if (place.in_except_star) return _ReportInExceptStar(span);
+    if (!place.in_loop)
+        return _Report(ECode::kOutsideLoop, span,
+                       is_break ? "'break' outside loop" : "'continue' not properly in loop");
+    constexpr int kAllowsContinueInFinally = 308;
+    if (!is_break && place.in_finally && _fLanguage.version < kAllowsContinueInFinally)
+        _Report(ECode::kContinueInFinally, span, "'continue' not supported inside 'finally' clause");
+}
+
+void CPlacementRules::_CheckImportStar(const CTreeNode& node, const CPlacement& place) {
+    const CTreeNode* const star = StarOfFromImport(*_fTree, node);
+    const bool is_allowed = place.scope == EScope::kModule || !_fLanguage.IsPython3();
+    if (star != nullptr && !is_allowed)
+        _Report(ECode::kImportStarNotInModule, SpanOf(*_fTree, *star),
+                "import * only allowed at module level");
+}
+
+void CPlacementRules::_CheckNonlocal(const CTreeNode& node, const CPlacement& place) {
+    if (place.scope == EScope::kModule)
+        _Report(ECode::kNonlocalInModule, SpanOf(*_fTree, node),
+                "nonlocal declaration not allowed at module level");
+}
+
+void CPlacementRules::_ReportInExceptStar(const CSpan& span) {
+    _Report(ECode::kJumpOutOfExceptStar, span,
+            "'break', 'continue' and 'return' cannot appear in an except* block");
+}
+
+void CPlacementRules::_Report(ECode code, const CSpan& span, std::string message) {
+    _fProblems.push_back({code, span.start, span.end, std::move(message), {}, {}});
+}
+
+}  // namespace codeloom

@@ -1,0 +1,92 @@
+// What may stand only in certain places: `return`, `yield`, `await`, `break`, `import *` and the like.
+//   in     the tree of a sound line, and the blocks around it
+//   out    problems
+//   keeps  for each function under way what is only known at its end
+// Where blocks are in doubt nothing is said.
+#pragma once
+
+#include <cstdint>
+#include <vector>
+
+#include "rules/blocks.h"
+#include "rules/problem.h"
+#include "syntax/language.h"
+#include "syntax/nodes.h"
+#include "syntax/tree.h"
+
+namespace codeloom {
+
+// What the place of a statement or an expression allows.
+struct CPlacement {
+    enum class EScope : uint8_t { kModule, kClass, kFunction, kAsyncFunction, kLambda };
+
+    EScope scope = EScope::kModule;
+    bool in_loop = false;
+    bool in_except_star = false;   // nearer than the loop and the function
+    bool in_finally = false;       // nearer than the loop
+    bool in_display = false;       // the innermost brackets are those of a list, set or dictionary
+    bool may_await = false;        // a generator expression, which becomes asynchronous then
+    bool in_first_clause = false;  // of a generator expression, whose iterable is read outside it
+    int depth = 0;
+
+    bool IsInFunction() const { return scope >= EScope::kFunction; }
+};
+
+class CPlacementRules {
+  public:
+    CPlacementRules(const CLanguage& language, CProblems& problems)
+        : _fLanguage(language), _fProblems(problems) {}
+
+    // Call for every line but comments, in order, once its block is known.
+    void Enter(const CBlockTracker& blocks) { _TrackFunctions(blocks.Blocks()); }
+
+    // Then call this; `tree` is null for one with a fault.
+    void Check(const CRawLogical& logical, const CTree* tree, const CBlockTracker& blocks);
+
+    // An expression embedded in the line that was checked last.
+    void CheckEmbedded(const CTree& tree, const CBlockTracker& blocks);
+
+    // Call once, after the last line.
+    void Finish() { _TrackFunctions({}); }
+
+  private:
+    // A function whose body is under way.
+    struct CAsyncFunction {
+        size_t block_i;  // of its body among the blocks around a line
+        uint32_t header_start = 0;
+        CSpan first_yield;   // empty where it has none
+        CSpan first_return;  // of a value
+    };
+
+    void _TrackFunctions(const std::vector<CBlock>& blocks);
+    void _EndFunction(const CAsyncFunction& function);
+    void _CheckFuture(const CTreeNode& statement, const CBlockTracker& blocks);
+    void _CheckFeature(const CTreeNode& name);
+    void _Visit(const CTreeNode& node, CPlacement place);
+    void _VisitChildren(const CTreeNode& node, const CPlacement& place);
+    void _VisitAfterKeyword(const CTreeNode& node, const CPlacement& place);
+    void _VisitPlainNode(const CTreeNode& node, const CPlacement& place);
+    void _VisitAsync(const CTreeNode& node, const CPlacement& place);
+    void _VisitDefinition(const CTreeNode& node, const CPlacement& place, CPlacement::EScope body_scope);
+    void _VisitLoop(const CTreeNode& node, const CPlacement& place);
+    void _VisitLambda(const CTreeNode& node, const CPlacement& place);
+    void _VisitAtom(const CTreeNode& node, CPlacement place);
+    void _VisitComprehensionList(const CTreeNode& list, CPlacement place);
+    void _VisitComprehension(const CTreeNode& node, const CPlacement& place);
+    void _CheckReturn(const CTreeNode& node, const CPlacement& place);
+    void _CheckYield(const CTreeNode& node, const CPlacement& place);
+    void _CheckKeyword(const CTreeNode& leaf, const CPlacement& place);
+    void _CheckJump(const CTreeNode& leaf, const CPlacement& place);
+    void _CheckImportStar(const CTreeNode& node, const CPlacement& place);
+    void _CheckNonlocal(const CTreeNode& node, const CPlacement& place);
+    void _ReportInExceptStar(const CSpan& span);
+    void _Report(ECode code, const CSpan& span, std::string message);
+
+    const CLanguage& _fLanguage;
+    CProblems& _fProblems;
+    const CTree* _fTree = nullptr;
+    std::vector<CAsyncFunction> _fFunctions;  // by depth; only those whose body is under way
+    bool _fIsPastFutures = false;
+};
+
+}  // namespace codeloom

@@ -1,0 +1,135 @@
+#include "rules/statement_head.h"
+
+#include <array>
+#include <span>
+
+#include "text/token_type.h"
+
+namespace codeloom {
+
+namespace {
+
+struct CClauseNames {
+    std::string_view keyword;
+    std::string_view statement;
+};
+
+// By EClause.
+constexpr auto kClauseNames = std::to_array<CClauseNames>({
+    {"", "statement"},
+    {"@", "decorator"},
+    {"def", "function definition"},
+    {"async def", "function definition"},
+    {"class", "class definition"},
+    {"if", "'if' statement"},
+    {"elif", "'elif' statement"},
+    {"else", "'else' statement"},
+    {"for", "'for' statement"},
+    {"async for", "'for' statement"},
+    {"while", "'while' statement"},
+    {"with", "'with' statement"},
+    {"async with", "'with' statement"},
+    {"try", "'try' statement"},
+    {"except", "'except' statement"},
+    {"except", "'except' statement"},
+    {"except*", "'except*' statement"},
+    {"finally", "'finally' statement"},
+    {"match", "'match' statement"},
+    {"case", "'case' statement"},
+});
+
+bool IsSignificant(const CRawToken& token) {
+    return token.type != kTokenId_COMMENT && token.type != kTokenId_BACKSLASH;
+}
+
+// The tokens from `token_i` on, passing over comments and backslashes; null at the end.
+const CRawToken* NextSignificant(std::span<const CRawToken> tokens, size_t& token_i) {
+    while (token_i < tokens.size()) {
+        const CRawToken& token = tokens[token_i++];
+        if (IsSignificant(token)) return &token;
+    }
+    return nullptr;
+}
+
+EClause ClauseOfExcept(const CRawToken* next) {
+    if (next != nullptr && next->type == kTokenId_STAR) return EClause::kExceptStar;
+    return next == nullptr || next->type == kTokenId_COLON ? EClause::kBareExcept : EClause::kExcept;
+}
+
+EClause ClauseOfAsync(const CRawToken* next) {
+    switch (next == nullptr ? EWord::kNone : next->word) {
+        case EWord::kDef:
+            return EClause::kAsyncDef;
+        case EWord::kFor:
+            return EClause::kAsyncFor;
+        case EWord::kWith:
+            return EClause::kAsyncWith;
+        default:
+            return EClause::kSimple;
+    }
+}
+
+EClause ClauseOfWord(EWord word) {
+    switch (word) {
+        case EWord::kDef:
+            return EClause::kDef;
+        case EWord::kClass:
+            return EClause::kClass;
+        case EWord::kIf:
+            return EClause::kIf;
+        case EWord::kElif:
+            return EClause::kElif;
+        case EWord::kElse:
+            return EClause::kElse;
+        case EWord::kFor:
+            return EClause::kFor;
+        case EWord::kWhile:
+            return EClause::kWhile;
+        case EWord::kWith:
+            return EClause::kWith;
+        case EWord::kTry:
+            return EClause::kTry;
+        case EWord::kFinally:
+            return EClause::kFinally;
+        default:
+            return EClause::kSimple;
+    }
+}
+
+}  // namespace
+
+CStatementHead ReadStatementHead(const CRawLogical& logical) {
+    CStatementHead head;
+    size_t token_i = 0;
+    const CRawToken* const first = NextSignificant(logical.tokens, token_i);
+    if (first == nullptr) return head;
+    head.start = logical.StartOf(*first);
+    head.end = logical.EndOf(*first);
+    if (first->type == kTokenId_AT) {
+        head.clause = EClause::kDecorator;
+    } else if (logical.type == ELogicalType::kMatch || logical.type == ELogicalType::kCase) {
+        head.clause = logical.type == ELogicalType::kMatch ? EClause::kMatch : EClause::kCase;
+    } else if (first->word == EWord::kExcept) {
+        head.clause = ClauseOfExcept(NextSignificant(logical.tokens, token_i));
+    } else if (first->word == EWord::kAsync) {
+        head.clause = ClauseOfAsync(NextSignificant(logical.tokens, token_i));
+    } else {
+        head.clause = ClauseOfWord(first->word);
+    }
+    for (size_t last_i = logical.tokens.size(); last_i-- > 0;) {
+        if (!IsSignificant(logical.tokens[last_i])) continue;
+        head.ends_in_colon = logical.tokens[last_i].type == kTokenId_COLON;
+        break;
+    }
+    return head;
+}
+
+std::string_view NameOfStatement(EClause clause) {
+    return kClauseNames[static_cast<size_t>(clause)].statement;
+}
+
+std::string_view KeywordOf(EClause clause) {
+    return kClauseNames[static_cast<size_t>(clause)].keyword;
+}
+
+}  // namespace codeloom

@@ -1,0 +1,53 @@
+// How a logical line begins, as far as blocks are concerned. Broken and half-typed lines have a head too: it
+// is read from the first words alone.
+#pragma once
+
+#include <cstdint>
+#include <string_view>
+
+#include "tokenizer/raw_logical.h"
+
+namespace codeloom {
+
+enum class EClause : uint8_t {
+    kSimple,
+    kDecorator,
+    kDef,
+    kAsyncDef,
+    kClass,
+    kIf,
+    kElif,
+    kElse,
+    kFor,
+    kAsyncFor,
+    kWhile,
+    kWith,
+    kAsyncWith,
+    kTry,
+    kExcept,
+    kBareExcept,
+    kExceptStar,
+    kFinally,
+    kMatch,
+    kCase,
+};
+
+struct CStatementHead {
+    EClause clause = EClause::kSimple;
+    uint32_t start = 0;  // bytes of the first token
+    uint32_t end = 0;
+    bool ends_in_colon = false;  // its last token, comments apart
+
+    bool IsHeader() const { return clause > EClause::kDecorator; }
+};
+
+// Requires: `logical` isn't a comment.
+CStatementHead ReadStatementHead(const CRawLogical& logical);
+
+// What a message calls the statement: "'if' statement", "function definition".
+std::string_view NameOfStatement(EClause clause);
+
+// The keyword that the clause begins with.
+std::string_view KeywordOf(EClause clause);
+
+}  // namespace codeloom

@@ -1,0 +1,22 @@
+// What can be assigned, augmented, annotated, deleted, and bound by `for`, `with`, `as` and `:=`.
+#pragma once
+
+#include "rules/rule_context.h"
+
+namespace codeloom {
+
+enum class ETargetUse : uint8_t { kAssign, kDelete };
+
+// One mark for one target.
+void CheckTarget(const CRuleContext& context, const CTreeNode& target, ETargetUse use);
+
+// The name of what is defined or imported, a parameter or a keyword argument.
+void CheckBoundName(const CRuleContext& context, const CTreeNode& name);
+
+void CheckAssignment(const CRuleContext& context, const CTreeNode& statement);
+void CheckImportedNames(const CRuleContext& context, const CTreeNode& names);
+
+// `a := b` as an expression or an argument.
+void CheckWalrus(const CRuleContext& context, const CTreeNode& named);
+
+}  // namespace codeloom

@@ -1,0 +1,74 @@
+#include "rules/text_checker.h"
+
+#include <algorithm>
+
+#include "rules/line_rules.h"
+
+namespace codeloom {
+
+namespace {
+
+// In quotes anything may stand that reads as a hint.
+bool IsHint(const CRawLogical& part) {
+    return part.type == ELogicalType::kStringifiedTypeHint || part.type == ELogicalType::kCommentedTypeHint;
+}
+
+bool IsInClass(const std::vector<CBlock>& blocks) {
+    for (size_t i = blocks.size(); i-- > 0;) {
+        const EClause clause = blocks[i].clause;
+        if (clause == EClause::kClass) return true;
+        if (clause == EClause::kDef || clause == EClause::kAsyncDef) return false;
+    }
+    return false;
+}
+
+// What lies within another problem follows from it.
+void DropNested(CProblems& problems, size_t first) {
+    if (problems.size() < first + 2) return;
+    const auto begin = problems.begin() + static_cast<ptrdiff_t>(first);
+    std::stable_sort(begin, problems.end(),
+                     [](const CProblem& one, const CProblem& other) { return one.start < other.start; });
+    const auto is_nested = [](const CProblem& outer, const CProblem& inner) {
+        return inner.start == outer.start || inner.end <= outer.end;
+    };
+    problems.erase(std::unique(begin, problems.end(), is_nested), problems.end());
+}
+
+}  // namespace
+
+void CTextChecker::Enter(const CRawLogical& logical) {
+    _fEnd = logical.EndOf(logical.tokens.back());
+    if (logical.type == ELogicalType::kComment) return;
+    _fBlocks.Enter(logical);
+    _fPlacement.Enter(_fBlocks);
+    _fLine = &logical;
+    _fFirstProblem = _fProblems.size();
+}
+
+void CTextChecker::Take(const CRawLogical& part, const CTree& tree) {
+    if (!IsHint(part))
+        CheckLine(tree, _fLanguage, !_fBlocks.IsInDoubt() && IsInClass(_fBlocks.Blocks()), _fProblems);
+    if (&part == _fLine) {
+        _fPlacement.Check(part, &tree, _fBlocks);
+    } else {
+        _fPlacement.CheckEmbedded(tree, _fBlocks);
+    }
+    DropNested(_fProblems, _fFirstProblem);
+}
+
+// What the trees of a line show doesn't count beside a fault of its grammar.
+void CTextChecker::Leave(const CRawLogical& logical, bool has_fault) {
+    if (logical.type == ELogicalType::kComment) return;
+    if (has_fault) {
+        _fProblems.resize(_fFirstProblem);
+        _fPlacement.Check(logical, nullptr, _fBlocks);
+    }
+    _fBlocks.Leave(has_fault);
+}
+
+void CTextChecker::Finish() {
+    _fBlocks.Finish(_fEnd);
+    _fPlacement.Finish();
+}
+
+}  // namespace codeloom

@@ -1,0 +1,37 @@
+// The rules for one text: what is around its lines, and what may stand where.
+#pragma once
+
+#include "line/tree_observer.h"
+#include "rules/blocks.h"
+#include "rules/placement.h"
+#include "rules/problem.h"
+#include "syntax/language.h"
+#include "tokenizer/raw_logical.h"
+
+namespace codeloom {
+
+class CTextChecker final : public CTreeObserver {
+  public:
+    // Both must outlive the checker.
+    CTextChecker(const CLanguage& language, CProblems& problems)
+        : _fLanguage(language), _fProblems(problems), _fBlocks(problems), _fPlacement(language, problems) {}
+
+    // Call for every line in order, before its analysis, which hands its trees over, and after that.
+    void Enter(const CRawLogical& logical);
+    void Take(const CRawLogical& part, const CTree& tree) override;
+    void Leave(const CRawLogical& logical, bool has_fault);
+
+    // Call once, after the last line.
+    void Finish();
+
+  private:
+    const CLanguage& _fLanguage;
+    CProblems& _fProblems;
+    CBlockTracker _fBlocks;
+    CPlacementRules _fPlacement;
+    const CRawLogical* _fLine = nullptr;  // under way
+    size_t _fFirstProblem = 0;            // of what its trees show
+    uint32_t _fEnd = 0;                   // of the last line
+};
+
+}  // namespace codeloom
