@@ -3,7 +3,63 @@
 For each line it says whether the line is sound, with the exact place of a fault, and what it says
 about names. A broken line never spoils its neighbours.
 
-The engine is the native module `codeloom.treesift`; `codeloom.check` reads whole files with it.
+    for problem in codeloom.analyze(source).problems:
+        print(problem)
+
+The engine beneath is the native module `codeloom.treesift`.
 """
 
+TYPE_CHECKING = False  # true for those who check types; `typing` takes longer to import than this package
+if TYPE_CHECKING:
+    from codeloom._analysis import (
+        Analysis,
+        Limit,
+        LimitKind,
+        Line,
+        LineKind,
+        Problem,
+        Range,
+        Record,
+        RecordKind,
+    )
+    from codeloom._face import analyze, analyze_file, analyze_paths
+    from codeloom.reading.languages import NEWEST, VERSIONS
+
 __version__ = "0.1.0"
+
+__all__ = [
+    "NEWEST",
+    "VERSIONS",
+    "Analysis",
+    "Limit",
+    "LimitKind",
+    "Line",
+    "LineKind",
+    "Problem",
+    "Range",
+    "Record",
+    "RecordKind",
+    "analyze",
+    "analyze_file",
+    "analyze_paths",
+]
+
+# Where the names are, which are imported when they are first asked for, so that `import codeloom` is cheap.
+_MODULES = {
+    **dict.fromkeys(("analyze", "analyze_file", "analyze_paths"), "codeloom._face"),
+    **dict.fromkeys(("NEWEST", "VERSIONS"), "codeloom.reading.languages"),
+}
+
+
+def __getattr__(name: str) -> object:
+    if name not in __all__:
+        raise AttributeError(f"module {__name__!r} has no attribute {name!r}")
+    from importlib import import_module
+
+    value = getattr(import_module(_MODULES.get(name, "codeloom._analysis")), name)
+    globals()[name] = value
+    return value
+
+
+def __dir__() -> list[str]:
+    return sorted({*globals(), *__all__})

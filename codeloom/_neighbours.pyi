@@ -455,6 +455,51 @@ def _NonInlineUcs4CharAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int) -
     character begins. IndexError or ValueError when `pos` or `end_pos` lies outside the buffer.
     """
 
+class CNonNestedSearch:
+    """
+    A search for bytes that lie outside brackets and string literals of Python source.
+
+    InitWith sets it up, FindNext gives one hit after the other.
+    """
+
+    def __init__(self) -> None:
+        ...
+
+    def InitWith(self, to_search: object, to_find_bytes: bytes, start: int, end: int) -> int:
+        """
+        Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything
+        else, None included, leaves the search idle. Returns 0. TypeError for a subclass of either
+        or when `to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside
+        the text.
+        """
+
+    def FindNext(self) -> int:
+        """
+        The byte offset of the next hit, -1 when there is none; the search is idle then.
+        """
+
+    def Clear(self) -> None:
+        """Make the search idle and let go of the text."""
+
+def _FindStringEndNonNested(search: CNonNestedSearch, quote_i: int) -> int:
+    """
+    The byte index behind the string literal whose opening quote stands at `quote_i` of the text
+    searched. An unterminated one ends with its row, with triple quotes at the end of the search.
+    IndexError when `quote_i` lies outside the text searched.
+    """
+
+def InitNonNestedStruct(structure: CNonNestedSearch, search_ptr: bytes | str | None, to_find_bytes: bytes, start: int, end: int) -> int:
+    """
+    Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`; None is for no
+    text at all. Returns 0. TypeError for anything else, AssertionError when `start` or `end` lies
+    outside the text.
+    """
+
+def FindNextNonNestedStruct(structure: CNonNestedSearch) -> int:
+    """
+    The byte offset of the next hit outside brackets and strings; -1 when there is none.
+    """
+
 def StrInStr(sub: bytes, whole: bytes) -> bool:
     """
     True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both
@@ -520,39 +565,6 @@ class CStringTokenizer:
 
     def Next(self) -> None:
         """Move to the next token; at the end, nothing happens."""
-
-class CNonNestedSearch:
-    """
-    A search for bytes that lie outside brackets and string literals of Python source.
-
-    InitWith sets it up, FindNext gives one hit after the other.
-    """
-
-    def __init__(self) -> None:
-        ...
-
-    def InitWith(self, to_search: object, to_find_bytes: bytes, start: int, end: int) -> int:
-        """
-        Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything
-        else, None included, leaves the search idle. Returns 0. TypeError for a subclass of either
-        or when `to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside
-        the text.
-        """
-
-    def FindNext(self) -> int:
-        """
-        The byte offset of the next hit, -1 when there is none; the search is idle then.
-        """
-
-    def Clear(self) -> None:
-        """Make the search idle and let go of the text."""
-
-def _FindStringEndNonNested(search: CNonNestedSearch, quote_i: int) -> int:
-    """
-    The byte index behind the string literal whose opening quote stands at `quote_i` of the text
-    searched. An unterminated one ends with its row, with triple quotes at the end of the search.
-    IndexError when `quote_i` lies outside the text searched.
-    """
 
 def _RecordKinds() -> tuple[tuple[str, bytes, int, str, str, str, str, str], ...]:
     """

@@ -1,21 +1,14 @@
 """The defs of a source: their arguments with types and defaults, and what they are known to give back."""
 
-from collections.abc import Iterable, Iterator, Sequence
+import re
+from collections.abc import Iterable, Iterator
 from dataclasses import dataclass, field, replace
-from os import PathLike, fspath
-from pathlib import Path
 from typing import Any
 
-from codeloom import logicalline
-from codeloom.check import Problem
-from codeloom.engine import Analysis, AnalyzerOf, Complaint, ComplaintOf, LineAnalyzer
-from codeloom.languages import DEFAULT_LANGUAGE_NAME, Language, LanguageOf
-from codeloom.line_length import TooLong
-from codeloom.line_reader import LineReader
-from codeloom.logicalline import CLogicalLine
-from codeloom.records import CRecord, RecordsOfLogical
-from codeloom.scopes import ScopeReader, WithSelfLeftOut
-from codeloom.source import Source, SourceFromBytes, SourceFromText
+from codeloom._analysis import Analysis, Line, LineKind, Problem, Record, RecordKind
+from codeloom._literals import EvaluateStringLiteral
+from codeloom.line_trees import new_parser
+from codeloom.reading.languages import language_of
 from codeloom.strutils import AsStr
 from codeloom.symbolinfo import JoinTokens, kArgPrefix
 from codeloom.treesift import (
@@ -27,6 +20,8 @@ from codeloom.treesift import (
     GetDefiningArgInfoList,
 )
 from codeloom.utils import GetLogicalsFromText
+
+_ARGUMENT_PREFIX = kArgPrefix.decode()
 
 
 @dataclass(frozen=True, slots=True)
@@ -55,8 +50,9 @@ class Argument:
 class Signature:
     """One def, or what is wrong with its line.
 
-    `name` is that of the def behind those of the classes and defs around it. `row` and `column`
-    count from 1, the column in characters.
+    `name` is that of the def after those of the classes and defs around it. `row` and `column` count
+    from 1, the column in characters. Where the parameters are nested too deep to be told, as only those
+    of Python 2 can be, `arguments` is None.
     """
 
     path: str
@@ -65,183 +61,168 @@ class Signature:
     name: str = ""
     is_async: bool = False
     type_parameters: tuple[str, ...] = ()
-    arguments: tuple[Argument, ...] = ()
+    arguments: tuple[Argument, ...] | None = ()
     return_hint: str | None = None
     returns: tuple[Value, ...] = ()
     yields: tuple[Value, ...] = ()
     problem: Problem | None = None
 
 
-def SignaturesInFile(
-    path: str | PathLike[str],
-    language: Language | str = DEFAULT_LANGUAGE_NAME,
-    *,
-    false_hints: bool = False,
-) -> list[Signature]:
-    """The signatures in a file, in its order; OSError when it can't be read.
-
-    `language` is the version of Python that it is written in, such as "3.12". With `false_hints`
-    all that looks like a type hint is taken for one, as the engine itself does.
-    """
-    return SignaturesInBytes(Path(path).read_bytes(), language, fspath(path), false_hints=false_hints)
-
-
-def SignaturesInText(
-    text: str,
-    language: Language | str = DEFAULT_LANGUAGE_NAME,
-    path: str = "<string>",
-    *,
-    false_hints: bool = False,
-) -> list[Signature]:
-    """The same for a source text; `path` is the name that its lines bear."""
-    return _Signatures(SourceFromText(text), language, path, false_hints)
-
-
-def SignaturesInBytes(
-    data: bytes, language: Language | str, path: str, *, false_hints: bool = False
-) -> list[Signature]:
-    """The same for the bytes of a file, decoded as the file says; `path` is its name."""
-    return _Signatures(SourceFromBytes(data), language, path, false_hints)
-
-
-def _Signatures(source: Source, language: Language | str, path: str, false_hints: bool) -> list[Signature]:
-    language = LanguageOf(source.text, language)
-    reader = _SignatureReader(source, language, path, false_hints)
-    with Analysis():
-        for logical in GetLogicalsFromText(source.text):
-            reader.Read(logical)
-    return reader.Signatures()
+def signatures_of(analysis: Analysis) -> list[Signature]:
+    """The signatures of the defs in a text, in its order."""
+    reader = _SignatureReader(analysis)
+    for line in analysis.lines:
+        reader.read(line)
+    return reader.signatures()
 
 
 @dataclass
-class _Outcomes:
+class _Scope:
+    """A class or a def whose body is being read; `of_def` is the number of the def, from zero."""
+
+    indent: int
+    name: str
+    of_def: int | None = None
+
+
+@dataclass
+class _Def:
+    """A def, and what its body is known to give so far."""
+
+    signature: Signature
+    is_method: bool
+    has_body: bool = False
     returns: list[Value] = field(default_factory=list)
     yields: list[Value] = field(default_factory=list)
 
 
-class _SignatureReader(LineReader):
+class _SignatureReader:
     """Reads the logical lines of one text in their order."""
 
-    def __init__(self, source: Source, language: Language, path: str, false_hints: bool) -> None:
-        super().__init__(source, path)
-        self._fAnalyzer = LineAnalyzer(source.text, language, false_hints)
-        self._fParse = AnalyzerOf(language).ParseToNode
-        self._fSignatures: list[Signature] = []
-        self._fOutcomes: list[_Outcomes] = []
-        self._fScopes = ScopeReader(self._fRowMap)
+    def __init__(self, analysis: Analysis) -> None:
+        self._path = analysis.path
+        self._parser = new_parser(language_of(analysis.text, analysis.python))
+        self._defs: list[_Def] = []
+        self._scopes: list[_Scope] = []
 
-    def Signatures(self) -> list[Signature]:
+    def signatures(self) -> list[Signature]:
         """What was read so far."""
         return [
-            replace(signature, returns=tuple(outcomes.returns), yields=tuple(outcomes.yields))
-            for signature, outcomes in zip(self._fSignatures, self._fOutcomes, strict=True)
+            replace(known.signature, returns=tuple(known.returns), yields=tuple(known.yields))
+            for known in self._defs
         ]
 
-    def Read(self, logical: CLogicalLine) -> None:
+    def read(self, line: Line) -> None:
         """Read the next line."""
-        is_comment = logical.fType == logicalline.kComment
-        if not logical.fTokenCount or (is_comment and not logical.fFirstInDef):
+        if line.kind is LineKind.COMMENT:
+            self._read_comment(line)
             return
-        self._fScopes.Read(logical)
-        if logical.fType == logicalline.kFunctionDef:
-            self._ReadDef(logical)
-        elif logical.fType != logicalline.kClassDef and not TooLong(logical):
-            self._ReadBodyLine(logical)
+        indent = line.indent
+        while indent is not None and self._scopes and self._scopes[-1].indent >= indent:
+            self._scopes.pop()
+        if line.kind is LineKind.CLASS:
+            self._scopes.append(_Scope(indent or 0, _name_after("class", line.text)))
+        elif line.kind is LineKind.DEF:
+            self._read_def(line, indent or 0)
+        elif self._scopes and self._scopes[-1].of_def is not None:
+            self._read_body(line, self._defs[self._scopes[-1].of_def])
 
     # Lines
 
-    def _ReadDef(self, logical: CLogicalLine) -> None:
+    def _read_def(self, line: Line, indent: int) -> None:
         """Add the signature of a def, or its fault."""
-        row, column = self._FirstPlace(logical, (logical.fFirstLine, 0))
-        signature = Signature(
-            self._fPath, row, column, self._fScopes.name, is_async=logical.fToks[0] == "async"
-        )
-        problem = self._Hindrance(logical, logical.fFirstLine)
-        self._fOutcomes.append(_Outcomes())
-        self._fSignatures.append(
-            self._Analyzed(signature, logical) if problem is None else replace(signature, problem=problem)
-        )
+        is_method = bool(self._scopes) and self._scopes[-1].of_def is None
+        self._scopes.append(_Scope(indent, _name_after("def", line.text), len(self._defs)))
+        name = ".".join(scope.name for scope in self._scopes)
+        place = line.range
+        signature = Signature(self._path, place.row, place.column, name, line.text.startswith("async"))
+        for problem in line.problems:
+            signature = replace(signature, problem=problem)
+            break
+        else:
+            signature = self._filled(signature, line)
+        self._defs.append(_Def(signature, is_method))
 
-    def _Analyzed(self, signature: Signature, logical: CLogicalLine) -> Signature:
-        plain, error = self._fAnalyzer.Analyze(logical)
-        if error is not None:
-            return replace(signature, problem=self._Problem(ComplaintOf(error, plain)))
-        tree = self._fParse(plain, logical.fInAsyncDef)
+    def _filled(self, signature: Signature, line: Line) -> Signature:
+        (logical,) = GetLogicalsFromText(line.text)
+        tree = self._parser.ParseToNode(logical, signature.is_async)
         if tree is None:
             return signature
-        records: Sequence[CRecord] = RecordsOfLogical(plain)
-        if self._fScopes.is_method:
-            records = WithSelfLeftOut(records, plain)
         try:
-            return _Filled(signature, tree, records)
+            return _filled(signature, tree, line.records)
         except RecursionError:  # as only tuples among the parameters of Python 2 can be nested
-            row, column = logical.fPositions[0]
-            complaint = Complaint(logical.fFirstLine + row, column, "the parameters are nested too deep")
-            return replace(signature, problem=self._Problem(complaint))
+            return replace(signature, arguments=None)
         finally:
             FinishedWithNode(tree)
 
-    def _ReadBodyLine(self, logical: CLogicalLine) -> None:
-        """Take what a line in the body of a def gives back, and its hint for the def."""
-        scope = self._fScopes.innermost
-        if scope is None or scope.of_def is None:
+    def _read_body(self, line: Line, known: _Def) -> None:
+        """Take what a line in the body of a def gives back."""
+        known.has_body = True
+        for record in line.records:
+            if record.name in _OUTCOMES and record.kind is not RecordKind.GET:
+                values = known.returns if record.name == "return" else known.yields
+                values.append(_value_of(record, line.range.row))
+
+    def _read_comment(self, line: Line) -> None:
+        """Take the hint of a def on the first row of its body."""
+        scope = self._scopes[-1] if self._scopes else None
+        if scope is None or scope.of_def is None or (line.indent or 0) <= scope.indent:
             return
-        plain, error = self._fAnalyzer.Analyze(logical)
-        if error is not None:
-            return
-        records = RecordsOfLogical(plain)
-        if logical.fType == logicalline.kComment:
-            signature = self._fSignatures[scope.of_def]
-            self._fSignatures[scope.of_def] = _WithHintsOfBody(signature, records, self._fScopes.is_method)
-            return
-        outcomes = self._fOutcomes[scope.of_def]
-        for record in records:
-            if record.name in ("return", "yield") and record.kind.name != "Get":
-                values = outcomes.returns if record.name == "return" else outcomes.yields
-                values.append(_ValueOf(record, logical.fFirstLine + 1))
+        known = self._defs[scope.of_def]
+        if not known.has_body:
+            known.has_body = True
+            known.signature = _with_hints_of_body(known.signature, line.records, known.is_method)
 
 
-def _ValueOf(record: CRecord, row: int) -> Value:
-    if record.kind.payload != "literal":
+_OUTCOMES = ("return", "yield")
+
+
+def _name_after(keyword: str, text: str) -> str:
+    _, _, rest = text.partition(f"{keyword} ")
+    return next(iter(re.findall(r"\w+", rest)), "?")
+
+
+def _value_of(record: Record, row: int) -> Value:
+    value = record.value
+    if record.kind is not RecordKind.LITERAL or not isinstance(value, tuple):
         return Value(row, None, record.payload)
-    type_name, text = record.value if isinstance(record.value, tuple) else (record.payload, None)
-    return Value(row, type_name, text)
+    return Value(row, *value)
 
 
 # The signature of one def
 
 
-def _Filled(signature: Signature, tree: CNode, records: Iterable[CRecord]) -> Signature:
+def _filled(signature: Signature, tree: CNode, records: Iterable[Record]) -> Signature:
     """A signature with what the tree and the records say of its def."""
-    of_arguments: dict[str, list[CRecord]] = {}
+    of_arguments: dict[str, list[Record]] = {}
     for record in records:
-        if record.of_arg:
+        if record.of_argument:
             of_arguments.setdefault(record.name, []).append(record)
     funcdef = tree
-    while not isinstance(funcdef, CFuncdefStmt):  # it stands last behind `async` and type parameters
+    while not isinstance(funcdef, CFuncdefStmt):  # it stands last, after `async` and type parameters
         funcdef = funcdef.fChildren[-1]
     return replace(
         signature,
-        type_parameters=tuple(_TypeParameters(of_arguments)),
-        arguments=tuple(_Arguments(funcdef, of_arguments, signature.row)),
-        return_hint=_Hint(funcdef.GetReturnType(), of_arguments.get("return", ())),
+        type_parameters=tuple(_type_parameters(of_arguments)),
+        arguments=tuple(_arguments(funcdef, of_arguments, signature.row)),
+        return_hint=_hint(funcdef.GetReturnType(), of_arguments.get("return", ())),
     )
 
 
-def _Arguments(funcdef: CFuncdefStmt, of_arguments: dict[str, list[CRecord]], row: int) -> list[Argument]:
+def _arguments(funcdef: CFuncdefStmt, of_arguments: dict[str, list[Record]], row: int) -> list[Argument]:
     arguments = []
-    for info in _Flat(GetDefiningArgInfoList(funcdef.GetParameters())):
+    for info in _flat(GetDefiningArgInfoList(funcdef.GetParameters())):
         name = None if info.name is None else info.name.fText
         records = of_arguments.get(name, ()) if name else ()
-        hint, default = _Hint(info.type_expr, records), _Default(info.value, records, row)
+        hint, default = _hint(info.type_expr, records), _default(info.value, records, row)
         arguments.append(Argument(name, info.prefix or "", hint, default))
-    slash_i = _SlashIndex(funcdef)
+    slash_i = _slash_index(funcdef)
     if slash_i is not None:
         arguments.insert(slash_i, Argument(None, "/"))
     return arguments
 
 
-def _SlashIndex(funcdef: CFuncdefStmt) -> int | None:
+def _slash_index(funcdef: CFuncdefStmt) -> int | None:
     """The number of arguments in front of a `/`."""
     parameters = funcdef.GetParameters()
     inner = parameters.GetChild(1) if parameters is not None else None
@@ -249,36 +230,32 @@ def _SlashIndex(funcdef: CFuncdefStmt) -> int | None:
     return texts[: texts.index("/")].count(",") if "/" in texts else None
 
 
-def _Flat(infos: Iterable[Any]) -> Iterator[Any]:
+def _flat(infos: Iterable[Any]) -> Iterator[Any]:
     for info in infos:
         if isinstance(info, list):
-            yield from _Flat(info)
+            yield from _flat(info)
         else:
             yield info
 
 
-def _Hint(annotation: CNode | None, records: Iterable[CRecord]) -> str | None:
-    """The annotation, without its quotes, or the hint in a comment."""
+def _hint(annotation: CNode | None, records: Iterable[Record]) -> str | None:
+    """The annotation, the value of one in quotes, or the hint in a comment."""
     if annotation is None:
-        return next((record.payload for record in records if record.kind.name == "TypeHint"), None)
+        return next((record.payload for record in records if record.kind is RecordKind.HINT), None)
     annotation = DropSimpleParens(annotation)
-    if isinstance(annotation, CStringLiteral):
-        return annotation.GetStringContents()
-    return _Written(annotation)
+    value = EvaluateStringLiteral(annotation.fText) if isinstance(annotation, CStringLiteral) else None
+    return value if isinstance(value, str) else _written(annotation)
 
 
-def _Default(default: CNode | None, records: Iterable[CRecord], row: int) -> Value | None:
+def _default(default: CNode | None, records: Iterable[Record], row: int) -> Value | None:
     if default is None:
         return None
-    value = Value(row, None, _Written(default))
-    for record in records:
-        if record.kind.payload == "literal":
-            known = _ValueOf(record, row)
-            return known if known.text is not None else replace(value, type=known.type)
-    return value
+    literals = (record for record in records if record.kind is RecordKind.LITERAL)
+    known = next((_value_of(record, row).type for record in literals), None)
+    return Value(row, known, _written(default))
 
 
-def _Written(expression: CNode) -> str:
+def _written(expression: CNode) -> str:
     """An expression as it is written, but for its blanks; it may be nested to any depth."""
     texts, pending = [], [DropSimpleParens(expression)]
     while pending:
@@ -290,29 +267,34 @@ def _Written(expression: CNode) -> str:
     return AsStr(JoinTokens(texts))
 
 
-def _TypeParameters(of_arguments: dict[str, list[CRecord]]) -> Iterator[str]:
+def _type_parameters(of_arguments: dict[str, list[Record]]) -> Iterator[str]:
     for name, records in of_arguments.items():
         for record in records:
-            if record.kind.name == "TypeParameter":
+            if record.kind is RecordKind.TYPEPARAM:
                 bound = record.payload.lstrip("* ")
                 stars = record.payload[: len(record.payload) - len(record.payload.lstrip("*"))]
                 yield stars + name + (f": {bound}" if bound else "")
 
 
-def _WithHintsOfBody(signature: Signature, records: Iterable[CRecord], is_method: bool) -> Signature:
-    """A signature with the hints of a comment on the first row of the body, which knows no names."""
-    hints = {record.name: record.payload for record in records if record.kind.name == "TypeHint"}
+def _with_hints_of_body(signature: Signature, records: Iterable[Record], is_method: bool) -> Signature:
+    """A signature with the hints of a comment on the first row of the body, which knows no names.
+
+    There must be as many as arguments; those of a method may leave out the first.
+    """
+    hints = {record.name: record.payload for record in records if record.kind is RecordKind.HINT}
     return_hint = hints.pop("return", None)
-    named = [argument for argument in signature.arguments if argument.name]
-    skipped = 1 if is_method and len(hints) == len(named) - 1 else 0
-    by_name = {
-        argument.name: hints.get(f"{kArgPrefix.decode()}{i}") for i, argument in enumerate(named[skipped:])
-    }
+    arguments = signature.arguments or ()
+    named = [argument.name for argument in arguments if argument.name]
+    if is_method and len(hints) == len(named) - 1:
+        named = named[1:]
+    if hints and len(hints) != len(named):
+        return signature
+    by_name = {name: hints.get(f"{_ARGUMENT_PREFIX}{i}") for i, name in enumerate(named)}
     return replace(
         signature,
         return_hint=signature.return_hint or return_hint,
         arguments=tuple(
-            replace(argument, hint=argument.hint or by_name.get(argument.name))
-            for argument in signature.arguments
+            replace(argument, hint=argument.hint or by_name.get(argument.name or ""))
+            for argument in arguments
         ),
     )

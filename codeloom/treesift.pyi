@@ -198,6 +198,18 @@ def BytesFindByte(b: bytes, c: int | bytes | str, start: int=0) -> int:
     0 <= start < len(b), TypeError when `b` is no byte string.
     """
 
+def InitNonNestedStruct(structure: CNonNestedSearch, search_ptr: bytes | str | None, to_find_bytes: bytes, start: int, end: int) -> int:
+    """
+    Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`; None is for no
+    text at all. Returns 0. TypeError for anything else, AssertionError when `start` or `end` lies
+    outside the text.
+    """
+
+def FindNextNonNestedStruct(structure: CNonNestedSearch) -> int:
+    """
+    The byte offset of the next hit outside brackets and strings; -1 when there is none.
+    """
+
 def StrInStr(sub: bytes, whole: bytes) -> bool:
     """
     True when `sub` occurs in `whole`, where a zero byte ends either of them. TypeError unless both
@@ -1239,10 +1251,8 @@ class CNodeToTextConverter:
 class CNodeToTextConverterImpl(CNodeToTextConverter):
     """Turns nodes into short texts, as names are recorded."""
 
-    def __init__(self, include_bracket_text: object | None=False, include_string_contents: object | None=False, include_arg_text: object | None=False) -> None:
-        """
-        Each a truth value: whether what stands in brackets, in strings and in calls is shown.
-        """
+    def __init__(self, include_bracket_text: bool=False, include_string_contents: bool=False, include_arg_text: bool=False) -> None:
+        """Whether what stands in brackets, in strings and in calls is shown."""
 
     @property
     def _fIncludeArgText(self) -> bool:
@@ -1342,7 +1352,7 @@ class CMatchCaseStatementParser:
 class CPGenParserImpl(CPGenAnalyzer):
     """Analyzes logical using a parser implemented via the pgen2 package"""
 
-    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: object=True) -> None:
+    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: bool=True) -> None:
         ...
 
     @property
@@ -1374,8 +1384,8 @@ class CPGenParserImpl(CPGenAnalyzer):
         The list that gives the node class for each token type and grammar state. Updates kClsForState.
         """
 
-    def DiscardNode(self, node: object) -> None:
-        """Give a tree back to the free lists."""
+    def DiscardNode(self, node: object | None) -> None:
+        """Give a tree back to the free lists. AttributeError for None."""
 
     def ParseToNode(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool=False) -> CNode | None:
         """
@@ -1814,7 +1824,7 @@ class CTypeHintWalker(CDispatchWalker):
 
     def _ParseHint(self, hint: str, tok_i: int, call_general_node_walker: bool) -> CNode | None:
         """
-        The top node of a hint, or None. Give it back with `_fHintParser.DiscardNode`. SyntaxError with the place in the comment when it doesn't parse.
+        The top node of a hint; None when it isn't one expression. Give it back with `_fHintParser.DiscardNode`. SyntaxError with the place in the comment when it doesn't parse.
         """
 
     def _RaiseHintSyntaxError(self, tok_i: int, utf8_offset_in_hint: int) -> None:
@@ -1830,7 +1840,7 @@ class CTypeHintWalker(CDispatchWalker):
 class CPGenAnalyzerImpl(CPGenAnalyzer):
     """Analyzes logical using a parser implemented via the pgen2 package"""
 
-    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: object=True, hint_grammar_file: object='Python-Grammar-3.8') -> None:
+    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.8', keyword_seq: object | None=None, py3_grammar: bool=True, hint_grammar_file: object='Python-Grammar-3.8') -> None:
         ...
 
     @property
@@ -1912,7 +1922,7 @@ class CNewerParser(CPGenParserImpl):
     Parses the language up to Python 3.14, with the grammar file of that version.
     """
 
-    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True) -> None:
+    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: bool=True) -> None:
         ...
 
     def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
@@ -1972,5 +1982,12 @@ class CNewerParser(CPGenParserImpl):
 class CNewerAnalyzer(CPGenAnalyzerImpl):
     """Analyzes logical lines of the language up to Python 3.14."""
 
-    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: object=True, hint_grammar_file: object='Python-Grammar-3.14') -> None:
+    def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: bool=True, hint_grammar_file: object='Python-Grammar-3.14') -> None:
         ...
+
+    def AnalyzeSingleLogical(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool, first_in_def: bool=False) -> typing.Any:
+        """
+        Analyze a single logical and return any exception (typically
+               SyntaxError, but can be other errors). Note that exception is only
+               returned if logical has not previously been parsed.
+        """

@@ -28,23 +28,25 @@ def main(argv: Sequence[str] | None = None) -> int:
     Wrong use raises SystemExit, as the standard library's parser of arguments does.
     """
     try:
-        arguments = _ArgumentParser().parse_args(argv)
-        status: int = arguments.command().Run(arguments)
+        arguments = _argument_parser().parse_args(argv)
+        status: int = arguments.command().run(arguments)
         if sys.stdout is not None:
             sys.stdout.flush()
         return status
     except KeyboardInterrupt:
         return _INTERRUPTED
     except BrokenPipeError:
-        _DropOutput()
+        _drop_output()
         return _PIPE_CLOSED
     except OSError as error:
-        _DropOutput()
+        _drop_output()
         print(f"codeloom: {error}", file=sys.stderr)
-        return ExitStatus.FAILURE
+    except MemoryError:
+        print("codeloom: out of memory: name fewer or smaller files", file=sys.stderr)
+    return ExitStatus.FAILURE
 
 
-def _ArgumentParser() -> argparse.ArgumentParser:
+def _argument_parser() -> argparse.ArgumentParser:
     parser = argparse.ArgumentParser(
         prog="codeloom", description="Analyses Python source one logical line at a time."
     )
@@ -52,12 +54,12 @@ def _ArgumentParser() -> argparse.ArgumentParser:
     commands = parser.add_subparsers(metavar="COMMAND", required=True)
     for command in COMMANDS:
         command_parser = commands.add_parser(command.NAME, help=command.HELP, description=command.DESCRIPTION)
-        command.AddArguments(command_parser)
+        command.add_arguments(command_parser)
         command_parser.set_defaults(command=command)
     return parser
 
 
-def _DropOutput() -> None:
+def _drop_output() -> None:
     """Send what is left in the buffers nowhere, so that the interpreter can end quietly."""
     nowhere = os.open(os.devnull, os.O_WRONLY)
     os.dup2(nowhere, sys.stdout.fileno())

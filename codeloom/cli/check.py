@@ -1,42 +1,40 @@
 """`codeloom check`: which logical lines of the files aren't sound."""
 
 import argparse
-from dataclasses import dataclass
 
-from codeloom.check import CheckBytes, Report
-from codeloom.cli.command import AddFalseHintsArgument, AddSourceArguments, Command, ExitStatus
+from codeloom._analysis import Analysis
+from codeloom.cli.command import Command, ExitStatus, add_source_arguments, analyses
 from codeloom.cli.console import Console
-from codeloom.cli.files import ReadFiles
 
 
-@dataclass
 class Tally:
     """What a run has seen so far."""
 
-    files: int = 0
-    faulty_files: int = 0
-    unread: int = 0
-    problems: int = 0
-    logicals: int = 0
+    def __init__(self) -> None:
+        self.files = 0
+        self.faulty_files = 0
+        self.unread = 0
+        self.problems = 0
+        self.lines = 0
 
-    def Add(self, report: Report) -> None:
+    def add(self, analysis: Analysis) -> None:
         """Count one file."""
         self.files += 1
-        self.faulty_files += bool(report.problems)
-        self.problems += len(report.problems)
-        self.logicals += report.logical_count
+        self.faulty_files += bool(analysis.problems)
+        self.problems += len(analysis.problems)
+        self.lines += len(analysis.lines)
 
-    def Status(self) -> ExitStatus:
+    def status(self) -> ExitStatus:
         """The exit status: what can't be read wins over problems."""
         if self.unread:
             return ExitStatus.FAILURE
         return ExitStatus.PROBLEMS if self.problems else ExitStatus.SOUND
 
     def __str__(self) -> str:
-        files = _Counted(self.files, "file")
+        files = _counted(self.files, "file")
         where = f"{self.faulty_files:,} of {files}" if self.problems else files
-        text = f"{_Counted(self.problems, 'problem')} in {where}"
-        text += f", {_Counted(self.logicals, 'logical line')}"
+        text = f"{_counted(self.problems, 'problem')} in {where}"
+        text += f", {_counted(self.lines, 'logical line')}"
         return f"{text}; {self.unread:,} not read" if self.unread else text
 
 
@@ -51,30 +49,29 @@ class CheckCommand(Command):
     )
 
     def __init__(self) -> None:
-        self._fConsole = Console()
-        self._fTally = Tally()
+        self._console = Console()
+        self._tally = Tally()
 
-    @staticmethod
-    def AddArguments(parser: argparse.ArgumentParser) -> None:
+    @classmethod
+    def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
         """Add the command's own arguments."""
-        AddSourceArguments(parser)
-        AddFalseHintsArgument(parser)
+        add_source_arguments(parser)
 
-    def Run(self, arguments: argparse.Namespace) -> ExitStatus:
-        """Check all files; one that can't be read is told, and the others are checked."""
-        for path, data in ReadFiles(arguments.paths, self._OnFailure):
-            report = CheckBytes(data, arguments.language, path, false_hints=arguments.false_hints)
-            self._fTally.Add(report)
-            for problem in report.problems:
-                self._fConsole.PrintProblem(problem)
-            self._fConsole.Flush()
-        self._fConsole.PrintSummary(str(self._fTally))
-        return self._fTally.Status()
+    def run(self, arguments: argparse.Namespace) -> ExitStatus:
+        """Check all files; one that can't be read is reported, and the others are checked."""
+        for analysis in analyses(arguments, self._on_error):
+            self._tally.add(analysis)
+            if analysis.problems:
+                for problem in analysis.problems:
+                    self._console.print_problem(problem)
+                self._console.flush()
+        self._console.print_row(str(self._tally))
+        return self._tally.status()
 
-    def _OnFailure(self, path: str, error: OSError) -> None:
-        self._fTally.unread += 1
-        self._fConsole.PrintFailure(path, error)
+    def _on_error(self, error: OSError) -> None:
+        self._tally.unread += 1
+        self._console.print_failure(error)
 
 
-def _Counted(count: int, noun: str) -> str:
+def _counted(count: int, noun: str) -> str:
     return f"{count:,} {noun}" if count == 1 else f"{count:,} {noun}s"

@@ -6,8 +6,8 @@ import shutil
 import sys
 from enum import StrEnum
 
-from codeloom.check import Problem
-from codeloom.excerpt import Excerpt, Printable
+from codeloom._analysis import Problem
+from codeloom.cli.excerpt import excerpt, printable
 
 _INDENT = "    "
 _WIDTH_WITHOUT_TERMINAL = 100
@@ -29,7 +29,7 @@ class Colour(StrEnum):
 class Console:
     """The standard streams, as the terminal or the pipe behind them wants them.
 
-    `width` is the room for a row behind the indentation, in columns of the terminal.
+    `width` is the room for a row after the indentation, in columns of the terminal.
     """
 
     def __init__(self) -> None:
@@ -37,50 +37,53 @@ class Console:
             sys.stdout.reconfigure(errors="backslashreplace")
         columns = shutil.get_terminal_size((_WIDTH_WITHOUT_TERMINAL, 0)).columns
         self.width = max(columns - len(_INDENT), _LEAST_WIDTH)
-        self._fHasColour = _IsColourWanted()
+        self._encoding = getattr(sys.stdout, "encoding", None) or "utf-8"
+        self._has_colour = _is_colour_wanted()
 
-    def PrintProblem(self, problem: Problem) -> None:
-        """The problem's place and message, its row of source and a caret under the place."""
-        place = f"{PrintablePath(problem.path)}:{problem.row}:{problem.column}:"
-        row, caret = Excerpt(problem.source_row, problem.column, self.width)
-        print(self.Coloured(Colour.BOLD, place), Printable(problem.message))
-        print(_INDENT + row)
-        print(_INDENT + self.Coloured(Colour.RED, caret))
+    def print_problem(self, problem: Problem) -> None:
+        """A problem's place and message, its row of source and a caret under the place."""
+        start = problem.range
+        message = f"{problem.code} {problem.message}"
+        self.print_fault(problem.path, start.row, start.column, message, problem.source_row)
 
-    def PrintFailure(self, path: str, error: OSError) -> None:
+    def print_fault(self, path: str, row: int, column: int, message: str, source_row: str) -> None:
+        """The same for any fault; row and column count from 1."""
+        place = f"{printable_path(path)}:{row}:{column}:"
+        shown, caret = excerpt(source_row, column, self.width, self._encoding)
+        print(self.coloured(Colour.BOLD, place), printable(message))
+        print(_INDENT + shown)
+        print(_INDENT + self.coloured(Colour.RED, caret))
+
+    def print_failure(self, error: OSError) -> None:
         """What can't be read, and why."""
         reason = error.strerror or str(error)
-        self.PrintError(f"codeloom: can't read {PrintablePath(path)}: {reason}")
+        self.print_error(f"codeloom: can't read {printable_path(error.filename)}: {reason}")
 
-    def PrintSummary(self, text: str) -> None:
-        """The last row of a command's output."""
-        print(text)
-
-    def PrintRow(self, row: str) -> None:
+    def print_row(self, row: str) -> None:
         """A row of a command's result."""
         print(row)
 
-    def PrintError(self, text: str) -> None:
-        """What is no part of the result, behind what was printed before."""
-        self.Flush()
+    def print_error(self, text: str) -> None:
+        """What is no part of the result, after what was printed before."""
+        self.flush()
         print(text, file=sys.stderr)
 
-    def Flush(self) -> None:
+    def flush(self) -> None:
         """Bring what was printed to its reader."""
         if sys.stdout is not None:
             sys.stdout.flush()
 
-    def Coloured(self, colour: Colour, text: str) -> str:
+    def coloured(self, colour: Colour, text: str) -> str:
         """`text` in a colour, where the output is a terminal that takes it."""
-        return f"{colour}{text}{_PLAIN}" if self._fHasColour else text
+        return f"{colour}{text}{_PLAIN}" if self._has_colour else text
 
 
-def PrintablePath(path: str) -> str:
+def printable_path(path: str) -> str:
     """`path` as a row of a terminal can show it, whatever bytes it is made of."""
-    return Printable(os.fsencode(path).decode(errors="backslashreplace"))
+    return printable(os.fsencode(path).decode(errors="backslashreplace"))
 
 
-def _IsColourWanted() -> bool:
+def _is_colour_wanted() -> bool:
     return (
         sys.stdout is not None
         and sys.stdout.isatty()

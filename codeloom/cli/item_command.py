@@ -2,72 +2,52 @@
 
 import argparse
 from abc import ABC, abstractmethod
-from collections.abc import Iterable, Mapping
-from typing import ClassVar, Generic, Protocol, TypeVar
+from collections.abc import Mapping
+from typing import ClassVar
 
-from codeloom.check import Problem
-from codeloom.cli.command import AddFalseHintsArgument, AddSourceArguments, Command, ExitStatus
+from codeloom._analysis import Analysis
+from codeloom.cli.command import Command, ExitStatus, add_source_arguments, analyses
 from codeloom.cli.console import Console
-from codeloom.cli.files import ReadFiles
-from codeloom.languages import Language
 
 
-class Item(Protocol):
-    """What stands in a file; its line may be faulty."""
-
-    @property
-    def problem(self) -> Problem | None:
-        """The fault of the line."""
-
-
-ItemT = TypeVar("ItemT", bound=Item)
-
-
-class ItemFormat(ABC, Generic[ItemT]):
-    """Prints items one after another."""
+class ItemFormat(ABC):
+    """Prints the items of one file after another."""
 
     def __init__(self, console: Console) -> None:
-        self._fConsole = console
+        self._console = console
 
     @abstractmethod
-    def Add(self, item: ItemT, /) -> None:
-        """Print one item."""
+    def add(self, analysis: Analysis) -> bool:
+        """Print the items of a file; true when none of them is faulty."""
 
 
-class ItemCommand(Command, Generic[ItemT]):
+class ItemCommand(Command):
     """Prints the items of each file, one file after the other."""
 
-    FORMATS: ClassVar[Mapping[str, type[ItemFormat]]]  # type: ignore[type-arg]
+    FORMATS: ClassVar[Mapping[str, type[ItemFormat]]]
     FORMAT_HELP: ClassVar[str]
 
     def __init__(self) -> None:
-        self._fConsole = Console()
-        self._fStatus = ExitStatus.SOUND
-
-    @abstractmethod
-    def Items(self, data: bytes, language: Language, path: str, false_hints: bool) -> Iterable[ItemT]:
-        """The items of the bytes of a file."""
+        self._console = Console()
+        self._status = ExitStatus.SOUND
 
     @classmethod
-    def AddArguments(cls, parser: argparse.ArgumentParser) -> None:
+    def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
         """Add the arguments that these commands share."""
-        AddSourceArguments(parser)
-        AddFalseHintsArgument(parser)
+        add_source_arguments(parser)
         parser.add_argument(
             "--format", choices=cls.FORMATS, default="text", help=f"{cls.FORMAT_HELP} (default: %(default)s)"
         )
 
-    def Run(self, arguments: argparse.Namespace) -> ExitStatus:
-        """Print all files; one that can't be read is told, and the others are printed."""
-        item_format = self.FORMATS[arguments.format](self._fConsole)
-        for path, data in ReadFiles(arguments.paths, self._OnFailure):
-            for item in self.Items(data, arguments.language, path, arguments.false_hints):
-                item_format.Add(item)
-                if item.problem is not None:
-                    self._fStatus = max(self._fStatus, ExitStatus.PROBLEMS)
-            self._fConsole.Flush()
-        return self._fStatus
+    def run(self, arguments: argparse.Namespace) -> ExitStatus:
+        """Print all files; one that can't be read is reported, and the others are printed."""
+        item_format = self.FORMATS[arguments.format](self._console)
+        for analysis in analyses(arguments, self._on_error, records=True):
+            if not item_format.add(analysis):
+                self._status = max(self._status, ExitStatus.PROBLEMS)
+            self._console.flush()
+        return self._status
 
-    def _OnFailure(self, path: str, error: OSError) -> None:
-        self._fStatus = ExitStatus.FAILURE
-        self._fConsole.PrintFailure(path, error)
+    def _on_error(self, error: OSError) -> None:
+        self._status = ExitStatus.FAILURE
+        self._console.print_failure(error)

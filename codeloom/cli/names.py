@@ -1,14 +1,10 @@
 """`codeloom names`: what each logical line reads and binds, and what it says of these names."""
 
-from collections.abc import Iterator
-
 from codeloom.cli import names_formats
 from codeloom.cli.item_command import ItemCommand
-from codeloom.languages import Language
-from codeloom.line_names import LineNames, NamesInBytes
 
 
-class NamesCommand(ItemCommand[LineNames]):
+class NamesCommand(ItemCommand):
     """Prints the names of each logical line."""
 
     NAME = "names"
@@ -21,7 +17,3 @@ class NamesCommand(ItemCommand[LineNames]):
     )
     FORMATS = names_formats.FORMATS
     FORMAT_HELP = "text; or jsonl, with an object for each record on a row"
-
-    def Items(self, data: bytes, language: Language, path: str, false_hints: bool) -> Iterator[LineNames]:
-        """The logical lines of a file."""
-        return NamesInBytes(data, language, path, false_hints=false_hints)

@@ -1,94 +1,125 @@
 """The forms in which `codeloom names` prints what lines say of names."""
 
 import json
+from abc import abstractmethod
 from collections.abc import Iterable, Iterator, Mapping
-from dataclasses import astuple
 from itertools import chain
-from typing import Any
 
-from codeloom.cli.console import Colour, Console, PrintablePath
+from codeloom._analysis import Analysis, Limit, Line, Problem, Range, Record, RecordKind
+from codeloom.cli.console import Colour, Console, printable_path
+from codeloom.cli.excerpt import on_one_row, printable
 from codeloom.cli.item_command import ItemFormat
-from codeloom.cli.names_in_words import Statements
-from codeloom.excerpt import OnOneRow, Printable
-from codeloom.line_names import LineNames, PlacedRecord
+from codeloom.cli.names_in_words import statements
 
 _INDENT = "    "
 _LABEL_WIDTH = 9
 _CUT = "..."
 
 
-class TextFormat(ItemFormat[LineNames]):
+class NamesFormat(ItemFormat):
+    """Prints what each line says."""
+
+    def add(self, analysis: Analysis) -> bool:
+        """Print the lines of a file, and its problems where they stand."""
+        limits = {limit.line: limit for limit in analysis.limits}
+        problems = iter(analysis.problems)
+        problem = next(problems, None)
+        for line in analysis.lines:
+            while problem is not None and _starts_before_end(problem.range, line.range):
+                self._add_problem(analysis.path, problem)
+                problem = next(problems, None)
+            records = list(line.records)
+            limit = limits.get(line) if limits else None
+            if records or limit is not None:
+                self._add_line(analysis.path, line, records, limit)
+        while problem is not None:
+            self._add_problem(analysis.path, problem)
+            problem = next(problems, None)
+        return not analysis.problems
+
+    @abstractmethod
+    def _add_line(self, path: str, line: Line, records: list[Record], limit: Limit | None) -> None:
+        """Print a line that says something."""
+
+    @abstractmethod
+    def _add_problem(self, path: str, problem: Problem) -> None:
+        """Print what is wrong with a line."""
+
+
+def _starts_before_end(place: Range, line: Range) -> bool:
+    return (place.row, place.column) <= (line.end_row, line.end_column)
+
+
+class TextFormat(NamesFormat):
     """For people: the line's place and first row, and what it does with names below."""
 
     def __init__(self, console: Console) -> None:
         super().__init__(console)
-        self._fRoom = console.width - _LABEL_WIDTH
+        self._room = console.width - _LABEL_WIDTH
 
-    def Add(self, line: LineNames, /) -> None:
-        """Print one line, unless it says nothing."""
-        if line.problem is not None:
-            self._fConsole.PrintProblem(line.problem)
-            return
-        if not line.records and not line.limits:
-            return
-        place = f"{PrintablePath(line.path)}:{line.row}:{line.column}:"
+    def _add_problem(self, path: str, problem: Problem) -> None:
+        self._console.print_problem(problem)
+
+    def _add_line(self, path: str, line: Line, records: list[Record], limit: Limit | None) -> None:
+        place = f"{printable_path(path)}:{line.range.row}:{line.range.column}:"
         first_row, _, more = line.text.partition("\n")
-        text = Printable(first_row.rstrip()) + (f" {_CUT}" if more else "")
-        self._fConsole.PrintRow(f"{self._fConsole.Coloured(Colour.BOLD, place)} {self._Shortened(text)}")
-        for label, rows in Statements([placed.record for placed in line.records]):
-            self._PrintStatement(label, rows)
-        for limit in line.limits:
-            self._PrintStatement("partly", [[f"the line is too much for a full walk: {limit}"]])
+        text = printable(first_row.rstrip()) + (f" {_CUT}" if more else "")
+        self._console.print_row(f"{self._console.coloured(Colour.BOLD, place)} {self._shortened(text)}")
+        for label, rows in statements(records):
+            self._print_statement(label, rows)
+        if limit is not None:
+            self._print_statement("partly", [[limit.message]])
 
-    def _PrintStatement(self, label: str, rows: Iterable[list[str]]) -> None:
-        shown = self._fConsole.Coloured(Colour.CYAN, f"{label:<{_LABEL_WIDTH}}")
-        for row in chain.from_iterable(map(self._Wrapped, rows)):
-            self._fConsole.PrintRow(_INDENT + shown + Printable(row))
+    def _print_statement(self, label: str, rows: Iterable[list[str]]) -> None:
+        shown = self._console.coloured(Colour.CYAN, f"{label:<{_LABEL_WIDTH}}")
+        for row in chain.from_iterable(map(self._wrapped, rows)):
+            self._console.print_row(_INDENT + shown + printable(row))
             shown = " " * _LABEL_WIDTH
 
-    def _Wrapped(self, items: list[str]) -> Iterator[str]:
+    def _wrapped(self, items: list[str]) -> Iterator[str]:
         """The items on as many rows as they need; one that is too long for a row is cut."""
         row = ""
-        for item in map(self._Shortened, map(OnOneRow, items)):
-            if row and len(row) + len(item) + 3 > self._fRoom:
+        for item in map(self._shortened, map(on_one_row, items)):
+            if row and len(row) + len(item) + 3 > self._room:
                 yield f"{row},"
                 row = item
             else:
                 row = f"{row}, {item}" if row else item
         yield row
 
-    def _Shortened(self, text: str) -> str:
-        return text if len(text) <= self._fRoom else text[: self._fRoom - len(_CUT)] + _CUT
+    def _shortened(self, text: str) -> str:
+        return text if len(text) <= self._room else text[: self._room - len(_CUT)] + _CUT
 
 
-class JsonLinesFormat(ItemFormat[LineNames]):
+class JsonLinesFormat(NamesFormat):
     """For programs: an object for each record on a row of its own."""
 
-    def Add(self, line: LineNames, /) -> None:
-        """The line's records, or what is wrong with it; limits go to the standard error."""
-        for placed in line.records:
-            self._fConsole.PrintRow(json.dumps(_Fields(line, placed)))
-        if line.problem is not None:
-            self._fConsole.PrintRow(json.dumps(_ErrorFields(line)))
-        for limit in line.limits:
-            self._fConsole.PrintError(f"{PrintablePath(line.path)}:{line.row}: {limit}")
+    def _add_line(self, path: str, line: Line, records: list[Record], limit: Limit | None) -> None:
+        """The line's records; its limit goes to the standard error."""
+        scope = next((record.name for record in records if record.kind is RecordKind.SET), None)
+        for record in records:
+            place = record.range
+            self._print(
+                path,
+                _values(place) if place else (line.range.row, None, None, None),
+                record.name,
+                record.kind.value,
+                record.payload or None,
+                scope if record.of_argument else None,
+            )
+        if limit is not None:
+            self._console.print_error(f"{printable_path(path)}:{line.range.row}: {limit.message}")
+
+    def _add_problem(self, path: str, problem: Problem) -> None:
+        self._print(path, _values(problem.range), None, "error", problem.message, None)
+
+    def _print(self, path: str, place: Iterable[int | None], *rest: str | None) -> None:
+        names = ("path", "row", "column", "end_row", "end_column", "name", "kind", "payload", "scope")
+        self._console.print_row(json.dumps(dict(zip(names, (path, *place, *rest), strict=True))))
 
 
-FORMATS: Mapping[str, type[ItemFormat[LineNames]]] = {"text": TextFormat, "jsonl": JsonLinesFormat}
+FORMATS: Mapping[str, type[ItemFormat]] = {"text": TextFormat, "jsonl": JsonLinesFormat}
 
 
-def _Fields(line: LineNames, placed: PlacedRecord) -> dict[str, Any]:
-    place = (line.row, None, None, None) if placed.range is None else astuple(placed.range)
-    record = placed.record
-    return _Object(line.path, place, record.name, record.kind.word, record.payload or None, placed.scope)
-
-
-def _ErrorFields(line: LineNames) -> dict[str, Any]:
-    assert line.problem is not None
-    place = line.problem.row, line.problem.column, None, None
-    return _Object(line.path, place, None, "error", line.problem.message, None)
-
-
-def _Object(path: str, place: Iterable[int | None], *rest: str | None) -> dict[str, Any]:
-    names = ("path", "row", "column", "end_row", "end_column", "name", "kind", "payload", "scope")
-    return dict(zip(names, (path, *place, *rest), strict=True))
+def _values(place: Range) -> tuple[int, int, int, int]:
+    return place.row, place.column, place.end_row, place.end_column

@@ -1,47 +1,50 @@
 """Records in words: what a line does with names, as a person would say it."""
 
+import re
 from collections.abc import Iterable, Iterator
 from itertools import groupby
 
-from codeloom.records import CRecord, RecordOfPair
-from codeloom.symbolinfo import kIterationSubscript
+from codeloom._analysis import Record, RecordKind
 
 # In the order in which a line's statements stand.
 _LABELS = (
     "binds", "global", "nonlocal", "types", "takes", "inside", "knows", "calls", "reads", "returns", "yields"
 )  # fmt: skip
 _LABEL_OF_KIND = {
-    "Global": "global",
-    "Nonlocal": "nonlocal",
-    "TypeParameter": "types",
-    "WithinExpr": "inside",
-    "Called": "calls",
-    "Get": "reads",
+    RecordKind.GLOBAL: "global",
+    RecordKind.NONLOCAL: "nonlocal",
+    RecordKind.TYPEPARAM: "types",
+    RecordKind.WITHIN: "inside",
+    RecordKind.CALLED: "calls",
+    RecordKind.GET: "reads",
 }
 _LABEL_OF_NAME = {"return": "returns", "yield": "yields", "*": "binds"}
-_ITEM_MARK = kIterationSubscript.decode()
+# How records write what iterating gives, the prefix of a record in a record, and that of a known type.
+_ITEM_MARK = "[*]"
+_PREFIX = re.compile(":.:")
+_LITERAL_PREFIX = ":l:"
 
 
-def Statements(records: list[CRecord]) -> Iterator[tuple[str, list[list[str]]]]:
+def statements(records: list[Record]) -> Iterator[tuple[str, list[list[str]]]]:
     """What records say: a label, and rows of items behind it.
 
     Names of which no more is said share a row; each of the others has its own.
     """
-    bound = {record.name for record in records if record.kind.name == "Set" and not record.of_arg}
+    bound = {record.name for record in records if record.kind is RecordKind.SET and not record.of_argument}
     said: dict[str, dict[str, _Said]] = {label: {} for label in _LABELS}
     for record in records:
-        of_label = said[_Label(record, bound)]
-        of_label.setdefault(record.name, _Said(record.name)).Add(record)
+        of_label = said[_label(record, bound)]
+        of_label.setdefault(record.name, _Said(record.name)).add(record)
     for label, by_name in said.items():
         if by_name:
-            yield label, _Rows(by_name.values())
+            yield label, _rows(by_name.values())
 
 
-def _Label(record: CRecord, bound: set[str]) -> str:
-    label = _LABEL_OF_KIND.get(record.kind.name) or _LABEL_OF_NAME.get(record.name)
+def _label(record: Record, bound: set[str]) -> str:
+    label = _LABEL_OF_KIND.get(record.kind) or _LABEL_OF_NAME.get(record.name)
     if label is not None:
         return label
-    if record.of_arg:
+    if record.of_argument:
         return "takes"
     return "binds" if record.name in bound else "knows"
 
@@ -51,48 +54,55 @@ class _Said:
 
     def __init__(self, name: str) -> None:
         is_numbered = name.startswith(":a:") and name[3:].isdecimal()
-        self._fName = f"argument {int(name[3:]) + 1}" if is_numbered else name
-        self._fIsOutcome = name in _LABEL_OF_NAME
-        self._fHints: list[str] = []
-        self._fValues: list[str] = []
-        self._fCalls: list[str] = []
+        self._name = f"argument {int(name[3:]) + 1}" if is_numbered else name
+        self._is_outcome = name in _LABEL_OF_NAME
+        self._hints: list[str] = []
+        self._values: list[str] = []
+        self._calls: list[str] = []
 
-    def Add(self, record: CRecord) -> None:
+    def add(self, record: Record) -> None:
         """Take in one record of the name."""
-        match record.kind.name:
-            case "Set" | "Get" | "Global" | "Nonlocal" | "WithinExpr" | "ImportAsName":
+        match record.kind:
+            case (
+                RecordKind.SET
+                | RecordKind.GET
+                | RecordKind.GLOBAL
+                | RecordKind.NONLOCAL
+                | RecordKind.WITHIN
+                | RecordKind.AS
+            ):
                 pass
-            case "TypeHint":
-                self._fHints.append(record.payload)
-            case "TypeParameter":
+            case RecordKind.HINT:
+                self._hints.append(record.payload)
+            case RecordKind.TYPEPARAM:
                 stars = record.payload[: len(record.payload) - len(record.payload.lstrip("*"))]
-                self._fName = stars + self._fName
-                self._fHints += [spec] if (spec := record.payload.lstrip("* ")) else []
-            case "Import" if record.payload == record.name:
-                self._fName = f"module {record.name}"
-            case "FromImport" if record.payload.endswith(f" {record.name}"):
-                self._fName = _Value(record)
-            case "Called":
-                self._fCalls.append(self._fName + record.payload)
+                self._name = stars + self._name
+                self._hints += [spec] if (spec := record.payload.lstrip("* ")) else []
+            case RecordKind.IMPORT if record.payload == record.name:
+                self._name = f"module {record.name}"
+            case RecordKind.FROM if record.payload.endswith(f" {record.name}"):
+                self._name = _value(record)
+            case RecordKind.CALLED:
+                self._calls.append(self._name + record.payload)
             case _:
-                self._fValues.append(_Value(record))
+                self._values.append(_value(record))
 
     @property
     def is_bare(self) -> bool:
         """True when no more is said than the name."""
-        return not (self._fHints or self._fValues or self._fCalls)
+        return not (self._hints or self._values or self._calls)
 
     def __str__(self) -> str:
-        if self._fCalls:
-            return ", ".join(self._fCalls)
-        values = " or ".join(self._fValues)
-        hints = " or ".join(self._fHints)
-        if self._fIsOutcome:
-            return values or hints or self._fName
-        return self._fName + (f": {hints}" if hints else "") + (f" = {values}" if values else "")
+        if self._calls:
+            return ", ".join(self._calls)
+        values = " or ".join(self._values)
+        hints = " or ".join(self._hints)
+        if self._is_outcome:
+            return values or hints or self._name
+        return self._name + (f": {hints}" if hints else "") + (f" = {values}" if values else "")
 
 
-def _Rows(said: Iterable[_Said]) -> list[list[str]]:
+def _rows(said: Iterable[_Said]) -> list[list[str]]:
     rows: list[list[str]] = []
     for is_bare, group in groupby(said, key=lambda one: one.is_bare):
         items = [str(one) for one in group]
@@ -100,38 +110,45 @@ def _Rows(said: Iterable[_Said]) -> list[list[str]]:
     return rows
 
 
-def _Value(record: CRecord) -> str:
+def _value(record: Record) -> str:
     """What a name stands for, in words."""
-    match record.kind.name, record.value:
-        case "TypedLiteral", (str(type_name), value):
-            return value or _SomeInstance(type_name)
-        case "Import", module:
+    match record.kind, record.value:
+        case RecordKind.LITERAL, (str(type_name), value):
+            return value or _some_instance(type_name)
+        case RecordKind.IMPORT, module:
             return f"module {module}"
-        case "FromImport", (module, "*"):
+        case RecordKind.FROM, (module, "*"):
             return f"everything in {module}"
-        case "FromImport", (module, name):
+        case RecordKind.FROM, (module, name):
             return f"{name} from {module}"
-        case "PlainEquiv", _ if record.name == "yield":
-            return _Yielded(record.payload)
+        case RecordKind.IS, _ if record.name == "yield":
+            return _yielded(record.payload)
         case _:
-            return _ItemInWords(record.payload)
+            return _item_in_words(record.payload)
 
 
-def _Yielded(text: str) -> str:
+def _yielded(text: str) -> str:
     if text == "from" or text.startswith("from "):
-        rest = text[len("from ") :].encode("utf-8", "surrogateescape")
-        return f"from {_Value(RecordOfPair(b'yield', rest))}"
-    return _ItemInWords(text) if text else "something"
+        return f"from {_yielded_from(text.removeprefix('from').lstrip())}"
+    return _item_in_words(text) if text else "something"
 
 
-def _ItemInWords(text: str) -> str:
+def _yielded_from(text: str) -> str:
+    """The value of a `yield from`, which keeps the prefix that tells its kind."""
+    if text.startswith(_LITERAL_PREFIX):
+        type_name, _, value = text.removeprefix(_LITERAL_PREFIX).partition(":")
+        return value.lstrip() or _some_instance(type_name)
+    return _item_in_words(_PREFIX.sub("", text, count=1)) if text else "something"
+
+
+def _item_in_words(text: str) -> str:
     if text.endswith(":"):
-        return _SomeInstance(text[:-1])
+        return _some_instance(text[:-1])
     whole, mark, part = text.rpartition(_ITEM_MARK)
     if not mark:
         return text
     return f"{part} of an item of {whole}" if part else f"an item of {whole}"
 
 
-def _SomeInstance(class_name: str) -> str:
+def _some_instance(class_name: str) -> str:
     return f"{'an' if class_name[:1] in 'aeiouAEIOU' else 'a'} {class_name}"

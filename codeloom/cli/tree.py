@@ -5,15 +5,11 @@ import os
 import re
 from itertools import chain
 
-from codeloom.cli.command import AddLanguageArgument, Command, ExitStatus
-from codeloom.cli.console import Console, PrintablePath
-from codeloom.cli.files import ReadFiles
+from codeloom._analysis import Analysis
+from codeloom._face import analyze
+from codeloom.cli.command import Command, ExitStatus, add_python_argument, as_named, read_path
+from codeloom.cli.console import Console, printable_path
 from codeloom.cli.tree_formats import FORMATS
-from codeloom.line_reader import CountRows
-from codeloom.line_trees import LineTrees
-from codeloom.source import Source, SourceFromBytes, SourceFromText
-
-_CODE_PATH = "<string>"
 
 # A place as `codeloom check` prints it; the column doesn't matter here.
 _PLACE = re.compile(r"(?P<path>.+?):(?P<row>\d{1,9})(?::\d+)?:?", re.ASCII | re.DOTALL)
@@ -32,10 +28,10 @@ class TreeCommand(Command):
     )
 
     def __init__(self) -> None:
-        self._fConsole = Console()
+        self._console = Console()
 
-    @staticmethod
-    def AddArguments(parser: argparse.ArgumentParser) -> None:
+    @classmethod
+    def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
         """Add the command's own arguments."""
         what = parser.add_mutually_exclusive_group(required=True)
         what.add_argument(
@@ -52,52 +48,60 @@ class TreeCommand(Command):
             default="text",
             help="text, with a row for each node; json; or dot, for Graphviz (default: %(default)s)",
         )
-        AddLanguageArgument(parser)
+        add_python_argument(parser)
 
-    def Run(self, arguments: argparse.Namespace) -> ExitStatus:
+    def run(self, arguments: argparse.Namespace) -> ExitStatus:
         """Print the trees of the code, of the row or of the file."""
         if arguments.code is not None:
-            return self._Print(SourceFromText(arguments.code), arguments, _CODE_PATH, None)
-        path, row = _PathAndRow(arguments.place)
+            return self._print(analyze(arguments.code, python=arguments.python), arguments, None)
+        path, row = _path_and_row(arguments.place)
         if os.path.isdir(path):
-            return self._Fail(f"{PrintablePath(path)} is a folder: name a file in it")
-        for name, data in ReadFiles([path], self._fConsole.PrintFailure):
-            return self._Print(SourceFromBytes(data), arguments, name, row)
-        return ExitStatus.FAILURE
+            return self._fail(f"{printable_path(path)} is a folder: name a file in it")
+        try:
+            analysis = read_path(as_named(path), arguments)
+        except OSError as error:
+            self._console.print_failure(error)
+            return ExitStatus.FAILURE
+        return self._print(analysis, arguments, row)
 
-    def _Print(self, source: Source, arguments: argparse.Namespace, path: str, row: int | None) -> ExitStatus:
-        lines = LineTrees(source, arguments.language, path, row)
+    def _print(self, analysis: Analysis, arguments: argparse.Namespace, row: int | None) -> ExitStatus:
+        from codeloom.line_trees import line_trees  # it loads the engine
+
+        lines = line_trees(analysis, row)
         first = next(lines, None)
         if first is None:
-            return self._Fail(_NothingThere(source.text, PrintablePath(path), row))
+            return self._fail(_nothing_there(analysis, row))
         second = next(lines, None)
         has_headings = arguments.code is None or second is not None
-        tree_format = FORMATS[arguments.format](self._fConsole)
-        tree_format.Begin()
+        tree_format = FORMATS[arguments.format](self._console)
+        tree_format.begin()
         status = ExitStatus.SOUND
         for line in chain([first], [] if second is None else [second], lines):
-            tree_format.Add(line, has_headings)
-            if line.problem is not None:
+            tree_format.add(line, has_headings)
+            if line.fault is not None:
                 status = ExitStatus.PROBLEMS
-        tree_format.End()
+        tree_format.end()
         return status
 
-    def _Fail(self, message: str) -> ExitStatus:
-        self._fConsole.PrintError(f"codeloom: {message}")
+    def _fail(self, message: str) -> ExitStatus:
+        self._console.print_error(f"codeloom: {message}")
         return ExitStatus.FAILURE
 
 
-def _PathAndRow(place: str) -> tuple[str, int | None]:
+def _path_and_row(place: str) -> tuple[str, int | None]:
     match = None if os.path.exists(place) else _PLACE.fullmatch(place)
     return (match["path"], int(match["row"])) if match else (place, None)
 
 
-def _NothingThere(text: str, path: str, row: int | None) -> str:
+def _nothing_there(analysis: Analysis, row: int | None) -> str:
+    from codeloom.line_trees import count_rows
+
+    path = printable_path(analysis.path)
     if row is None:
         return f"{path} holds no line"
     if row == 0:
         return f"{path} has no row 0: rows count from 1"
-    count = CountRows(text)
+    count = count_rows(analysis.text)
     if row > count:
         return f"{path} has no row {row}: it ends with row {count}"
     return f"row {row} of {path} is blank"

@@ -4,28 +4,30 @@ import json
 from abc import ABC, abstractmethod
 from collections.abc import Iterator, Mapping
 from itertools import pairwise
-from typing import Any
+from typing import TYPE_CHECKING, Any
 
-from codeloom.cli.console import Colour, Console, PrintablePath
-from codeloom.excerpt import Printable
-from codeloom.line_trees import LineTree
-from codeloom.treesift import CNode
+from codeloom.cli.console import Colour, Console, printable_path
+from codeloom.cli.excerpt import printable
+
+if TYPE_CHECKING:  # they load the engine
+    from codeloom.line_trees import LineTree
+    from codeloom.treesift import CNode
 
 
 class TreeFormat(ABC):
-    """Prints lines one after another, between Begin and End."""
+    """Prints lines one after another, between begin and end."""
 
     def __init__(self, console: Console) -> None:
-        self._fConsole = console
+        self._console = console
 
-    def Begin(self) -> None:  # noqa: B027
+    def begin(self) -> None:  # noqa: B027
         """Print what stands in front of all lines."""
 
     @abstractmethod
-    def Add(self, line: LineTree, has_heading: bool) -> None:
+    def add(self, line: "LineTree", has_heading: bool) -> None:
         """Print one line; without a heading when the reader knows already which line it is."""
 
-    def End(self) -> None:  # noqa: B027
+    def end(self) -> None:  # noqa: B027
         """Print what stands behind all lines."""
 
 
@@ -34,35 +36,36 @@ class TextFormat(TreeFormat):
 
     def __init__(self, console: Console) -> None:
         super().__init__(console)
-        self._fHasLines = False
+        self._has_lines = False
 
-    def Add(self, line: LineTree, has_heading: bool) -> None:
+    def add(self, line: "LineTree", has_heading: bool) -> None:
         """The line's place and text, and below it the tree, or what is wrong."""
-        if self._fHasLines:
-            self._fConsole.PrintRow("")
-        self._fHasLines = True
-        if line.problem is not None:
-            self._fConsole.PrintProblem(line.problem)
+        if self._has_lines:
+            self._console.print_row("")
+        self._has_lines = True
+        if line.fault is not None:
+            fault = line.fault
+            self._console.print_fault(fault.path, fault.row, fault.column, fault.message, fault.source_row)
             return
         if has_heading:
-            self._fConsole.PrintRow(self._Heading(line))
+            self._console.print_row(self._heading(line))
         if line.tree is None:
-            self._fConsole.PrintRow(self._fConsole.Coloured(Colour.DIM, "no tree"))
+            self._console.print_row(self._console.coloured(Colour.DIM, "no tree"))
             return
-        for node, depth in _Nodes(line.tree):
-            self._fConsole.PrintRow("  " * depth + self._Row(node))
+        for node, depth in _nodes(line.tree):
+            self._console.print_row("  " * depth + self._row(node))
 
-    def _Heading(self, line: LineTree) -> str:
-        place = f"{PrintablePath(line.path)}:{line.row}:{line.column}:"
-        return f"{self._fConsole.Coloured(Colour.BOLD, place)} {_FirstRow(line.text)}"
+    def _heading(self, line: "LineTree") -> str:
+        place = f"{printable_path(line.path)}:{line.row}:{line.column}:"
+        return f"{self._console.coloured(Colour.BOLD, place)} {_first_row(line.text)}"
 
-    def _Row(self, node: CNode) -> str:
+    def _row(self, node: "CNode") -> str:
         words = [(Colour.CYAN, type(node).__name__), (Colour.DIM, str(node.GetStateName()))]
         if node.fText is not None:
             words.append((Colour.GREEN, repr(node.fText)))
         if node.fContext is not None:
             words.append((Colour.DIM, f"@{node.fContext}"))
-        return " ".join(self._fConsole.Coloured(colour, word) for colour, word in words)
+        return " ".join(self._console.coloured(colour, word) for colour, word in words)
 
 
 class JsonFormat(TreeFormat):
@@ -70,30 +73,30 @@ class JsonFormat(TreeFormat):
 
     def __init__(self, console: Console) -> None:
         super().__init__(console)
-        self._fSeparator = ""
+        self._separator = ""
 
-    def Begin(self) -> None:
+    def begin(self) -> None:
         """Open the list."""
-        self._fConsole.PrintRow("[")
+        self._console.print_row("[")
 
-    def Add(self, line: LineTree, has_heading: bool) -> None:
+    def add(self, line: "LineTree", has_heading: bool) -> None:
         """An object with the line's place and text, what is wrong, and the tree."""
-        problem = line.problem
+        fault = line.fault
         head = {
             "path": line.path,
             "row": line.row,
             "column": line.column,
             "text": line.text,
-            "error": problem and {"row": problem.row, "column": problem.column, "message": problem.message},
+            "error": fault and {"row": fault.row, "column": fault.column, "message": fault.message},
         }
-        rows = ["null"] if line.tree is None else _JsonRows(line.tree)
+        rows = ["null"] if line.tree is None else _json_rows(line.tree)
         tree = "\n".join(rows)
-        self._fConsole.PrintRow(f'{self._fSeparator}{json.dumps(head)[:-1]}, "tree": {tree}}}')
-        self._fSeparator = ","
+        self._console.print_row(f'{self._separator}{json.dumps(head)[:-1]}, "tree": {tree}}}')
+        self._separator = ","
 
-    def End(self) -> None:
+    def end(self) -> None:
         """Close the list."""
-        self._fConsole.PrintRow("]")
+        self._console.print_row("]")
 
 
 class DotFormat(TreeFormat):
@@ -101,36 +104,38 @@ class DotFormat(TreeFormat):
 
     def __init__(self, console: Console) -> None:
         super().__init__(console)
-        self._fNodeCount = 0
+        self._node_count = 0
 
-    def Begin(self) -> None:
+    def begin(self) -> None:
         """Open the graph."""
-        self._fConsole.PrintRow("digraph tree {")
-        self._fConsole.PrintRow('  node [fontname="monospace"]; edge [arrowhead=none];')
+        self._console.print_row("digraph tree {")
+        self._console.print_row('  node [fontname="monospace"]; edge [arrowhead=none];')
 
-    def Add(self, line: LineTree, has_heading: bool) -> None:
+    def add(self, line: "LineTree", has_heading: bool) -> None:
         """The text of the line, and its tree below it."""
-        if line.problem is not None:
-            self._fConsole.PrintError(line.problem.Rendered())
+        fault = line.fault
+        if fault is not None:
+            place = f"{printable_path(fault.path)}:{fault.row}:{fault.column}:"
+            self._console.print_error(f"{place} {printable(fault.message)}")
         if line.tree is None:
             return
-        path = [self._AddNode(f"{line.row}: {_FirstRow(line.text)}", "plaintext")]
-        for node, depth in _Nodes(line.tree):
+        path = [self._add_node(f"{line.row}: {_first_row(line.text)}", "plaintext")]
+        for node, depth in _nodes(line.tree):
             del path[depth + 1 :]
             is_leaf = node.fText is not None
             label = f"{type(node).__name__}\n{repr(node.fText) if is_leaf else node.GetStateName()}"
-            path.append(self._AddNode(label, "box" if is_leaf else "ellipse"))
-            self._fConsole.PrintRow(f"  {path[-2]} -> {path[-1]};")
+            path.append(self._add_node(label, "box" if is_leaf else "ellipse"))
+            self._console.print_row(f"  {path[-2]} -> {path[-1]};")
 
-    def End(self) -> None:
+    def end(self) -> None:
         """Close the graph."""
-        self._fConsole.PrintRow("}")
+        self._console.print_row("}")
 
-    def _AddNode(self, label: str, shape: str) -> str:
-        self._fNodeCount += 1
-        name = f"n{self._fNodeCount}"
+    def _add_node(self, label: str, shape: str) -> str:
+        self._node_count += 1
+        name = f"n{self._node_count}"
         quoted = label.replace("\\", "\\\\").replace('"', '\\"').replace("\n", "\\n")
-        self._fConsole.PrintRow(f'  {name} [shape={shape} label="{quoted}"];')
+        self._console.print_row(f'  {name} [shape={shape} label="{quoted}"];')
         return name
 
 
@@ -141,7 +146,7 @@ FORMATS: Mapping[str, type[TreeFormat]] = {
 }
 
 
-def _Nodes(tree: CNode) -> Iterator[tuple[CNode, int]]:
+def _nodes(tree: "CNode") -> Iterator[tuple["CNode", int]]:
     """The nodes in source order, parents first, each with its depth."""
     pending = [(tree, 0)]
     while pending:
@@ -151,9 +156,9 @@ def _Nodes(tree: CNode) -> Iterator[tuple[CNode, int]]:
         pending += [(child, depth + 1) for child in reversed(children) if child is not None]
 
 
-def _JsonRows(tree: CNode) -> Iterator[str]:
+def _json_rows(tree: "CNode") -> Iterator[str]:
     """The nested object of a tree, a node on each row."""
-    nodes = [(_JsonFields(node), depth) for node, depth in _Nodes(tree)]
+    nodes = [(_json_fields(node), depth) for node, depth in _nodes(tree)]
     for (fields, depth), (_, next_depth) in pairwise([*nodes, ({}, 0)]):
         row = "  " * depth + json.dumps(fields)
         if next_depth > depth:
@@ -162,7 +167,7 @@ def _JsonRows(tree: CNode) -> Iterator[str]:
             yield row + "]}" * (depth - next_depth) + ("," if next_depth else "")
 
 
-def _JsonFields(node: CNode) -> dict[str, Any]:
+def _json_fields(node: "CNode") -> dict[str, Any]:
     fields = {
         "class": type(node).__name__,
         "rule": node.GetStateName(),
@@ -172,6 +177,6 @@ def _JsonFields(node: CNode) -> dict[str, Any]:
     return {name: value for name, value in fields.items() if value is not None}
 
 
-def _FirstRow(text: str) -> str:
+def _first_row(text: str) -> str:
     first_row, _, more = text.partition("\n")
-    return Printable(first_row.rstrip()) + (" ..." if more else "")
+    return printable(first_row.rstrip()) + (" ..." if more else "")

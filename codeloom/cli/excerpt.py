@@ -13,27 +13,28 @@ _COMBINING = frozenset({"Mn", "Me"})
 _WIDE = frozenset({"W", "F"})
 
 
-def Excerpt(source_row: str, column: int, width: int = 100) -> tuple[str, str]:
+def excerpt(source_row: str, column: int, width: int = 100, encoding: str = "utf-8") -> tuple[str, str]:
     """What to print of `source_row`, and the row with the caret to print below it.
 
-    `column` counts characters from 1 and may lie behind the row's end. `width` is in terminal
-    columns; a wider row is cut on either side of the place.
+    `column` counts characters from 1 and may lie after the row's end. `width` is in terminal columns;
+    a wider row is cut on either side of the place. What the terminal's encoding lacks is shown by its
+    number.
     """
     place_i = min(column - 1, len(source_row))
     # No more than this can be shown, and a row may be as long as a file.
     first_i = max(0, place_i - width)
-    cells = list(_Cells(source_row[first_i : place_i + width + 1]))
-    start, end = _Window(cells, place_i - first_i, width)
+    cells = list(_cells(source_row[first_i : place_i + width + 1], encoding))
+    start, end = _window(cells, place_i - first_i, width)
     if first_i + start > 0 or first_i + end < len(source_row):
-        start, end = _Window(cells, place_i - first_i, width - 2 * len(_CUT))
+        start, end = _window(cells, place_i - first_i, width - 2 * len(_CUT))
     cut_before = _CUT if first_i + start > 0 else ""
-    cut_behind = _CUT if first_i + end < len(source_row) else ""
+    cut_after = _CUT if first_i + end < len(source_row) else ""
     shown = "".join(cell for cell, _ in cells[start:end])
     blanks = len(cut_before) + sum(width for _, width in cells[start : place_i - first_i])
-    return cut_before + shown + cut_behind, " " * blanks + "^"
+    return cut_before + shown + cut_after, " " * blanks + "^"
 
 
-def Printable(text: str) -> str:
+def printable(text: str) -> str:
     """`text` with U+FFFD for each character that would do something to a terminal."""
     if text.isprintable():
         return text
@@ -42,28 +43,29 @@ def Printable(text: str) -> str:
     )
 
 
-def OnOneRow(text: str) -> str:
+def on_one_row(text: str) -> str:
     """`text` with a blank for each end of a row and the blanks around it, as hints in quotes may have."""
     return _ROW_END.sub(" ", text.strip())
 
 
-def _Cells(chars: str) -> Iterator[tuple[str, int]]:
+def _cells(chars: str, encoding: str) -> Iterator[tuple[str, int]]:
     """Each character as it is printed, and how many columns of the terminal it takes."""
     col = 0
     for char in chars:
-        cell = " " * (_TAB_WIDTH - col % _TAB_WIDTH) if char == "\t" else Printable(char)
-        cell_width = sum(map(_WidthOf, cell))
+        cell = " " * (_TAB_WIDTH - col % _TAB_WIDTH) if char == "\t" else printable(char)
+        cell = cell.encode(encoding, "backslashreplace").decode(encoding)
+        cell_width = sum(map(_width_of, cell))
         yield cell, cell_width
         col += cell_width
 
 
-def _WidthOf(char: str) -> int:
+def _width_of(char: str) -> int:
     if unicodedata.category(char) in _COMBINING:
         return 0
     return 2 if unicodedata.east_asian_width(char) in _WIDE else 1
 
 
-def _Window(cells: Sequence[tuple[str, int]], place_i: int, room: int) -> tuple[int, int]:
+def _window(cells: Sequence[tuple[str, int]], place_i: int, room: int) -> tuple[int, int]:
     """The range of cells around `place_i` that fits into `room` columns, alike on both sides."""
     start = end = place_i
     used = 0

@@ -1,0 +1,1 @@
+"""Finding source files and reading them: folders, encodings, versions of Python."""

@@ -1,0 +1,130 @@
+"""Finding source files and reading their bytes."""
+
+import errno
+import os
+import stat
+from collections.abc import Iterator, Sequence
+
+_SUFFIXES = (".py", ".pyi", ".pyw")
+_NOTEBOOK_SUFFIX = ".ipynb"
+_CACHE_FOLDER = "__pycache__"
+_ENVIRONMENT_MARK = "pyvenv.cfg"
+
+# Where the files lie that a process has open: pipes there were handed over by the shell.
+_OPEN_FILES = ("/dev/fd/", "/dev/stdin", "/proc/self/fd/")
+
+
+class StandardInput(str):
+    """The standard input where it stands among paths."""
+
+    NAME = "-"
+    __slots__ = ()
+
+    def __new__(cls) -> "StandardInput":
+        return super().__new__(cls, cls.NAME)
+
+
+def read_file(path: str) -> bytes:
+    """The bytes of a file; OSError when it can't be read, also for devices, pipes and notebooks."""
+    if path.lower().endswith(_NOTEBOOK_SUFFIX):
+        raise OSError(errno.EINVAL, "notebooks aren't read: export it as a .py file", path)
+    mode = os.stat(path).st_mode
+    is_handed_over = stat.S_ISFIFO(mode) and path.startswith(_OPEN_FILES)
+    if stat.S_ISDIR(mode):
+        raise IsADirectoryError(errno.EISDIR, os.strerror(errno.EISDIR), path)
+    if not stat.S_ISREG(mode) and not is_handed_over:
+        raise OSError(errno.EINVAL, "it is no regular file", path)
+    with open(path, "rb") as file:
+        return file.read()
+
+
+def find_files(paths: Sequence[str]) -> Iterator[str | OSError]:
+    """The paths of the files that `paths` name, and an error for each folder that can't be listed.
+
+    A folder stands for the Python files below it, in the order of their names. Hidden folders,
+    caches and virtual environments are left out, unless they are named themselves; links to folders
+    aren't followed. No file is found twice, whatever its names.
+    """
+    return _FileFinder(paths).files()
+
+
+# What is the same for all names of a file or a folder: device and number, or else the path.
+_Identity = tuple[int, int] | str
+
+
+def _identity_of(path: str) -> _Identity:
+    if isinstance(path, StandardInput):
+        return path
+    try:
+        status = os.stat(path)
+    except OSError:
+        return path
+    return status.st_dev, status.st_ino
+
+
+class _FileFinder:
+    """Goes through files and folders, and remembers what it has seen."""
+
+    def __init__(self, paths: Sequence[str]) -> None:
+        self._paths = paths
+        self._seen: set[_Identity] = set()
+
+    def files(self) -> Iterator[str | OSError]:
+        for path in self._paths:
+            if isinstance(path, StandardInput):
+                if self._is_new(path):
+                    yield path
+            elif os.path.isdir(path):
+                yield from self._files_below(path)
+            elif self._is_new(path):
+                yield path
+
+    def _files_below(self, folder: str) -> Iterator[str | OSError]:
+        # What is still to be looked at, the next one last; folders end in a separator.
+        pending = [os.path.join(folder, "")]
+        is_named = True
+        while pending:
+            path = pending.pop()
+            if not path.endswith(os.sep):
+                if self._is_new(path):
+                    yield path
+                continue
+            try:
+                pending += self._children(folder if is_named else path, is_named)
+            except OSError as error:
+                yield error
+            is_named = False
+
+    def _children(self, folder: str, is_named: bool) -> list[str]:
+        """What is of interest in a folder, in reverse order; nothing if it was looked at before."""
+        if not self._is_new(folder):
+            return []
+        with os.scandir(folder) as scan:
+            entries = sorted(scan, key=lambda entry: entry.name, reverse=True)
+        if not is_named and any(entry.name == _ENVIRONMENT_MARK for entry in entries):
+            return []
+        return [path for entry in entries if (path := _path_of_interest(entry)) is not None]
+
+    def _is_new(self, path: str) -> bool:
+        """False for what was found before, by this name or another."""
+        identity = _identity_of(path)
+        if identity in self._seen:
+            return False
+        self._seen.add(identity)
+        return True
+
+
+def _path_of_interest(entry: os.DirEntry[str]) -> str | None:
+    """The path of a folder, with a separator, or of a Python file; None for anything else."""
+    is_hidden = entry.name.startswith(".")
+    if entry.is_dir(follow_symlinks=False):
+        is_left_out = is_hidden or entry.name == _CACHE_FOLDER
+        return None if is_left_out else entry.path + os.sep
+    if not entry.name.lower().endswith(_SUFFIXES):
+        return None
+    try:
+        is_broken = entry.is_symlink() and not os.path.exists(entry.path)
+        # A broken link is a failure when it is read; hidden ones are the locks of editors.
+        return entry.path if entry.is_file() or (is_broken and not is_hidden) else None
+    except OSError:  # a link that leads to itself
+        return None if is_hidden else entry.path

@@ -1,0 +1,331 @@
+// The classes of the face as the host sees them.
+#include "face/bind_face.h"
+
+#include <nanobind/nanobind.h>
+#include <nanobind/operators.h>
+#include <nanobind/stl/string.h>
+#include <nanobind/stl/tuple.h>
+
+#include "face/items.h"
+#include "face/kinds.h"
+#include "host/errors.h"
+#include "host/sequence_slots.h"
+#include "host/text.h"
+
+namespace nb = nanobind;
+using namespace nb::literals;
+
+namespace codeloom {
+
+namespace {
+
+struct CAnalysis {
+    CSourceFilePtr file;
+};
+
+nb::object Attribute(nb::handle object, const char* name) {
+    return nb::getattr(object, name);
+}
+
+nb::object Operator(const char* name) {
+    return nb::module_::import_("operator").attr(name);
+}
+
+// What all immutable objects of the face have: a copy is the object itself.
+template <class Binding>
+void BindCopies(Binding& binding) {
+    using Class = typename Binding::Type;
+    binding.def(
+        "__copy__", [](nb::pointer_and_handle<Class> self) { return nb::borrow(self.h); },
+        nb::sig("def __copy__(self) -> typing.Self"));
+    binding.def(
+        "__deepcopy__", [](nb::pointer_and_handle<Class> self, nb::handle) { return nb::borrow(self.h); },
+        "memo"_a.none(), nb::sig("def __deepcopy__(self, memo: object) -> typing.Self"));
+}
+
+template <class Binding>
+void BindEquality(Binding& binding) {
+    using Class = typename Binding::Type;
+    binding.def(
+        "__eq__", [](const Class& self, const Class& other) { return self == other; }, nb::is_operator(),
+        nb::sig("def __eq__(self, other: object, /) -> bool"));
+    binding.def("__hash__", [](const Class& self) { return self.Hash(); });
+}
+
+CAnalysis MakeAnalysis(nb::bytes utf8, nb::str path, nb::str python, int version, bool false_hints,
+                       nb::list faults, nb::list unreadable) {
+    CUnreadable places;
+    for (nb::handle fault : faults) {
+        const auto [start, end, message] = nb::cast<std::tuple<uint32_t, uint32_t, std::string>>(fault);
+        places.faults.push_back({start, end, message});
+    }
+    for (nb::handle offset : unreadable) places.offsets.push_back(nb::cast<uint32_t>(offset));
+    const bool is_known = version == CLanguage::kOldest || (version >= 300 && version <= CLanguage::kNewest);
+    if (!is_known) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    CFileSettings settings;
+    settings.version = version;
+    settings.false_hints = false_hints;
+    return {std::make_shared<const CSourceFile>(std::move(utf8), std::move(path), std::move(python), settings,
+                                                std::move(places))};
+}
+
+// The arguments that make the analysis anew.
+nb::object ArgumentsOf(const CSourceFile& file) {
+    nb::list faults, unreadable;
+    for (const CUnreadable::CFault& fault : file.Unreadable().faults)
+        faults.append(nb::make_tuple(fault.start, fault.end, fault.message));
+    for (const uint32_t offset : file.Unreadable().offsets) unreadable.append(offset);
+    return nb::make_tuple(file.Utf8(), file.Path(), file.Python(), file.Version(), file.TakesFalseHints(),
+                          faults, unreadable);
+}
+
+void BindRange(nb::module_& module) {
+    nb::class_<CRange> range(
+        module, "Range",
+        "A piece of a text. Rows and columns count from 1, columns in characters; the end is "
+        "after the last character.");
+    range.def(nb::init<uint32_t, uint32_t, uint32_t, uint32_t>(), "row"_a, "column"_a, "end_row"_a,
+              "end_column"_a);
+    range.def_ro("row", &CRange::row);
+    range.def_ro("column", &CRange::column);
+    range.def_ro("end_row", &CRange::end_row);
+    range.def_ro("end_column", &CRange::end_column);
+    range.def(
+        "__eq__", [](const CRange& self, const CRange& other) { return self == other; }, nb::is_operator(),
+        nb::sig("def __eq__(self, other: object, /) -> bool"));
+    range.def("__hash__", [](const CRange& self) {
+        return ((size_t{self.row} * 1'000'003 + self.column) * 1'000'003 + self.end_row) * 31 +
+               self.end_column;
+    });
+    range.def("__repr__", [](const CRange& self) {
+        return nb::str("Range({}, {}, {}, {})").format(self.row, self.column, self.end_row, self.end_column);
+    });
+    range.def(
+        "__reduce__",
+        [](nb::pointer_and_handle<CRange> self) {
+            return nb::make_tuple(self.h.type(), nb::make_tuple(self.p->row, self.p->column, self.p->end_row,
+                                                                self.p->end_column));
+        },
+        nb::sig("def __reduce__(self) -> tuple[typing.Any, ...]"));
+    BindCopies(range);
+}
+
+// What every item has.
+template <class Item>
+nb::class_<Item> BindItem(nb::module_& module, const char* name, const char* documentation) {
+    nb::class_<Item> binding(module, name, documentation);
+    BindEquality(binding);
+    BindCopies(binding);
+    binding.def(
+        "__reduce__",
+        [](const Item& self) {
+            const nb::object all = Attribute(nb::cast(CAnalysis{self.file}), Item::kSequence);
+            return nb::make_tuple(Operator("getitem"), nb::make_tuple(all, self.i));
+        },
+        nb::sig("def __reduce__(self) -> tuple[typing.Any, ...]"));
+    return binding;
+}
+
+void BindProblem(nb::module_& module) {
+    auto problem = BindItem<CProblemItem>(module, "Problem", "A fault of a text.");
+    problem.def_prop_ro(
+        "path", [](const CProblemItem& self) { return self.file->Path(); }, "The path of its text.");
+    problem.def_prop_ro(
+        "message", [](const CProblemItem& self) { return TextFromUtf8(self.Message()); },
+        nb::sig("def message(self) -> str"), "What is wrong, in words.");
+    problem.def_prop_ro("code", &CProblemItem::Code, "What kind of fault it is, such as \"CL201\".");
+    problem.def_prop_ro("range", &CProblemItem::Range,
+                        "What it is about; empty for a place between characters.");
+    problem.def_prop_ro("related", &CProblemItem::Related,
+                        nb::sig("def related(self) -> tuple[tuple[Range, str], ...]"),
+                        "Other places that it has to do with, each with what it is.");
+    problem.def_prop_ro(
+        "hint",
+        [](const CProblemItem& self) -> nb::object {
+            return self.Data().hint.empty() ? nb::none() : TextFromUtf8(self.Data().hint);
+        },
+        nb::sig("def hint(self) -> str | None"), "What may have been meant, where that can be told.");
+    problem.def_prop_ro(
+        "source_row",
+        [](const CProblemItem& self) {
+            const CRowIndex& rows = self.file->Rows();
+            return TextFromUtf8(rows.Text(rows.PlaceOf(self.Data().start).row));
+        },
+        nb::sig("def source_row(self) -> str"), "The text of the row in which it begins.");
+    problem.def("__str__", &CProblemItem::Text);
+    problem.def("__repr__",
+                [](const CProblemItem& self) { return nb::str("<Problem {}>").format(self.Text()); });
+}
+
+void BindLine(nb::module_& module) {
+    auto line = BindItem<CLineItem>(
+        module, "Line", "A logical line: a statement, the header of one, or a comment on rows of its own.");
+    line.def_prop_ro("range", &CLineItem::Range, "From its first character to its last one.");
+    line.def_prop_ro(
+        "kind", [](const CLineItem& self) { return LineKindOf(self.Data().type); },
+        nb::sig("def kind(self) -> LineKind"), "What kind of statement it holds or begins.");
+    line.def_prop_ro(
+        "text", [](const CLineItem& self) { return TextFromUtf8(self.Text()); },
+        nb::sig("def text(self) -> str"), "Its text, as written.");
+    line.def_prop_ro(
+        "indent",
+        [](const CLineItem& self) -> nb::object {
+            const int indent = self.Indent();
+            if (indent < 0) return nb::none();
+            return nb::int_(indent);
+        },
+        nb::sig("def indent(self) -> int | None"),
+        "The width of the blanks before it; None after another line on the same row.");
+    line.def_prop_ro(
+        "problems", [](const CLineItem& self) { return ProblemsOf(self); }, "What is wrong with it.");
+    line.def_prop_ro(
+        "records", [](const CLineItem& self) { return RecordsOf(self); },
+        "What it says of names; nothing when it has a problem.");
+    line.def("__repr__", [](const CLineItem& self) {
+        return nb::str("<Line {}: {!r}>").format(self.Range().row, TextFromUtf8(self.Text()));
+    });
+}
+
+void BindRecord(nb::module_& module) {
+    auto record = BindItem<CRecordItem>(module, "Record", "What a line says of one name.");
+    record.def_prop_ro(
+        "kind", [](const CRecordItem& self) { return RecordKindOf(self.Data().kind); },
+        nb::sig("def kind(self) -> RecordKind"), "What is said.");
+    record.def_prop_ro(
+        "name", [](const CRecordItem& self) { return TextFromUtf8(self.Name()); },
+        nb::sig("def name(self) -> str"), "The name; a chain such as `a.b` is one too.");
+    record.def_prop_ro(
+        "payload", [](const CRecordItem& self) { return TextFromUtf8(self.Payload()); },
+        nb::sig("def payload(self) -> str"), "What is said besides the kind, as text.");
+    record.def_prop_ro("value", &CRecordItem::Value,
+                       nb::sig("def value(self) -> None | int | str | tuple[str, str | None]"),
+                       "The payload by its form: None, a text, the index of a token, (module, name) or "
+                       "(type, value).");
+    record.def_prop_ro(
+        "of_argument", [](const CRecordItem& self) { return self.Data().of_arg; },
+        "True when the name is an argument or a type parameter of the definition on its line.");
+    record.def_prop_ro(
+        "range",
+        [](const CRecordItem& self) -> nb::object {
+            return self.HasPlace() ? nb::cast(self.Range()) : nb::none();
+        },
+        nb::sig("def range(self) -> Range | None"), "Where the name stands; None where it stands nowhere.");
+    record.def_prop_ro("line", &CRecordItem::Line, "The line that says it.");
+    record.def("__str__", &CRecordItem::Text);
+    record.def("__repr__",
+               [](const CRecordItem& self) { return nb::str("<Record {}>").format(self.Text()); });
+}
+
+void BindLimit(nb::module_& module) {
+    auto limit = BindItem<CLimitItem>(
+        module, "Limit", "A line that was too much for a full walk and lacks some of its records.");
+    limit.def_prop_ro(
+        "kind", [](const CLimitItem& self) { return LimitKindOf(self.Data().limit); },
+        nb::sig("def kind(self) -> LimitKind"), "Which limit it met.");
+    limit.def_prop_ro("message", &CLimitItem::Message, "The same in words.");
+    limit.def_prop_ro("line", &CLimitItem::Line, "The line.");
+    limit.def("__repr__", [](const CLimitItem& self) {
+        return nb::str("<Limit {}: {}>").format(self.Line().Range().row, self.Message());
+    });
+}
+
+// A class of the host over TItems, which is a Sequence there. `name` is that of the class, `item` that of its
+// items.
+template <class Items>
+void BindItems(nb::module_& module, const char* name, const char* signature) {
+    using Item = typename Items::CItemType;
+    nb::class_<Items> items(module, name, nb::type_slots(kSequenceSlots<Items>), nb::sig(signature));
+    BindEquality(items);
+    BindCopies(items);
+    items.def(
+        "index",
+        [](nb::pointer_and_handle<Items> self, nb::handle value, nb::handle start, nb::handle stop) {
+            return SequenceIndex(self.h, value, start, stop);
+        },
+        "value"_a.none(), "start"_a = 0, "stop"_a.none() = nb::none(),
+        nb::sig("def index(self, value: object, start: int = 0, stop: int | None = None) -> int"));
+    items.def(
+        "count",
+        [](nb::pointer_and_handle<Items> self, nb::handle value) { return SequenceCount(self.h, value); },
+        "value"_a.none(), nb::sig("def count(self, value: object) -> int"));
+    items.def("__repr__", [name](const Items& self) {
+        return nb::str("<{} of {!r}: {}>").format(name, self.file->Path(), self.count);
+    });
+    items.def(
+        "__reduce__",
+        [](const Items& self) -> nb::object {
+            const nb::object analysis = nb::cast(CAnalysis{self.file});
+            const nb::object all = Attribute(analysis, Item::kSequence);
+            if (self.step == 1 && self.first == 0 && self.count == nb::len(all))
+                return nb::make_tuple(nb::module_::import_("builtins").attr("getattr"),
+                                      nb::make_tuple(analysis, Item::kSequence));
+            return nb::make_tuple(Operator("getitem"), nb::make_tuple(all, self.AsSlice()));
+        },
+        nb::sig("def __reduce__(self) -> tuple[typing.Any, ...]"));
+    nb::module_::import_("_collections_abc").attr("Sequence").attr("register")(items);
+}
+
+void BindAnalysis(nb::module_& module) {
+    nb::class_<CAnalysis> analysis(module, "Analysis",
+                                   "What a text says. Each part is worked out when it is first asked for.");
+    analysis.def(
+        "__init__",
+        [](CAnalysis* self, nb::bytes utf8, nb::str path, nb::str python, int version, bool false_hints,
+           nb::list faults, nb::list unreadable) {
+            new (self) CAnalysis(MakeAnalysis(std::move(utf8), std::move(path), std::move(python), version,
+                                              false_hints, std::move(faults), std::move(unreadable)));
+        },
+        "utf8"_a, "path"_a, "python"_a, "version"_a, "false_hints"_a, "faults"_a, "unreadable"_a,
+        nb::sig("def __init__(self, utf8: bytes, path: str, python: str, version: int, false_hints: bool, "
+                "faults: list[tuple[int, int, str]], unreadable: list[int]) -> None"),
+        "For `codeloom.analyze`, which decodes. `faults` are places that are no text, and `unreadable` the "
+        "offset of each character that stands for something unreadable.");
+    analysis.def_prop_ro(
+        "path", [](const CAnalysis& self) { return self.file->Path(); }, "The name that problems bear.");
+    analysis.def_prop_ro(
+        "python", [](const CAnalysis& self) { return self.file->Python(); },
+        "The version of Python that the text is written in.");
+    analysis.def_prop_ro(
+        "text", [](const CAnalysis& self) { return self.file->HostText(); },
+        "The source text, with U+FFFD for what can't be read.");
+    analysis.def_prop_ro(
+        "problems", [](const CAnalysis& self) { return ProblemsOf(self.file); },
+        "What is wrong, in the order of the text.");
+    analysis.def_prop_ro(
+        "lines", [](const CAnalysis& self) { return LinesOf(self.file); },
+        "The logical lines, in the order of the text.");
+    analysis.def_prop_ro(
+        "records", [](const CAnalysis& self) { return RecordsOf(self.file); },
+        "What the lines say of names.");
+    analysis.def_prop_ro(
+        "limits", [](const CAnalysis& self) { return LimitsOf(self.file); },
+        "The lines that lack some of their records.");
+    analysis.def("__repr__", [](const CAnalysis& self) {
+        return nb::str("<Analysis of {!r}>").format(self.file->Path());
+    });
+    analysis.def(
+        "__reduce__",
+        [](nb::pointer_and_handle<CAnalysis> self) {
+            return nb::make_tuple(self.h.type(), ArgumentsOf(*self.p->file));
+        },
+        nb::sig("def __reduce__(self) -> tuple[typing.Any, ...]"));
+    BindCopies(analysis);
+}
+
+}  // namespace
+
+void BindFace(nb::module_& module) {
+    BindKinds(module);
+    BindRange(module);
+    BindProblem(module);
+    BindLine(module);
+    BindRecord(module);
+    BindLimit(module);
+    BindItems<CProblemItems>(module, "Problems", "class Problems(collections.abc.Sequence[Problem])");
+    BindItems<CLineItems>(module, "Lines", "class Lines(collections.abc.Sequence[Line])");
+    BindItems<CRecordItems>(module, "Records", "class Records(collections.abc.Sequence[Record])");
+    BindItems<CLimitItems>(module, "Limits", "class Limits(collections.abc.Sequence[Limit])");
+    BindAnalysis(module);
+}
+
+}  // namespace codeloom

@@ -1,0 +1,178 @@
+#include "face/items.h"
+
+#include <algorithm>
+#include <charconv>
+#include <functional>
+
+#include "face/kinds.h"
+#include "host/text.h"
+#include "text/place.h"
+
+namespace codeloom {
+
+namespace {
+
+size_t HashOf(std::string_view text, size_t more) {
+    return std::hash<std::string_view>()(text) * 31 + more;
+}
+
+template <class Items>
+Items AllOf(const CSourceFilePtr& file, size_t count) {
+    return {file, 0, 1, count};
+}
+
+nb::object Split(std::string_view payload, size_t at, size_t behind, bool may_lack_second) {
+    const std::string_view second = payload.substr(behind);
+    const nb::object shown = may_lack_second && second.empty() ? nb::none() : TextFromUtf8(second);
+    return nb::make_tuple(TextFromUtf8(payload.substr(0, at)), shown);
+}
+
+}  // namespace
+
+CRange RangeOfBytes(const CSourceFile& file, uint32_t start, uint32_t end) {
+    const CRowIndex& rows = file.Rows();
+    const CCharPlace first = rows.PlaceOf(start);
+    const CCharPlace last = end == start ? first : rows.PlaceOf(end);
+    return {first.row + 1, first.column + 1, last.row + 1, last.column + 1};
+}
+
+// Problems
+
+std::string CProblemItem::Code() const {
+    return "CL" + std::to_string(static_cast<int>(Data().code));
+}
+
+nb::object CProblemItem::Related() const {
+    nb::list related;
+    for (const CRelated& place : Data().related) {
+        const CRange range = RangeOfBytes(*file, place.start, place.end);
+        related.append(nb::make_tuple(range, TextFromUtf8(place.text)));
+    }
+    return nb::tuple(related);
+}
+
+nb::str CProblemItem::Text() const {
+    const CRange range = Range();
+    return nb::str("{}:{}:{}: {} {}")
+        .format(file->Path(), range.row, range.column, Code().c_str(), TextFromUtf8(Message()));
+}
+
+bool CProblemItem::operator==(const CProblemItem& other) const {
+    if (file == other.file && i == other.i) return true;
+    return Data().code == other.Data().code && Message() == other.Message() && Range() == other.Range() &&
+           file->Path().equal(other.file->Path());
+}
+
+size_t CProblemItem::Hash() const {
+    return HashOf(Message(), Range().row);
+}
+
+// Lines
+
+int CLineItem::Indent() const {
+    const std::string_view text = file->Text();
+    const CRowIndex& rows = file->Rows();
+    CPlace place;
+    place.pos = rows.Start(rows.PlaceOf(Data().start).row);
+    SkipIndent(text, place);
+    return place.pos == Data().start ? place.indent : -1;
+}
+
+bool CLineItem::operator==(const CLineItem& other) const {
+    if (file == other.file && i == other.i) return true;
+    return Data().type == other.Data().type && Text() == other.Text() && Range() == other.Range();
+}
+
+size_t CLineItem::Hash() const {
+    return HashOf(Text(), Range().row);
+}
+
+// Records
+
+nb::object CRecordItem::Value() const {
+    const std::string_view form = PayloadFormOf(Data().kind), payload = Payload();
+    if (form == "none" && payload.empty()) return nb::none();
+    if (form == "index") {
+        uint32_t number = 0;
+        const auto parsed = std::from_chars(payload.data(), payload.data() + payload.size(), number);
+        if (parsed.ec == std::errc() && parsed.ptr == payload.data() + payload.size())
+            return nb::int_(number);
+    }
+    if (form == "import") {
+        if (const size_t blank = payload.rfind(' '); blank != std::string_view::npos)
+            return Split(payload, blank, blank + 1, false);
+    }
+    if (form == "literal") {
+        const size_t colon = std::min(payload.find(':'), payload.size());
+        const size_t behind = std::min(colon + 1, payload.size());
+        return Split(payload, colon, behind + payload.substr(behind).starts_with(' '), true);
+    }
+    return TextFromUtf8(payload);
+}
+
+std::string CRecordItem::Text() const {
+    std::string text(Data().of_arg ? "arg " : "");
+    text += WordOfRecordKind(Data().kind);
+    text.append(" ").append(Name());
+    if (!Payload().empty()) text.append("  ").append(Payload());
+    return text;
+}
+
+bool CRecordItem::operator==(const CRecordItem& other) const {
+    if (file == other.file && i == other.i) return true;
+    return Data().kind == other.Data().kind && Data().of_arg == other.Data().of_arg &&
+           Name() == other.Name() && Payload() == other.Payload() && HasPlace() == other.HasPlace() &&
+           (!HasPlace() || Range() == other.Range());
+}
+
+size_t CRecordItem::Hash() const {
+    return HashOf(Name(), HashOf(Payload(), static_cast<size_t>(Data().kind)));
+}
+
+// Limits
+
+const char* CLimitItem::Message() const {
+    return Data().limit == ELimit::kTooDeep
+               ? "the line is nested too deep for a full walk: names further in have no records"
+               : "the line has too many parts for a full walk: names further on have no records";
+}
+
+bool CLimitItem::operator==(const CLimitItem& other) const {
+    return Data().limit == other.Data().limit && Line() == other.Line();
+}
+
+size_t CLimitItem::Hash() const {
+    return Line().Hash();
+}
+
+// Sequences
+
+CProblemItems ProblemsOf(const CSourceFilePtr& file) {
+    return AllOf<CProblemItems>(file, file->Analysis().problems.size());
+}
+
+CProblemItems ProblemsOf(const CLineItem& line) {
+    const CFileAnalysis& analysis = line.file->Analysis();
+    const size_t first = analysis.FirstProblem(line.i);
+    return {line.file, first, 1, analysis.FirstProblem(line.i + 1) - first};
+}
+
+CLineItems LinesOf(const CSourceFilePtr& file) {
+    return AllOf<CLineItems>(file, file->Analysis().lines.size());
+}
+
+CRecordItems RecordsOf(const CSourceFilePtr& file) {
+    return AllOf<CRecordItems>(file, file->WithRecords().records.records.size());
+}
+
+CRecordItems RecordsOf(const CLineItem& line) {
+    const CFileAnalysis& analysis = line.file->WithRecords();
+    const size_t first = analysis.FirstRecord(line.i);
+    return {line.file, first, 1, analysis.FirstRecord(line.i + 1) - first};
+}
+
+CLimitItems LimitsOf(const CSourceFilePtr& file) {
+    return AllOf<CLimitItems>(file, file->WithRecords().limits.size());
+}
+
+}  // namespace codeloom

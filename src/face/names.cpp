@@ -1,0 +1,84 @@
+#include "face/names.h"
+
+#include <string>
+
+#include "host/errors.h"
+#include "host/text.h"
+#include "names/name_walker.h"
+#include "names/record_kinds.h"
+#include "syntax/line_parser.h"
+#include "tokenizer/tokenizer.h"
+
+namespace nb = nanobind;
+using namespace nb::literals;
+
+namespace codeloom {
+
+namespace {
+
+// Parses and walks lines one by one.
+class CLineNames {
+  public:
+    explicit CLineNames(const CLanguage& language) : _fParser(language), _fWalker(language.IsPython3()) {}
+
+    // (what is wrong, the index of its token, the limit, records), the records as (name, info bytes, whether
+    // of an argument, first byte, end).
+    nb::tuple NamesOf(const CRawLogical& logical, bool in_async_def, bool with_records) {
+        _fRecords = CRecords();
+        CWalkResult result;
+        result.fault = _fParser.Parse(logical, in_async_def, _fTree);
+        if (!result.fault) result = _fWalker.Walk(_fTree, with_records ? &_fRecords : nullptr);
+        nb::list records;
+        for (const CRecord& record : _fRecords.records) records.append(_Shown(record));
+        return nb::make_tuple(static_cast<int>(result.fault.kind), result.fault.token_i,
+                              static_cast<int>(result.limit), records);
+    }
+
+  private:
+    nb::tuple _Shown(const CRecord& record) const {
+        std::string info;
+        if (record.kind != kPlainEquivKind) info.append({':', record.kind, ':'});
+        info += _fRecords.Value(record);
+        const std::string_view name = _fRecords.Name(record);
+        return nb::make_tuple(nb::bytes(name.data(), name.size()), nb::bytes(info.data(), info.size()),
+                              record.of_arg, record.start, record.end);
+    }
+
+    CLineParser _fParser;
+    CNameWalker _fWalker;
+    CTree _fTree;
+    CRecords _fRecords;
+};
+
+nb::list DumpNames(nb::str text, int version, bool has_print_function, bool with_records) {
+    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    const CUtf8 utf8(text);
+    CTokenizer tokenizer(utf8);
+    CLineNames names(LanguageOf(version, has_print_function));
+    CRawLogical logical;
+    nb::list lines;
+    while (tokenizer.NextLogical(logical)) {
+        lines.append(names.NamesOf(logical, logical.in_async_def, with_records));
+        for (const CRawLogical& embedded : logical.embedded)
+            lines.append(names.NamesOf(embedded, logical.in_async_def, with_records));
+    }
+    return lines;
+}
+
+}  // namespace
+
+void BindNames(nb::module_& module) {
+    module.def(
+        "DumpNames", &DumpNames, "text"_a, "version"_a, "has_print_function"_a = false,
+        "with_records"_a = true,
+        nb::sig("def DumpNames(text: str, version: int, has_print_function: bool = False, with_records: bool "
+                "= True) -> list[tuple[int, int, int, list[tuple[bytes, bytes, bool, int, int]]]]"),
+        "For developers: what the walk for names records of each logical line of a text, and of each "
+        "expression embedded in it.\n\n"
+        "Each is the kind of its fault (0 for none), the token at fault, the limit that the walk hit (0 for "
+        "none), and the records: name, info bytes, whether of an argument, and the bytes of the text at "
+        "which "
+        "the name stands. `version` is 312 for Python 3.12.");
+}
+
+}  // namespace codeloom

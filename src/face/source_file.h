@@ -1,0 +1,63 @@
+// face/: the package's face, codeloom._analysis: what a text says, as small objects that are made when asked
+// for.
+//   in     UTF-8 bytes and settings from the Python layer, which decodes
+//   out    Analysis, and its sequences of Problem, Line, Record and Limit
+//   keeps  the text, and what the pass over it found, as plain data
+//   start  at CSourceFile here; items.h for the objects, module.cpp for what is bound
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string_view>
+
+#include <nanobind/nanobind.h>
+
+#include "file/file_analyzer.h"
+#include "file/row_index.h"
+
+namespace nb = nanobind;
+
+namespace codeloom {
+
+// One text with all that is known of it. Everything but the text is worked out when it is first asked for,
+// and stays as it is from then on.
+class CSourceFile {
+  public:
+    // Raises ValueError for a text that is too long.
+    CSourceFile(nb::bytes utf8, nb::str path, nb::str python, const CFileSettings& settings,
+                CUnreadable unreadable);
+
+    std::string_view Text() const { return {_fUtf8.c_str(), _fUtf8.size()}; }
+    const nb::bytes& Utf8() const { return _fUtf8; }
+    const nb::str& Path() const { return _fPath; }
+    const nb::str& Python() const { return _fPython; }
+    int Version() const { return _fSettings.version; }
+    bool TakesFalseHints() const { return _fSettings.false_hints; }
+    const CUnreadable& Unreadable() const { return _fUnreadable; }
+
+    // The pass over the text; other threads of the host run meanwhile.
+    const CFileAnalysis& Analysis() const {
+        return _fWithRecords ? *_fWithRecords : _Analyzed(_fQuick, false);
+    }
+    const CFileAnalysis& WithRecords() const { return _Analyzed(_fWithRecords, true); }
+
+    const CRowIndex& Rows() const;
+    nb::str HostText() const;
+
+  private:
+    const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records) const;
+
+    nb::bytes _fUtf8;
+    nb::str _fPath;
+    nb::str _fPython;
+    CFileSettings _fSettings;
+    CUnreadable _fUnreadable;
+    mutable std::unique_ptr<const CFileAnalysis> _fQuick;  // without records
+    mutable std::unique_ptr<const CFileAnalysis> _fWithRecords;
+    mutable std::unique_ptr<const CRowIndex> _fRows;
+    mutable nb::object _fHostText;
+};
+
+using CSourceFilePtr = std::shared_ptr<const CSourceFile>;
+
+}  // namespace codeloom
