@@ -16,17 +16,17 @@ constexpr CNeighbourFunction kReportCurrentException("reflect", "ReportCurrentEx
 constexpr CNeighbourFunction kRaiseWithTraceback("reflect", "RaiseWithTraceback");
 
 // A fault of the walkers that isn't a syntax error, as a ValueError which tells the line.
-void RaiseCouldNotAnalyze(const CLogicalLine& logical, const CHostError& inner) {
+void RaiseCouldNotAnalyze(CLogicalLine& logical, const CHostError& inner) {
     const CHandlingScope handling(inner);
     const nb::object exc_info = HomeModule().attr("sys").attr("exc_info")();
     const nb::object text =
         nb::str("Could not analyze logical -- inner exception is {}\n  logical tokens: {}")
-            .format(nb::repr(exc_info[1]), nb::str(" ").attr("join")(logical.fToks));
+            .format(nb::repr(exc_info[1]), nb::str(" ").attr("join")(logical.GetToks()));
     kRaiseWithTraceback(nb::borrow(PyExc_ValueError)(text), exc_info[2]);
 }
 
 // What leaves an inspection whose walk failed: syntax errors and what is no Exception pass unchanged.
-CHostError InspectionFailure(const CLogicalLine& logical, CHostError error) {
+CHostError InspectionFailure(CLogicalLine& logical, CHostError error) {
     if (error.Is(PyExc_SyntaxError) || !error.Is(PyExc_Exception)) return error;
     try {
         RaiseCouldNotAnalyze(logical, error);
@@ -49,7 +49,7 @@ CAnalyzerParts PartsAround(CRef<CPGenParserImpl> parser, nb::object version_trip
 }
 
 void CPGenAnalyzerImpl::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-                             nb::object py3_grammar, nb::object hint_grammar_file) {
+                             bool py3_grammar, nb::object hint_grammar_file) {
     CRef<CPGenParserImpl> parser =
         NewInstance<CPGenParserImpl>(version_triple, grammar_file, keyword_seq, py3_grammar);
     CRef<CPGenParserImpl> hint_parser = NewInstance<CPGenParserImpl>(version_triple, hint_grammar_file);
@@ -132,7 +132,7 @@ void CPGenAnalyzerImpl::_InspectEmbedded(CLogicalLine& logical, CLogicalLine& ex
         if (!error.Is(ParseErrorClass())) error.Raise();
         const CHandlingScope handling(error);
         logical.ClearDerivedInfo();
-        RaiseEmbeddedError(logical, exp_logical, error.Value().attr("context"));
+        RaiseHostError(EmbeddedError(logical, exp_logical, error.Value().attr("context")));
     }
 }
 
@@ -154,15 +154,25 @@ void BindAnalyzer(nb::module_& module) {
         " Analyzes logical using a parser implemented via the pgen2 package ");
     const nb::object default_grammar = module.attr("kPy3DefaultGrammar");
     binding
-        .def(TInit<nb::object, nb::object, nb::object, nb::object, nb::object>(), "version_triple"_a.none(),
+        .def(TInit<nb::object, nb::object, nb::object, bool, nb::object>(), "version_triple"_a.none(),
              "grammar_file"_a = default_grammar, "keyword_seq"_a = nb::none(), "py3_grammar"_a = true,
              "hint_grammar_file"_a = default_grammar)
         .def_ro("_fNodeWalker", &CPGenAnalyzerImpl::_fNodeWalker, "The walker for names.")
         .def_ro("_fTypeHintWalker", &CPGenAnalyzerImpl::_fTypeHintWalker, "The walker for type hints.")
-        .def("ParseToNode", &CPGenAnalyzerImpl::ParseToNode, "logical"_a, "in_async_def"_a = false,
-             "The node of a logical's statement, or None. ParseError on a token that the grammar refuses.")
-        .def("ParseTokenListToNode", &CPGenAnalyzerImpl::ParseTokenListToNode, "logical"_a,
-             "in_async_def"_a = false, "The same for a list of token texts, without the special cases.")
+        .def(
+            "ParseToNode",
+            [](CPGenAnalyzerImpl& analyzer, CLogicalLine& logical, CTruth in_async_def) {
+                return analyzer.ParseToNode(logical, in_async_def);
+            },
+            "logical"_a, "in_async_def"_a = false,
+            "The node of a logical's statement, or None. ParseError on a token that the grammar refuses.")
+        .def(
+            "ParseTokenListToNode",
+            [](CPGenAnalyzerImpl& analyzer, nb::list logical, CTruth in_async_def) {
+                return analyzer.ParseTokenListToNode(std::move(logical), in_async_def);
+            },
+            "logical"_a, "in_async_def"_a = false,
+            "The same for a list of token texts, without the special cases.")
         .def("GetTypeParameterNodes", &CPGenAnalyzerImpl::GetTypeParameterNodes, "toks"_a,
              " Get type parameters defined in toks. Tries to ignore parse errors\n"
              "        and get all names if possible ");

@@ -28,8 +28,8 @@ CAnalyzerParts PartsAround(CRef<CPGenParserImpl> parser, nb::object version_trip
 
 class CPGenAnalyzerImpl : public CPGenAnalyzer {
   public:
-    void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-              nb::object py3_grammar, nb::object hint_grammar_file);
+    void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq, bool py3_grammar,
+              nb::object hint_grammar_file);
     void InitFromParts(CAnalyzerParts parts);
 
     nb::object AnalyzeSingleLogical(CLogicalLine& logical, bool in_async_def, bool first_in_def) override;

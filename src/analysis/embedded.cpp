@@ -1,7 +1,6 @@
 #include "analysis/embedded.h"
 
 #include "analysis/syntax_error.h"
-#include "host/errors.h"
 #include "neighbours/imported_names.h"
 
 namespace codeloom {
@@ -18,14 +17,13 @@ const char* MessageFor(const CLogicalLine& exp_logical) {
 
 }  // namespace
 
-void RaiseEmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_logical, nb::handle context) {
+nb::object EmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_logical, nb::handle context) {
     const nb::str message(MessageFor(exp_logical));
     const nb::object inner = CreateSyntaxError(message, exp_logical.Self(), context, nb::none());
     const nb::int_ rows_down(int64_t{exp_logical.fFirstLine} - logical.fFirstLine);
     // The message stands in the place of the file name too.
-    RaiseHostError(nb::borrow(PyExc_SyntaxError)(
-        message,
-        nb::make_tuple(message, rows_down + inner.attr("lineno"), inner.attr("offset"), inner.attr("text"))));
+    return nb::borrow(PyExc_SyntaxError)(message, nb::make_tuple(message, rows_down + inner.attr("lineno"),
+                                                                 inner.attr("offset"), inner.attr("text")));
 }
 
 void LiftTypeEquivs(const CLogicalLine& exp_logical, CLogicalLine& logical) {

@@ -7,10 +7,9 @@
 
 namespace codeloom {
 
-// Raises the SyntaxError for a token `context` of an embedded logical, with its row in the frame of
-// `logical`. The column stays relative to the embedded text.
-[[noreturn]] void RaiseEmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_logical,
-                                     nb::handle context);
+// Makes the SyntaxError for a token `context` of an embedded logical, with its row in the frame of `logical`.
+// The column stays relative to the embedded text.
+nb::object EmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_logical, nb::handle context);
 
 // Appends the type equivs of an embedded logical to those of the line around it.
 void LiftTypeEquivs(const CLogicalLine& exp_logical, CLogicalLine& logical);

@@ -57,7 +57,8 @@ CPlace PlaceOf(nb::handle logical, nb::handle context, nb::handle pos_info_in_to
 
 nb::object CreateSyntaxError(nb::handle msg, nb::handle logical, nb::handle context,
                              nb::handle pos_info_in_tok) {
-    const CPlace place = PlaceOf(logical, context, pos_info_in_tok);
+    const nb::object kept_context = nb::borrow(context);  // its node may be given back meanwhile
+    const CPlace place = PlaceOf(logical, kept_context, pos_info_in_tok);
     const nb::object src = kTextFromTokens(logical);
     const nb::int_ one(1);
     return nb::borrow(PyExc_SyntaxError)(

@@ -8,8 +8,10 @@
 #include "host/restore.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
-#include "neighbours/token_type.h"
+#include "symbolinfo/module_constants.h"
+#include "text/token_type.h"
 #include "tree/token_end.h"
+#include "typing/function_hint.h"
 
 namespace codeloom {
 
@@ -19,13 +21,13 @@ constexpr CNeighbourFunction kGetLogicalsFromText("utils", "GetLogicalsFromText"
 
 // Row or column of a token; a negative index counts from the end.
 Py_ssize_t PlaceOf(CLogicalLine& logical, Py_ssize_t tok_i, int32_t CPosition::* native, Py_ssize_t item_i) {
-    if (logical.Places() == nullptr) {
+    if (logical.Tokens() == nullptr) {
         const nb::tuple position(nb::borrow(TupleItem(logical.GetPositions(), tok_i)));
         return ResultFromHost<Py_ssize_t>(nb::borrow(TupleItem(position, item_i)));
     }
     if (tok_i < 0) tok_i += logical.fTokenCount;
     if (tok_i < 0 || tok_i >= logical.fTokenCount) RaiseIndexError("token index out of range");
-    return logical.Places()[tok_i].position.*native;
+    return logical.Tokens()[tok_i].position.*native;
 }
 
 Py_ssize_t RowOf(CLogicalLine& logical, Py_ssize_t tok_i) {
@@ -55,6 +57,18 @@ Py_ssize_t RowCount(const CNode& leaf) {
     return static_cast<Py_ssize_t>(nb::len(leaf.fText.attr("splitlines")()));
 }
 
+CNode& LastPiece(const CArgument& arg) {
+    return arg.value ? *arg.value : arg.type_expr ? *arg.type_expr : *arg.name;
+}
+
+// A hint is an expression. What stands for a statement is none: its node, or the leaf of a keyword such as
+// `pass`.
+bool IsHintExpression(const CNode& node) {
+    if (node.As<CKeywordLiteral>() != nullptr) return IsKeywordLiteral(CUtf8(node.fText));
+    const bool is_expression = node.As<CExpression>() != nullptr || !node.fText.is_none();
+    return is_expression && node.As<CYieldExpr>() == nullptr;
+}
+
 // The arguments of a `def`, by the records which say that they are bound; none when it has no records.
 nb::object NamesOfArguments(const CLogicalLine& funcdef_logical) {
     if (funcdef_logical.fArgTypeEquivs.IsEmpty()) return nb::none();
@@ -70,7 +84,7 @@ nb::object NamesOfArguments(const CLogicalLine& funcdef_logical) {
 // Finding
 
 CTextOrNone CTypeHintWalker::_GetHintFromComment(nb::str comment) {
-    return HintInComment(comment);
+    return AlignedHintInComment(comment);
 }
 
 CFoundText CTypeHintWalker::_FindComment(Py_ssize_t row, CRef<CLogicalLine> logical) {
@@ -78,15 +92,15 @@ CFoundText CTypeHintWalker::_FindComment(Py_ssize_t row, CRef<CLogicalLine> logi
     for (Py_ssize_t i = 0; i < logical->fTokenCount; ++i) {
         const Py_ssize_t tok_row = RowOf(*logical, i);
         if (tok_row > row) break;
-        const nb::handle tok = TupleItem(logical->fToks, i);
+        const nb::handle tok = TupleItem(logical->GetToks(), i);
         if (tok_row == row && IsComment(tok)) return {nb::borrow(tok), i};
     }
     return {};
 }
 
 CRowRange CTypeHintWalker::_GetRowRange(CNode& node) {
-    const CNode& last = LastLeaf(node);
-    return {StartRow(*_fLogical, FirstLeaf(node)), StartRow(*_fLogical, last) + RowCount(last)};
+    const CNodeRef first = FirstLeaf(node), last = LastLeaf(node);
+    return {StartRow(*_fLogical, *first), StartRow(*_fLogical, *last) + RowCount(*last)};
 }
 
 CFoundText CTypeHintWalker::_FindEndingTypeComment(CNode& node) {
@@ -121,14 +135,18 @@ CNodeRef CTypeHintWalker::_ParseHint(nb::str hint, Py_ssize_t tok_i, bool call_g
         [&](Py_ssize_t context) {  // an invented token stands for the last real one
             return ColumnOf(*logical, std::min<Py_ssize_t>(context, logical->fTokenCount - 1));
         });
-    if (!node || !call_general_node_walker) return node;
-    try {
-        _WalkNamesOf(node);
-    } catch (...) {
-        _fHintParser->DiscardNode(node.AsHost());
-        throw;
-    }
-    return node;
+    if (!node) return node;
+    CNodeRef hint_node;
+    TryFinally(
+        [&] {
+            if (!IsHintExpression(*node)) return;
+            if (call_general_node_walker) _WalkNamesOf(node);
+            hint_node = node;
+        },
+        [&] {
+            if (!hint_node) _fHintParser->DiscardNode(node.AsHost());
+        });
+    return hint_node;
 }
 
 CRewrittenHint CTypeHintWalker::_RewriteFuncdefCommentHint(nb::str hint) {
@@ -178,26 +196,27 @@ void CTypeHintWalker::_ProcessNameAndHint(const CNodeRef& name_node, const nb::s
 void CTypeHintWalker::_ProcessArgSpecificComment(const CArgument& arg) {
     if (!arg.name || _fCommentHintCount == 0) return;
     CLogicalLine& logical = *_fLogical;
-    const Py_ssize_t count = TupleSize(logical.fToks);
-    Py_ssize_t tok_i = GetTokenEndIndex(arg.value ? *arg.value : arg.type_expr ? *arg.type_expr : *arg.name);
+    const Py_ssize_t count = Py_ssize_t{logical.fTokenCount};
+    Py_ssize_t tok_i = GetTokenEndIndex(LastPiece(arg));
     if (tok_i < count && logical.GetTokenType(tok_i) == kTokenId_COMMA) ++tok_i;
     if (tok_i >= count || logical.GetTokenType(tok_i) != kTokenId_COMMENT) return;
-    const nb::object tok = nb::borrow(TupleItem(logical.fToks, tok_i));
+    const nb::object tok = nb::borrow(TupleItem(logical.GetToks(), tok_i));
     if (!IsText(tok)) return;
     const nb::object hint = _GetHintFromComment(nb::borrow<nb::str>(tok));
-    if (!hint.is_none()) _ProcessNameAndHint(arg.name, nb::borrow<nb::str>(hint), tok_i, true);
+    if (hint.is_none()) return;
+    ++_fArgCommentCount;
+    _ProcessNameAndHint(arg.name, nb::borrow<nb::str>(hint), tok_i, true);
 }
 
-// The comment behind the header. Where arguments have comments of their own, one that isn't in the form of a
-// function belongs to the last argument.
-void CTypeHintWalker::_ProcessEndingComment(CFuncdefStmt& node, const CArgumentList& args) {
+// The comment after the header is a function's hint. Where arguments before have comments of their own, the
+// last one has no room for its own but there: it owns a comment on its row that isn't in a function's form.
+void CTypeHintWalker::_ProcessEndingComment(CFuncdefStmt& node, const CArgument* last_arg) {
     const CFoundText found = _FindEndingTypeComment(node);
     if (found.text.is_none()) return;
     const nb::str hint = nb::borrow<nb::str>(found.text);
-    const bool is_of_last_arg = _fCommentHintCount > 1 && !args.empty() && args.back().name &&
-                                !args.back().type_expr && !HasFunctionForm(hint);
-    if (is_of_last_arg) {
-        _ProcessNameAndHint(args.back().name, hint, found.tok_i, true);
+    if (_fArgCommentCount != 0 && last_arg != nullptr && !HasFunctionForm(CUtf8(hint)) &&
+        _GetRowRange(LastPiece(*last_arg)).end_row - 1 == RowOf(*_fLogical, found.tok_i)) {
+        _ProcessNameAndHint(last_arg->name, hint, found.tok_i, true);
     } else {
         _ProcessFuncdefComment(hint, found.tok_i, _fLogical, true);
     }

@@ -23,9 +23,9 @@ void CDispatchWalker::Walk(CNodeRef node, CLogicalLine& logical, bool) {
     const CRestoreOnExit idle_logical(_fLogical, CRef<CLogicalLine>(&logical));
     const CCallOnExit idle([this] {
         _fLimits.Reset();
-        _fNodeStack.clear();
+        DropEach(_fNodeStack);
     });
-    _fNodeStack.clear();
+    DropEach(_fNodeStack);
     RunLimited([&] { _VisitNode(std::move(node)); });
 }
 
@@ -34,7 +34,9 @@ void CDispatchWalker::_VisitNode(CNodeRef node) {
     _fNodeStack.push_back(node);
     CVisitLimits::CheckDepth(static_cast<Py_ssize_t>(_fNodeStack.size()));
     const CCallOnExit popped([this] {
-        if (!_fNodeStack.empty()) _fNodeStack.pop_back();
+        if (_fNodeStack.empty()) return;
+        const CNodeRef left = std::move(_fNodeStack.back());
+        _fNodeStack.pop_back();
     });
     if (_AreChildrenWanted(node)) _VisitChildren(node);
     HostAssert(!_fNodeStack.empty() && _fNodeStack.back().get() == node.get());

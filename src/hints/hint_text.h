@@ -14,10 +14,7 @@ bool HoldsTypeMark(nb::handle comment);
 
 // The hint in a comment, behind as many blanks as there are bytes in front of it; none for a comment that is
 // no hint, or a bare `type: ignore`.
-CTextOrNone HintInComment(const nb::str& comment);
-
-// True for the hint of a function, in brackets.
-bool HasFunctionForm(const nb::str& hint);
+CTextOrNone AlignedHintInComment(const nb::str& comment);
 
 // The hint of a function made parsable: the tokens, and for each the offset in the hint that it stands for.
 struct CRewrittenHint {

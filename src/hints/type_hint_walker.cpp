@@ -5,9 +5,9 @@
 #include "host/errors.h"
 #include "host/restore.h"
 #include "host/text.h"
+#include "names/record_kinds.h"
 #include "neighbours/strutils/text.h"
-#include "neighbours/token_type.h"
-#include "symbolinfo/record_kinds.h"
+#include "text/token_type.h"
 
 namespace codeloom {
 
@@ -15,14 +15,14 @@ namespace {
 
 // The comment tokens of a logical that hold "type:". Most logicals pay for this scan and no more.
 int CountHintComments(CLogicalLine& logical) {
-    const CLogicalLine::CTokenPlace* const places = logical.Places();
-    const nb::object types = places == nullptr ? logical.GetTokTypes() : nb::none();
+    const CRawToken* const tokens = logical.Tokens();
+    const nb::object types = tokens == nullptr ? logical.GetTokTypes() : nb::none();
     int count = 0;
     for (Py_ssize_t i = 0; i < logical.fTokenCount; ++i) {
-        const bool is_comment = places != nullptr
-                                    ? places[i].type == kTokenId_COMMENT
+        const bool is_comment = tokens != nullptr
+                                    ? tokens[i].type == kTokenId_COMMENT
                                     : TupleItem(types, i).equal(nb::int_(int{kTokenId_COMMENT}));
-        if (is_comment && HoldsTypeMark(TupleItem(logical.fToks, i))) ++count;
+        if (is_comment && HoldsTypeMark(TupleItem(logical.GetToks(), i))) ++count;
     }
     return count;
 }
@@ -94,9 +94,16 @@ void CTypeHintWalker::_WalkLoneComment(CLogicalLine& logical, bool first_in_def)
 
 nb::object CTypeHintWalker::_VisitFuncdefStmt(CFuncdefStmt& node) {
     const CArgumentList args = GetDefiningArgInfoList(CNodeRef(node.GetParameters().get()));
-    for (const CArgument& arg : args) _VisitArgument(arg);
+    const CRestoreOnExit arg_comments(_fArgCommentCount, 0);
+    const CArgument* last_without_hint = nullptr;
+    for (const CArgument& arg : args) {
+        const int taken = _fArgCommentCount;
+        _VisitArgument(arg);
+        const bool is_hinted = arg.type_expr || _fArgCommentCount != taken;
+        last_without_hint = arg.name && !is_hinted ? &arg : nullptr;
+    }
     _RecordHint(nb::str(kReturnName), CNodeRef(node.GetReturnType().get()), true);
-    _ProcessEndingComment(node, args);
+    _ProcessEndingComment(node, last_without_hint);
     return nb::none();
 }
 

@@ -84,11 +84,13 @@ class CTypeHintWalker : public CDispatchWalker {
 
     void _WalkLoneComment(CLogicalLine& logical, bool first_in_def);
     void _VisitArgument(const CArgument& arg);
-    void _ProcessEndingComment(CFuncdefStmt& node, const CArgumentList& args);
+    void _ProcessEndingComment(CFuncdefStmt& node, const CArgument* last_arg);
     void _ProcessNameAndHint(const CNodeRef& name_node, const nb::str& hint, Py_ssize_t tok_i, bool is_arg);
     void _RecordFuncdefHint(CFuncdefStmt& hint_node, CLogicalLine* funcdef_logical, bool is_arg);
     void _RecordHint(const nb::object& name, const CNodeRef& hint_node, bool is_arg);
     void _WalkNamesOf(const CNodeRef& hint_node);
+
+    int _fArgCommentCount = 0;  // hints in comments of arguments that the visit of a `def` has taken
 };
 
 template <class Class>
@@ -131,8 +133,8 @@ class TTypeHintWalkerOperations : public TDispatchWalkerOperations<Class> {
     OPERATION(_GetHintInfoStr, "The record of a hint; None when it has no text.", "node"_a.none())
     OPERATION(_AddSymInfo, "Append a record to the logical.", "name"_a, "istr"_a, "is_arg"_a)
     OPERATION(_ParseHint,
-              "The top node of a hint, or None. Give it back with `_fHintParser.DiscardNode`. SyntaxError "
-              "with the place in the comment when it doesn't parse.",
+              "The top node of a hint; None when it isn't one expression. Give it back with "
+              "`_fHintParser.DiscardNode`. SyntaxError with the place in the comment when it doesn't parse.",
               "hint"_a, "tok_i"_a, "call_general_node_walker"_a)
     OPERATION(_RaiseHintSyntaxError,
               "Raise SyntaxError for a place in the hint that the comment token at `tok_i` holds.", "tok_i"_a,
@@ -152,9 +154,10 @@ namespace nanobind::detail {
 
 template <>
 struct type_caster<codeloom::CFoundText>
-    : pair_caster<codeloom::CFoundText, codeloom::CTextOrNone, Py_ssize_t> {};
+    : pair_caster<codeloom::CFoundText, codeloom::CTextOrNone, codeloom::CIndex> {};
 
 template <>
-struct type_caster<codeloom::CRowRange> : pair_caster<codeloom::CRowRange, Py_ssize_t, Py_ssize_t> {};
+struct type_caster<codeloom::CRowRange>
+    : pair_caster<codeloom::CRowRange, codeloom::CIndex, codeloom::CIndex> {};
 
 }  // namespace nanobind::detail

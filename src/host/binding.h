@@ -7,6 +7,14 @@
 
 namespace codeloom {
 
+// An object has room for what its nearest native class makes, and for nothing else. TypeError when that is
+// not Class, whose `__init__` was called.
+template <class Class>
+void RequireOwnInit(nb::handle self) {
+    const std::type_info& wanted = nb::type_info(self.type());
+    if (wanted != typeid(Class)) RaiseForeignInit(typeid(Class), wanted, self);
+}
+
 // `__init__` of a class: makes the object, then calls its Init(arguments...). By then the object is complete,
 // so that overrides of a host subclass work in Init, as they do in a host constructor.
 template <class... Arguments>
@@ -17,12 +25,13 @@ struct TInit : nb::def_visitor<TInit<Arguments...>> {
         using HostSubclass = typename Binding::Alias;
         binding.def(
             "__init__",
-            [](nb::pointer_and_handle<Class> self, Arguments... arguments) {
+            [](nb::pointer_and_handle<Class> self, TBound<Arguments>... arguments) {
+                RequireOwnInit<Class>(self.h);
                 Class* const made =
                     nb::inst_python_derived(self.h) ? new (self.p) HostSubclass : new (self.p) Class;
                 CHosted::Introduce<Class>(*made, self.h);
                 nb::inst_mark_ready(self.h);
-                made->Init(std::forward<Arguments>(arguments)...);
+                made->Init(std::forward<TBound<Arguments>>(arguments)...);
             },
             extra...);
     }

@@ -56,6 +56,12 @@ void RaiseWrongType(const char* expected, nb::handle found) {
     throw nb::python_error();
 }
 
+void RaiseForeignInit(const std::type_info& called, const std::type_info& wanted, nb::handle self) {
+    PyErr_Format(PyExc_TypeError, "%s.__init__ can't make a %s: call %s.__init__", HostName(called).c_str(),
+                 Py_TYPE(self.ptr())->tp_name, HostName(wanted).c_str());
+    throw nb::python_error();
+}
+
 void RaiseNoneUsed(const std::type_info& wanted) {
     PyErr_Format(PyExc_AttributeError, "expected %s, NoneType found", HostName(wanted).c_str());
     throw nb::python_error();

@@ -45,6 +45,10 @@ class CHosted {
 // The name of a class as the host knows it: `codeloom::CNode` is CNode, `CRef<CNode>` is CNode too.
 std::string HostName(const std::type_info& type);
 
+// Raises the host's TypeError for `called`.__init__ on an object that only `wanted`.__init__ can make.
+[[noreturn]] void RaiseForeignInit(const std::type_info& called, const std::type_info& wanted,
+                                   nb::handle self);
+
 // Raises the host's AttributeError of an operation on none.
 [[noreturn]] void RaiseNoneUsed(const std::type_info& wanted);
 
@@ -145,6 +149,30 @@ class CRef {
     }
 
     T* _fObject = nullptr;
+};
+
+// Empties a vector of what owns references. Dropping one may run host code, so each leaves the vector first.
+template <class Vector>
+void DropEach(Vector& owners) {
+    while (!owners.empty()) {
+        const auto dropped = std::move(owners.back());
+        owners.pop_back();
+    }
+}
+
+// While it lives, the collector doesn't run by itself, and with it no host code of finalizers and callbacks.
+// For loops that make host objects of native ones which host code could change under them.
+class CNoCollection {
+  public:
+    CNoCollection() : _fWasOn(PyGC_Disable()) {}
+    ~CNoCollection() {
+        if (_fWasOn) PyGC_Enable();
+    }
+    CNoCollection(const CNoCollection&) = delete;
+    CNoCollection& operator=(const CNoCollection&) = delete;
+
+  private:
+    const int _fWasOn;
 };
 
 // Makes an object of class T in a new host object. Its constructor takes `arguments`.

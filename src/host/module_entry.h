@@ -3,6 +3,21 @@
 
 #include <nanobind/nanobind.h>
 
+namespace codeloom {
+
+// False, with an ImportError, in a subinterpreter: what is kept for the life of the process, host objects
+// among it, belongs to the interpreter that loaded the module first.
+inline bool MayBeLoaded(const char* name) {
+    if (PyInterpreterState_Get() == PyInterpreterState_Main()) return true;
+    PyErr_Format(PyExc_ImportError,
+                 "codeloom.%s can't be loaded in a subinterpreter: use it in the main interpreter, or in a "
+                 "process of its own",
+                 name);
+    return false;
+}
+
+}  // namespace codeloom
+
 // CODELOOM_MODULE(name, variable) { body }: as NB_MODULE, which would wrap the exception into an ImportError
 // that says nothing.
 #define CODELOOM_MODULE(name, variable)                                                                      \
@@ -21,6 +36,7 @@
         return -1;                                                                                           \
     }                                                                                                        \
     extern "C" NB_EXPORT PyObject* PyInit_##name() {                                                         \
+        if (!codeloom::MayBeLoaded(#name)) return nullptr;                                                   \
         nanobind::detail::init_singletons();                                                                 \
         if (!nanobind::detail::nb_backend_init(#name)) return nullptr;                                       \
         static PyObject* const definition =                                                                  \

@@ -26,6 +26,8 @@
 #include <nanobind/nanobind.h>
 
 #include "host/hosted.h"
+#include "host/index.h"
+#include "host/truth.h"
 
 namespace codeloom {
 
@@ -59,11 +61,16 @@ std::string HostTypeName() {
     return name.find('%') == std::string_view::npos ? std::string(name) : HostName(typeid(T));
 }
 
+// How a parameter of this type is bound, and what a result of it is read as.
+template <class Type>
+using TBound = std::conditional_t<std::is_same_v<Type, bool>, CTruth,
+                                  std::conditional_t<std::is_same_v<Type, Py_ssize_t>, CIndex, Type>>;
+
 // A value of the host's as a T; a wrong kind is the host's TypeError.
 template <class T>
-T ResultFromHost(const nb::object& result) {
-    T value{};
-    if (!nb::try_cast<T>(result, value)) RaiseWrongType(HostTypeName<T>().c_str(), result);
+T ResultFromHost(nb::object result) {
+    TBound<T> value{};
+    if (!nb::try_cast(result, value)) RaiseWrongType(HostTypeName<T>().c_str(), result);
     return value;
 }
 
@@ -76,9 +83,8 @@ Result CallOverride(const CHostOperation& operation, nb::handle self, Arguments&
     if constexpr (std::is_base_of_v<nb::handle, Result>) {
         return Result(result);
     } else if constexpr (!std::is_void_v<Result>) {
-        Result value{};
-        if (!nb::try_cast<Result>(result, value))
-            operation.RaiseWrongResult(self, HostTypeName<Result>(), result);
+        TBound<Result> value{};
+        if (!nb::try_cast(result, value)) operation.RaiseWrongResult(self, HostTypeName<Result>(), result);
         return value;
     }
 }
@@ -96,8 +102,8 @@ struct TOperationTraits<Result_ (Owner::*)(Arguments...)> {
     // A function object for the binding, with `Caller` as its body.
     template <class Class, class Caller>
     struct CBound {
-        Result operator()(Class& self, Arguments... arguments) const {
-            return Caller{}(self, std::forward<Arguments>(arguments)...);
+        Result operator()(Class& self, TBound<Arguments>... arguments) const {
+            return Caller{}(self, std::forward<TBound<Arguments>>(arguments)...);
         }
     };
 };

@@ -11,6 +11,10 @@ namespace codeloom {
 
 nb::object TextFromUtf8(std::string_view utf8);
 
+inline nb::bytes BytesFromUtf8(std::string_view utf8) {
+    return nb::bytes(utf8.data(), utf8.size());
+}
+
 // The same as an interned string.
 nb::object InternedText(std::string_view utf8);
 

@@ -1,10 +1,11 @@
 #include "newer/newer_forms.h"
 
+#include <algorithm>
+
 #include "analysis/syntax_error.h"
 #include "host/errors.h"
 #include "host/text.h"
-#include "neighbours/token_type.h"
-#include "neighbours/tokenizer/string_lexer.h"
+#include "text/token_type.h"
 #include "tree/child_list.h"
 #include "tree/expression_nodes.h"
 
@@ -53,30 +54,13 @@ Py_ssize_t FindStarInList(const CNode& node) {
     return list && FindOfClass<CStarExpression>(*list) != -1 ? child_i : -1;
 }
 
-// The version of a string literal; null for one that has always been.
-const CForm* FormOfString(std::string_view text) {
-    const CStringStart start = ReadStringStart(text, 0);
-    const auto has = [prefix = text.substr(0, start.prefix_length)](const char* letters) {
-        return prefix.find_first_of(letters) != std::string_view::npos;
-    };
-    if (start.has_fields) return has("tT") ? &forms::kTString : &forms::kFString;
-    return has("uU") && has("rR") ? &forms::kRawUnicode : nullptr;
-}
-
-//   0777  10L       0  00  0_0  0x1F  0777.5  0777e1  0777j
-const CForm* FormOfNumber(std::string_view text) {
-    if (text.back() == 'L' || text.back() == 'l') return &forms::kLongNumber;
-    if (text.front() != '0' || text.find_first_not_of("0123456789_") != std::string_view::npos)
-        return nullptr;
-    return text.find_first_not_of("0_") != std::string_view::npos ? &forms::kOldOctal : nullptr;
-}
-
 int VersionOf(nb::handle version_triple) {
     if (!nb::isinstance<nb::tuple>(version_triple) || TupleSize(version_triple) < 2) return INT32_MAX;
     int major = 0, minor = 0;
     const bool is_read = nb::try_cast(TupleItem(version_triple, 0), major) &&
                          nb::try_cast(TupleItem(version_triple, 1), minor);
-    return is_read ? major * kVersionsOfMajor + minor : INT32_MAX;
+    constexpr int kMost = INT32_MAX / 2 / kVersionsOfMajor;
+    return is_read ? std::clamp(major, 0, kMost) * kVersionsOfMajor + std::clamp(minor, 0, kMost) : INT32_MAX;
 }
 
 }  // namespace
@@ -122,6 +106,7 @@ void CNewerForms::_Watch(int type, const CNodeForm* form) {
 void CNewerForms::NoteNode(int type, const CNode& node) {
     if (type == kTokenId_STRING || type == kTokenId_NUMBER) {
         const CUtf8 text(node.fText);
+        if (text->empty()) return;  // of a node that a host made
         const CForm* const form = type == kTokenId_STRING ? FormOfString(text) : FormOfNumber(text);
         if (form) Note(*form, node.fContext);
         return;
@@ -138,12 +123,14 @@ void CNewerForms::Note(const CForm& form, nb::handle context) {
     _fContext = nb::borrow(context);
 }
 
-void CNewerForms::Raise(CLogicalLine& logical) const {
-    const int major = _fFound->version / kVersionsOfMajor, minor = _fFound->version % kVersionsOfMajor;
-    const nb::str message = _fFound->version == CForm::kNone
-                                ? nb::str("{} ended with Python 2").format(_fFound->name)
-                                : nb::str("{} needs Python {}.{}").format(_fFound->name, major, minor);
-    RaiseHostError(CreateSyntaxError(message, logical.Self(), _fContext, nb::none()));
+nb::object CNewerForms::ErrorIn(CLogicalLine& logical) const {
+    const CForm& found = *_fFound;
+    const nb::object context = _fContext;
+    const int major = found.version / kVersionsOfMajor, minor = found.version % kVersionsOfMajor;
+    const nb::str message = found.version == CForm::kNone
+                                ? nb::str("{} ended with Python 2").format(found.name)
+                                : nb::str("{} needs Python {}.{}").format(found.name, major, minor);
+    return CreateSyntaxError(message, logical.Self(), context, nb::none());
 }
 
 }  // namespace codeloom

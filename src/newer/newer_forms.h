@@ -9,45 +9,10 @@
 #include <nanobind/nanobind.h>
 
 #include "neighbours/logicalline/logical_line.h"
+#include "syntax/forms.h"
 #include "tree/node.h"
 
 namespace codeloom {
-
-struct CForm {
-    static constexpr int kNone = INT32_MAX;
-
-    const char* name;
-    int version;  // the first that has it, 312 for 3.12; kNone for what ended with Python 2
-};
-
-namespace forms {
-
-inline constexpr CForm kFString{"an f-string", 306};
-inline constexpr CForm kVariableAnnotation{"an annotation of a variable", 306};
-inline constexpr CForm kWalrus{"`:=`", 308};
-inline constexpr CForm kStarInResult{"a starred expression without brackets behind `return` or `yield`", 308};
-inline constexpr CForm kPositionalOnly{"`/` among parameters", 308};
-inline constexpr CForm kDecorator{"a decorator that is no name or call of one", 309};
-inline constexpr CForm kWithBrackets{"a `with` whose items stand in brackets", 309};
-inline constexpr CForm kStarInFor{"a starred expression in the list of a `for`", 309};
-inline constexpr CForm kWalrusInSet{"`:=` without brackets of its own in a set", 309};
-inline constexpr CForm kMatch{"`match`", 310};
-inline constexpr CForm kCase{"`case`", 310};
-inline constexpr CForm kWalrusInSubscript{"`:=` without brackets of its own in a subscript", 310};
-inline constexpr CForm kExceptStar{"`except*`", 311};
-inline constexpr CForm kStarInSubscript{"a starred expression in a subscript", 311};
-inline constexpr CForm kStarredAnnotation{"a starred annotation", 311};
-inline constexpr CForm kTypeAlias{"`type`", 312};
-inline constexpr CForm kTypeParameters{"a list of type parameters", 312};
-inline constexpr CForm kTypeDefault{"a default of a type parameter", 313};
-inline constexpr CForm kBareExcept{"an `except` of several types without brackets", 314};
-inline constexpr CForm kTString{"a t-string", 314};
-
-inline constexpr CForm kOldOctal{"an octal number without `0o`", CForm::kNone};
-inline constexpr CForm kLongNumber{"the suffix `L` of a number", CForm::kNone};
-inline constexpr CForm kRawUnicode{"the prefix `ur` of a string", CForm::kNone};
-
-}  // namespace forms
 
 class CNewerForms {
   public:
@@ -77,7 +42,7 @@ class CNewerForms {
     bool HasFound() const { return _fFound != nullptr; }
 
     // The SyntaxError about the first form that was found.
-    [[noreturn]] void Raise(CLogicalLine& logical) const;
+    nb::object ErrorIn(CLogicalLine& logical) const;
 
     template <class Visitor>
     void References(Visitor&& visit) {

@@ -2,10 +2,10 @@
 
 #include "host/errors.h"
 #include "host/restore.h"
-#include "neighbours/token_type.h"
 #include "parse/parentheses.h"
 #include "parse/pseudo_node.h"
 #include "parse/token_copy.h"
+#include "text/token_type.h"
 #include "tree/atom_nodes.h"
 #include "tree/pattern_nodes.h"
 

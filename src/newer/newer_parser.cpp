@@ -3,12 +3,13 @@
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
-#include "neighbours/token_type.h"
 #include "newer/newer_match_case_parser.h"
 #include "newer/outside_brackets.h"
+#include "parse/class_table.h"
 #include "parse/parentheses.h"
 #include "parse/pseudo_node.h"
 #include "parse/token_search.h"
+#include "text/token_type.h"
 #include "tree/child_list.h"
 #include "tree/statement_nodes.h"
 
@@ -39,9 +40,9 @@ CWithContents ReadWithContents(const nb::tuple& toks, Py_ssize_t open_i, Py_ssiz
 }  // namespace
 
 void CNewerParser::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-                        nb::object py3_grammar) {
+                        bool py3_grammar) {
     CPGenParserImpl::Init(std::move(version_triple), std::move(grammar_file), std::move(keyword_seq),
-                          std::move(py3_grammar));
+                          py3_grammar);
     const CRef<CNewerMatchCaseParser> match_case_parser = NewInstance<CNewerMatchCaseParser>(Self());
     _fMatchCaseStatementParser = CRef<CMatchCaseStatementParser>(match_case_parser.get());
     _fForms.SetVersion(_fVersionTriple);
@@ -68,17 +69,30 @@ CNodeRef CNewerParser::ParseToNode(CLogicalLine& logical, bool in_async_def) {
     _fForms.Reset();
     CNodeRef node = CPGenParserImpl::ParseToNode(logical, in_async_def);
     if (!_fForms.HasFound()) return node;
+    const nb::object error = _fForms.ErrorIn(logical);  // before host code may parse another line
     if (node) DiscardNode(node.AsHost());
-    _fForms.Raise(logical);
+    RaiseHostError(error);
 }
 
 // A star before any expression has a rule of its own in the grammar, since `star_expr` takes less. And `...`
 // is an expression, so that what holds one loses no records.
-nb::list CNewerParser::_BuildClsForStateList() {
-    nb::list classes = CPGenParserImpl::_BuildClsForStateList();
+nb::list CNewerParser::_WithNewerClasses(nb::list classes) const {
     if (_HasSymbol("star_test")) classes[_NumberOfSymbol("star_test")] = nb::type<CStarExpression>();
     classes[static_cast<int>(kTokenId_ELLIPSIS)] = nb::type<CExpression>();
     return classes;
+}
+
+nb::list CNewerParser::_BuildClsForStateList() {
+    return _WithNewerClasses(CPGenParserImpl::_BuildClsForStateList());
+}
+
+bool CNewerParser::HasOriginalClasses() const {
+    const nb::list original = _WithNewerClasses(OriginalClsForStateList(_fGrammar));
+    if (!nb::isinstance<nb::list>(_fClsForStateList) || ListSize(_fClsForStateList) != ListSize(original))
+        return false;
+    for (Py_ssize_t i = 0; i < ListSize(original); ++i)
+        if (!ListItem(_fClsForStateList, i).is(ListItem(original, i))) return false;
+    return true;
 }
 
 CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
@@ -265,7 +279,7 @@ void BindNewerParser(nb::module_& module) {
     nb::class_<CNewerParser, CPGenParserImpl, TParserDriverOperations<CNewerParser>> binding(
         module, "CNewerParser", Collected<CNewerParser>(),
         "Parses the language up to Python 3.14, with the grammar file of that version.");
-    binding.def(TInit<nb::object, nb::object, nb::object, nb::object>(), "version_triple"_a.none(),
+    binding.def(TInit<nb::object, nb::object, nb::object, bool>(), "version_triple"_a.none(),
                 "grammar_file"_a = kNewerGrammar, "keyword_seq"_a = nb::none(), "py3_grammar"_a = true);
     BindOperations(binding);
 }

@@ -24,8 +24,7 @@ inline constexpr const char* kNewerGrammar = "Python-Grammar-3.14";
 
 class CNewerParser : public CPGenParserImpl {
   public:
-    void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-              nb::object py3_grammar);
+    void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq, bool py3_grammar);
 
     // Forms of every version are taken from now on.
     void TakeAllForms() { _fForms.SetVersion(nb::none()); }
@@ -56,7 +55,11 @@ class CNewerParser : public CPGenParserImpl {
         _fForms.References(visit);
     }
 
+    // Its trees are of the classes that they had before a host could change any.
+    bool HasOriginalClasses() const;
+
   private:
+    nb::list _WithNewerClasses(nb::list classes) const;
     // A node of this type, once its form is noted.
     nb::object _Noted(int type, nb::object node);
     CNodeRef _ParseMatchOrCase(const nb::tuple& toks, bool in_async_def, const CPositions& positions,

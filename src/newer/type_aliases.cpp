@@ -2,11 +2,11 @@
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
-#include "neighbours/tokenizer/keywords.h"
 #include "newer/newer_parser.h"
 #include "newer/outside_brackets.h"
 #include "parse/token_copy.h"
 #include "parse/token_search.h"
+#include "tokenizer/keywords.h"
 #include "tree/child_list.h"
 #include "tree/statement_nodes.h"
 
@@ -19,7 +19,7 @@ namespace {
 template <class Visit>
 void ForEachStatement(const nb::tuple& toks, Py_ssize_t first_i, Visit visit) {
     const Py_ssize_t count = TupleSize(toks);
-    bool has_header = first_i < count && IsCompoundWord(CUtf8(TupleItem(toks, first_i)));
+    bool has_header = first_i < count && IsCompoundWord(WordOf(CUtf8(TupleItem(toks, first_i))));
     Py_ssize_t start = has_header ? -1 : first_i;
     ForEachOutsideBrackets(toks, first_i, count, [&](Py_ssize_t i, std::string_view text) {
         const bool ends_header = has_header && text == ":";

@@ -2,9 +2,9 @@
 // search outside brackets, and puts down what the pattern is made of; what fits nothing fails at its token.
 #include "host/errors.h"
 #include "host/text.h"
-#include "neighbours/token_type.h"
 #include "parse/match_case_parser.h"
 #include "parse/pattern_work.h"
+#include "text/token_type.h"
 #include "tree/expression_nodes.h"
 #include "tree/statement_nodes.h"
 
@@ -69,6 +69,8 @@ void CMatchCaseStatementParser::DoPatternStep(CPatternWork& work, const CPattern
             return _PlanMappingPattern(CPlan(work), step.start_i, step.end_i);
         case EKind::kToken:
             return work.AddNode(_TokNode(step.start_i));
+        case EKind::kTokenBefore:
+            return work.AddNodeBeforeLast(_TokNode(step.start_i));
         case EKind::kFail:
             _FailAt(step.start_i);
         case EKind::kBuild:
@@ -125,9 +127,9 @@ void CMatchCaseStatementParser::_PlanAlternatives(CPlan& plan, Py_ssize_t start_
 //        ^^^^^^^
 //   a CPatternNode: `(`, the pattern, `)`
 void CMatchCaseStatementParser::_PlanGroup(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
-    plan.Token(start_i);
     plan.Pattern(start_i + 1, end_i - 1);
     if (!_IsTok(end_i - 1, ")")) plan.Fail(end_i - 1);
+    plan.TokenBefore(start_i);
     plan.Token(end_i - 1);
     plan.Build<CPatternNode>();
 }
@@ -161,16 +163,17 @@ void CMatchCaseStatementParser::_PlanNumberPattern(CPlan&& plan, Py_ssize_t star
     Py_ssize_t i = start_i;
     const auto take = [&] { plan.Token(i++); };
     const auto take_number = [&] {
-        if (_TokType(i) != kTokenId_NUMBER) _FailAt(i);
-        take();
+        const bool is_number = _TokType(i) == kTokenId_NUMBER;
+        is_number ? take() : plan.Fail(i);
+        return is_number;
     };
     if (_IsSign(i)) take();
-    take_number();
+    if (!take_number()) return;
     if (_IsSign(i)) {
         take();
-        take_number();
+        if (!take_number()) return;
     }
-    if (i != end_i) _FailAt(i);
+    if (i != end_i) return plan.Fail(i);
     plan.Build<CPatternNode>();
 }
 
@@ -180,11 +183,11 @@ void CMatchCaseStatementParser::_PlanNumberPattern(CPlan&& plan, Py_ssize_t star
 void CMatchCaseStatementParser::_PlanDottedNameValue(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
     bool dot_is_due = false;
     for (Py_ssize_t i = start_i; i < end_i; ++i) {
-        if (_TokType(i) != (dot_is_due ? kTokenId_DOT : kTokenId_NAME)) _FailAt(i);
+        if (_TokType(i) != (dot_is_due ? kTokenId_DOT : kTokenId_NAME)) return plan.Fail(i);
         plan.Token(i);
         dot_is_due = !dot_is_due;
     }
-    if (!dot_is_due) _FailAt(end_i - 1);
+    if (!dot_is_due) return plan.Fail(end_i - 1);
     plan.Build<CExpression>();
 }
 

@@ -8,6 +8,8 @@ namespace codeloom {
 
 namespace {
 
+nb::handle gOriginalClsForState;  // lives as long as the process
+
 // Node classes are what stands in the module's namespace: a class joins the table by being defined there.
 nb::list NodeClasses() {
     const nb::handle node_class = nb::type<CNode>();
@@ -26,6 +28,21 @@ void AddSupportedRules(nb::dict cls_for_state) {
 
 Py_ssize_t HighestSymbol(nb::handle number2symbol) {
     return nb::cast<Py_ssize_t>(nb::module_::import_("builtins").attr("max")(number2symbol));
+}
+
+nb::list ClassList(nb::handle grammar, nb::handle cls_for_state) {
+    const nb::object number2symbol = grammar.attr("number2symbol");
+    const nb::object tok_name = HomeModule().attr("token").attr("tok_name");
+    const Py_ssize_t top = HighestSymbol(number2symbol);
+    nb::list classes;
+    for (Py_ssize_t i = 0; i < top; ++i) {
+        nb::object name = number2symbol.attr("get")(i);
+        if (name.is_none()) name = tok_name.attr("get")(i);
+        const nb::object cls = cls_for_state.attr("get")(name, nb::type<CNode>());
+        classes.append(cls.is_none() ? nb::type<CExpression>() : nb::handle(cls));
+    }
+    classes.append(nb::none());
+    return classes;
 }
 
 }  // namespace
@@ -67,18 +84,17 @@ nb::dict DirectClsForState() {
 
 nb::list BuildClsForStateList(nb::handle grammar, nb::dict cls_for_state) {
     AddSupportedRules(cls_for_state);
-    const nb::object number2symbol = grammar.attr("number2symbol");
-    const nb::object tok_name = HomeModule().attr("token").attr("tok_name");
-    const Py_ssize_t top = HighestSymbol(number2symbol);
-    nb::list classes;
-    for (Py_ssize_t i = 0; i < top; ++i) {
-        nb::object name = number2symbol.attr("get")(i);
-        if (name.is_none()) name = tok_name.attr("get")(i);
-        const nb::object cls = cls_for_state.attr("get")(name, nb::type<CNode>());
-        classes.append(cls.is_none() ? nb::type<CExpression>() : nb::handle(cls));
-    }
-    classes.append(nb::none());
-    return classes;
+    return ClassList(grammar, cls_for_state);
+}
+
+void RememberClsForState() {
+    nb::dict classes = DirectClsForState();
+    AddSupportedRules(classes);
+    gOriginalClsForState = classes.release();
+}
+
+nb::list OriginalClsForStateList(nb::handle grammar) {
+    return ClassList(grammar, gOriginalClsForState);
 }
 
 nb::list CPGenParserImpl::_BuildClsForStateList() {

@@ -14,4 +14,10 @@ nb::dict DirectClsForState();
 // are those in the home module's namespace; `cls_for_state` gets the names of the rules that they support.
 nb::list BuildClsForStateList(nb::handle grammar, nb::dict cls_for_state);
 
+// The same list without what a host has changed since the classes were bound.
+nb::list OriginalClsForStateList(nb::handle grammar);
+
+// Takes the classes and states as they are now for the original ones.
+void RememberClsForState();
+
 }  // namespace codeloom

@@ -5,11 +5,11 @@
 #include "host/restore.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
-#include "neighbours/token_type.h"
 #include "parse/parentheses.h"
 #include "parse/parser_driver.h"
 #include "parse/pseudo_node.h"
 #include "parse/token_copy.h"
+#include "text/token_type.h"
 #include "tree/statement_nodes.h"
 
 namespace codeloom {

@@ -5,10 +5,10 @@
 #include "host/errors.h"
 #include "host/neighbour_call.h"
 #include "host/text.h"
-#include "neighbours/token_type.h"
 #include "parse/class_table.h"
 #include "parse/token_feed.h"
 #include "parse/token_search.h"
+#include "text/token_type.h"
 
 namespace codeloom {
 
@@ -41,12 +41,6 @@ nb::object OperatorTypes() {
     return types;
 }
 
-nb::object PathOfGrammar(nb::object grammar_file) {
-    if (nb::cast<bool>(nb::bool_(HomeModule().attr("os").attr("path").attr("isabs")(grammar_file))))
-        return grammar_file;
-    return kGetTarnFilename(nb::str("resources/pgen-grammars/") + grammar_file);
-}
-
 nb::dict KeywordsOf(nb::object keyword_seq) {
     if (keyword_seq.is_none()) keyword_seq = HomeModule().attr("keyword").attr("kwlist");
     nb::dict keywords;
@@ -56,14 +50,20 @@ nb::dict KeywordsOf(nb::object keyword_seq) {
 
 }  // namespace
 
+nb::object PathOfGrammar(nb::object grammar_file) {
+    if (IsTrue(nb::object(HomeModule().attr("os").attr("path").attr("isabs")(grammar_file))))
+        return grammar_file;
+    return kGetTarnFilename(nb::str("resources/pgen-grammars/") + grammar_file);
+}
+
 void CPGenParserImpl::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-                           nb::object py3_grammar) {
+                           bool py3_grammar) {
     const nb::dict token_names = TokenNames();
     const nb::object operator_types = OperatorTypes();
     const nb::object generator = kParserGenerator(
         PathOfGrammar(grammar_file), "tok_number2name"_a = token_names, "op_text2number"_a = operator_types);
     _fGrammar = generator.attr("make_grammar")();
-    _fPy3Grammar = nb::cast<bool>(nb::bool_(py3_grammar));
+    _fPy3Grammar = py3_grammar;
     if (!version_triple.is_none() && !nb::isinstance<nb::tuple>(version_triple))
         RaiseWrongType("tuple", version_triple);
     _fVersionTriple = std::move(version_triple);
@@ -103,7 +103,7 @@ void CPGenParserImpl::DiscardNode(nb::handle node) {
 }
 
 CNodeRef CPGenParserImpl::ParseToNode(CLogicalLine& logical, bool in_async_def) {
-    return ParseToksToNode(logical.fToks, in_async_def, CPositions(logical));
+    return ParseToksToNode(logical.GetToks(), in_async_def, CPositions(logical));
 }
 
 CNodeRef CPGenParserImpl::ParseToksToNode(nb::object toks, bool in_async_def, CPositions positions) {
@@ -194,7 +194,7 @@ void BindParserDriver(nb::module_& module) {
         module, "CPGenParserImpl", Collected<CPGenParserImpl>(),
         " Analyzes logical using a parser implemented via the pgen2 package ");
     binding
-        .def(TInit<nb::object, nb::object, nb::object, nb::object>(), "version_triple"_a.none(),
+        .def(TInit<nb::object, nb::object, nb::object, bool>(), "version_triple"_a.none(),
              "grammar_file"_a = module.attr("kPy3DefaultGrammar"), "keyword_seq"_a = nb::none(),
              "py3_grammar"_a = true)
         .def_ro("_fVersionTriple", &CPGenParserImpl::_fVersionTriple, "The Python version analysed, a tuple.")

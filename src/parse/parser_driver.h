@@ -18,8 +18,7 @@ namespace codeloom {
 // statement.
 class CPGenParserImpl : public CPGenAnalyzer {
   public:
-    void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-              nb::object py3_grammar);
+    void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq, bool py3_grammar);
 
     nb::object convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
                        nb::handle children) override;
@@ -83,6 +82,8 @@ class CPGenParserImpl : public CPGenAnalyzer {
     bool _HasSymbol(const char* symbol) const;
     int _NumberOfSymbol(const char* symbol) const;  // KeyError when the grammar has no such rule
 
+    nb::object _fGrammar = nb::none();
+    nb::object _fClsForStateList = nb::none();
     nb::object _fKeywords = nb::none();
     CRef<CNodeFactory> _fNodeFactory;
 
@@ -94,11 +95,9 @@ class CPGenParserImpl : public CPGenAnalyzer {
                              Py_ssize_t start, Py_ssize_t end);
     CNodeRef _PeelRoot(nb::object parsed, bool is_decorator);
 
-    nb::object _fGrammar = nb::none();
     bool _fPy3Grammar = true;
     int _fFileInputNumber = 0;
     CRef<Parser> _fParser;
-    nb::object _fClsForStateList = nb::none();
     nb::object __GetTime = nb::none();
 };
 
@@ -108,7 +107,7 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
     OPERATION(
         _BuildClsForStateList,
         "The list that gives the node class for each token type and grammar state. Updates kClsForState.")
-    OPERATION(DiscardNode, "Give a tree back to the free lists.", "node"_a)
+    OPERATION(DiscardNode, "Give a tree back to the free lists. AttributeError for None.", "node"_a.none())
     OPERATION(ParseToNode,
               "The node of a logical's statement, or None. ParseError on a token that the grammar\n"
               "refuses. Give it back with DiscardNode.",
@@ -168,6 +167,9 @@ class TParserDriverOperations : public TPGenAnalyzerOperations<Class> {
 
 // Binds the driver, and the parser of `match` and `case` that it owns. `kClsForState` is set here, after all
 // node classes exist.
+// Where a grammar file lies.
+nb::object PathOfGrammar(nb::object grammar_file);
+
 void BindParserDriver(nb::module_& module);
 
 }  // namespace codeloom

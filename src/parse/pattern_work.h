@@ -22,9 +22,10 @@ struct CPatternStep {
         kNumber,
         kSequence,
         kMapping,
-        kToken,  // make the leaf of the token at start_i
-        kFail,   // raise a ParseError at start_i
-        kBuild,  // make a node of the nodes from start_i on
+        kToken,        // make the leaf of the token at start_i
+        kTokenBefore,  // the same, and put it before the node that was made last
+        kFail,         // raise a ParseError at start_i
+        kBuild,        // make a node of the nodes from start_i on
     };
 
     EKind kind;
@@ -54,6 +55,7 @@ class CPatternWork {
             _Add({EKind::kPattern, start_i, end_i, allow_as});
         }
         void Token(Py_ssize_t tok_i) { _Add({EKind::kToken, tok_i}); }
+        void TokenBefore(Py_ssize_t tok_i) { _Add({EKind::kTokenBefore, tok_i}); }
         void Fail(Py_ssize_t tok_i) { _Add({EKind::kFail, tok_i}); }
 
         // A node of all the parts of this plan.
@@ -78,6 +80,10 @@ class CPatternWork {
     }
 
     void AddNode(CNodeRef node) { _fNodes.push_back(std::move(node)); }
+    void AddNodeBeforeLast(CNodeRef node) {
+        _fNodes.push_back(std::move(node));
+        std::iter_swap(_fNodes.end() - 2, _fNodes.end() - 1);
+    }
     void Build(const CPatternStep& step) {
         const auto first = _fNodes.begin() + step.start_i;
         CNodeRef node = step.build({first, _fNodes.end()});

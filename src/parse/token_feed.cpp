@@ -2,7 +2,7 @@
 
 #include "analysis/syntax_error.h"
 #include "host/text.h"
-#include "neighbours/token_type.h"
+#include "text/token_type.h"
 
 namespace codeloom {
 
@@ -23,7 +23,7 @@ CTokenFeed::CTokenFeed(CPGenParserImpl& driver, const nb::tuple& toks, bool in_a
       _fParser(*driver._fParser),
       _fToks(toks),
       _fPositions(positions),
-      _fPlaces(positions.PlacesOf(toks)),
+      _fRawTokens(positions.TokensOf(toks)),
       _fStart(start),
       _fEnd(end),
       _fAsyncIsKeyword(driver._fAsyncAlwaysKeyword || in_async_def) {
@@ -43,7 +43,7 @@ void CTokenFeed::_FeedToken(Py_ssize_t i) {
     nb::handle tok = TupleItem(_fToks, i);
     if (tok.is_none()) return;
     const CUtf8 text(tok);
-    int type = _fPlaces != nullptr ? _fPlaces[i].type : GetTokenType(text);
+    int type = _fRawTokens != nullptr ? _fRawTokens[i].type : GetTokenType(text);
     if (!_fFirstToken.is_valid()) type = _BeginStatement(tok, text, type, i);
     if (type == kTokenId_NAME && _fAsyncIsKeyword) type = AsyncTokenType(text);
     if (_IsSkipped(type, i)) return;

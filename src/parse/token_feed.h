@@ -35,7 +35,7 @@ class CTokenFeed {
     Parser& _fParser;
     const nb::tuple& _fToks;
     const CPositions& _fPositions;
-    const CLogicalLine::CTokenPlace* const _fPlaces;  // which have the types of the tokens; may be null
+    const CRawToken* const _fRawTokens;  // which have the types of the tokens; may be null
     const Py_ssize_t _fStart;
     const Py_ssize_t _fEnd;
     bool _fAsyncIsKeyword;

@@ -2,7 +2,7 @@
 
 #include "host/collections.h"
 #include "host/text.h"
-#include "neighbours/token_type.h"
+#include "text/token_type.h"
 
 namespace codeloom {
 

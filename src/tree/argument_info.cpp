@@ -153,7 +153,7 @@ bool ArgumentFromHost(nb::handle candidate, CArgument& argument) {
 CArgumentList GetDefiningArgInfoList(CNodeRef node) {
     const CRecursionScope recursion;
     if (IsA<CParametersNode>(node)) {
-        if (node->_GetChildCount() == 2) return CArgumentList();
+        if (node->ChildCount() == 2) return CArgumentList();
         node = node->ChildAs<CNode>(1);
     }
     if (IsA<CDefiningArglistNode>(node)) return CParameterReader().Read(*node);
@@ -172,8 +172,9 @@ CArgumentList GetUsedArgInfoList(CNodeRef node) {
         } else if (TextIsOneOf(child->fText, "*", "**")) {
             current.prefix = child->fText;
         } else if (CSingleUsedArgumentNode* const single = As<CSingleUsedArgumentNode>(child)) {
-            current = LoneArgument(child);
             current.prefix = single->GetPrefix();
+            current.name = single->GetName();
+            current.value = single->GetValue();
         } else {
             current.value = child;
         }

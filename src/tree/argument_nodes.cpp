@@ -20,7 +20,7 @@ CNodeRef CSingleUsedArgumentNode::GetValue() {
 }
 
 bool CSingleUsedArgumentNode::IsUnparenthesizedGenExpr() {
-    return _GetChildCount() == 2 && TryChild<CCompForNode>(1) != nullptr;
+    return ChildCount() == 2 && TryChild<CCompForNode>(1) != nullptr;
 }
 
 CNodeRef CSingleUsedArgumentNode::GetNameAssigned() {
@@ -34,7 +34,7 @@ CNodeRef CSingleUsedArgumentNode::GetNamedRightHandExpression() {
 // CFunctionParameterDef
 
 CNodeRef CFunctionParameterDef::GetNestedListNode() {
-    const bool is_tuple = _GetChildCount() == kCount && IsToken(0, "(");
+    const bool is_tuple = ChildCount() == kCount && IsToken(0, "(");
     return is_tuple ? ChildAs<CNode>(kNestedIndex) : CNodeRef();
 }
 
@@ -43,7 +43,7 @@ CNodeRef CFunctionParameterDef::GetName() {
 }
 
 CNodeRef CFunctionParameterDef::GetTypeExpr() {
-    const bool has_annotation = _GetChildCount() == kCount && IsToken(1, ":");
+    const bool has_annotation = ChildCount() == kCount && IsToken(1, ":");
     return has_annotation ? ChildAs<CNode>(kAnnotationIndex) : CNodeRef();
 }
 

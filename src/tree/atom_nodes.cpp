@@ -106,7 +106,7 @@ CExpressionRef CAtom::GetSubExpr(int i) {
 
 int CAtom::GetSubExprCount() {
     const nb::object bracket = GetInitialBracket();
-    const bool may_hold_list = _GetChildCount() == kFilledChildCount && TextIsOneOf(bracket, "(", "[");
+    const bool may_hold_list = ChildCount() == kFilledChildCount && TextIsOneOf(bracket, "(", "[");
     if (!may_hold_list || !IsLiteral()) return 0;
     const CRecursionScope recursion;
     if (const CExpressionRef contents(TryChild<CExpression>(kContentsIndex)); contents) {
@@ -118,7 +118,7 @@ int CAtom::GetSubExprCount() {
 }
 
 CTextOrNone CAtom::GetInitialBracket() {
-    if (_GetChildCount() == 0) throw nb::value_error("Atom node with no children");
+    if (ChildCount() == 0) throw nb::value_error("Atom node with no children");
     const nb::object text = ChildAt(0).fText;
     return TextIsOneOf(text, "(", "[", "{") ? CTextOrNone(text) : CTextOrNone();
 }
@@ -128,7 +128,7 @@ bool CAtom::IsLiteral() {
 }
 
 bool CAtom::IsComprehension() {
-    if (_GetChildCount() != kFilledChildCount) return false;
+    if (fChildren.Size() != kFilledChildCount) return false;
     const CNode& contents = ChildAt(kContentsIndex);
     // `a for b in c`, `a: b for c in d`
     return contents.TryChild<CCompForNode>(1) != nullptr || contents.TryChild<CCompForNode>(3) != nullptr;

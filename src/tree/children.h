@@ -63,11 +63,9 @@ class TChildren {
     nb::object AsHost() {
         if (_fIsNone) return nb::none();
         if (_HasList()) return _fList;
-        const Py_ssize_t count = Size();
-        nb::object list = nb::steal(PyList_New(count));
+        const CNoCollection steady;
+        nb::object list = nb::steal(PyList_New(Size()));
         if (!list.is_valid()) throw nb::python_error();
-        // A new object may start the collector, which runs host code.
-        if (_HasList() || Size() != count) return AsHost();
         Py_ssize_t i = 0;
         for (CRef<Node>& node : _fNodes) PyList_SET_ITEM(list.ptr(), i++, node.Release().release().ptr());
         _fNodes.clear();
@@ -78,20 +76,20 @@ class TChildren {
     // The list that the host has; invalid when it hasn't asked for one.
     const nb::object& ListOfHost() const { return _fList; }
 
-    // Gives each native child to take(child), and is those of a leaf afterwards.
+    // Gives each native child to take(child), or else the host's list to the caller, and is those of a leaf
+    // afterwards. It drops nothing, so that no host code runs, unless `take` does.
     template <class Take>
-    void TakeAll(Take take) {
-        for (size_t i = 0; i < _fNodes.size(); ++i) take(std::move(_fNodes[i]));
+    nb::object TakeAll(Take take) {
+        for (CRef<Node>& node : _fNodes) take(std::move(node));
         _fNodes.clear();  // of places without a node
-        SetNone();
+        if (_fNodes.capacity() > kMostKept) std::vector<CRef<Node>>().swap(_fNodes);
+        _fIsNone = true;
+        return std::move(_fList);
     }
 
     void SetNone() {
         _fIsNone = true;
-        while (!_fNodes.empty()) {  // each leaves first, since dropping one may run host code
-            const CRef<Node> dropped = std::move(_fNodes.back());
-            _fNodes.pop_back();
-        }
+        DropEach(_fNodes);
         if (_fNodes.capacity() > kMostKept) std::vector<CRef<Node>>().swap(_fNodes);
         const nb::object dropped = std::move(_fList);
     }

@@ -25,7 +25,8 @@ CNodeRef CForStmt::GetBody() {
 }
 
 CNodeRef CForStmt::GetElseBody() {
-    return _GetChildCount() == kCountWithElse ? ChildAs<CNode>(-1) : CNodeRef();
+    const bool has_else = !fChildren.IsNone() && ChildCount() == kCountWithElse;
+    return has_else ? ChildAs<CNode>(-1) : CNodeRef();
 }
 
 // CWithItem, CWithStmt
@@ -53,9 +54,9 @@ CNodeRef CExceptClause::GetExceptionType() {
 
 // The target is last, behind `as` or a comma: both forms of the rule are in force.
 CNodeRef CExceptClause::GetTarget() {
-    const Py_ssize_t separator_i = _GetChildCount() - 2;
+    const Py_ssize_t separator_i = fChildren.IsNone() ? -1 : ChildCount() - 2;
     const bool has_target = separator_i >= 1 && TextIsOneOf(ChildText(separator_i), ",", "as");
-    return has_target ? ChildAs<CNode>(-1) : CNodeRef();
+    return has_target ? GetChild(separator_i + 1) : CNodeRef();
 }
 
 // CMatchStmt, CCaseStmt
@@ -69,7 +70,7 @@ CNodeRef CCaseStmt::GetPattern() {
 }
 
 CNodeRef CCaseStmt::GetGuard() {
-    return _GetChildCount() >= kLeastCountWithGuard ? ChildAs<CNode>(kGuardIndex) : CNodeRef();
+    return ChildCount() >= kLeastCountWithGuard ? ChildAs<CNode>(kGuardIndex) : CNodeRef();
 }
 
 CNodeRef CCaseStmt::GetBody() {

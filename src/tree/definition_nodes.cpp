@@ -11,8 +11,8 @@ CTextOrNone CClassdefStmt::GetClassName() {
 }
 
 CArgumentList CClassdefStmt::GetBaseClassList() {
-    const bool has_arguments =
-        _GetChildCount() > kArgumentsIndex && IsToken(kOpenIndex, "(") && !IsToken(kArgumentsIndex, ")");
+    const bool has_arguments = ChildCount() > kArgumentsIndex && ChildAt(kOpenIndex).HasText("(") &&
+                               !ChildAt(kArgumentsIndex).HasText(")");
     return has_arguments ? GetUsedArgInfoList(ChildAs<CNode>(kArgumentsIndex)) : CArgumentList();
 }
 
@@ -27,12 +27,12 @@ CRef<CParametersNode> CFuncdefStmt::GetParameters() {
 }
 
 CExpressionRef CFuncdefStmt::GetReturnType() {
-    const bool has_arrow = _GetChildCount() > kReturnTypeIndex && IsToken(kArrowIndex, "->");
+    const bool has_arrow = IsToken(kArrowIndex, "->") && ChildCount() > kReturnTypeIndex;
     return has_arrow ? ChildAs<CExpression>(kReturnTypeIndex) : CExpressionRef();
 }
 
 CNodeRef CFuncdefStmt::GetSuite() {
-    return _GetChildCount() == 0 ? CNodeRef() : ChildAs<CNode>(-1);
+    return ChildCount() == 0 ? CNodeRef() : ChildAs<CNode>(-1);
 }
 
 // CSingleDecorator
@@ -43,14 +43,14 @@ CNodeRef CSingleDecorator::GetDottedName() {
 
 CArgumentList CSingleDecorator::GetUsedArgList() {
     const bool has_arguments =
-        _GetChildCount() > kCloseIndex && IsToken(kOpenIndex, "(") && IsToken(kCloseIndex, ")");
+        ChildCount() > kCloseIndex && IsToken(kOpenIndex, "(") && IsToken(kCloseIndex, ")");
     return has_arguments ? GetUsedArgInfoList(ChildAs<CNode>(kArgumentsIndex)) : CArgumentList();
 }
 
 // CTypeParameter
 
 CTextOrNone CTypeParameter::GetName() {
-    switch (_GetChildCount()) {
+    switch (ChildCount()) {
         case 1:
             return ChildText(0);
         case 2:
@@ -66,7 +66,7 @@ CTextOrNone CTypeParameter::GetPrefix() {
 }
 
 CNodeRef CTypeParameter::GetSpecNode() {
-    return _GetChildCount() >= 3 ? ChildAs<CNode>(-1) : CNodeRef();
+    return ChildCount() >= 3 ? ChildAs<CNode>(-1) : CNodeRef();
 }
 
 // CWithTypeParameters

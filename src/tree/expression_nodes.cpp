@@ -21,21 +21,21 @@ CTextOrNone COperatorExpression::GetOperatorStr(int operator_i) {
     const bool is_prefix = GetTermCount() == 1;
     if (operator_i < 0 || (is_prefix && operator_i != 0)) return CTextOrNone();
     const Py_ssize_t child_i = is_prefix ? 0 : Py_ssize_t{operator_i} * 2 + 1;
-    if (child_i >= _GetChildCount()) return CTextOrNone();
+    if (child_i >= fChildren.Size()) return CTextOrNone();
     const CNode& node = ChildAt(child_i);
-    return node.fText.is_none() ? _TextOfTwoWords(node) : CTextOrNone(node.fText);
+    return node.fText.is_none() ? _TextOfTwoWords(ChildAs<CNode>(child_i)) : CTextOrNone(node.fText);
 }
 
 // `not in`, `is not`
-CTextOrNone COperatorExpression::_TextOfTwoWords(const CNode& node) {
-    if (node.fChildren.Size() != 2) return CTextOrNone();
-    const nb::object first = node.ChildAt(0).fText, second = node.ChildAt(1).fText;
+CTextOrNone COperatorExpression::_TextOfTwoWords(const CNodeRef& node) {
+    if (node->ChildCount() != 2) return CTextOrNone();
+    const nb::object first = node->ChildText(0), second = node->ChildText(1);
     if (first.is_none() || second.is_none()) return CTextOrNone();
     return first + nb::str(" ") + second;
 }
 
 int COperatorExpression::GetTermCount() {
-    const Py_ssize_t child_count = _GetChildCount();
+    const Py_ssize_t child_count = ChildCount();
     if (child_count < 2) return 0;
     return child_count == 2 ? 1 : static_cast<int>(child_count / 2 + 1);
 }
@@ -63,7 +63,7 @@ CNodeRef CLambdaExpr::GetBodyExpr() {
 // CYieldExpr, CYieldArg
 
 CNodeRef CYieldExpr::GetValue() {
-    if (_GetChildCount() < 2) return CNodeRef();
+    if (fChildren.Size() < 2) return CNodeRef();
     const CRef<CYieldArg> argument(TryChild<CYieldArg>(kArgumentIndex));
     return argument ? argument->GetValue() : ChildAs<CNode>(kArgumentIndex);
 }
@@ -74,11 +74,11 @@ bool CYieldExpr::IsYieldFrom() {
 }
 
 CNodeRef CYieldArg::GetValue() {
-    return ChildAs<CNode>(_GetChildCount() < 2 ? 0 : 1);
+    return ChildAs<CNode>(ChildCount() < 2 ? 0 : 1);
 }
 
 bool CYieldArg::IsYieldFrom() {
-    if (_GetChildCount() < 2) return false;
+    if (ChildCount() < 2) return false;
     const CKeywordLiteral* const keyword = TryChild<CKeywordLiteral>(0);
     return keyword != nullptr && keyword->HasText("from");
 }
@@ -88,7 +88,7 @@ bool CYieldArg::IsYieldFrom() {
 CExpressionRef CTestListStarExpr::GetSubExpr(int i) {
     if (IsGenExpr()) return CExpressionRef();
     const Py_ssize_t child_i = Py_ssize_t{i} * 2;
-    if (child_i >= _GetChildCount()) throw nb::value_error("Not enough expressions in list");
+    if (child_i >= fChildren.Size()) throw nb::value_error("Not enough expressions in list");
     if (CExpression* const expression = TryChild<CExpression>(child_i)) return CExpressionRef(expression);
     const nb::object message = nb::str("Elenment {} of {} needs to be a CExpression; fChildren = {}")
                                    .format(child_i, nb::repr(Self()), nb::repr(fChildren.AsHost()));
@@ -96,7 +96,7 @@ CExpressionRef CTestListStarExpr::GetSubExpr(int i) {
 }
 
 int CTestListStarExpr::GetSubExprCount() {
-    return IsGenExpr() ? 1 : static_cast<int>((_GetChildCount() + 1) / 2);
+    return IsGenExpr() ? 1 : static_cast<int>((ChildCount() + 1) / 2);
 }
 
 bool CTestListStarExpr::IsTuple() {
@@ -104,15 +104,16 @@ bool CTestListStarExpr::IsTuple() {
 }
 
 bool CTestListStarExpr::IsGenExpr() {
-    return TryChild<CCompForNode>(1) != nullptr;
+    return ChildCount() >= 2 && TryChild<CCompForNode>(1) != nullptr;
 }
 
 // CAtomExpr
 
 CNodeRef CAtomExpr::GetPrefix() {
+    if (ChildCount() < 2) return CNodeRef();
     CKeywordLiteral* const keyword = TryChild<CKeywordLiteral>(0);
-    const bool is_prefix = keyword != nullptr && keyword->HasText("await") && _GetChildCount() >= 2 &&
-                           TryChild<CTrailer>(1) == nullptr;
+    const bool is_prefix =
+        keyword != nullptr && keyword->HasText("await") && TryChild<CTrailer>(1) == nullptr;
     return is_prefix ? CNodeRef(keyword) : CNodeRef();
 }
 
@@ -122,7 +123,8 @@ CNodeRef CAtomExpr::GetAtom() {
 
 CNodeRange CAtomExpr::GetTrailers() {
     if (fChildren.IsNone()) return CNodeRange();
-    return CNodeRange(*this, _AtomIndex() + 1, _GetChildCount());
+    const Py_ssize_t atom_i = _AtomIndex();
+    return CNodeRange(*this, atom_i + 1, fChildren.Size());
 }
 
 Py_ssize_t CAtomExpr::_AtomIndex() {
@@ -139,9 +141,8 @@ CNodeRef CPower::GetAtom() {
 CNodeRange CPower::GetTrailers() {
     const CRef<CAtomExpr> atom_expr(ChildAt(0).As<CAtomExpr>());
     if (atom_expr) return atom_expr->GetTrailers();
-    const Py_ssize_t child_count = _GetChildCount();
     Py_ssize_t end = 1;
-    while (end < child_count && !IsToken(end, "**")) ++end;
+    while (end < fChildren.Size() && !ChildAt(end).HasText("**")) ++end;
     return CNodeRange(*this, 1, end);
 }
 
@@ -181,13 +182,13 @@ CNodeRef CCompForNode::GetInNode() {
 }
 
 CNodeRef CCompForNode::GetCompIterNode() {
-    const bool may_have_next = _IsWrapped() || _GetChildCount() == _IndexInClause(kNextIndex) + 1;
+    const bool may_have_next = _IsWrapped() || ChildCount() == _IndexInClause(kNextIndex) + 1;
     return may_have_next ? _Read(kNextIndex, &CCompForNode::GetCompIterNode) : CNodeRef();
 }
 
 // `async` and a whole clause, instead of `async` and the parts of one
 bool CCompForNode::_IsWrapped() {
-    return _GetChildCount() == 2 && IsAsync() && TryChild<CCompForNode>(kWrappedIndex) != nullptr;
+    return IsAsync() && ChildCount() == 2 && TryChild<CCompForNode>(kWrappedIndex) != nullptr;
 }
 
 Py_ssize_t CCompForNode::_IndexInClause(Py_ssize_t i) {
@@ -205,7 +206,7 @@ CNodeRef CCompForNode::_Read(Py_ssize_t i, CNodeRef (CCompForNode::*accessor)())
 // CListmakerNode
 
 int CListmakerNode::GetSubExprCount() {
-    return _IsComprehension() ? 1 : static_cast<int>((_GetChildCount() - 1) / 2 + 1);
+    return _IsComprehension() ? 1 : static_cast<int>((ChildCount() - 1) / 2 + 1);
 }
 
 CExpressionRef CListmakerNode::GetSubExpr(nb::object i) {
@@ -221,19 +222,19 @@ bool CListmakerNode::_IsComprehension() {
 // CTrailer
 
 CTextOrNone CTrailer::GetDotName() {
-    const CNode* const dot = TryChild<CNode>(0);
-    if (_GetChildCount() != 2 || dot == nullptr || !dot->HasText(".")) return CTextOrNone();
+    const bool has_dot = ChildCount() == 2 && TryChild<CNode>(0) != nullptr && IsToken(0, ".");
+    if (!has_dot) return CTextOrNone();
     const CNameLiteral* const name = TryChild<CNameLiteral>(kNameIndex);
     return name == nullptr ? CTextOrNone() : CTextOrNone(name->fText);
 }
 
 CNodeRef CTrailer::GetNestedNode() {
-    const bool has_contents = _GetChildCount() == 3 && (IsToken(0, "[") || IsToken(0, "("));
+    const bool has_contents = ChildCount() == 3 && (IsToken(0, "[") || IsToken(0, "("));
     return has_contents ? ChildAs<CNode>(kContentsIndex) : CNodeRef();
 }
 
 CTextOrNone CTrailer::GetInitialToken() {
-    if (_GetChildCount() == 0) throw nb::value_error("Trailer node with no children");
+    if (ChildCount() == 0) throw nb::value_error("Trailer node with no children");
     return ChildAt(0).fText;
 }
 

@@ -65,7 +65,7 @@ class COperatorExpression : public CExpression {
     virtual CNodeRef GetTerm(int term_index);
 
   private:
-    static CTextOrNone _TextOfTwoWords(const CNode& node);
+    static CTextOrNone _TextOfTwoWords(const CNodeRef& node);
 };
 
 // `*a` as an expression, not in a declaration of arguments
@@ -157,6 +157,17 @@ class CPower : public CExpression {
     virtual CNodeRange GetTrailers();
     virtual CNodeRef GetExponentNode();
 };
+
+// What a chain is made of: a CAtomExpr or a CPower, whose exponent is no part of it.
+struct CChainParts {
+    CNodeRef atom;
+    CNodeRange trailers;
+};
+
+template <class Chain>
+CChainParts PartsOf(Chain& chain) {
+    return {chain.GetAtom(), chain.GetTrailers()};  // asked in this order
+}
 
 // `-a`, `+a`, `~a`
 //   child    operator  factor

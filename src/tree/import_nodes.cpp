@@ -42,7 +42,7 @@ CTextOrNone CFromImportStmt::GetFromString() {
 }
 
 bool CFromImportStmt::GetImportStar() {
-    return _GetChildCount() >= 3 && IsToken(-1, "*");
+    return ChildCount() >= 3 && ChildAt(-1).HasText("*");
 }
 
 CAsNameList CFromImportStmt::GetAsNameList() {
@@ -67,7 +67,7 @@ Py_ssize_t _GetMatchingChildToken(const CNode& node, nb::str text) {
 
 CAsNameList _ProcessAsNamesList(CNodeRef node) {
     CAsNameList names;
-    if (node->_GetChildCount() < 2 || !node->IsToken(1, ",")) {
+    if (node->ChildCount() < 2 || !node->ChildAt(1).HasText(",")) {
         names.append(_ProcessSingleModuleNameAs(node).Release());
         return names;
     }
@@ -80,7 +80,7 @@ CAsNameList _ProcessAsNamesList(CNodeRef node) {
 
 CRef<CAsName> _ProcessSingleModuleNameAs(CNodeRef node) {
     CRef<CAsName> name = MakeInstance<CAsName>();
-    const bool has_as = node && node->_GetChildCount() == 3 && node->IsToken(1, "as");
+    const bool has_as = node && node->ChildCount() == 3 && node->IsToken(1, "as");
     name->module_name = TextOf(has_as ? node->ChildAt(0) : *node);
     if (has_as) name->as_name = node->ChildText(2);
     return name;

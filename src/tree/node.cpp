@@ -11,14 +11,33 @@ void CNodeClassInfo::Init(nb::object cls, int nodetype, nb::object name) {
     fName = std::move(name);
 }
 
+CNodeRef CNodeClassInfo::TakeFree() {
+    CNodeRef node = std::move(fFirstFree);
+    if (!node) return node;
+    fFirstFree = node->fNextFree;
+    node->fIsFree = false;
+    return node;
+}
+
+void CNodeClassInfo::PutBack(CNodeRef node) {
+    CNode& free = *node;
+    if (free.fIsFree) return;
+    free.fIsFree = true;
+    const CNodeRef stale = std::move(free.fNextFree);  // dropped last: that may run host code
+    free.fNextFree = std::move(fFirstFree);
+    fFirstFree = std::move(node);
+}
+
 CNode::~CNode() {
     // A chain of free nodes is unlinked in a loop: dropping it by recursion would overflow the stack.
     CNodeRef next = std::move(fNextFree);
     while (next && next.IsOnlyReference()) next = std::move(next->fNextFree);
 }
 
+// What accessors ask for: each reads the children themselves, as an override that calls its base expects.
+
 Py_ssize_t CNode::GetChildCount() {
-    return _GetChildCount();
+    return fChildren.Size();
 }
 
 Py_ssize_t CNode::_GetChildCount() {
@@ -26,11 +45,11 @@ Py_ssize_t CNode::_GetChildCount() {
 }
 
 CTextOrNone CNode::GetChildText(Py_ssize_t child_i) {
-    return _GetChildText(child_i);
+    return _TextAt(child_i);
 }
 
 CTextOrNone CNode::_GetChildText(Py_ssize_t i) {
-    return ChildText(i);
+    return _TextAt(i);
 }
 
 CNodeRef CNode::GetChild(Py_ssize_t child_i) {

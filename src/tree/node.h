@@ -5,6 +5,7 @@
 //   start  at CNode here, CNodeFactory in node_factory.h, the classes in node_classes.h
 #pragma once
 
+#include <algorithm>
 #include <bitset>
 #include <string_view>
 
@@ -28,6 +29,11 @@ class CNodeClassInfo : public CHosted {
   public:
     // `name` is a text string or none.
     void Init(nb::object cls, int nodetype, nb::object name);
+
+    // The free list. A node joins it when nothing is left of what it held, and once only: a node that is on
+    // it already stays where it is.
+    CNodeRef TakeFree();  // empty when there is none
+    void PutBack(CNodeRef node);
 
     template <class Visitor>
     void References(Visitor&& visit) {
@@ -121,14 +127,23 @@ class CNode : public CHosted {
         return child == nullptr ? nullptr : child->As<T>();
     }
 
+    // The following three are what accessors read. Of a class of the host, its overrides are asked.
+
+    Py_ssize_t ChildCount() const { return _fAsksHost ? _Asked()._GetChildCount() : fChildren.Size(); }
+
     // The text of the child at `i`; none past the end, and for a child without text.
-    CTextOrNone ChildText(Py_ssize_t i) const {
-        return _HasItem(i) ? CTextOrNone(ChildAt(i).fText) : CTextOrNone();
-    }
+    CTextOrNone ChildText(Py_ssize_t i) const { return _fAsksHost ? _Asked()._GetChildText(i) : _TextAt(i); }
 
     // True when the child at `i` has the text `token`; false past the end.
     bool IsToken(Py_ssize_t i, std::string_view token) const {
+        if (_fAsksHost) [[unlikely]]
+            return TextIs(ChildText(i), token);
         return _HasItem(i) && ChildAt(i).HasText(token);
+    }
+
+    // A count that an override gave, so that one can reckon with it.
+    static constexpr Py_ssize_t CountWithinBounds(Py_ssize_t count) {
+        return std::clamp<Py_ssize_t>(count, 0, INT32_MAX / 2);
     }
 
     bool HasText(std::string_view text) const { return TextIs(fText, text); }
@@ -150,11 +165,19 @@ class CNode : public CHosted {
     nb::object fContext = nb::none();  // by convention the index of the node's (first) token
     CRef<CNodeClassInfo> fClsInfo;     // the record that made the node
     CNodeRef fNextFree;                // link of the free list; stale while the node is in use
+    bool fIsFree = false;              // on the free list of its record
+
+  protected:
+    bool _fAsksHost = false;  // of a class of the host, which may override what accessors read
 
   private:
     const CNodeKind* _fKind = &kNodeKind<CNode>;
 
     bool _HasItem(Py_ssize_t i) const { return i < fChildren.Size() && !fChildren.IsNone(); }
+    CTextOrNone _TextAt(Py_ssize_t i) const {
+        return _HasItem(i) ? CTextOrNone(ChildAt(i).fText) : CTextOrNone();
+    }
+    CNode& _Asked() const { return const_cast<CNode&>(*this); }
 };
 
 template <class Class>
@@ -172,6 +195,10 @@ class TNodeOperations : public Class {
     OPERATION(GetStateName, "The name of the grammar state; the class name of a node without a class record.")
     OPERATION(_DoesChildTextMatch, "True when a direct child's text equals `text`.", "text"_a)
     END_OPERATIONS
+
+    TNodeOperations() { this->_fAsksHost = true; }
+    Py_ssize_t _GetChildCount() override { return CNode::CountWithinBounds(this->GetChildCount()); }
+    CTextOrNone _GetChildText(Py_ssize_t i) override { return this->GetChildText(i); }
 };
 
 }  // namespace codeloom

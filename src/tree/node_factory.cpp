@@ -1,7 +1,7 @@
 #include "tree/node_factory.h"
 
 #include "host/errors.h"
-#include "neighbours/token_type.h"
+#include "text/token_type.h"
 #include "tree/atom_nodes.h"
 #include "tree/recycling.h"
 
@@ -81,15 +81,13 @@ CNodeRef CNodeFactory::_NewLeaf(CNodeClassInfo& clsinfo, nb::handle text, nb::ha
     CNodeRef node = _FreeNode(clsinfo);
     node->fText = nb::borrow(text);
     node->fContext = nb::borrow(context);
-    if (!node->fChildren.IsNone()) node->fChildren.SetNone();  // it was given back twice
+    if (!node->fChildren.IsNone()) node->fChildren.SetNone();  // a host's class may make nodes that have some
     return node;
 }
 
 CNodeRef CNodeFactory::_FreeNode(CNodeClassInfo& clsinfo) {
-    CNodeRef node = std::move(clsinfo.fFirstFree);
-    if (!node) return CNodeRef(Instance<CNode>(nb::object(clsinfo.fCls(clsinfo.Self()))));
-    clsinfo.fFirstFree = node->fNextFree;
-    return node;
+    CNodeRef node = clsinfo.TakeFree();
+    return node ? node : CNodeRef(Instance<CNode>(nb::object(clsinfo.fCls(clsinfo.Self()))));
 }
 
 CNodeRef CNodeFactory::ConvertRule(int type, nb::handle context, CObjectStack& stack, size_t first) {

@@ -20,8 +20,8 @@ class CDescent {
 
 // The node within `( ... )`, tuples and generators too; empty for anything else.
 CNodeRef InnerOfParens(CNode& node) {
-    const bool is_filled_paren = node.As<CAtom>() != nullptr && node.IsToken(0, "(") &&
-                                 node._GetChildCount() == CAtom::kFilledChildCount;
+    const bool is_filled_paren =
+        node.As<CAtom>() != nullptr && node.ChildCount() == CAtom::kFilledChildCount && node.IsToken(0, "(");
     return is_filled_paren ? node.GetChild(CAtom::kContentsIndex) : CNodeRef();
 }
 
@@ -46,7 +46,7 @@ std::optional<std::vector<CNodeRef>> ExpandSeqLiteral(CNode& node) {
     const CNodeRef sequence = DropSimpleParens(node);
     if (sequence->As<CAtom>() == nullptr || !sequence->IsToken(0, "(")) return std::nullopt;
     std::vector<CNodeRef> elements;
-    if (sequence->_GetChildCount() == 2) return elements;
+    if (sequence->ChildCount() == 2) return elements;
     const CNodeRef contents = sequence->GetChild(CAtom::kContentsIndex);
     CTestListStarExpr* const list = contents->As<CTestListStarExpr>();
     if (list == nullptr) return std::vector{contents};
@@ -60,28 +60,28 @@ bool IsDottedName(CNode& node) {
     const CNodeRef shown = DropSimpleParens(node);
     if (shown->As<CNameLiteral>() != nullptr) return true;
     if (CAtomExpr* const chain = shown->As<CAtomExpr>())
-        return !chain->GetPrefix() && IsDottedChain(*chain->GetAtom(), chain->GetTrailers());
+        return !chain->GetPrefix() && IsDottedChain(PartsOf(*chain));
     CPower* const power = shown->As<CPower>();
-    return power != nullptr && !power->GetExponentNode() &&
-           IsDottedChain(*power->GetAtom(), power->GetTrailers());
+    return power != nullptr && !power->GetExponentNode() && IsDottedChain(PartsOf(*power));
 }
 
-bool IsDottedChain(CNode& atom, const CNodeRange& trailers) {
+bool IsDottedChain(const CChainParts& chain) {
+    const auto& [atom, trailers] = chain;
     for (Py_ssize_t i = 0; i < trailers.Size(); ++i)
         if (trailers.At<CTrailer>(i)->GetDotName().is_none()) return false;
     // Brackets in front of a trailer aren't simple.
-    return trailers.Size() == 0 ? IsDottedName(atom) : atom.As<CNameLiteral>() != nullptr;
+    return trailers.Size() == 0 ? IsDottedName(*atom) : atom->As<CNameLiteral>() != nullptr;
 }
 
 bool IsSetLiteral(CAtom& atom_node) {
     const bool is_filled_brace =
-        TextIs(atom_node.GetInitialBracket(), "{") && atom_node._GetChildCount() == CAtom::kFilledChildCount;
+        TextIs(atom_node.GetInitialBracket(), "{") && atom_node.ChildCount() == CAtom::kFilledChildCount;
     return is_filled_brace && !atom_node.ChildAt(CAtom::kContentsIndex).HasToken(":");
 }
 
 bool IsGenExpression(CAtom& atom_node) {
     const bool is_filled_paren =
-        atom_node._GetChildCount() == CAtom::kFilledChildCount && TextIs(atom_node.GetInitialBracket(), "(");
+        atom_node.ChildCount() == CAtom::kFilledChildCount && TextIs(atom_node.GetInitialBracket(), "(");
     return is_filled_paren && atom_node.ChildAt(CAtom::kContentsIndex).HasToken("for");
 }
 
@@ -90,8 +90,8 @@ bool IsTupleLiteralNode(CNode& node) {
     CNodeRef inner(&node);
     while (CAtom* const atom = inner->As<CAtom>()) {
         if (!TextIs(atom->GetInitialBracket(), "(")) return false;
-        if (atom->_GetChildCount() == 2) return true;
-        HostAssert(atom->_GetChildCount() == CAtom::kFilledChildCount);
+        if (atom->ChildCount() == 2) return true;
+        HostAssert(atom->ChildCount() == CAtom::kFilledChildCount);
         inner = atom->ChildAs<CNode>(CAtom::kContentsIndex);
         descent.Step();
     }

@@ -20,7 +20,7 @@ std::optional<std::vector<CNodeRef>> ExpandSeqLiteral(CNode& node);
 bool IsDottedName(CNode& node);
 
 // The same for an atom and the trailers behind it.
-bool IsDottedChain(CNode& atom, const CNodeRange& trailers);
+bool IsDottedChain(const CChainParts& chain);
 
 // True for `{a, b}`.
 bool IsSetLiteral(CAtom& atom_node);

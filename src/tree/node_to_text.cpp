@@ -2,18 +2,14 @@
 
 #include "host/errors.h"
 #include "host/text.h"
+#include "names/encode_literal.h"
+#include "names/join_tokens.h"
 #include "neighbours/symbolinfo/info_bytes.h"
-#include "neighbours/symbolinfo/join_tokens.h"
-#include "strutils/utf8.h"
 #include "tree/node_helpers.h"
 
 namespace codeloom {
 
 namespace {
-
-nb::bytes HostBytes(std::string_view utf8) {
-    return nb::bytes(utf8.data(), utf8.size());
-}
 
 bool IsName(const CNode& leaf) {
     return leaf.As<CNameLiteral>() != nullptr;
@@ -23,20 +19,8 @@ bool IsKeywordLiteral(nb::handle text) {
     return TextIsOneOf(text, "None", "True", "False");
 }
 
-// Characters that can't be mistaken for anything but the contents of a string.
-bool AreAllSafe(std::string_view text) {
-    const auto end_pos = static_cast<Py_ssize_t>(text.size());
-    for (Py_ssize_t pos = 0; pos < end_pos; pos = AdjustUtf8Pos(text.data(), pos, 1, end_pos)) {
-        const bool is_safe =
-            IsAlnumAtUtf8Pos(text.data(), pos, end_pos) != 0 ||
-            std::string_view(" \"',._").find(text[static_cast<size_t>(pos)]) != std::string_view::npos;
-        if (!is_safe) return false;
-    }
-    return true;
-}
-
 bool AreAllStrings(CNode& node) {
-    for (Py_ssize_t i = 0; i < node._GetChildCount(); ++i)
+    for (Py_ssize_t i = 0; i < node.fChildren.Size(); ++i)
         if (node.TryChild<CStringLiteral>(i) == nullptr) return false;
     return true;
 }
@@ -53,11 +37,11 @@ CBytesOrNone CNodeToTextConverter::TextForNode(CNode&, bool, bool, bool, bool) {
     return CBytesOrNone();
 }
 
-void CNodeToTextConverterImpl::Init(nb::handle include_bracket_text, nb::handle include_string_contents,
-                                    nb::handle include_arg_text) {
-    _fIncludeBracketText = IsTrue(include_bracket_text);
-    _fIncludeStringContents = IsTrue(include_string_contents);
-    _fIncludeArgText = IsTrue(include_arg_text);
+void CNodeToTextConverterImpl::Init(bool include_bracket_text, bool include_string_contents,
+                                    bool include_arg_text) {
+    _fIncludeBracketText = include_bracket_text;
+    _fIncludeStringContents = include_string_contents;
+    _fIncludeArgText = include_arg_text;
 }
 
 // The operations as the host calls them. Each works in a buffer of its own.
@@ -69,13 +53,13 @@ CBytesOrNone CNodeToTextConverterImpl::TextForNode(CNode& node, bool dotted_name
     const CNodeTextOptions options{dotted_name_only, discard_simple_parens, literal_only,
                                    add_parens_if_operator};
     const bool has_text = CNodeToTextConverterImpl::AppendTextForNode(text, node, options);
-    return has_text ? CBytesOrNone(HostBytes(text)) : CBytesOrNone();
+    return has_text ? CBytesOrNone(BytesFromUtf8(text)) : CBytesOrNone();
 }
 
 nb::bytes CNodeToTextConverterImpl::_TextForStringLiteral(CStringLiteral& node) {
     std::string text;
     CNodeToTextConverterImpl::AppendTextForStringLiteral(text, node);
-    return HostBytes(text);
+    return BytesFromUtf8(text);
 }
 
 CBytesOrNone CNodeToTextConverterImpl::TextForAtomPlusTrailers(CNode& atom, const CNodeRange& trailers,
@@ -86,7 +70,7 @@ CBytesOrNone CNodeToTextConverterImpl::TextForAtomPlusTrailers(CNode& atom, cons
     const CNodeTextOptions options{dotted_name_only, discard_simple_parens, literal_only};
     const bool has_text =
         CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(text, atom, trailers, options);
-    return has_text ? CBytesOrNone(HostBytes(text)) : CBytesOrNone();
+    return has_text ? CBytesOrNone(BytesFromUtf8(text)) : CBytesOrNone();
 }
 
 // Nodes
@@ -96,10 +80,8 @@ bool CNodeToTextConverterImpl::AppendTextForNode(std::string& text, CNode& node,
     const CRecursionScope recursion;
     const CNodeRef shown = options.discard_simple_parens ? DropSimpleParens(node) : CNodeRef(&node);
     if (!shown->fText.is_none()) return _AppendLeaf(text, *shown, options);
-    if (CAtomExpr* const chain = shown->As<CAtomExpr>())
-        return AppendTextForAtomPlusTrailers(text, *chain->GetAtom(), chain->GetTrailers(), options);
-    if (CPower* const power = shown->As<CPower>())
-        return AppendTextForAtomPlusTrailers(text, *power->GetAtom(), power->GetTrailers(), options);
+    if (CAtomExpr* const chain = shown->As<CAtomExpr>()) return _AppendChain(text, *chain, options);
+    if (CPower* const power = shown->As<CPower>()) return _AppendChain(text, *power, options);
     CAtom* const atom = options.dotted_name_only ? nullptr : shown->As<CAtom>();
     return atom == nullptr ? _AppendJoinedChildren(text, *shown, options) : _AppendAtom(text, *atom, options);
 }
@@ -119,8 +101,8 @@ bool CNodeToTextConverterImpl::_AppendAtom(std::string& text, CAtom& atom, const
     if (!_fIncludeBracketText && TextIsOneOf(bracket, "{", "[")) {
         text += TextIs(bracket, "{") ? "{}" : "[]";
     } else if (AreAllStrings(atom)) {
-        AppendTextForStringLiteral(text, *atom.ChildAs<CStringLiteral>(0));  // the first piece stands for all
-    } else if (_fIncludeBracketText && TextIs(bracket, "(") && atom._GetChildCount() == 2 &&
+        _AppendFirstString(text, atom);
+    } else if (_fIncludeBracketText && TextIs(bracket, "(") && atom.ChildCount() == 2 &&
                atom.IsToken(1, ")")) {
         text += "( )";
     } else {
@@ -129,11 +111,21 @@ bool CNodeToTextConverterImpl::_AppendAtom(std::string& text, CAtom& atom, const
     return true;
 }
 
+// Each of adjacent strings is converted; the first one stands for all.
+void CNodeToTextConverterImpl::_AppendFirstString(std::string& text, CAtom& atom) {
+    size_t end = text.size();
+    for (Py_ssize_t i = 0; i < atom.fChildren.Size(); ++i) {
+        AppendTextForStringLiteral(text, *atom.ChildAs<CStringLiteral>(i));
+        if (i == 0) end = text.size();
+    }
+    text.resize(end);
+}
+
 // Whatever has no form of its own: the texts of its children, joined as tokens are.
 bool CNodeToTextConverterImpl::_AppendJoinedChildren(std::string& text, CNode& node,
                                                      const CNodeTextOptions& options) {
     if (!_fIncludeBracketText || options.dotted_name_only || node.fChildren.IsNone()) return false;
-    const Py_ssize_t child_count = node._GetChildCount();
+    const Py_ssize_t child_count = node.fChildren.Size();
     const bool has_parens = options.add_parens_if_operator && child_count != 1;
     if (has_parens) text += '(';
     CTokenJoiner joiner;
@@ -148,6 +140,13 @@ bool CNodeToTextConverterImpl::_AppendJoinedChildren(std::string& text, CNode& n
 }
 
 // Chains
+
+template <class Chain>
+bool CNodeToTextConverterImpl::_AppendChain(std::string& text, Chain& chain,
+                                            const CNodeTextOptions& options) {
+    const CChainParts parts = PartsOf(chain);
+    return AppendTextForAtomPlusTrailers(text, *parts.atom, parts.trailers, options);
+}
 
 bool CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(std::string& text, CNode& atom,
                                                              const CNodeRange& trailers,
@@ -201,9 +200,8 @@ void CNodeToTextConverterImpl::AppendTextForStringLiteral(std::string& text, CSt
     const nb::object literal = node.fText;
     if (_fIncludeStringContents) {
         const CUtf8 utf8(literal);
-        std::string storage;
-        if (AreAllSafe(utf8)) {
-            text += EncodeStringLiteral(utf8, storage);
+        if (IsHarmlessLiteral(utf8)) {
+            text += utf8;
             return;
         }
     }
@@ -222,9 +220,9 @@ void BindNodeToText(nb::module_& module) {
                TNodeToTextConverterImplOperations<CNodeToTextConverterImpl>>
         converter(module, "CNodeToTextConverterImpl", "Turns nodes into short texts, as names are recorded.");
     converter
-        .def(TInit<nb::handle, nb::handle, nb::handle>(), "include_bracket_text"_a.none() = false,
-             "include_string_contents"_a.none() = false, "include_arg_text"_a.none() = false,
-             "Each a truth value: whether what stands in brackets, in strings and in calls is shown.")
+        .def(TInit<bool, bool, bool>(), "include_bracket_text"_a = false, "include_string_contents"_a = false,
+             "include_arg_text"_a = false,
+             "Whether what stands in brackets, in strings and in calls is shown.")
         .def_ro("_fIncludeArgText", &CNodeToTextConverterImpl::_fIncludeArgText,
                 "True when the arguments of calls are shown.");
     BindOperations(converter);

@@ -44,9 +44,7 @@ class TNodeToTextConverterOperations : public Class {
 
 class CNodeToTextConverterImpl : public CNodeToTextConverter {
   public:
-    // Truth values of the host.
-    void Init(nb::handle include_bracket_text, nb::handle include_string_contents,
-              nb::handle include_arg_text);
+    void Init(bool include_bracket_text, bool include_string_contents, bool include_arg_text);
 
     CBytesOrNone TextForNode(CNode& node, bool dotted_name_only = false, bool discard_simple_parens = true,
                              bool literal_only = false, bool add_parens_if_operator = false) override;
@@ -74,6 +72,9 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
   private:
     bool _AppendLeaf(std::string& text, CNode& leaf, const CNodeTextOptions& options);
     bool _AppendAtom(std::string& text, CAtom& atom, const CNodeTextOptions& options);
+    void _AppendFirstString(std::string& text, CAtom& atom);
+    template <class Chain>
+    bool _AppendChain(std::string& text, Chain& chain, const CNodeTextOptions& options);
     bool _AppendJoinedChildren(std::string& text, CNode& node, const CNodeTextOptions& options);
     bool _AppendTrailer(std::string& text, CTrailer& trailer, const CNodeTextOptions& options);
     void _AppendNested(std::string& text, CTrailer& trailer, std::string_view brackets, bool with_contents);

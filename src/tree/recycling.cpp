@@ -1,5 +1,9 @@
 #include "tree/recycling.h"
 
+#include <algorithm>
+#include <utility>
+#include <vector>
+
 #include "host/errors.h"
 
 namespace codeloom {
@@ -13,36 +17,73 @@ CNodeRef NodeToRecycle(nb::handle node) {
     return CNodeRef(Instance<CNode>(node));
 }
 
-void __FinishedWithNode(CNodeRef node, Py_ssize_t depth);
+// Takes a tree apart. Whatever is dropped may run host code, and that may ask for nodes, or give this tree
+// back once more: so a node goes on its free list when nothing is left of it, and what it held is dropped
+// after that.
+class CRecycling {
+  public:
+    CRecycling() : _fWaiting(std::move(gSpare)) {}
+    ~CRecycling() {
+        DropEach(_fWaiting);
+        if (_fWaiting.capacity() <= kMostKept) gSpare = std::move(_fWaiting);
+    }
+    CRecycling(const CRecycling&) = delete;
+    CRecycling& operator=(const CRecycling&) = delete;
 
-// A node of the host may be among its own children, so that it comes back here before its loop is over.
-void FinishChildren(TChildren<CNode>& children, Py_ssize_t depth) {
-    if (const nb::object list = children.ListOfHost(); list.is_valid()) [[unlikely]] {
-        const Py_ssize_t count = ListSize(list);
-        for (Py_ssize_t i = 0; i < count; ++i) __FinishedWithNode(NodeToRecycle(ListItem(list, i)), depth);
+    // Gives the number of nodes that lie too deep.
+    int64_t Recycle(CNodeRef root) {
+        int64_t too_deep_count = 0;
+        _fWaiting.push_back({std::move(root), 0});
+        while (!_fWaiting.empty()) {
+            CPart part = std::move(_fWaiting.back());
+            _fWaiting.pop_back();
+            if (part.depth > kMaxDepth) {
+                ++too_deep_count;
+            } else if (!part.node->fIsFree) {
+                _RecycleOne(std::move(part));
+            }
+        }
+        return too_deep_count;
     }
-    children.TakeAll([depth](CNodeRef child) { __FinishedWithNode(std::move(child), depth); });
-}
 
-void __FinishedWithNode(CNodeRef node, Py_ssize_t depth) {
-    if (depth > kMaxDepth) {
-        PrintReport(nb::str("depth too great"));
-        return;
+  private:
+    struct CPart {
+        CNodeRef node;
+        Py_ssize_t depth;
+    };
+
+    void _RecycleOne(CPart part) {
+        CNode& node = *part.node;
+        const nb::object list = _TakeChildren(node, part.depth + 1);
+        const nb::object text = std::exchange(node.fText, nb::none());
+        const nb::object context = std::exchange(node.fContext, nb::none());
+        if (node.fClsInfo) node.fClsInfo->PutBack(std::move(part.node));
     }
-    CNode& finished = *node;
-    if (finished.fClsInfo) {
-        finished.fNextFree = std::move(finished.fClsInfo->fFirstFree);
-        finished.fClsInfo->fFirstFree = std::move(node);
+
+    // The first child comes next. A child of the host's that is no node leaves the node as it is.
+    nb::object _TakeChildren(CNode& node, Py_ssize_t depth) {
+        const auto first = static_cast<Py_ssize_t>(_fWaiting.size());
+        if (const nb::object list = node.fChildren.ListOfHost(); list.is_valid()) [[unlikely]]
+            for (Py_ssize_t i = 0; i < ListSize(list); ++i)
+                _fWaiting.push_back({NodeToRecycle(ListItem(list, i)), depth});
+        nb::object list =
+            node.fChildren.TakeAll([&](CNodeRef child) { _fWaiting.push_back({std::move(child), depth}); });
+        std::reverse(_fWaiting.begin() + first, _fWaiting.end());
+        return list;
     }
-    if (!finished.fChildren.IsNone()) FinishChildren(finished.fChildren, depth + 1);
-    finished.fText = nb::none();
-    finished.fContext = nb::none();
-}
+
+    static constexpr size_t kMostKept = 4096;
+    static inline std::vector<CPart> gSpare;  // memory for the next tree
+
+    std::vector<CPart> _fWaiting;  // the next one last
+};
 
 }  // namespace
 
+// Printing runs host code too, and lets other threads in: by then nothing is under way any more.
 void FinishedWithNode(nb::handle node) {
-    __FinishedWithNode(NodeToRecycle(node), 0);
+    int64_t too_deep_count = CRecycling().Recycle(NodeToRecycle(node));
+    for (; too_deep_count > 0; --too_deep_count) PrintReport(nb::str("depth too great"));
 }
 
 }  // namespace codeloom

@@ -21,12 +21,12 @@ CNodeRef CAnnotatedAssignNode::GetTypeHintNode() {
 }
 
 CNodeRef CAnnotatedAssignNode::GetPostEqualsTestExpr() {
-    return _GetChildCount() > kValueIndex ? ChildAs<CNode>(kValueIndex) : CNodeRef();
+    return ChildCount() > kValueIndex ? ChildAs<CNode>(kValueIndex) : CNodeRef();
 }
 
 Py_ssize_t CExprStmt::GetEqualCount() {
     Py_ssize_t count = 0;
-    for (Py_ssize_t i = 0; i < ListedCount(*this); ++i) count += IsToken(i, "=");
+    for (Py_ssize_t i = 0; i < ListedCount(*this); ++i) count += ChildAt(i).HasText("=");
     return count;
 }
 
@@ -53,19 +53,19 @@ CTextOrNone CExprStmt::GetAugAssignOp() {
 }
 
 CNodeRef CReturnStmt::GetValue() {
-    return GetChild(kValueIndex);
+    return fChildren.Size() > kValueIndex ? ChildAs<CNode>(kValueIndex) : CNodeRef();
 }
 
 CNodeList CDelStmt::GetExpressions() {
     CNodeList expressions;
-    if (_GetChildCount() != 2) return expressions;
+    if (ChildCount() != 2) return expressions;
     const CRef<CTestListStarExpr> comma_list(TryChild<CTestListStarExpr>(kExpressionIndex));
     if (!comma_list) {
         expressions.append(ChildAs<CNode>(kExpressionIndex).Release());
         return expressions;
     }
-    for (int i = 0; i < comma_list->GetSubExprCount(); ++i)
-        expressions.append(comma_list->GetSubExpr(i).Release());
+    const int count = comma_list->GetSubExprCount();
+    for (int i = 0; i < count; ++i) expressions.append(comma_list->GetSubExpr(i).Release());
     return expressions;
 }
 

@@ -9,7 +9,7 @@ const CNode* ChildOrNone(const CNode& node, Py_ssize_t child_i) {
 }
 
 // A tree of the host may contain itself: a second walk at half the pace would be caught up with.
-const CNode& EdgeLeaf(const CNode& node, Py_ssize_t child_i) {
+CNodeRef EdgeLeaf(const CNode& node, Py_ssize_t child_i) {
     const CNode* last = &node;
     const CNode* slow = &node;
     bool is_odd_step = false;
@@ -19,21 +19,21 @@ const CNode& EdgeLeaf(const CNode& node, Py_ssize_t child_i) {
         if (last == slow) throw nb::value_error("the tree contains itself");
         is_odd_step = !is_odd_step;
     }
-    return *last;
+    return CNodeRef(last->As<CNode>());
 }
 
 }  // namespace
 
-const CNode& FirstLeaf(const CNode& node) {
+CNodeRef FirstLeaf(const CNode& node) {
     return EdgeLeaf(node, 0);
 }
 
-const CNode& LastLeaf(const CNode& node) {
+CNodeRef LastLeaf(const CNode& node) {
     return EdgeLeaf(node, -1);
 }
 
 Py_ssize_t GetTokenEndIndex(const CNode& node) {
-    return Py_ssize_t{ResultFromHost<int>(LastLeaf(node).fContext)} + 1;
+    return Py_ssize_t{ResultFromHost<int>(LastLeaf(node)->fContext)} + 1;
 }
 
 }  // namespace codeloom

@@ -10,7 +10,7 @@ namespace codeloom {
 Py_ssize_t GetTokenEndIndex(const CNode& node);
 
 // The leaf that is reached by always taking the first child, or the last one. ValueError as above.
-const CNode& FirstLeaf(const CNode& node);
-const CNode& LastLeaf(const CNode& node);
+CNodeRef FirstLeaf(const CNode& node);
+CNodeRef LastLeaf(const CNode& node);
 
 }  // namespace codeloom

@@ -18,8 +18,8 @@ nb::object BoundName(const CAsName& as_name) {
     return AsUtf8(as_name.as_name.is_none() ? as_name.module_name : as_name.as_name);
 }
 
-const CAsName& ItemAt(const CAsNameList& as_names, Py_ssize_t i) {
-    return *Instance<CAsName>(ListItem(as_names, i));
+CRef<CAsName> ItemAt(const CAsNameList& as_names, Py_ssize_t i) {
+    return CRef<CAsName>(Instance<CAsName>(ListItem(as_names, i)));
 }
 
 }  // namespace
@@ -29,13 +29,13 @@ const CAsName& ItemAt(const CAsNameList& as_names, Py_ssize_t i) {
 void CNodeWalker::_VisitImportNames(CImportNamesStmt& node) {
     const CAsNameList as_names = node.GetAsNameList();
     for (Py_ssize_t i = 0; i < ListSize(as_names); ++i) {
-        const CAsName& as_name = ItemAt(as_names, i);
-        nb::object name = BoundName(as_name);
-        nb::object module = AsUtf8(as_name.module_name);
+        const CRef<CAsName> as_name = ItemAt(as_names, i);
+        nb::object name = BoundName(*as_name);
+        nb::object module = AsUtf8(as_name->module_name);
         const CUtf8 bound(name);
         if (const size_t dot = bound->find('.'); dot != std::string_view::npos)
             name = module = JoinUtf8({bound->substr(0, dot)});
-        _DefineImported(as_name, name, Utf8Concat2(gPrefixes.kImportPrefix, module));
+        _DefineImported(*as_name, name, Utf8Concat2(gPrefixes.kImportPrefix, module));
     }
 }
 
@@ -45,13 +45,13 @@ void CNodeWalker::_VisitFromImport(CFromImportStmt& node) {
         return Utf8Concat4(gPrefixes.kFromImportPrefix, module, nb::bytes(" "), imported);
     };
     if (node.GetImportStar()) {
-        const nb::bytes star("*");
-        return _AddTypeEquiv(star, equiv_for(star));
+        static const CHostText kStar("*");
+        return _AddTypeEquiv(nb::handle(kStar), equiv_for(kStar));
     }
     const CAsNameList as_names = node.GetAsNameList();
     for (Py_ssize_t i = 0; i < ListSize(as_names); ++i) {
-        const CAsName& as_name = ItemAt(as_names, i);
-        _DefineImported(as_name, BoundName(as_name), equiv_for(as_name.module_name));
+        const CRef<CAsName> as_name = ItemAt(as_names, i);
+        _DefineImported(*as_name, BoundName(*as_name), equiv_for(as_name->module_name));
     }
 }
 
@@ -159,7 +159,7 @@ void CNodeWalker::_VisitTypeParameter(CTypeParameter& type_param) {
         const CBytesOrNone text = _TextForNode(*spec);
         if (!text.is_none()) equiv = Utf8Concat3(equiv, blank, text);
     }
-    if (nb::cast<bool>(nb::bool_(kIsScopeStartLogical(_fLogical)))) _AddArgInfoBytes(name, equiv);
+    if (IsTrue(kIsScopeStartLogical(_fLogical))) _AddArgInfoBytes(name, equiv);
 }
 
 }  // namespace codeloom

@@ -56,13 +56,17 @@ void CNodeWalker::_VisitNameLiteral(CNameLiteral& node, CNodeRef atom_node,
 
 CTextOrNone CNodeWalker::_NameInChain(CNode& atom, const CNodeRange& trailers, Py_ssize_t count) {
     count = std::min(count, trailers.Size());
-    if (_fChainText != nullptr && _fChainText->IsOf(atom, trailers)) return _fChainText->UpTo(count);
-    return CChainText(*_fToText, atom, trailers).UpTo(count);
+    CChainText* const visited = _fChainText;
+    if (visited == nullptr || !visited->IsOf(atom, trailers))
+        return CChainText(*_fToText, atom, trailers).UpTo(count);
+    const CRestoreOnExit<CChainText*> busy(_fChainText,
+                                           nullptr);  // while it grows, host code may come back here
+    return visited->UpTo(count);
 }
 
 void CNodeWalker::_VisitDottedName(CDottedName& node) {
     nb::str name("");
-    for (Py_ssize_t i = 0; i < node._GetChildCount(); ++i) {
+    for (Py_ssize_t i = 0; i < node.fChildren.Size(); ++i) {
         name = nb::str(name + node.ChildAt(i).fText);
         if (i % 2 == 0) _ProcessLoadName(name);
     }
@@ -75,12 +79,14 @@ void CNodeWalker::_ProcessLoadName(CTextOrNone name) {
 // Chains
 
 void CNodeWalker::_VisitPower(CPower& node) {
-    _VisitAtomPlusTrailers(*node.GetAtom(), node.GetTrailers());
+    const CChainParts parts = PartsOf(node);
+    _VisitAtomPlusTrailers(*parts.atom, parts.trailers);
     if (const CNodeRef exponent = node.GetExponentNode()) _VisitNode(*exponent);
 }
 
 void CNodeWalker::_VisitAtomExpr(CAtomExpr& node) {
-    _VisitAtomPlusTrailers(*node.GetAtom(), node.GetTrailers());
+    const CChainParts parts = PartsOf(node);
+    _VisitAtomPlusTrailers(*parts.atom, parts.trailers);
 }
 
 void CNodeWalker::_VisitAtomPlusTrailers(CNode& atom_node, const CNodeRange& all_trailers) {
@@ -99,7 +105,7 @@ void CNodeWalker::_VisitTrailer(CNode& atom_node, const CNodeRange& all_trailers
     const CRef<CTrailer> trailer = all_trailers.At<CTrailer>(i);
     const CTextOrNone token = trailer->GetInitialToken();
     const CNodeRef child = trailer->ChildAs<CNode>(1);
-    if (TextIs(token, "(") && trailer->_GetChildCount() == 3) {
+    if (TextIs(token, "(") && trailer->ChildCount() == 3) {
         _VisitCall(atom_node, all_trailers.First(i), *child);
     } else if (CNameLiteral* const name = TextIs(token, ".") ? child->As<CNameLiteral>() : nullptr) {
         _VisitNameLiteral(*name, CNodeRef(&atom_node), all_trailers, static_cast<int>(i));
@@ -114,7 +120,8 @@ void CNodeWalker::_VisitTrailer(CNode& atom_node, const CNodeRange& all_trailers
 
 void CNodeWalker::_VisitCall(CNode& atom, const CNodeRange& prev_trailers, CNode& arglist) {
     CBytesOrNone func_name;
-    if (IsDottedChain(atom, prev_trailers)) func_name = _TextForChain(atom, prev_trailers);
+    const CChainParts called{CNodeRef(&atom), prev_trailers};
+    if (IsDottedChain(called)) func_name = _TextForChain(called);
     _ProcessFunctionCall(std::move(func_name), GetUsedArgInfoList(CNodeRef(&arglist)));
 }
 
@@ -155,14 +162,14 @@ void CNodeWalker::_ProcessIsInstanceCall(const CArgumentList& arg_list) {
     const CBytesOrNone name = _DottedNameOf(*object.value);
     if (name.is_none()) return;
     for (const nb::object& instance_name : _InstanceNamesFor(*classes.value))
-        _fLogical->AppendTypeEquiv(name, instance_name);
+        _fLogical->AppendTypeEquiv(name, AsUtf8(instance_name));
 }
 
-std::vector<CTextOrUtf8> CNodeWalker::_InstanceNamesFor(CNode& class_or_tuple) {
-    std::vector<CTextOrUtf8> names;
+std::vector<nb::object> CNodeWalker::_InstanceNamesFor(CNode& class_or_tuple) {
+    std::vector<nb::object> names;
     const auto add = [&](CNode& node) {
         const CBytesOrNone name = _DottedNameOf(node);
-        if (!name.is_none()) names.emplace_back(JoinUtf8({GetInstanceNameForClass(CUtf8(name))}));
+        if (!name.is_none()) names.push_back(TextFromUtf8(GetInstanceNameForClass(CUtf8(name))));
     };
     add(class_or_tuple);
     if (!names.empty()) return names;

@@ -13,8 +13,7 @@ namespace codeloom {
 void CNodeWalker::Init(nb::tuple version_triple) {
     _fPy3 = version_triple >= nb::make_tuple(3, 0);
     _fToText = MakeInstance<CNodeToTextConverterImpl>();
-    const nb::bool_ include_text(_fIncludeExprText);
-    _fToText->Init(include_text, include_text, include_text);
+    _fToText->Init(_fIncludeExprText, _fIncludeExprText, _fIncludeExprText);
 }
 
 // The walk
@@ -105,9 +104,9 @@ CBytesOrNone CNodeWalker::_TextForNode(CNode& node, const CNodeTextOptions& opti
     return CBytesOrNone(JoinUtf8({text}));
 }
 
-CBytesOrNone CNodeWalker::_TextForChain(CNode& atom, const CNodeRange& trailers) {
+CBytesOrNone CNodeWalker::_TextForChain(const CChainParts& chain) {
     std::string text;
-    if (!_fToText->AppendTextForAtomPlusTrailers(text, atom, trailers)) return CBytesOrNone();
+    if (!_fToText->AppendTextForAtomPlusTrailers(text, *chain.atom, chain.trailers)) return CBytesOrNone();
     return CBytesOrNone(JoinUtf8({text}));
 }
 
@@ -115,17 +114,34 @@ CBytesOrNone CNodeWalker::_DottedNameOf(CNode& node) {
     return IsDottedName(node) ? _TextForNode(node, {.dotted_name_only = true}) : CBytesOrNone();
 }
 
+namespace {
+
+// Accessors of a field that hosts set by truth values.
+template <bool CNodeWalker::* field>
+bool Get(const CNodeWalker& walker) {
+    return walker.*field;
+}
+template <bool CNodeWalker::* field>
+void Set(CNodeWalker& walker, CTruth value) {
+    walker.*field = value;
+}
+
+}  // namespace
+
 void BindNodeWalker(nb::module_& module) {
     nb::class_<CNodeWalker, TNodeWalkerOperations<CNodeWalker>> binding(
         module, "CNodeWalker", Collected<CNodeWalker>(), "Records what a logical line does with names.");
     binding.def(TInit<nb::tuple>(), "version_triple"_a)
-        .def_rw("_fIncludeExprText", &CNodeWalker::_fIncludeExprText,
-                "True when literals of numbers and strings are recorded with their text.")
-        .def_rw("_fIncludeOperatorExpressions", &CNodeWalker::_fIncludeOperatorExpressions,
-                "False keeps _TypeEquivForOperatorExpression from giving anything.")
+        .def_prop_rw("_fIncludeExprText", Get<&CNodeWalker::_fIncludeExprText>,
+                     Set<&CNodeWalker::_fIncludeExprText>,
+                     "True when literals of numbers and strings are recorded with their text.")
+        .def_prop_rw("_fIncludeOperatorExpressions", Get<&CNodeWalker::_fIncludeOperatorExpressions>,
+                     Set<&CNodeWalker::_fIncludeOperatorExpressions>,
+                     "False keeps _TypeEquivForOperatorExpression from giving anything.")
         .def_rw("_fMaxOperatorExpressionLength", &CNodeWalker::_fMaxOperatorExpressionLength,
                 "Kept for hosts; the limit of 120 bytes doesn't follow it.")
-        .def_rw("_fPy3", &CNodeWalker::_fPy3, "True when the analysed language level is 3.0 or later.")
+        .def_prop_rw("_fPy3", Get<&CNodeWalker::_fPy3>, Set<&CNodeWalker::_fPy3>,
+                     "True when the analysed language level is 3.0 or later.")
         .def_ro("_fToText", &CNodeWalker::_fToText,
                 nb::for_getter(nb::sig("def _fToText(self) -> CNodeToTextConverterImpl")),
                 "The converter for all text that is recorded.");

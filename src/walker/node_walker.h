@@ -102,13 +102,14 @@ class CNodeWalker : public CHosted {
   private:
     // What the converter gives for a node or a chain, as bytes.
     CBytesOrNone _TextForNode(CNode& node, const CNodeTextOptions& options = {});
-    CBytesOrNone _TextForChain(CNode& atom, const CNodeRange& trailers);
+    CBytesOrNone _TextForChain(const CChainParts& chain);
 
     // The same for what is a name or a chain of names throughout; none for anything else.
     CBytesOrNone _DottedNameOf(CNode& node);
 
-    // What stands for an instance of a class, or of each class of a tuple, as far as they have names.
-    std::vector<CTextOrUtf8> _InstanceNamesFor(CNode& class_or_tuple);
+    // The texts that stand for an instance of a class, or of each class of a tuple, as far as they have
+    // names.
+    std::vector<nb::object> _InstanceNamesFor(CNode& class_or_tuple);
 
     CTextOrNone _NameInChain(CNode& atom, const CNodeRange& trailers, Py_ssize_t count);
     void _VisitTrailer(CNode& atom_node, const CNodeRange& all_trailers, Py_ssize_t i);
@@ -124,8 +125,8 @@ class CNodeWalker : public CHosted {
     CBytesOrNone _EquivForDisplay(CAtom& atom, nb::handle bracket);
     CBytesOrNone _EquivForGrouping(CAtom& atom, const CBytesOrNone& extra_trailer);
     CBytesOrNone _EquivForTuple(CTestListStarExpr& tuple);
-    CBytesOrNone _EquivForSimpleLiteral(CNode& node);
-    CBytesOrNone _EquivForNumber(CNumberLiteral& number, std::string_view sign = {});
+    CBytesOrNone _EquivForLiteral(CNode& node);
+    CBytesOrNone _EquivForNumber(CNumberLiteral& number, const CTextOrNone& sign = {});
     CBytesOrNone _EquivForString(CStringLiteral& literal);
     CBytesOrNone _EquivForOperators(CNode& node, const CBytesOrNone& extra_trailer);
     CBytesOrNone _InstanceNameForString(CStringLiteral& literal);

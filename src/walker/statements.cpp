@@ -1,6 +1,7 @@
 // Statements and expressions that bind names by a target, and those that hand a value on.
 #include "analysis/syntax_error.h"
 #include "host/errors.h"
+#include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "strutils/text.h"
 #include "symbolinfo/vocabulary.h"
@@ -33,8 +34,7 @@ void CNodeWalker::_VisitExceptClause(CExceptClause& exc_clause) {
         RaiseHostError(CreateSyntaxError(nb::str("Name in except clause must be a simple name"),
                                          _fLogical.AsHost(), target->fContext, nb::none()));
     _ProcessTargets(*target, CNodeRef());
-    for (const CTextOrUtf8& instance_name : _InstanceNamesFor(*type))
-        _AddNodeInfoStr(*target, CTextOrUtf8OrNone(instance_name));
+    for (const nb::object& instance_name : _InstanceNamesFor(*type)) _AddNodeInfoStr(*target, instance_name);
 }
 
 void CNodeWalker::_VisitReturn(CReturnStmt& return_stmt) {
@@ -42,7 +42,8 @@ void CNodeWalker::_VisitReturn(CReturnStmt& return_stmt) {
     if (!value) return;
     _VisitNode(*value);
     const CBytesOrNone equiv = _TypeEquivForNode(*value);
-    if (!equiv.is_none()) _AddTypeEquiv(nb::bytes("return"), equiv);
+    static const CHostText kReturn("return");
+    if (!equiv.is_none()) _AddTypeEquiv(nb::handle(kReturn), equiv);
 }
 
 // Unlike a `return`, a `yield` of an unknown value is recorded, as an empty equiv.
@@ -52,7 +53,8 @@ void CNodeWalker::_VisitYield(CYieldExpr& yield_expr) {
     _VisitNode(*value);
     const CBytesOrNone equiv = _TypeEquivForNode(*value);
     const nb::bytes from(yield_expr.IsYieldFrom() ? "from " : "");
-    _AddTypeEquiv(nb::bytes("yield"), Utf8Concat2(from, equiv));
+    static const CHostText kYield("yield");
+    _AddTypeEquiv(nb::handle(kYield), Utf8Concat2(from, equiv));
 }
 
 void CNodeWalker::_VisitNamedExpr(CNode& node) {
@@ -86,13 +88,13 @@ void CNodeWalker::_VisitPatternNode(CPatternNode& pattern_node) {
     const CRecursionScope recursion;
     Py_ssize_t first = 0;
     if (pattern_node.As<CClassPatternNode>() != nullptr) {
-        _VisitNode(*pattern_node.ChildAs<CNode>(0));
+        _VisitNode(*pattern_node.GetChild(0));
         first = 1;
     } else if (pattern_node.As<CClassArgumentPatternNode>() != nullptr && pattern_node.IsToken(1, "=")) {
         first = 2;
     }
-    for (Py_ssize_t i = first; i < pattern_node._GetChildCount(); ++i) {
-        const CNodeRef child = pattern_node.ChildAs<CNode>(i);
+    for (Py_ssize_t i = first; i < pattern_node.fChildren.Size(); ++i) {
+        const CNodeRef child = pattern_node.GetChild(i);
         if (child->HasText("_")) continue;
         if (child->As<CNameLiteral>() != nullptr) {
             _AddNameDefined(child->fText);

@@ -1,4 +1,7 @@
 // Assignments: which name receives what.
+#include <algorithm>
+#include <climits>
+
 #include "host/errors.h"
 #include "neighbours/imported_names.h"
 #include "strutils/text.h"
@@ -36,7 +39,7 @@ void CNodeWalker::_VisitExprStmt(CExprStmt& node) {
 }
 
 void CNodeWalker::_VisitAssignment(CExprStmt& node) {
-    const int count = static_cast<int>(node.GetEqualCount());
+    const int count = static_cast<int>(std::clamp<Py_ssize_t>(node.GetEqualCount(), -1, INT_MAX));
     if (count == 0) return _VisitChildren(node);
     const CNodeRef rhs = node.GetPostEqualsTestExpr(count - 1);
     for (int i = 0; i < count; ++i) {

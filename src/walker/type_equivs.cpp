@@ -3,6 +3,7 @@
 #include "host/errors.h"
 #include "host/restore.h"
 #include "host/text.h"
+#include "names/encode_literal.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/symbolinfo/info_bytes.h"
 #include "strutils/text.h"
@@ -21,16 +22,21 @@ bool StartsWith(const nb::object& equiv, nb::handle prefix) {
     return CUtf8(equiv)->starts_with(CUtf8(prefix));
 }
 
-// The number behind a plus or minus; null for any other node.
-CNumberLiteral* SignedNumber(const CNode& node) {
-    const CRef<CFactorExpr> factor(node.As<CFactorExpr>());
-    if (!factor || !TextIsOneOf(factor->GetUnaryOperator(), "+", "-")) return nullptr;
-    return factor->TryChild<CNumberLiteral>(1);
+// A number and the plus or minus in front of it.
+struct CSignedNumber {
+    CRef<CNumberLiteral> number;  // empty for any other node
+    CTextOrNone sign;
+};
+
+CSignedNumber SignedNumber(CFactorExpr& factor) {
+    CTextOrNone sign = factor.GetUnaryOperator();
+    const CNodeRef child = factor.GetChild(1);
+    if (!child || !TextIsOneOf(sign, "+", "-")) return {};
+    return {CRef<CNumberLiteral>(child->As<CNumberLiteral>()), std::move(sign)};
 }
 
-// Literals outside brackets. No part of one can be told.
-bool IsSimpleLiteral(const CNode& node) {
-    if (node.fText.is_none()) return SignedNumber(node) != nullptr;
+// Leaves but names. No part of one can be told.
+bool IsLiteral(const CNode& node) {
     return node.As<CNumberLiteral>() != nullptr || node.As<CStringLiteral>() != nullptr ||
            TextIsOneOf(node.fText, "None", "True", "False");
 }
@@ -58,13 +64,17 @@ CBytesOrNone CNodeWalker::_TypeEquivForNode(CNode& node, CBytesOrNone extra_trai
     if (CAtom* const atom = node.As<CAtom>()) return _EquivForAtom(*atom, extra_trailer);
     if (CTestListStarExpr* const list = node.As<CTestListStarExpr>(); list != nullptr && list->IsTuple())
         return has_trailer ? CBytesOrNone() : _EquivForTuple(*list);
-    if (IsSimpleLiteral(node)) return has_trailer ? CBytesOrNone() : _EquivForSimpleLiteral(node);
+    if (CFactorExpr* const factor = node.As<CFactorExpr>()) {
+        const CSignedNumber found = SignedNumber(*factor);
+        if (found.number) return has_trailer ? CBytesOrNone() : _EquivForNumber(*found.number, found.sign);
+    }
+    if (IsLiteral(node)) return has_trailer ? CBytesOrNone() : _EquivForLiteral(node);
     if (CPower* const power = node.As<CPower>()) {
         if (power->GetExponentNode()) return CBytesOrNone();
-        return WithTrailer(_TextForChain(*power->GetAtom(), power->GetTrailers()), extra_trailer);
+        return WithTrailer(_TextForChain(PartsOf(*power)), extra_trailer);
     }
     if (CAtomExpr* const chain = node.As<CAtomExpr>())
-        return WithTrailer(_TextForChain(*chain->GetAtom(), chain->GetTrailers()), extra_trailer);
+        return WithTrailer(_TextForChain(PartsOf(*chain)), extra_trailer);
     if (node.As<COperatorExpression>() != nullptr || node.As<CFactorExpr>() != nullptr)
         return _EquivForOperators(node, extra_trailer);
     return WithTrailer(_DottedNameOf(node), extra_trailer);
@@ -77,8 +87,10 @@ CBytesOrNone CNodeWalker::_EquivForAtom(CAtom& atom, const CBytesOrNone& extra_t
     if (TextIs(bracket, "(") && (_fInnerGrouping == &atom || !IsTupleLiteralNode(atom)))
         return _EquivForGrouping(atom, extra_trailer);
     if (!bracket.is_none()) return has_trailer ? CBytesOrNone() : _EquivForDisplay(atom, bracket);
-    if (atom.IsTwoPlusStringLiterals())
-        return has_trailer ? CBytesOrNone() : _InstanceNameForString(*atom.ChildAs<CStringLiteral>(0));
+    if (atom.IsTwoPlusStringLiterals()) {
+        if (has_trailer) return CBytesOrNone();
+        return _InstanceNameForString(*CRef<CStringLiteral>::FromHost(atom.GetChild(0).AsHost()));
+    }
     const CBytesOrNone text = _TextForNode(atom);
     if (text.is_none() && has_trailer)
         RaiseHost(PyExc_TypeError, "an atom without text can't be followed by a trailer");
@@ -97,7 +109,7 @@ CBytesOrNone CNodeWalker::_EquivForDisplay(CAtom& atom, nb::handle bracket) {
 // Parentheses that aren't a tuple's are looked through.
 CBytesOrNone CNodeWalker::_EquivForGrouping(CAtom& atom, const CBytesOrNone& extra_trailer) {
     const CRecursionScope recursion;
-    if (atom._GetChildCount() == CAtom::kFilledChildCount) {
+    if (atom.ChildCount() == CAtom::kFilledChildCount) {
         const CNodeRef contents = atom.ChildAs<CNode>(CAtom::kContentsIndex);
         const CRestoreOnExit<const CNode*> inner_grouping(_fInnerGrouping, contents.get());
         return _TypeEquivForNode(*contents, extra_trailer);
@@ -114,9 +126,7 @@ CBytesOrNone CNodeWalker::_EquivForTuple(CTestListStarExpr& tuple) {
     return BuildLiteralInfo("tuple", JoinUtf8({"(", elements, ")"}));
 }
 
-CBytesOrNone CNodeWalker::_EquivForSimpleLiteral(CNode& node) {
-    if (CNumberLiteral* const number = SignedNumber(node))
-        return _EquivForNumber(*number, CUtf8(node.ChildAt(0).fText));
+CBytesOrNone CNodeWalker::_EquivForLiteral(CNode& node) {
     if (TextIs(node.fText, "None")) return BuildLiteralInfo("None", node.fText);
     if (TextIsOneOf(node.fText, "True", "False"))
         return Utf8Concat3(gPrefixes.kTypedLiteralPrefix, nb::bytes("bool: "), node.fText);
@@ -124,10 +134,10 @@ CBytesOrNone CNodeWalker::_EquivForSimpleLiteral(CNode& node) {
     return _EquivForString(*node.As<CStringLiteral>());
 }
 
-CBytesOrNone CNodeWalker::_EquivForNumber(CNumberLiteral& number, std::string_view sign) {
+CBytesOrNone CNodeWalker::_EquivForNumber(CNumberLiteral& number, const CTextOrNone& sign) {
     const std::string_view type_name = number.IsFloat() ? "float" : "int";
     if (!_fIncludeExprText || number.fText.is_none()) return BuildLiteralInfo(type_name, nb::none());
-    return BuildLiteralInfo(type_name, JoinUtf8({sign, CUtf8(number.fText)}));
+    return BuildLiteralInfo(type_name, Utf8Concat2(sign, number.fText));
 }
 
 CBytesOrNone CNodeWalker::_EquivForString(CStringLiteral& literal) {
