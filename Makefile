@@ -1,6 +1,6 @@
 # make run     set up what is missing, build, and check the examples and the interpreter's own library
 # make test    set up what is missing, build, and run all tests
-# The rest: lint, tidy, format, asan, leaks, fuzz, bench, clean.
+# The rest: lint, tidy, format, asan, leaks, fuzz, bench, bench-short, clean.
 
 PYTHON ?= python3.11
 VENV   := .venv
@@ -11,7 +11,7 @@ SOURCES   := $(shell find src resources codeloom -type f -not -name '*.pyc') CMa
 CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
 STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
 
-.PHONY: run test lint tidy format asan asan-short leaks fuzz bench build clean
+.PHONY: run test lint tidy format asan asan-short leaks fuzz bench bench-short build clean
 
 build: $(STAMP)
 
@@ -76,10 +76,11 @@ fuzz: build
 	$(BIN)/python tests/fuzz.py --seconds $(or $(SECONDS),60) $(SEED:%=--seed %)
 
 bench: build
-	$(BIN)/python benchmarks/bench_accessors.py
-	$(BIN)/python benchmarks/bench_analyze.py
-	$(BIN)/python benchmarks/bench_hints.py
-	$(BIN)/python benchmarks/bench_names.py
+	$(BIN)/pip install --quiet --group benchmark
+	$(BIN)/python -P benchmarks/bench.py --write
+
+bench-short: build
+	$(BIN)/python -P benchmarks/bench.py --short
 
 clean:
 	rm -rf build $(VENV)

@@ -1,23 +1,28 @@
-"""Breaks single lines of sound files at random and sees whether exactly those lines are reported.
+"""Breaks lines of sound files at random and sees whether exactly those lines are reported.
 
-One token of one logical line is deleted, doubled or replaced by another of the file. The broken line
-alone is judged by the interpreter: what it still accepts, or refuses only after its grammar, doesn't
-count. Run it for a measurement; tests/test_broken_lines.py holds the goal.
+What is broken is judged by the interpreter, line by line: what it still accepts, or refuses only after its
+grammar, doesn't count. Run it for a measurement; tests/test_broken_lines.py holds the goal.
 
-    python tests/broken_lines.py [--analyzer older|newer] [--cases N] [--seed N] [--show]
+    python tests/broken_lines.py [single|six|typed] [--analyzer older|newer] [--cases N] [--seed N] [--show N]
 """
 
 import argparse
 import ast
 import io
 import random
+import re
 import sysconfig
 import warnings
+from collections import Counter
+from collections.abc import Iterator
 from contextlib import redirect_stdout
 from dataclasses import dataclass
+from functools import cached_property
 from pathlib import Path
 
-from codeloom.logicalline import kComment
+from faults import KINDS, Edit, Line, Lines, OpensTriple, TypedAbove
+
+from codeloom.logicalline import CLogicalLine
 from codeloom.treesift import CNewerAnalyzer, CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
 
@@ -60,31 +65,96 @@ AFTER_THE_GRAMMAR = (
 
 @dataclass(frozen=True)
 class Case:
-    """One broken line: where it stands, what was done, and the errors that were found."""
+    """A text with broken lines, and what was found there."""
 
     path: Path
-    first_row: int
-    end_row: int
-    deed: str
-    source: str
+    kinds: list[str]
+    damaged: list[range]
+    """The rows of the broken lines, counted in the broken text."""
     errors: list[tuple[int, str]]
+    keeps_others: bool
+    """All other lines are read as in the sound text."""
+    text: str
 
-    def IsExact(self) -> bool:
-        """True when every error lies in the broken line, and there is one."""
-        return bool(self.errors) and all(self.first_row <= row < self.end_row for row, _ in self.errors)
+    @cached_property
+    def found_count(self) -> int:
+        return sum(any(row in rows for row, _ in self.errors) for rows in self.damaged)
+
+    @cached_property
+    def is_dirty(self) -> bool:
+        """A row is blamed that isn't broken."""
+        return not all(any(row in rows for rows in self.damaged) for row, _ in self.errors)
+
+    @property
+    def is_exact(self) -> bool:
+        return self.found_count == len(self.damaged) and not self.is_dirty and self.keeps_others
+
+    def __str__(self) -> str:
+        source_rows = self.text.split("\n")
+        shown = [f"-- {', '.join(self.kinds)}: {self.path}"]
+        shown += [f"   errors: {self.errors}", f"   others kept: {self.keeps_others}"]
+        for rows in self.damaged:
+            for row in range(max(rows.start - 2, 0), min(rows.stop + 8, len(source_rows))):
+                shown.append(f"{'>' if row in rows else ' '}{row:5} {source_rows[row]}")
+        return "\n".join(shown)
 
 
-def SoundFiles() -> list[Path]:
-    """The files of the interpreter's library."""
-    library = Path(sysconfig.get_path("stdlib"))
-    return [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
+class SoundText:
+    """One sound file and its lines."""
+
+    def __init__(self, path: Path, text: str, analyzer: CPGenAnalyzerImpl) -> None:
+        self.path = path
+        self.text = text
+        self.analyzer = analyzer
+        self.logicals = GetLogicalsFromText(text)
+        self.lines = Lines(text, self.logicals)
+
+    def Broken(self, edits: list[tuple[str, Line, Edit]]) -> Case:
+        """What is found when lines are edited, each by one of `edits`, which are in the order of the text."""
+        text = self.text
+        for _, _, edit in reversed(edits):
+            text = text[: edit.start] + edit.new + text[edit.end :]
+        damaged = []
+        kept = []
+        shift = 0
+        logical_i = 0
+        for _, line, edit in edits:
+            more = edit.new.count("\n") - self.text.count("\n", edit.start, edit.end)
+            is_insertion = edit.new.endswith(f"\n{line.indent}") and edit.end == line.start
+            end_row = line.first_row if is_insertion else line.end_row
+            while logical_i < len(self.logicals) and self.logicals[logical_i].fFirstLine < end_row:
+                if self.logicals[logical_i].fFirstLine < line.first_row:
+                    kept.append((self.logicals[logical_i], shift))
+                logical_i += 1
+            damaged.append(range(line.first_row + shift, end_row + shift + more))
+            shift += more
+        kept += [(logical, shift) for logical in self.logicals[logical_i:]]
+        return self._Judge(text, [kind for kind, _, _ in edits], damaged, kept)
+
+    def _Judge(
+        self, text: str, kinds: list[str], damaged: list[range], kept: list[tuple[CLogicalLine, int]]
+    ) -> Case:
+        sound = {_Facts(logical, shift) for logical, shift in kept}
+        changed = [logical for logical in GetLogicalsFromText(text) if not _Discarded(sound, _Facts(logical))]
+        errors = Errors(changed, self.analyzer)
+        return Case(self.path, kinds, damaged, errors, not sound, text)
 
 
-def Errors(text: str, analyzer: CPGenAnalyzerImpl) -> list[tuple[int, str]]:
+def _Facts(logical: CLogicalLine, shift: int = 0) -> tuple:
+    return (logical.fFirstLine + shift, logical.fType, tuple(logical.fToks), tuple(logical.fPositions))
+
+
+def _Discarded(facts: set, fact: tuple) -> bool:
+    is_in = fact in facts
+    facts.discard(fact)
+    return is_in
+
+
+def Errors(logicals: list[CLogicalLine], analyzer: CPGenAnalyzerImpl) -> list[tuple[int, str]]:
     """The row in the file and the text of every broken logical line."""
     errors = []
     with redirect_stdout(io.StringIO()):
-        for logical in GetLogicalsFromText(text):
+        for logical in logicals:
             error = analyzer.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
             if error is not None:
                 errors.append((logical.fFirstLine + error.lineno - 1, error.text))
@@ -96,13 +166,13 @@ def IsBroken(line: str) -> bool:
     line = line.strip()
     word = line.split(None, 1)[0] if line else ""
     before, behind = "", ""
-    if word.startswith("elif"):
+    if re.match(r"elif\b", word):
         line = line[2:]
-    elif word.startswith("else"):
+    elif re.match(r"else\b", word):
         before = "if 0: pass\n"
-    elif word.startswith(("except", "finally")):
+    elif re.match(r"(except|finally)\b", word):
         before = "try: pass\n"
-    elif word.startswith("try"):
+    elif re.match(r"try\b", word):
         behind = "\nfinally: pass"
     elif word == "case":
         before = "match x:\n "
@@ -110,93 +180,150 @@ def IsBroken(line: str) -> bool:
         behind = "\ndef function(): pass"
     if line.endswith(":"):
         line += " pass"
+    return IsRefused(before + line + behind + "\n")
+
+
+def IsRefused(text: str) -> bool:
+    """True when the interpreter's grammar refuses a text."""
     try:
         with warnings.catch_warnings():
             warnings.simplefilter("ignore")
-            ast.parse(before + line + behind + "\n")
+            ast.parse(text)
     except SyntaxError as error:
-        return not str(error.msg).startswith(AFTER_THE_GRAMMAR)
+        message = str(error.msg)
+        return not message.startswith(AFTER_THE_GRAMMAR) and "illegal expression" not in message
     except ValueError:
         return True
     return False
 
 
-class Breaker:
-    """Breaks lines of one sound file."""
-
-    def __init__(
-        self, path: Path, text: str, random_source: random.Random, analyzer: CPGenAnalyzerImpl
-    ) -> None:
-        self.analyzer = analyzer
-        self.path = path
-        self.random = random_source
-        self.data = text.encode()
-        self.row_starts = [0]
-        for row in self.data.splitlines(keepends=True):
-            self.row_starts.append(self.row_starts[-1] + len(row))
-        self.logicals = [logical for logical in GetLogicalsFromText(text) if logical.fType != kComment]
-        self.words = [token for logical in self.logicals for token in logical.fToks if token[0] not in "#\\"]
-
-    def Break(self) -> Case | None:
-        """A case, or None when what was done broke nothing."""
-        logical = self.random.choice(self.logicals)
-        token_i = self.random.choice([i for i, token in enumerate(logical.fToks) if token[0] not in "#\\"])
-        token = logical.fToks[token_i]
-        deed = self.random.choice(["delete", "double", "replace"])
-        new = {"delete": "", "double": f"{token} {token}", "replace": self.random.choice(self.words)}[deed]
-        if new == token:
-            return None
-        start, end = self._Bytes(logical, token_i)
-        line_start, line_end = self._Bytes(logical, 0)[0], self._Bytes(logical, -1)[1]
-        new_bytes = f" {new} ".encode()
-        line = self.data[line_start:start] + new_bytes + self.data[end:line_end]
-        if not IsBroken(line.decode()):
-            return None
-        text = (self.data[:start] + new_bytes + self.data[end:]).decode()
-        end_row = logical.fFirstLine + line.count(b"\n") + 1
-        return Case(self.path, logical.fFirstLine, end_row, deed, line.decode(), Errors(text, self.analyzer))
-
-    def _Bytes(self, logical, token_i: int) -> tuple[int, int]:
-        row, col = logical.fPositions[token_i]
-        start = self.row_starts[logical.fFirstLine + row] + col
-        return start, start + len(logical.fToks[token_i].encode())
+def IsBreaking(line: Line, edit: Edit) -> bool:
+    """The edited line, or the one that was put above it, is broken."""
+    if edit.end == line.start and edit.new.endswith(f"\n{line.indent}"):
+        return IsBroken(edit.new)
+    return IsBroken(line.source[line.start : edit.start] + edit.new + line.source[edit.end : line.end])
 
 
-def Cases(count: int, seed: int, analyzer: CPGenAnalyzerImpl = ANALYZERS["newer"]) -> list[Case]:
-    """`count` broken lines of random sound files."""
-    random_source = random.Random(seed)
-    files = SoundFiles()
-    cases: list[Case] = []
-    while len(cases) < count:
-        path = random_source.choice(files)
+def SoundTexts(source: random.Random, analyzer: CPGenAnalyzerImpl) -> Iterator[SoundText]:
+    """Random files of the interpreter's library without end."""
+    library = Path(sysconfig.get_path("stdlib"))
+    paths = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
+    while True:
+        path = source.choice(paths)
         try:
             text = path.read_text("utf-8")
-            ast.parse(text)
-        except (SyntaxError, ValueError):
+        except ValueError:
             continue
-        if not text.strip() or "\f" in text or len(text) > 200_000 or Errors(text, analyzer):
-            continue
-        breaker = Breaker(path, text, random_source, analyzer)
-        if breaker.logicals:
-            cases += [case for _ in range(10) if (case := breaker.Break()) is not None]
-    return cases[:count]
+        is_usable = text.isascii() and not set("\f\r\0") & set(text) and 200 < len(text) < 100_000
+        if is_usable and not IsRefused(text):
+            sound = SoundText(path, text, analyzer)
+            if len(sound.lines) > 6 and not Errors(sound.logicals, analyzer):
+                yield sound
+
+
+def _BreakingEdit(
+    sound: SoundText, kind: str, line: Line, source: random.Random
+) -> tuple[str, Line, Edit] | None:
+    edit = KINDS[kind](line, source, sound.lines)
+    return (kind, line, edit) if edit and IsBreaking(line, edit) else None
+
+
+def _WithOneFault(sound: SoundText, kind: str, source: random.Random) -> Case | None:
+    for _ in range(20):
+        if edit := _BreakingEdit(sound, kind, source.choice(sound.lines), source):
+            return sound.Broken([edit])
+    return None
+
+
+def Singles(count: int, seed: int, analyzer: CPGenAnalyzerImpl = ANALYZERS["newer"]) -> Iterator[Case]:
+    """`count` texts with one broken line, all kinds alike."""
+    source = random.Random(seed)
+    for sound in SoundTexts(source, analyzer):
+        for kind in KINDS:
+            if case := _WithOneFault(sound, kind, source):
+                yield case
+                count -= 1
+                if count == 0:
+                    return
+
+
+def _SixEdits(sound: SoundText, source: random.Random) -> list[tuple[str, Line, Edit]]:
+    """Faults in six lines, in the order of the text, or fewer.
+
+    One of them at most leaves triple quotes open: two may pair up to a sound string.
+    """
+    edits: list[tuple[str, Line, Edit]] = []
+    for line in source.sample(sound.lines, k=40):
+        edit = _BreakingEdit(sound, source.choice(list(KINDS)), line, source)
+        opens = edit and OpensTriple(line, edit[2])
+        if edit and not (opens and any(OpensTriple(*other[1:]) for other in edits)):
+            edits.append(edit)
+    return sorted(edits[:6], key=lambda edit: edit[1].start)
+
+
+def Sixes(count: int, seed: int, analyzer: CPGenAnalyzerImpl = ANALYZERS["newer"]) -> Iterator[Case]:
+    """`count` texts of 60 lines or more, with six broken ones."""
+    source = random.Random(seed)
+    for sound in SoundTexts(source, analyzer):
+        for _ in range(3 if len(sound.lines) >= 60 else 0):
+            edits = _SixEdits(sound, source)
+            if len(edits) == 6:
+                yield sound.Broken(edits)
+                count -= 1
+                if count == 0:
+                    return
+
+
+def Typed(count: int, seed: int, analyzer: CPGenAnalyzerImpl = ANALYZERS["newer"]) -> Iterator[Case]:
+    """At least `count` texts, in which a line grows above a sound one character by character."""
+    source = random.Random(seed)
+    for sound in SoundTexts(source, analyzer):
+        for _ in range(4):
+            line = source.choice(sound.lines)
+            for edit in TypedAbove(line, source.choice(sound.lines)):
+                yield sound.Broken([("typed", line, edit)])
+                count -= 1
+        if count <= 0:
+            return
+
+
+def IsSoundAfterAll(case: Case) -> bool:
+    """The edited text as a whole is sound, whatever its lines are by themselves."""
+    return not IsRefused(case.text)
+
+
+RUNS = {"single": Singles, "six": Sixes, "typed": Typed}
 
 
 def main() -> None:
     parser = argparse.ArgumentParser(description=__doc__.splitlines()[0])
-    parser.add_argument("--cases", type=int, default=500)
+    parser.add_argument("run", choices=RUNS, nargs="?", default="single")
+    parser.add_argument("--cases", type=int, default=2000)
     parser.add_argument("--analyzer", choices=ANALYZERS, default="newer")
     parser.add_argument("--seed", type=int, default=random.randrange(1 << 30))
-    parser.add_argument("--show", action="store_true", help="print the lines that were missed")
+    parser.add_argument("--show", type=int, default=0, help="print so many of the cases that were missed")
     options = parser.parse_args()
-    cases = Cases(options.cases, options.seed, ANALYZERS[options.analyzer])
-    missed = [case for case in cases if not case.IsExact()]
-    if options.show:
-        for case in missed:
-            print(f"-- {case.deed}, rows {case.first_row} to {case.end_row} of {case.path}")
-            print(case.source)
-            print("   errors:", case.errors)
-    print(f"seed {options.seed}: {len(cases) - len(missed)} of {len(cases)} exact")
+    counts: Counter[str] = Counter()
+    missed: Counter[str] = Counter()
+    shown = 0
+    for case in RUNS[options.run](options.cases, options.seed, ANALYZERS[options.analyzer]):
+        is_right = case.is_exact if options.run != "typed" else not case.is_dirty and case.keeps_others
+        if not is_right and IsSoundAfterAll(case):
+            continue
+        counts["texts"] += 1
+        counts["faults"] += len(case.damaged)
+        counts["found"] += case.found_count
+        counts["exact"] += is_right
+        counts["dirty"] += case.is_dirty
+        counts["changed"] += not case.keeps_others
+        if not is_right:
+            missed[" + ".join(sorted(case.kinds)) if len(case.kinds) == 1 else "six"] += 1
+            if shown < options.show:
+                shown += 1
+                print(case)
+    print(f"seed {options.seed}:", dict(counts))
+    for kind, count in missed.most_common():
+        print(f"  {count:5} {kind}")
 
 
 if __name__ == "__main__":

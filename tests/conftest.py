@@ -1,11 +1,15 @@
 """What several test files share."""
 
+import gc
 import os
 import random
 import subprocess
 import sys
-from collections.abc import Callable
+import threading
+from collections.abc import Callable, Iterator
+from contextlib import AbstractContextManager, contextmanager
 from pathlib import Path
+from typing import Any
 
 import pytest
 from hypothesis import settings
@@ -37,6 +41,54 @@ def seed(request: pytest.FixtureRequest) -> int:
 def rewrite(request: pytest.FixtureRequest) -> bool:
     """True when golden files are to be rewritten, not compared."""
     return request.config.getoption("--rewrite")
+
+
+@pytest.fixture
+def at_a_collection() -> Callable[[Callable[[], object]], AbstractContextManager[None]]:
+    """Lets the collector run as often as it can meanwhile, and calls what it is given whenever it does."""
+
+    @contextmanager
+    def AtACollection(call: Callable[[], object]) -> Iterator[None]:
+        def OnCollection(phase: str, _: dict[str, int]) -> None:
+            if phase == "start":
+                call()
+
+        thresholds = gc.get_threshold()
+        gc.callbacks.append(OnCollection)
+        gc.set_threshold(1)
+        try:
+            yield
+        finally:
+            gc.set_threshold(*thresholds)
+            gc.callbacks.remove(OnCollection)
+
+    return AtACollection
+
+
+@pytest.fixture
+def in_small_thread() -> Iterator[Callable[..., Any]]:
+    """Calls a function in a thread of `kib` KiB, and gives its result or raises its exception."""
+
+    def Call(function: Callable[[], Any], kib: int = 256) -> Any:
+        def Run() -> None:
+            try:
+                outcome.append(function())
+            except BaseException as error:
+                failure.append(error)
+
+        outcome: list[Any] = []
+        failure: list[BaseException] = []
+        threading.stack_size(kib * 1024)
+        thread = threading.Thread(target=Run)
+        thread.start()
+        thread.join()
+        if failure:
+            raise failure[0]
+        return outcome[0]
+
+    old_size = threading.stack_size()
+    yield Call
+    threading.stack_size(old_size)
 
 
 @pytest.fixture

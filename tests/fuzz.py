@@ -1,27 +1,31 @@
-"""Feeds odd text to the tokenizer and the analyzer. Run with `make fuzz`.
+"""Feeds odd text to the tokenizer, the analyzer and the commands. Run with `make fuzz`.
 
 A text is a row of odd pieces, a part of a real file with pieces strewn in, or statements made from a
-grammar with words swapped. Whatever it says, analysis ends, swallows no exception, loses no
-character, and leaves the next line sound. A failure prints the seed and the text.
+grammar with words swapped; now and then it is repeated into a big file. Whatever it says, analysis
+ends, swallows no exception, loses no character, and leaves the next line sound; a command ends with a
+status, and the records survive host code that runs while they are asked for, or does what nobody should
+while a line is analysed. A failure prints the seed and the text.
 """
 
 import argparse
+import gc
 import io
 import random
 import re
 import sys
 import sysconfig
+import tempfile
 import time
-from collections.abc import Callable
-from contextlib import redirect_stdout
+from collections.abc import Callable, Iterator
+from contextlib import contextmanager, redirect_stderr, redirect_stdout
 from pathlib import Path
 
+from odd_hosts import OddHost
 from sentences import COMMENTS, WORDS, Sentences
 
-from codeloom import treesift
-from codeloom.engine import LineAnalyzer
-from codeloom.languages import LanguageNamed
+from codeloom import analyze, cli, treesift
 from codeloom.logicalline import CLogicalLine
+from codeloom.rows import RowTexts
 from codeloom.treesift import CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
 
@@ -34,9 +38,19 @@ BLANKS_AND_THE_LIKE = ["", "\n", "\n\t", "\\\n", "\r", "\r\n", "\x0c", "\0", "\u
 PIECES = [*WORDS_AND_MARKS.split(), *BLANKS_AND_THE_LIKE, '"""', "# x\n", "# type: int\n"]
 
 
-# The roads of a line: as the upper layers send it, and as the engine alone takes it.
+# The versions in which a text is analysed as users call it.
 LANGUAGES = ["2.7", "3.5", "3.8", "3.11", "3.14"]
-ENGINE = "the engine alone"
+
+COMMANDS = [
+    ["check"],
+    *(["names", f"--format={form}"] for form in ("text", "jsonl")),
+    *(["hints", f"--format={form}"] for form in ("text", "jsonl")),
+    *(["tree", f"--format={form}"] for form in ("text", "json", "dot")),
+]
+COMMANDED_TEXTS = 0.1  # the part of the texts that a command takes too
+ODDLY_HOSTED_TEXTS = 0.1
+BIG_FILES = 0.002
+BIG_FILE_SIZE = 300_000
 
 # What the engine alone swallows: in its trees three dots are no expression, and what wants one refuses
 # them; and a hint has arguments although the `def` has none.
@@ -55,6 +69,8 @@ class Fuzzer:
         words = {**WORDS, "NEWLINE": ["\n", *COMMENTS]}
         self.sentences = [Sentences(version, self.random, words) for version in ("2.7", "3.8", "3.14")]
         self.engine = CPGenAnalyzerImpl((3, 11, 0))
+        self.odd_host = OddHost(random.Random(seed))
+        self.folder = tempfile.TemporaryDirectory()
 
     def Text(self) -> str:
         kind = self.random.random()
@@ -85,26 +101,68 @@ class Fuzzer:
         logicals = GetLogicalsFromText(text)
         kept = "".join(token for logical in logicals for token in logical.fToks)
         assert _Solid(kept) == _Solid(text), "characters were lost"
-        self.road = self.random.choice([*LANGUAGES, ENGINE])
-        analyze = self._Engine if self.road == ENGINE else self._UpperLayers(text)
+        for logical in [*logicals, *GetLogicalsFromText("x = f(1)")]:
+            error = self.engine.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
+        assert error is None
+        self._Analyze(text, len(logicals))
+        self._AskWhileDropping(logicals)
+        if self.random.random() < ODDLY_HOSTED_TEXTS:
+            for logical in logicals:
+                self.odd_host.Analyze(logical)
+        if self.random.random() < COMMANDED_TEXTS:
+            self._Command(text)
+        if self.random.random() < BIG_FILES:
+            self._Command((f"{text}\n" * BIG_FILE_SIZE)[:BIG_FILE_SIZE])
+
+    def _AskWhileDropping(self, logicals: list[CLogicalLine]) -> None:
+        """Ask for records while host code, run by a collection, drops them."""
         for logical in logicals:
-            error = analyze(logical)
-            assert error is None or 1 <= error.lineno <= text.count("\n") + text.count("\r") + 1
-        (sound,) = GetLogicalsFromText("x = f(1)")
-        assert analyze(sound) is None
+            with _OnCollection(logical.ClearDerivedInfo):
+                for name in ("fTypeEquivs", "fArgTypeEquivs"):
+                    records = getattr(logical, name)
+                    assert records is None or all(len(record) == 2 for record in records)
 
-    def _Engine(self, logical: CLogicalLine) -> SyntaxError | None:
-        return self.engine.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
+    def _Command(self, text: str) -> None:
+        """Run a command on a file of the text: it says what it says, and ends with a status."""
+        path = Path(self.folder.name) / "text.py"
+        path.write_bytes(text.encode("utf-8", "surrogatepass"))
+        command, *options = self.random.choice(COMMANDS)
+        with redirect_stderr(io.StringIO()) as failures:
+            status = cli.main([command, *options, "--python", self.random.choice(LANGUAGES), str(path)])
+        holds_nothing = command == "tree" and "holds no line" in failures.getvalue()
+        assert status in (0, 1) or holds_nothing, (command, options, status, failures.getvalue())
 
-    def _UpperLayers(self, text: str) -> Callable[[CLogicalLine], SyntaxError | None]:
-        analyzer = LineAnalyzer(text, LanguageNamed(self.road), false_hints=False)
-        return lambda logical: analyzer.Analyze(logical)[1]
+    def _Analyze(self, text: str, line_count: int) -> None:
+        """The same as users call it."""
+        analysis = analyze(f"{text}\nx = f(1)", python=self.random.choice(LANGUAGES))
+        assert line_count <= len(analysis.lines) <= line_count + 1
+        rows = len(RowTexts(analysis.text))
+        for item in (*analysis.problems, *analysis.records):
+            place = item.range
+            assert place is None or 1 <= place.row <= place.end_row <= rows
 
     def OnSwallowed(self, suppress_gui: bool = False) -> None:
         """Raise what an analysis wants to log, but for what is known of the engine alone."""
         error = sys.exc_info()[1]
-        if self.road != ENGINE or not _SWALLOWED_BY_ENGINE.search(str(error)):
+        if not _SWALLOWED_BY_ENGINE.search(str(error)):
             raise AssertionError("an exception was swallowed") from error
+
+
+@contextmanager
+def _OnCollection(action: Callable[[], None]) -> Iterator[None]:
+    """Nearly every new object starts a collection, which calls `action`."""
+
+    def OnPhase(phase: str, info: dict[str, int]) -> None:
+        action()
+
+    thresholds = gc.get_threshold()
+    gc.callbacks.append(OnPhase)
+    gc.set_threshold(1)
+    try:
+        yield
+    finally:
+        gc.set_threshold(*thresholds)
+        gc.callbacks.remove(OnPhase)
 
 
 def _Solid(text: str) -> list[str]:

@@ -2,7 +2,7 @@
 
 from types import SimpleNamespace
 
-from codeloom.languages import LanguageNamed
+from codeloom.reading.languages import language_named
 from codeloom.treesift import CNode, CNodeClassInfo, CNodeFactory, CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
 
@@ -19,7 +19,7 @@ def Leaf(text=None, context=0, cls=CNode):
 
 
 def Driver(version):
-    language = LanguageNamed(version)
+    language = language_named(version)
     return CPGenParserImpl(language.version_triple, language.grammar_file, language.keywords, language.is_py3)
 
 

@@ -282,14 +282,12 @@ def test_broken_places(logical, context, failure):
 
 
 def test_wrong_types_are_refused():
-    logical = Logical("x")
     for call in [
         lambda: CPGenAnalyzerImpl("3.8"),
         lambda: CPGenAnalyzerImpl(None),
         lambda: CPGenAnalyzerImpl(VERSION, 7),
         lambda: ANALYZER.AnalyzeSingleLogical("x = 1", False),
         lambda: ANALYZER.AnalyzeSingleLogical(None, False),
-        lambda: ANALYZER.AnalyzeSingleLogical(logical, "no"),
         lambda: ANALYZER.ParseTokenListToNode("x"),
         lambda: CLogicalLine(1, (), ()),
         lambda: CLogicalLine(kComment, [], []),

@@ -11,7 +11,6 @@ from codeloom.treesift import (
     CArgInfo,
     CDefiningArglistNode,
     CFunctionParameterDef,
-    CLambdaExpr,
     CNameLiteral,
     CNode,
     CParametersNode,
@@ -35,45 +34,8 @@ def Written(arguments):
     ]
 
 
-def Parameters(source, version="3.8"):
-    node = Parse(source, version)
-    return node.GetArgumentsNode() if isinstance(node, CLambdaExpr) else node.GetParameters()
-
-
-@pytest.mark.parametrize(
-    ("source", "version", "written"),
-    [
-        ("def f(): pass", "3.8", []),
-        ("def f(a: int): pass", "3.8", ["a: int"]),
-        (
-            "def f(a, /, b: ... = ..., *c, d: int = 2, **e): pass",
-            "3.8",
-            ["a", "b: ...=...", "*c", "d: int=2", "**e"],
-        ),
-        ("lambda a: 0", "3.8", ["a"]),
-        ("lambda *, a=b == c: 0", "3.8", ["*", "a=b == c"]),
-        ("lambda a, (b, (c, d))=e, *g: 0", "2.7", ["a", ["b", ["c", "d"]], "*g"]),
-        ("def f(((a,),)): pass", "2.7", [[["a"]]]),
-    ],
-)
-def test_parameters(source, version, written):
-    assert Written(GetDefiningArgInfoList(Parameters(source, version))) == written
-
-
-@pytest.mark.parametrize(
-    ("source", "version", "written"),
-    [
-        ("f(1,)", "3.8", ["=1"]),
-        ("f(1, x=2, *y, a := 1, b[c:d])", "3.8", ["=1", "x=2", "*=* y", "=a := 1", "=b [ c : d ]"]),
-        ("f(1, x=2, *y, **z)", "2.7", ["=1", "x=2", "*=y", "**=z"]),
-        ("f(*y)", "3.8", ["=* y"]),  # the prefix of a lone argument isn't told
-        ("f(*y)", "2.7", ["*=y"]),  # where it stands in a list
-        ("f(a for a in b)", "3.8", ["=a for a in b"]),
-    ],
-)
-def test_arguments(source, version, written):
-    (call,) = Parse(source, version).GetTrailers()
-    assert Written(GetUsedArgInfoList(call.GetNestedNode())) == written
+def Parameters(source):
+    return Parse(source).GetParameters()
 
 
 def test_records():
@@ -171,29 +133,6 @@ def test_where_a_node_ends():
             node.fChildren[-1] = child
         with pytest.raises(ValueError, match="contains itself"):
             GetTokenEndIndex(Node(CNode, nodes[0]))
-
-
-def test_overrides_are_asked():
-    class Argument(CSingleUsedArgumentNode):
-        def GetValue(self):
-            return self.GetChild(0)
-
-        def GetPrefix(self):
-            return "***"
-
-    single = Node(Argument, Leaf("a"), Leaf("="), Leaf("b"))
-    assert Written(GetUsedArgInfoList(single)) == ["a=a"]
-    assert Written(GetUsedArgInfoList(Node(CUsedArglistNode, single, Leaf(",")))) == ["***a=a"]
-
-    class Parameter(CFunctionParameterDef):
-        def GetNestedListNode(self):
-            return None
-
-    parameter = Node(Parameter, Leaf("("), Leaf("a", cls=CNameLiteral), Leaf(")"))
-    assert Written(GetDefiningArgInfoList(parameter)) == ["("]
-    Parameter.GetNestedListNode = lambda self: "text"
-    with pytest.raises(TypeError):
-        GetDefiningArgInfoList(parameter)
 
 
 def test_an_override_that_empties_the_list():

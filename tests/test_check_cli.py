@@ -41,14 +41,14 @@ def test_output(write_files, run_cli):
     write_files({"a b.py": "if x:\n\ty = '日本' )\r\n", "c.py": b"'\xe9'\n" + b"z = 1 ) " + b"+ 1 " * 60})
     done = run_cli("check", "a b.py", "c.py")
     assert done.stdout.splitlines() == [
-        "a b.py:2:11: invalid syntax",
+        "a b.py:2:11: CL201 invalid syntax",
         "        y = '日本' )",
         "                   ^",
-        "c.py:1:2: byte 0xE9 can't be read as utf-8: save the file as UTF-8, or name its encoding "
+        "c.py:1:2: CL101 byte 0xE9 can't be read as utf-8: save the file as UTF-8, or name its encoding "
         "in the first row, as in `# coding: latin-1`",
         "    '\ufffd'",
         "     ^",
-        "c.py:2:7: invalid syntax",
+        "c.py:2:7: CL201 invalid syntax",
         "    " + ("z = 1 ) " + "+ 1 " * 60)[:90] + "...",
         " " * 10 + "^",
         "3 problems in 2 of 2 files, 4 logical lines",
@@ -78,6 +78,9 @@ def test_the_examples(run_cli):
         (["check"], "FILE-OR-FOLDER"),
         (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.14"),
         (["check", "--fast", "a.py"], "--fast"),
+        (["tree"], "FILE:ROW -c is required"),
+        (["tree", "f.py:1", "-c", "x"], "not allowed with"),
+        (["tree", "-c", "x", "--format", "xml"], "invalid choice: 'xml'"),
     ],
 )
 def test_wrong_use(run_cli, arguments, words):
@@ -121,11 +124,12 @@ class TestFiles:
         (folder / "b/link.py").symlink_to("../a.py")
         assert checked("a.py", "b") == ["a.py", "b/c.py", "b/d.py"]
 
-    def test_links_of_folders(self, write_files, checked):
+    def test_links_of_folders_are_followed_only_when_they_are_named(self, write_files, checked):
         folder = write_files({"a/b.py": ")", "other/c.py": ")"})
         (folder / "a/loop").symlink_to(".", target_is_directory=True)
         (folder / "a/up").symlink_to("..", target_is_directory=True)
-        assert checked("a") == ["a/b.py", "a/up/other/c.py"]
+        assert checked("a") == ["a/b.py"]
+        assert checked("a/up/other") == ["a/up/other/c.py"]
 
     def test_broken_links_and_pipes(self, write_files, run_cli):
         folder = write_files({"a.py": "x = 1\n"})
@@ -133,12 +137,29 @@ class TestFiles:
         (folder / "self.py").symlink_to("self.py")
         (folder / ".#lock.py").symlink_to("user@host")
         os.mkfifo(folder / "pipe.py")
+        (folder / "null.py").symlink_to("/dev/null")
         done = run_cli("check", ".")
         assert done.returncode == 2
         assert done.stderr.splitlines() == [
             "codeloom: can't read ./gone.py: No such file or directory",
             "codeloom: can't read ./self.py: Too many levels of symbolic links",
         ]
+
+    def test_what_is_no_regular_file_or_no_source(self, write_files, run_cli):
+        folder = write_files({"a.ipynb": "{}"})
+        os.mkfifo(folder / "pipe")
+        done = run_cli("check", "pipe", "/dev/zero", "a.ipynb")
+        assert (done.returncode, done.stdout) == (2, "0 problems in 0 files, 0 logical lines; 3 not read\n")
+        assert done.stderr.splitlines() == [
+            "codeloom: can't read pipe: it is no regular file",
+            "codeloom: can't read /dev/zero: it is no regular file",
+            "codeloom: can't read a.ipynb: notebooks aren't read: export it as a .py file",
+        ]
+
+    def test_a_pipe_of_the_shell(self, run_cli, tmp_path):
+        command = f"{sys.executable} -m codeloom check <(echo 'x = )')"
+        done = subprocess.run(["bash", "-c", command], capture_output=True, text=True, cwd=tmp_path)
+        assert "1 problem in 1 of 1 file" in done.stdout
 
     def test_deep_folders(self, tmp_path, checked):
         folder = tmp_path
@@ -158,12 +179,12 @@ class TestFiles:
             (tmp_path / os.fsdecode(b"\xff\x1b.py")).write_text(")")
         except OSError:
             pytest.skip("this file system takes only text")
-        assert run_cli("check", ".").stdout.startswith("./\\xff\ufffd.py:1:1: invalid syntax")
+        assert run_cli("check", ".").stdout.startswith("./\\xff\ufffd.py:1:1: CL201 invalid syntax")
 
     def test_standard_input(self, checked, run_cli):
         assert checked("-", "-", stdin=b")") == ["<stdin>"]
         done = run_cli("check", "-", stdin=b"# coding: latin-1\r'\xe9' )\r")
-        assert done.stdout.splitlines()[:2] == ["<stdin>:2:5: invalid syntax", "    'é' )"]
+        assert done.stdout.splitlines()[:2] == ["<stdin>:2:5: CL201 invalid syntax", "    'é' )"]
 
 
 class TestEndings:
@@ -208,6 +229,25 @@ class TestEndings:
             process = start_cli("a.py", stdout=full)
             _, stderr = process.communicate(timeout=30)
         assert (process.returncode, stderr) == (2, b"codeloom: [Errno 28] No space left on device\n")
+
+    @pytest.mark.skipif(
+        "ASAN_OPTIONS" in os.environ, reason="the sanitizer ends a process that runs out of memory"
+    )
+    def test_out_of_memory(self, write_files, tmp_path, cli_environment):
+        write_files({"a.py": "x = 1\n" * 10_000_000})
+        command = f"ulimit -v 400000; exec {sys.executable} -m codeloom check a.py"
+        done = subprocess.run(
+            ["sh", "-c", command], capture_output=True, text=True, cwd=tmp_path, env=cli_environment
+        )
+        assert (done.returncode, done.stdout) == (2, "")
+        assert done.stderr.startswith("codeloom: out of memory") and done.stderr.count("\n") == 1
+
+    def test_an_ascii_terminal(self, write_files, start_cli, cli_environment):
+        write_files({"a.py": "é = '日' )\n"})
+        cli_environment["PYTHONIOENCODING"] = "ascii"
+        stdout, _ = start_cli("a.py").communicate(timeout=30)
+        _, row, caret, _ = stdout.decode("ascii").splitlines()
+        assert row[caret.index("^")] == ")" and row.strip().startswith("\\xe9 = '\\u65e5'")
 
     @pytest.mark.parametrize(("no_colour", "coloured"), [(None, True), ("", True), ("1", False)])
     def test_colour_on_a_terminal(self, write_files, start_cli, cli_environment, no_colour, coloured):

@@ -1,7 +1,6 @@
 """Lines of great depth and length, read in a thread with a small stack."""
 
 import sys
-import threading
 
 import pytest
 
@@ -17,30 +16,6 @@ VERSION = (3, 12, 0)
 DEPTH = 10_000
 ANALYZER = CPGenAnalyzerImpl(VERSION)
 DRIVER = CPGenParserImpl(VERSION)
-
-
-@pytest.fixture
-def in_small_thread():
-    """Calls a function in a thread of 256 KiB, and gives its result or raises its exception."""
-
-    def Call(function):
-        def Run():
-            try:
-                outcome.append(function())
-            except BaseException as error:
-                failure.append(error)
-
-        outcome, failure = [], []
-        thread = threading.Thread(target=Run)
-        thread.start()
-        thread.join()
-        if failure:
-            raise failure[0]
-        return outcome[0]
-
-    old_size = threading.stack_size(256 * 1024)
-    yield Call
-    threading.stack_size(old_size)
 
 
 def Analyze(text):
@@ -93,6 +68,15 @@ def test_deep_and_long_lines(in_small_thread, capsys, head, open_, middle, close
     assert error.offset >= len(text) or text.endswith(": pass")  # places in a body count from its start
     printed = capsys.readouterr().out.splitlines()
     assert all(line.startswith(("RuntimeError raised", "depth too great")) for line in printed)
+
+
+def test_nested_strings_need_no_stack(in_small_thread):
+    def Fields(logicals):
+        return sum(1 + Fields(logical.GetExpLogicals()) for logical in logicals) if logicals else 0
+
+    for depth in (160, 161):
+        text = "f'{" * depth + "x" + "}'" * depth
+        assert Fields(in_small_thread(lambda text=text: GetLogicalsFromText(text), kib=64)) == 161
 
 
 def test_recursion_ends_before_the_stack_does(in_small_thread):

@@ -12,8 +12,6 @@ from codeloom.treesift import (
     CNameLiteral,
     CNode,
     COperatorExpression,
-    CPower,
-    CTestListStarExpr,
     CTrailer,
     CYieldArg,
     CYieldExpr,
@@ -109,19 +107,6 @@ def test_await_is_a_prefix_before_anything_but_a_trailer():
         assert len(node.GetTrailers()) == count
 
 
-def test_a_power_asks_the_chain_in_it():
-    class Chain(CAtomExpr):
-        def GetAtom(self):
-            return Name("overridden")
-
-        def GetTrailers(self):
-            return []
-
-    chain = Node(Chain, Name("a"), Node(CTrailer, Leaf("."), Name("b")))
-    power = Node(CPower, chain, Leaf("**"), Name("c"))
-    assert Tokens(power.GetAtom()) == "overridden" and power.GetTrailers() == []
-
-
 def test_clauses_in_both_asynchronous_shapes():
     words = ["for", "x", "in", "y", "if"]
     clause = [Keyword(words[0]), Name("x"), Keyword("in"), Name("y"), Name("next")]
@@ -160,20 +145,3 @@ def test_bottomless_trees_end():
     for ask in [*asks, lambda: brackets.GetSubExpr(0)]:
         with pytest.raises(RecursionError):
             ask()
-
-
-def test_overrides_answer_for_their_node_wherever_it_stands():
-    class List(CTestListStarExpr):
-        def GetSubExprCount(self):
-            return 7
-
-        def GetSubExpr(self, i):
-            return Name(f"item {i}")
-
-    atom = Node(CAtom, Leaf("("), Node(List), Leaf(")"))
-    assert atom.GetSubExprCount() == 7 and atom.GetSubExpr(3).fText == "item 3"
-    List.GetSubExpr = lambda self, i: 5
-    with pytest.raises(TypeError, match=r"List\.GetSubExpr must return CExpression, not int"):
-        atom.GetSubExpr(3)
-    del List.GetSubExprCount
-    assert atom.GetSubExprCount() == 0 and atom.GetSubExpr(3) is None

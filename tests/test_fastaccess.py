@@ -40,6 +40,18 @@ def Hits(text, to_find, start=0, end=None) -> list[int]:
     return hits
 
 
+def test_the_search_as_two_functions(module):
+    search = CNonNestedSearch()
+    assert module.InitNonNestedStruct(search, "f(a=1), b=2", b"=", 0, 11) == 0
+    assert [module.FindNextNonNestedStruct(search) for _ in range(3)] == [9, -1, -1]
+    assert module.InitNonNestedStruct(search, None, b"=", 0, 5) == 0
+    assert module.FindNextNonNestedStruct(search) == -1
+    with pytest.raises(AssertionError):
+        module.InitNonNestedStruct(search, b"a", b"=", 0, 5)
+    with pytest.raises(TypeError):
+        module.InitNonNestedStruct(search, 1, b"=", 0, 1)
+
+
 def StringEnd(text: bytes, quote_i: int) -> int:
     quote = text[quote_i : quote_i + 1]
     if text[quote_i : quote_i + 3] == quote * 3:

@@ -14,8 +14,8 @@ from pathlib import Path
 import pytest
 from golden import Cases, Check
 
-from codeloom.languages import LanguageNamed
 from codeloom.logicalinspect import TextFromTokens
+from codeloom.reading.languages import language_named
 from codeloom.records import FormatRecord, ParseRecord, RecordsOfLogical, kRecordKinds
 from codeloom.treesift import CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
@@ -24,7 +24,7 @@ CASES = Cases(Path(__file__).parent / "records", ".records")
 
 
 def Analyzer(version):
-    language = LanguageNamed(version)
+    language = language_named(version)
     return CPGenAnalyzerImpl(
         language.version_triple, language.grammar_file, language.keywords, language.is_py3
     )

@@ -14,17 +14,20 @@ import pytest
 from golden import Cases, Check
 from test_library import LibraryTexts
 
+from codeloom import analyze, analyze_file
 from codeloom.cli.console import Console
 from codeloom.cli.hints import TextFormat
-from codeloom.signatures import Argument, SignaturesInFile, SignaturesInText, Value
+from codeloom.signatures import Argument, Value, signatures_of
+
+
+def Signatures(text, python="3.12"):
+    return signatures_of(analyze(text, python=python))
 
 
 def Printed(source):
     stream = StringIO()
     with redirect_stdout(stream):
-        text_format = TextFormat(Console())
-        for signature in SignaturesInText(source, "3.12"):
-            text_format.Add(signature)
+        TextFormat(Console()).add(analyze(source, python="3.12"))
     return f"---\n{stream.getvalue()}".replace("<string>:", "").rstrip("\n")
 
 
@@ -57,7 +60,7 @@ def Def(signature):
 def test_signatures_are_those_of_the_interpreter(seed):
     for path, text, tree in LibraryTexts(80, seed):
         if "# type:" not in text:
-            signatures = SignaturesInText(text)
+            signatures = Signatures(text)
             ours = {Def(signature) for signature in signatures if signature.problem is None}
             theirs = {*DefsByTree(tree)}
             assert ours <= theirs and len(theirs) <= len(signatures), (seed, path)
@@ -66,31 +69,47 @@ def test_signatures_are_those_of_the_interpreter(seed):
 def test_an_api_of_values(tmp_path):
     path = tmp_path / "a.py"
     path.write_text("class A:\n  def f(self, a: int = 1): return 2\n  def g(self):\n    return b\n")
-    f, g = SignaturesInFile(path)
+    f, g = signatures_of(analyze_file(path))
     assert (f.path, f.row, f.column, f.name) == (str(path), 2, 3, "A.f")
     assert f.arguments == (Argument("self"), Argument("a", "", "int", Value(2, "int", "1")))
     assert (f.returns, g.returns) == ((), (Value(4, None, "b"),))
     with pytest.raises(FileNotFoundError):
-        SignaturesInFile(tmp_path / "absent.py")
+        analyze_file(tmp_path / "absent.py")
 
 
 def test_depth():
     text = "[" * 20_000 + "]" * 20_000
-    (signature,) = SignaturesInText(f"def f(a={text}): pass")
+    (signature,) = Signatures(f"def f(a={text}): pass")
     assert signature.arguments[0].default.text == text
-    (signature,) = SignaturesInText(f"def f({'(' * 20_000}a,{')' * 20_000}): pass", "2.7")
-    assert signature.problem.message == "the parameters are nested too deep"
+    (signature,) = Signatures(f"def f({'(' * 20_000}a,{')' * 20_000}): pass", "2.7")
+    assert signature.arguments is None
+
+
+def test_what_a_signature_is_written_as():
+    """Defaults as they stand, hints in quotes by their value; a comment must fit the arguments."""
+    (f,) = Signatures("def f(a=('==', '<'), b: \"Literal['\\\\n']\" = 'x'): pass")
+    assert [argument.default.text for argument in f.arguments] == ["('==', '<')", "'x'"]
+    assert f.arguments[1].hint == "Literal['\\n']"
+    text = "class A:\n  def f(self, a, b):\n    # type: ({}) -> c\n    pass\n"
+    for hints, found in [
+        ("x, y", [None, "x", "y"]),
+        ("s, x, y", ["s", "x", "y"]),
+        ("x", [None, None, None]),
+        ("s, x, y, z", [None, None, None]),
+    ]:
+        (signature,) = Signatures(text.format(hints))
+        assert [argument.hint for argument in signature.arguments] == found
 
 
 @pytest.mark.parametrize(
     ("arguments", "status", "rows"),
     [
         (["a.py"], 0, ["a.py:1:1: def f(a)", "    a      int", "    gives  int 1"]),
-        (["b.py", "a.py"], 1, ["b.py:1:9: invalid syntax", "    def f(a b): pass"]),
-        (["absent.py", "b.py"], 2, ["b.py:1:9: invalid syntax"]),
+        (["b.py", "a.py"], 1, ["b.py:1:9: CL201 invalid syntax", "    def f(a b): pass"]),
+        (["absent.py", "b.py"], 2, ["b.py:1:9: CL201 invalid syntax"]),
         (["--python", "2.7", "old.py"], 0, ["old.py:1:1: def f(a, b, c)", "    a  = 1, int"]),
         (["c.py"], 0, ["c.py:1:1: def f(a)"]),
-        (["--false-hints", "c.py"], 1, ["c.py:1:20: invalid syntax"]),
+        (["--false-hints", "c.py"], 1, ["c.py:1:20: CL601 invalid syntax"]),
     ],
 )
 def test_the_command(run_cli, write_files, arguments, status, rows):

@@ -1,53 +1,14 @@
 """Import statements as records."""
 
 import pytest
-from hand_made import Leaf, Node, Parse
+from hand_made import Leaf, Node
 
 from codeloom import treesift
-from codeloom.treesift import CAsName, CFromImportStmt, CImportNamesStmt, CNameLiteral, CNode
+from codeloom.treesift import CAsName, CFromImportStmt, CImportNamesStmt, CNode
 
 
 def Names(node):
     return [(name.module_name, name.as_name) for name in node.GetAsNameList()]
-
-
-@pytest.mark.parametrize("version", ["3.8", "2.7"])
-@pytest.mark.parametrize(
-    ("source", "names"),
-    [
-        ("import a", [("a", None)]),
-        ("import a.b as c", [("a.b", "c")]),
-        ("import a, b . c as d", [("a", None), ("b.c", "d")]),
-    ],
-)
-def test_import(source, names, version):
-    node = Parse(source, version)
-    assert type(node) is CImportNamesStmt and Names(node) == names
-
-
-@pytest.mark.parametrize("version", ["3.8", "2.7"])
-@pytest.mark.parametrize(
-    ("source", "module", "names"),
-    [
-        ("from a import (b, c,)", "a", [("b", None), ("c", None)]),
-        ("from . import b", ".", [("b", None)]),
-        ("from .a.b import c", ".a.b", [("c", None)]),
-        ("from ....a import b", "....a", [("b", None)]),
-        ("from a import b as c", "a", [("b", "c")]),
-        ("from é import ü as ö", "é", [("ü", "ö")]),
-    ],
-)
-def test_from_import(source, module, names, version):
-    if version == "2.7" and not source.isascii():
-        pytest.skip("names are ASCII there")
-    node = Parse(source, version)
-    assert type(node) is CFromImportStmt and not node.GetImportStar()
-    assert (node.GetFromString(), Names(node)) == (module, names)
-
-
-def test_star():
-    node = Parse("from a.b import *")
-    assert node.GetImportStar() and Names(node) == [("*", None)]
 
 
 def test_statements_are_no_cstmt():
@@ -96,13 +57,3 @@ def test_records_are_open():
         name.module_name = 1
     name.module_name = None
     assert name.module_name is None
-
-
-def test_overrides_are_asked():
-    class FromImport(CFromImportStmt):
-        def _GetImportIndex(self):
-            return 3
-
-    children = [Leaf(text, cls=CNameLiteral) for text in ("from", "a", "import", "import", "b")]
-    node = Node(FromImport, *children)
-    assert (node.GetFromString(), Names(node)) == ("aimport", [("b", None)])

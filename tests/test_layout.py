@@ -7,6 +7,15 @@ SOURCES = Path(__file__).parent.parent / "src"
 
 # Each folder may include those of its own step and of the steps before it.
 STEPS = [
+    ["text"],
+    ["tokenizer"],
+    ["grammar"],
+    ["syntax"],
+    ["names"],
+    ["typing"],
+    ["line"],
+    ["rules"],
+    ["file"],
     ["host"],
     ["neighbours", "strutils", "_fastaccess", "symbolinfo"],
     ["tree"],
@@ -15,6 +24,7 @@ STEPS = [
     ["hints"],
     ["analysis"],
     ["newer"],
+    ["face"],
 ]
 STEP_OF = {folder: step for step, folders in enumerate(STEPS) for folder in folders}
 

@@ -127,15 +127,36 @@ except ImportError as error:
 def test_a_failing_constant_stops_the_load():
     code = """
 import codeloom.symbolinfo
-def GetInstanceNameForClass(cls_name):
-    raise LookupError(cls_name)
-codeloom.symbolinfo.GetInstanceNameForClass = GetInstanceNameForClass
+def EnsureScopeNameIndicies(scope):
+    raise LookupError(scope)
+codeloom.symbolinfo.EnsureScopeNameIndicies = EnsureScopeNameIndicies
 try:
     import codeloom.treesift
 except LookupError as error:
     print(error)
 """
-    assert RunPython(code) == "list#0\n"
+    assert RunPython(code) == "list\n"
+
+
+@pytest.mark.parametrize(
+    ("name", "value", "wanted"),
+    [
+        ("kSetPrefix", "b':x:'", "b':s:'"),
+        ("kIterationSubscript", "b'[]'", "b'[*]'"),
+        ("kPrefixLen", "4", "3"),
+        ("JoinTokens", "b' '.join", "that of codeloom._neighbours"),
+    ],
+)
+def test_another_vocabulary_is_refused(name, value, wanted):
+    code = f"""
+import codeloom.symbolinfo
+codeloom.symbolinfo.{name} = {value}
+try:
+    import codeloom.treesift
+except ImportError as error:
+    print(error)
+"""
+    assert RunPython(code).endswith(f"another vocabulary: codeloom.symbolinfo.{name} must be {wanted}\n")
 
 
 def test_loading_leaves_no_traces():
@@ -161,6 +182,15 @@ def test_no_object_changes_its_class():
         if not issubclass(cls, BaseException):
             with pytest.raises(AttributeError, match="__class__"):
                 cls.__new__(cls).__class__ = cls
+
+
+@pytest.mark.parametrize("name", ["treesift", "_neighbours"])
+@pytest.mark.parametrize("first", ["", "import codeloom.treesift, codeloom._neighbours"])
+def test_a_subinterpreter_is_refused(name, first):
+    inside = f"try: import codeloom.{name}\nexcept ImportError as error: print(error, flush=True)"
+    code = f"{first}\nimport _xxsubinterpreters as sub\nsub.run_string(sub.create(), {inside!r})"
+    printed = RunPython(code)
+    assert printed.startswith("codeloom.") and "can't be loaded in a subinterpreter" in printed
 
 
 def test_the_stubs_are_up_to_date():

@@ -1,5 +1,7 @@
 """The node base class, the factory and the free lists."""
 
+import io
+import sys
 from types import SimpleNamespace
 
 import pytest
@@ -205,8 +207,55 @@ def test_odd_trees_of_the_host_end():
     node = factory.NewNode(Info(factory), 0, None, 0, children)
     children += [node, node, CNode()]
     FinishedWithNode(node)  # contains itself
-    FinishedWithNode(node)  # and is given back twice
     assert factory.NewNode(Info(factory), 0, None, 0, None) is node
+
+
+def test_a_tree_that_is_given_back_twice_is_free_once():
+    driver = CPGenParserImpl((3, 11, 0))
+    (logical,) = GetLogicalsFromText("a = b + c")
+    tree = driver.ParseToNode(logical)
+    driver.DiscardNode(tree)
+    driver.DiscardNode(tree)
+    assert driver.ParseToNode(logical) is not driver.ParseToNode(logical)
+
+
+@pytest.mark.parametrize("place", ["text", "context"])
+def test_host_code_that_runs_while_a_tree_is_given_back(place):
+    """It finds on the free list what nothing is left of, and may do what it likes with it."""
+
+    class Dropped(str):
+        def __del__(self):
+            FinishedWithNode(root)
+            taken.append(factory.NewNode(Info(factory), EXPR, None, 0, [Leaf("b", factory), CNode()]))
+            FinishedWithNode(taken[-1])
+
+    taken = []
+    factory = MakeFactory()
+    root = factory.NewNode(Info(factory), EXPR, None, 0, [])
+    dropped = {place: Dropped("x")}
+    leaves = [factory.NewNameNode(dropped.get("text", "x"), dropped.get("context", 0)) for _ in range(3)]
+    root.fChildren.extend(leaves)
+    del leaves, dropped
+    FinishedWithNode(root)
+    assert len(taken) == 1
+    assert FreeNodes(Info(factory)) == [root] and len(FreeNodes(Info(factory, NAME))) == 3
+
+
+def test_host_code_that_runs_while_it_is_told_that_a_tree_is_too_deep(monkeypatch):
+    class Output(io.StringIO):
+        def write(self, text):
+            taken.append([factory.NewNode(Info(factory), EXPR, None, 0, None) for _ in range(200)])
+            return len(text)
+
+    taken = []
+    factory = MakeFactory()
+    tree = Chain(factory, 110)
+    monkeypatch.setattr(sys, "stdout", Output())
+    FinishedWithNode(tree)
+    monkeypatch.undo()
+    nodes = {id(node) for nodes in taken for node in nodes}
+    assert tree in taken[0] and len(nodes) == sum(map(len, taken))
+    assert all(node.fChildren is node.fText is None for nodes in taken for node in nodes)
 
 
 def test_recursive_convert():

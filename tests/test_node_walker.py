@@ -14,16 +14,19 @@ from hand_made import DRIVERS, Leaf, Node
 from codeloom.records import FormatRecord, RecordsOfLogical
 from codeloom.treesift import (
     CArgInfo,
+    CAsName,
     CAtom,
     CAtomExpr,
     CClassArgumentPatternNode,
     CExprStmt,
     CFactorExpr,
     CForStmt,
+    CImportNamesStmt,
     CNameLiteral,
     CNode,
     CNodeToTextConverterImpl,
     CNodeWalker,
+    CNumberLiteral,
     COperatorExpression,
     CPower,
     CSingleUsedArgumentNode,
@@ -334,6 +337,60 @@ def test_a_tree_that_changes_below_the_walk():
                 open_nodes.extend(children)
         with suppress(*HOST_ERRORS):
             Walker(VERSION).Walk(node, logical)
+
+
+def test_an_operator_that_answers_differently_each_time():
+    class Factor(CFactorExpr):
+        def GetUnaryOperator(self):
+            return answers.pop(0)
+
+    class Number(CNumberLiteral):
+        def IsFloat(self):
+            node.fChildren.clear()
+            return True
+
+    answers = ["-", None, None]
+    node = Node(Factor, Leaf("-"), Leaf("1", cls=Number))
+    assert CNodeWalker(VERSION)._TypeEquivForNode(node) == b":l:float: -1"
+    assert answers == [None, None]
+
+
+def test_an_imported_name_that_goes_while_it_is_recorded():
+    class Import(CImportNamesStmt):
+        def GetAsNameList(self):
+            name = CAsName()
+            name.module_name, name.as_name = "a.b", "c"
+            names.append(name)
+            return names
+
+    class Walker(CNodeWalker):
+        def _AddNameDefined(self, name):
+            super()._AddNameDefined(name)
+            names.clear()
+
+    names = []
+    _, logical = Tree("import a")
+    Walker(VERSION).Walk(Node(Import), logical)
+    assert [FormatRecord(record) for record in RecordsOfLogical(logical)] == [
+        "set  c",
+        "import c  a.b",
+        "as   c  c",
+    ]
+
+
+def test_a_chain_that_is_visited_again_while_its_text_is_made():
+    class Trailer(CTrailer):
+        def GetInitialToken(self):
+            if walker.visits < 5:
+                walker.visits += 1
+                walker._VisitNameLiteral(name, name, trailers, 0)
+            return super().GetInitialToken()
+
+    walker = type("Walker", (CNodeWalker,), {"visits": 0})(VERSION)
+    name, *attributes = (Leaf(text, cls=CNameLiteral) for text in "abc")
+    trailers = [Node(Trailer, Leaf("."), attribute) for attribute in attributes]
+    walker._VisitAtomPlusTrailers(name, trailers)
+    assert Analyzed(walker, "d") == [["get  a", "get  a.b", "get  a.b.c", "get  d"]]
 
 
 def test_names_of_an_odd_kind():

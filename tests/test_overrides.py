@@ -1,20 +1,37 @@
 """Host subclasses: overrides are honoured wherever native code calls an operation; super() is the base."""
 
 import gc
+import io
+import random
+import sys
 import weakref
+from contextlib import redirect_stdout, suppress
 from types import SimpleNamespace
 
 import pytest
+from hand_made import Leaf, Node
+from odd_hosts import OddHost
 
+from codeloom import treesift
 from codeloom.logicalline import CLogicalLine, kAssignment, kComment
+from codeloom.optpgen import ParseError
 from codeloom.treesift import (
+    CAtomExpr,
+    CExceptClause,
+    CMatchCaseStatementParser,
     CNameLiteral,
     CNode,
     CNodeFactory,
+    CNodeToTextConverterImpl,
     CNodeWalker,
+    CNumberLiteral,
     CPGenAnalyzer,
     CPGenAnalyzerImpl,
     CPGenParserImpl,
+    CSingleUsedArgumentNode,
+    CTestListStarExpr,
+    CTrailer,
+    GetUsedArgInfoList,
 )
 from codeloom.utils import GetLogicalsFromText
 
@@ -95,6 +112,32 @@ def test_a_subclass_without_the_base_constructor():
         Driver().ParseToNode(Logical("x"), False)
 
 
+@pytest.mark.parametrize(
+    ("cls", "arguments"),
+    [
+        (treesift.CPGenAnalyzer, ()),
+        (treesift.CPGenAnalyzerImpl, ()),
+        (treesift.CPGenParserImpl, ()),
+        (treesift.CNewerAnalyzer, (VERSION,)),
+        (treesift.CNewerParser, (VERSION,)),
+        (treesift.CNewerMatchCaseParser, (None,)),
+        (treesift.CTypeHintWalker, (None,)),
+        (treesift.CNodeToTextConverterImpl, ()),
+        (CNameLiteral, ()),
+    ],
+)
+def test_the_constructor_of_a_base_makes_no_derived_class(cls, arguments):
+    base = cls.__base__
+
+    class Derived(cls):
+        def __init__(self):
+            base.__init__(self, *arguments)
+
+    for make in (Derived, lambda: base.__init__(cls.__new__(cls), *arguments)):
+        with pytest.raises(TypeError, match=rf"^{base.__name__}\.__init__ can't make .*{cls.__name__}"):
+            make()
+
+
 def test_the_driver_calls_its_overrides():
     calls, converted = [], []
 
@@ -134,6 +177,50 @@ def test_what_an_override_returns():
     assert type(driver.ParseToNode(Logical("x"), False)) is CNode
 
 
+EXTREMES = [sys.maxsize, -sys.maxsize - 1, 0]
+
+
+@pytest.mark.parametrize("start", EXTREMES)
+@pytest.mark.parametrize("end", EXTREMES)
+def test_indexes_beyond_all_tokens(start, end):
+    def Try(operation, *arguments):
+        with suppress(IndexError, TypeError, ValueError, SyntaxError, ParseError):
+            operation(*arguments)
+
+    class Parser(treesift.CNewerMatchCaseParser):
+        def _ParseCaseStmtImpl(self):
+            for kind in ("Pattern", "ClassPattern", "DottedNameValue", "NumberPattern", "SequencePattern"):
+                Try(getattr(self, f"_NodeFor{kind}"), start, end)
+            Try(self._NodeForMappingPattern, start, end)
+            Try(self._NonNestedFindTokenIndex, ",", start, end)
+
+    class Walker(treesift.CTypeHintWalker):
+        def _GetRowRange(self, node):
+            return start, end
+
+    class Statement(treesift.CExprStmt):
+        def GetEqualCount(self):
+            return start
+
+    driver = treesift.CNewerParser(VERSION)
+    logical = Logical("case [A(x), *y]:  # type: int")
+    toks, places = logical.fToks, logical.fPositions
+    Parser(driver).ParseCaseStmt(toks, places)
+    Try(driver._NodesForTypeParameters, toks, False, places, start, end, True)
+    Try(driver._CreateSingleTypeParameterNode, toks, False, places, start, end, True)
+    Try(driver._NonNestedFindTokenIndex, ",", toks, start, end)
+    for operation in ("ParenthesizedWith", "ExceptStar", "WithTypeParameter"):
+        Try(getattr(driver, f"_ParseSpecialCase{operation}"), toks, False, places, start)
+    Try(driver._FindNextNonSkipIndex, toks, start)
+    Try(driver._ShouldSkipSlash, start, places)
+    Try(logical.GetTokenType, start)
+    Walker(VERSION, treesift.kPy3DefaultGrammar, None).Walk(
+        Node(treesift.CForStmt, *map(Leaf, "ab")), logical, False
+    )
+    Try(CNodeWalker(VERSION)._VisitAssignment, Node(Statement, Leaf("a")))
+    Try(treesift.CNewerParser, (2**31 - 1, 2**31 - 1))
+
+
 def test_host_node_classes_are_made_and_asked():
     class Name(CNameLiteral):
         pass
@@ -163,6 +250,163 @@ def test_factory_overrides_reach_native_callers():
     assert seen == ["a", "if", "+", "b"]
 
 
+def Recording(base, *operations):
+    """A subclass of `base`, and the list of those of its operations that are called."""
+    calls = []
+
+    def Override(name):
+        def Operation(self, *arguments):
+            calls.append(name)
+            return getattr(base, name)(self, *arguments)
+
+        return Operation
+
+    return type(base.__name__, (base,), {name: Override(name) for name in operations}), calls
+
+
+def Tree(source, **classes):
+    """The tree of a line, with a host's node classes in place of those of the same name."""
+
+    class Driver(CPGenParserImpl):
+        def _BuildClsForStateList(self):
+            return [classes.get(getattr(cls, "__name__", ""), cls) for cls in super()._BuildClsForStateList()]
+
+    return Driver(VERSION).ParseToNode(Logical(source), False)
+
+
+def test_parts_are_asked_for_in_order():
+    chain, calls = Recording(CAtomExpr, "GetAtom", "GetTrailers")
+    tree = Tree("a.b", CAtomExpr=chain)
+    assert CNodeToTextConverterImpl().TextForNode(tree) == b"a.b"
+    assert calls == ["GetAtom", "GetTrailers"]
+
+    argument, calls = Recording(CSingleUsedArgumentNode, "GetPrefix", "GetName", "GetValue")
+    tree = Tree("f(a, b=1)", CSingleUsedArgumentNode=argument)
+    GetUsedArgInfoList(tree.GetTrailers()[0].GetNestedNode())
+    assert calls == ["GetPrefix", "GetName", "GetValue"]
+
+    items, calls = Recording(CTestListStarExpr, "GetSubExprCount")
+    assert len(Tree("del a, b", CTestListStarExpr=items).GetExpressions()) == 2
+    assert calls == ["GetSubExprCount"]
+
+
+def test_names_reach_operations_as_the_texts_that_they_are():
+    class Walker(CNodeWalker):
+        def _AddTypeEquiv(self, name, equiv):
+            names.append(name)
+
+        def _AddNodeInfoStr(self, name_node, istr):
+            names.append(istr)
+
+    names = []
+    walker = Walker(VERSION)
+    for source in ("return 1", "(yield)", "yield 1", "from m import *", "except A as e: pass"):
+        walker.Walk(Tree(source), Logical(source))
+    assert names == ["return", "yield", "*", b"e", "A:", "A"]
+
+
+def test_accessors_ask_the_overrides_of_what_they_read():
+    class Trailer(CTrailer):
+        def GetChildCount(self):
+            return super().GetChildCount() + self.more
+
+        def GetChildText(self, child_i):
+            return self.texts.get(child_i) or super().GetChildText(child_i)
+
+    Trailer.more, Trailer.texts = 0, {}
+    dot, call = Tree("a.b(c)", CTrailer=Trailer).GetTrailers()
+    assert dot.GetDotName() == "b" and call.GetNestedNode().fText == "c"
+    Trailer.more = 1
+    assert dot.GetDotName() is None and call.GetNestedNode() is None
+    Trailer.more, Trailer.texts = 0, {0: "["}
+    assert dot.GetDotName() is None and call.GetNestedNode().fText == "c"
+    assert call.GetInitialToken() == "("  # the text of the child itself
+
+    class Except(CExceptClause):
+        def GetChild(self, child_i):
+            asked.append(child_i)
+            return super().GetChild(0)
+
+        def GetChildCount(self):
+            return 2**62
+
+    asked = []
+    clause = Tree("except A as b: pass", CExceptClause=Except).fChildren[3]
+    assert clause.GetExceptionType().fText == "except" and clause.GetTarget() is None and asked == [1]
+
+
+def test_each_of_adjacent_strings_is_converted():
+    converter, calls = Recording(CNodeToTextConverterImpl, "_TextForStringLiteral")
+    assert converter().TextForNode(Tree("b'a' 'b' 'c'")) == b"''"
+    assert len(calls) == 3
+
+
+@pytest.mark.parametrize(
+    "pattern, order",
+    [
+        ("(a)", [2, 1, 3]),
+        ("[a]", [1, 2, 3]),
+        ("-1 + x", [1, 2, 3]),
+        ("a.b.", [1, 2, 3]),
+        ("a as b", [1, 2, 3]),
+    ],
+)
+def test_tokens_of_a_pattern_are_made_in_order(pattern, order):
+    class Parser(CMatchCaseStatementParser):
+        def _TokNode(self, tok_i):
+            made.append(tok_i)
+            return super()._TokNode(tok_i)
+
+    made = []
+    logical = Logical(f"case {pattern}:")
+    with suppress(ParseError):
+        Parser(CPGenParserImpl(VERSION)).ParseCaseStmt(logical.fToks, logical.fPositions)
+    assert made[:3] == order
+
+
+class Undecided:
+    def __bool__(self):
+        raise ArithmeticError
+
+
+def test_truth_values_stand_for_booleans():
+    logical = Logical("async with a: pass")
+    for py3_grammar in (0, None):
+        analyzer = CPGenAnalyzerImpl(VERSION, "Python-Grammar-2.7", py3_grammar=py3_grammar)
+        assert analyzer.ParseTokenListToNode(["x", "[", "...", "]"], None) is not None
+    for analyzer in (CPGenAnalyzerImpl((3, 6)), CPGenParserImpl((3, 6))):
+        assert analyzer.ParseToNode(logical, 1) is not None
+        with pytest.raises(ParseError):
+            analyzer.ParseToNode(logical, None)
+        with pytest.raises(ArithmeticError):
+            analyzer.ParseToNode(logical, Undecided())
+    assert CNodeToTextConverterImpl(1).TextForNode(Tree("(a)"), discard_simple_parens=[]) == b"(a)"
+    walker = CNodeWalker(VERSION)
+    walker._fPy3 = 0
+    assert walker._fPy3 is False
+    with pytest.raises(ArithmeticError):
+        walker._fPy3 = Undecided()
+
+
+def test_truth_values_that_overrides_give():
+    class Number(CNumberLiteral):
+        def IsFloat(self):
+            return self.answer
+
+    tree = Tree("-1", CNumberLiteral=Number)
+    walker = CNodeWalker(VERSION)
+    for Number.answer, equiv in ((None, b":l:int: -1"), ("a", b":l:float: -1")):
+        assert walker._TypeEquivForNode(tree) == equiv
+    Number.answer = Undecided()
+    with pytest.raises(ArithmeticError):
+        walker._TypeEquivForNode(tree)
+
+
+def test_no_tree_to_give_back():
+    with pytest.raises(AttributeError, match="fClsInfo"):
+        CPGenParserImpl(VERSION).DiscardNode(None)
+
+
 def test_a_logical_of_the_host():
     class Logical(CLogicalLine):
         def ClearDerivedInfo(self):
@@ -179,6 +423,17 @@ def test_a_logical_of_the_host():
     assert calls == [True, "clear"] and logical.fParsed
 
 
+@pytest.mark.parametrize("change", ["ClearDerivedInfo", "AppendTypeEquiv"])
+def test_records_may_change_while_their_list_is_made(change, at_a_collection):
+    logical = Logical("x")
+    for i in range(3000):
+        logical.AppendTypeEquiv(b"%d" % i, b"y")
+    arguments = (b"z", b"z") if change == "AppendTypeEquiv" else ()
+    with at_a_collection(lambda: getattr(logical, change)(*arguments)):
+        records = logical.fTypeEquivs
+    assert records[:3000] == [(b"%d" % i, b"y") for i in range(3000)]
+
+
 def test_a_host_analyzer():
     class Analyzer(CPGenAnalyzer):
         def AnalyzeSingleLogical(self, logical, in_async_def, first_in_def=False):
@@ -188,6 +443,15 @@ def test_a_host_analyzer():
     assert Analyzer().AnalyzeSingleLogical(logical, True) is logical
     with pytest.raises(NotImplementedError):
         CPGenAnalyzer().AnalyzeSingleLogical(logical, True)
+
+
+def test_odd_hosts_get_exceptions_at_most(seed):
+    odd_host = OddHost(random.Random(seed))
+    text = "def f(a: int = -1, *b) -> c: pass\nx = [a.b(c)[1], *d]  # type: int\nfrom a import b as c"
+    with redirect_stdout(io.StringIO()):
+        for logical in GetLogicalsFromText(text) * 10:
+            odd_host.Analyze(logical)
+    assert CPGenAnalyzerImpl(VERSION).AnalyzeSingleLogical(Logical("x = f(1)"), False) is None
 
 
 def test_everything_is_collected():

@@ -4,7 +4,8 @@ import codecs
 
 import pytest
 
-from codeloom.source import MOST_FAULTY_ROWS, RowMap, SourceFromBytes, SourceFromText
+from codeloom import analyze
+from codeloom.reading.source import MOST_FAULTY_ROWS, source_from_bytes
 
 
 @pytest.mark.parametrize(
@@ -26,9 +27,9 @@ from codeloom.source import MOST_FAULTY_ROWS, RowMap, SourceFromBytes, SourceFro
     ],
 )
 def test_sound_files(data, text):
-    source = SourceFromBytes(data)
-    assert (source.faults, source.spoiled_rows) == ((), frozenset())
-    assert source.text == (text if text is not None else data.decode("cp1252"))
+    analysis = analyze(data)
+    assert not [problem for problem in analysis.problems if problem.code == "CL101"]
+    assert analysis.text == (text if text is not None else data.decode("cp1252"))
 
 
 @pytest.mark.parametrize(
@@ -58,49 +59,59 @@ def test_sound_files(data, text):
     ],
 )
 def test_faulty_files(data, text, faults):
-    source = SourceFromBytes(data)
-    assert source.text == text
-    assert [(fault.row, fault.column) for fault in source.faults] == [fault[:2] for fault in faults]
-    for fault, (_, _, words) in zip(source.faults, faults, strict=True):
-        assert words in fault.message
-        assert any(remedy in fault.message for remedy in ("save", "name", "remove"))
+    analysis = analyze(data)
+    assert analysis.text == text
+    found = [problem for problem in analysis.problems if problem.code == "CL101"]
+    assert [(problem.range.row, problem.range.column) for problem in found] == [fault[:2] for fault in faults]
+    for problem, (_, _, words) in zip(found, faults, strict=True):
+        assert words in problem.message
+        assert any(remedy in problem.message for remedy in ("save", "name", "remove"))
 
 
-def test_spoiled_rows_are_told_even_where_no_fault_is():
-    assert SourceFromBytes(b"# coding: klingon\n\n'\xff'").spoiled_rows == {2}
+def test_a_line_with_unreadable_bytes_is_not_blamed_even_where_no_fault_is():
+    assert [problem.range.row for problem in analyze(b"# coding: klingon\n\nx = ) '\xff'").problems] == [1]
 
 
 def test_a_binary_file_gives_a_short_list():
-    source = SourceFromBytes(b"\xff\0\n" * 1000)
-    assert len(source.faults) == MOST_FAULTY_ROWS
-    assert "980 more rows" in source.faults[-1].message
-    assert len(source.spoiled_rows) == 1000
+    problems = analyze(b"\xff\0\n" * 1000).problems
+    assert len(problems) == MOST_FAULTY_ROWS
+    assert "980 more rows" in problems[-1].message
+
+
+def test_sound_bytes_are_not_copied():
+    data = "é\n".encode() * 10
+    assert source_from_bytes(data).utf8 is data
 
 
 def test_text_of_a_host():
-    assert SourceFromText("x = '\ufffd'").faults == ()
-    source = SourceFromText("é\n'\ud800'\0")
-    assert source.text == "é\n'\ufffd'\ufffd"
-    assert [(fault.row, fault.column) for fault in source.faults] == [(2, 2)]
+    assert not analyze("x = '\ufffd'").problems
+    analysis = analyze("é\n'\ud800'\0")
+    assert analysis.text == "é\n'\ufffd'\ufffd"
+    assert [(problem.range.row, problem.range.column) for problem in analysis.problems] == [(2, 2)]
+
+
+@pytest.mark.parametrize("text", ["\ufeff=", "x = 1\n\ufeff =\n", "x\ufeff = 1\n"])
+def test_a_mark_that_is_no_first_character(text):
+    problems = analyze(text).problems
+    assert len(problems) == 1 and "\ufeff" in problems[0].source_row
+    assert not analyze(codecs.BOM_UTF8 + b"x = 1\n").problems
 
 
 def test_rows_end_at_line_feed_and_carriage_return_only():
-    text = "a\nb\r\nc\rd\x0b\x0c\x1c\x85\u2028\u2029e\n"
-    rows = RowMap(text)
-    assert [rows.Text(row) for row in range(5)] == ["a", "b", "c", text[7:-1], ""]
+    text = "a\nb\r\nc\rd + '\x0b\x0c\x1c\x85\u2028\u2029' e\n"
+    (problem,) = analyze(text).problems
+    assert (problem.range.row, problem.source_row) == (4, text[7:-1])
 
 
-@pytest.mark.parametrize(
-    ("row", "utf8_col", "place"),
-    [
-        (0, 0, (0, 0)),
-        (0, 3, (0, 2)),  # "é" has two bytes
-        (1, 4, (1, 1)),  # and "𝄞" four
-        (1, 5, (1, 2)),  # just behind the row
-        (0, 3 + 2 + 4, (1, 1)),  # on into the row below: "=", CR LF and "𝄞"
-        (2, 0, (2, 0)),
-        (2, 99, (2, 1)),  # behind the text
-    ],
-)
-def test_places(row, utf8_col, place):
-    assert RowMap("é=\r\n𝄞=\rz").Place(row, utf8_col) == place
+@pytest.mark.parametrize("end", ["\n", "\r\n", "\r"])
+@pytest.mark.parametrize("filler", ["a", "é", "日", "𝄞"])
+def test_columns_count_characters(end, filler):
+    """In short rows, and in long ones, which are counted in another way."""
+    for length in (0, 1, 100, 300, 1000):
+        string = f"'{filler * length}'"
+        text = f"x{end}{string} + a){end}y = ]"
+        places = [problem.range for problem in analyze(text).problems]
+        assert [(place.row, place.column, place.end_column) for place in places] == [
+            (2, length + 7, length + 8),
+            (3, 5, 6),
+        ]

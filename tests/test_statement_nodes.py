@@ -13,7 +13,6 @@ from codeloom.treesift import (
     CGlobalStmt,
     CNameLiteral,
     CNode,
-    CParametersNode,
     CTestListStarExpr,
     CTypeParameter,
     CWithItem,
@@ -127,14 +126,3 @@ def test_type_parameters_without_a_statement():
     node = Node(CWithTypeParameters, parameter, None)
     assert node.GetTypeParameters() == [parameter]
     assert node.GetTypeParameterScopedStatement() is None
-
-
-def test_overrides_reach_every_caller():
-    class Funcdef(CFuncdefStmt):
-        def GetParameters(self):
-            return super().GetParameters() or Node(CParametersNode)
-
-    empty = Node(Funcdef, Leaf("def"), Leaf("f"), None)
-    assert type(empty.GetParameters()) is CParametersNode
-    # The base operation stays what it is.
-    assert CFuncdefStmt.GetParameters(empty) is None

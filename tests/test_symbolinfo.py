@@ -171,7 +171,7 @@ def test_a_host_says_where_the_builtins_are():
 
 LITERALS = st.builds(
     "{0}{1}{2}{1}".format,
-    st.sampled_from(["", "r", "R", "b", "B", "u", "U", "br", "Rb", "f", "ur", "x"]),
+    st.sampled_from(["", "r", "R", "b", "B", "u", "U", "br", "Rb", "f", "x"]),
     st.sampled_from(["'", '"', "'''", '"""']),
     st.lists(
         st.sampled_from([*"a\\'\"\n\ré{#\0", "\\x41", "\\u0041", "\\N{EM DASH}", "\\N{DASH}", "\\d", "\r\n"])
@@ -196,6 +196,20 @@ def test_the_value_of_a_literal_is_the_interpreters(text):
     for given_text in (text, text.encode()):
         found = ObjectForStringLiteral(given_text)
         assert (type(found), found) == (type(value), value)
+
+
+@pytest.mark.parametrize(
+    ("text", "value"),
+    [
+        (r"ur'a\d'", r"a\d"),
+        (r"uR'\u0041\U0001F600'", "A\U0001f600"),
+        (r"ur'\\u0041'", r"\\u0041"),
+        (r"""UR"\'\é" """.strip(), r"\'\é"),
+        (r"ur'\u12'", None),
+    ],
+)
+def test_the_value_of_a_raw_text_of_python_2(text, value):
+    assert ObjectForStringLiteral(text) == value
 
 
 def test_what_is_no_literal_has_no_value():

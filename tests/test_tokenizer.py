@@ -1,6 +1,7 @@
-"""Whole texts in the tokenizer: nothing is lost, the interpreter agrees, and a fault stays where it is.
+"""Whole texts in the tokenizer: nothing is lost, and the interpreter agrees.
 
-How single lines are cut is in tokens/, read by test_tokens.py.
+How single lines are cut is in tokens/, read by test_tokens.py; that a fault stays where it is, in
+test_broken_lines.py.
 """
 
 import io
@@ -16,11 +17,9 @@ from hypothesis import given, settings
 from hypothesis import strategies as st
 from test_tokens import CheckPositions
 
-from codeloom._fastaccess import GetTokenType, kTokenId_ERRORTOKEN, kTokenId_STRING
+from codeloom._fastaccess import GetTokenType, kTokenId_ERRORTOKEN
 from codeloom.logicalline import kComment
 from codeloom.utils import GetLogicalsFromText
-
-OPENERS, CLOSERS = tuple("([{"), tuple(")]}")
 
 WORDS = """
 def f class return if else for in lambda async match case type x y é 1 0x1F 10L 1_0 1e5 ( ) [ ] { } , : ; = :=
@@ -133,68 +132,6 @@ def FoundTokens(text):
 def test_the_interpreter_finds_the_same_tokens(seed):
     for text in LibraryTexts(30, seed):
         assert list(FoundTokens(text)) == list(ExpectedTokens(text)), seed
-
-
-class Breaker:
-    """Takes characters out of a sound text, and sees which lines change."""
-
-    def __init__(self, text, seed):
-        self.text = text
-        self.random = random.Random(seed)
-        self.lines = TokenLists(text)
-        starts = [0]
-        for row in text.split("\n"):
-            starts.append(starts[-1] + len(row) + 1)
-        self.tokens = [
-            (line_i, starts[line.fFirstLine + row] + column, token)
-            for line_i, line in enumerate(GetLogicalsFromText(text))
-            for token, (row, column) in zip(line.fToks, line.fPositions, strict=True)
-        ]
-
-    def Places(self, kind):
-        """(line, start, end) of what can be taken out."""
-        for line_i, start, token in self.tokens:
-            end = start + len(token)
-            is_string = GetTokenType(token) == kTokenId_STRING and len(token) > 2
-            is_triple = is_string and token.endswith(('"""', "'''"))
-            if (kind == "opener" and token in OPENERS) or (kind == "closer" and token in CLOSERS):
-                yield line_i, start, end
-            if (kind == "quote" and is_string and not is_triple) or (kind == "triple quotes" and is_triple):
-                yield line_i, end - (3 if is_triple else 1), end
-
-    def IsIsolated(self, kind, fault_count):
-        """True when `fault_count` faults change as many lines and no other; None without so many places."""
-        places = list(self.Places(kind))
-        self.random.shuffle(places)
-        faults = list({line_i: (line_i, start, end) for line_i, start, end in places}.values())[:fault_count]
-        if len(faults) < fault_count:
-            return None
-        text = self.text
-        for _, start, end in sorted(faults, reverse=True):
-            text = text[:start] + text[end:]
-        found = TokenLists(text)
-        broken = {line_i for line_i, _, _ in faults}
-        return len(found) == len(self.lines) and all(
-            found[line_i] == tokens for line_i, tokens in enumerate(self.lines) if line_i not in broken
-        )
-
-
-@pytest.mark.parametrize(
-    ("kind", "fault_count", "share"),
-    [
-        ("closer", 1, 0.97),
-        ("opener", 1, 0.97),
-        ("quote", 1, 0.94),
-        ("closer", 6, 0.95),
-        ("quote", 6, 0.85),
-        ("triple quotes", 1, 0.5),  # whose text is code now and then
-    ],
-)
-def test_a_fault_spoils_its_own_line_only(kind, fault_count, share, seed):
-    breakers = [Breaker(text, seed) for text in LibraryTexts(15, seed)]
-    results = [breaker.IsIsolated(kind, fault_count) for breaker in breakers for _ in range(10)]
-    results = [result for result in results if result is not None]
-    assert sum(results) >= share * len(results), (seed, sum(results), len(results))
 
 
 @pytest.mark.parametrize(

@@ -1,9 +1,6 @@
 """`codeloom tree`: which lines are shown, the three formats, what goes wrong."""
 
 import json
-import os
-import subprocess
-import sys
 
 import pytest
 
@@ -107,21 +104,6 @@ def test_what_cannot_be_read(write_files, run_cli):
     assert Headings(done.stdout)[1].startswith("f.py:2:6: byte 0xE9 can't be read as utf-8")
 
 
-@pytest.mark.parametrize(
-    ("arguments", "words"),
-    [
-        ([], "FILE:ROW -c is required"),
-        (["f.py:1", "-c", "x"], "not allowed with"),
-        (["-c", "x", "--format", "xml"], "invalid choice: 'xml'"),
-        (["-c", "x", "--python", "1.5"], "unknown Python version '1.5'"),
-    ],
-)
-def test_wrong_use(run_cli, arguments, words):
-    done = run_cli("tree", *arguments)
-    assert (done.returncode, done.stdout) == (2, "")
-    assert words in done.stderr and "Traceback" not in done.stderr
-
-
 def test_other_grammars(run_cli):
     assert run_cli("tree", "-c", "print x", "--python", "2.7").stdout.startswith("CNode print_stmt")
     assert run_cli("tree", "-c", "print x").returncode == 1
@@ -188,19 +170,3 @@ def test_deep_trees(run_cli, tree_format):
     done = run_cli("tree", "-", "--format", tree_format, stdin=source)
     assert (done.returncode, done.stderr) == (0, "")
     assert done.stdout.count("CAtom") == depth
-
-
-@pytest.mark.parametrize(("no_colour", "coloured"), [(None, True), ("1", False)])
-def test_colour_on_a_terminal(tmp_path, cli_environment, no_colour, coloured):
-    pty = pytest.importorskip("pty")
-    if no_colour is not None:
-        cli_environment["NO_COLOR"] = no_colour
-    terminal, terminal_of_process = pty.openpty()
-    command = [sys.executable, "-m", "codeloom", "tree", "-c", "x"]
-    process = subprocess.Popen(command, cwd=tmp_path, env=cli_environment, stdout=terminal_of_process)
-    os.close(terminal_of_process)
-    assert process.wait(30) == 0
-    output = os.read(terminal, 65_536).decode()
-    os.close(terminal)
-    plain = "CNameLiteral NAME 'x' @0\r\n"
-    assert (output != plain) == coloured and "CNameLiteral" in output and "'x'" in output

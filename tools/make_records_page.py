@@ -45,7 +45,8 @@ def with_tables(page: str) -> str:
     for name, rows in tables().items():
         block = "\n".join([f"<!-- {name} -->", *rows, "<!-- end -->"])
         pattern = rf"<!-- {name} -->.*?<!-- end -->"
-        page = re.sub(pattern, lambda _, block=block: block, page, count=1, flags=re.DOTALL)
+        before, _, after = re.split(f"({pattern})", page, maxsplit=1, flags=re.DOTALL)
+        page = before + block + after
     return page
 
 

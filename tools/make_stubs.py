@@ -15,7 +15,7 @@ from types import ModuleType
 from nanobind.stubgen import StubGen
 
 PACKAGE = pathlib.Path(__file__).parent.parent / "codeloom"
-NATIVE_MODULES = ("_neighbours", "treesift")
+NATIVE_MODULES = ("_analysis", "_neighbours", "treesift")
 COMPUTING_MODULES = ("_fastaccess", "logicalline", "symbolinfo")
 HEADER = "# Made by tools/make_stubs.py; don't edit.\n"
 # What a container of the host holds where a signature doesn't say.
@@ -24,13 +24,20 @@ ANYTHING = ast.parse("typing.Any", mode="eval").body
 
 
 class _ItemTypes(ast.NodeTransformer):
-    """Gives the containers of annotations the types of their items."""
+    """Gives the containers of annotations the types of their items.
 
-    def visit_Subscript(self, node: ast.Subscript) -> ast.AST:
+    A boolean, which may be any truth value, stays `bool`, as callers and overrides are to read it.
+    """
+
+    def visit_BinOp(self, node: ast.BinOp) -> ast.expr:
+        self.generic_visit(node)
+        return node.left if ast.unparse(node) == "bool | None" else node
+
+    def visit_Subscript(self, node: ast.Subscript) -> ast.expr:
         node.slice = self.visit(node.slice)
         return node
 
-    def visit_Name(self, node: ast.Name) -> ast.AST:
+    def visit_Name(self, node: ast.Name) -> ast.expr:
         items = UNTOLD.get(node.id)
         return node if items is None else ast.parse(f"{node.id}[{items}]", mode="eval").body
 
@@ -55,16 +62,50 @@ class _AnnotationsOnly(ast.NodeTransformer):
             node.returns = self._ResultType(node.returns)
         return node
 
-    def _ResultType(self, node: ast.expr | None) -> ast.AST:
-        is_told = node is not None and ast.unparse(node) != "object"
-        return _ItemTypes().visit(node) if is_told else ANYTHING
+    def _ResultType(self, node: ast.expr | None) -> ast.expr:
+        if node is None or ast.unparse(node) == "object":
+            return ANYTHING
+        known: ast.expr = _ItemTypes().visit(node)
+        return known
+
+
+# What a sequence has without its class saying so, by the type of its items.
+SEQUENCE_METHODS = """
+def __len__(self) -> int: ...
+@typing.overload
+def __getitem__(self, i: typing.SupportsIndex, /) -> {item}: ...
+@typing.overload
+def __getitem__(self, i: slice, /) -> typing.Self: ...
+def __iter__(self) -> collections.abc.Iterator[{item}]: ...
+"""
+
+
+class _KnownBases(ast.NodeTransformer):
+    """Completes classes by what is known of their base: sequences, and enums, whose members need no words."""
+
+    def visit_ClassDef(self, node: ast.ClassDef) -> ast.AST:
+        base = ast.unparse(node.bases[0]) if node.bases else ""
+        if base == "enum.Enum":
+            first, *members = node.body
+            node.body = [first, *(part for part in members if isinstance(part, ast.Assign))]
+        elif base.startswith("Sequence["):
+            item = base.removeprefix("Sequence[").removesuffix("]")
+            known = ast.parse(SEQUENCE_METHODS.format(item=item)).body
+            names = {part.name for part in known if isinstance(part, ast.FunctionDef)}
+            own = [
+                part for part in node.body if not (isinstance(part, ast.FunctionDef) and part.name in names)
+            ]
+            node.body = known + own
+        return node
 
 
 def native_stub(module: ModuleType) -> str:
     generator = StubGen(module=module, include_private=True)
     generator.put(module)
-    tree = _AnnotationsOnly().visit(ast.parse(generator.get()))
-    return HEADER + "import typing\n" + ast.unparse(tree) + "\n"
+    tree = _KnownBases().visit(_AnnotationsOnly().visit(ast.parse(generator.get())))
+    text = ast.unparse(tree) + "\n"
+    needed = [name for name in ("collections.abc", "typing") if f"{name}." in text]
+    return HEADER + "".join(f"import {name}\n" for name in needed) + text
 
 
 def reduced(statement: ast.stmt) -> ast.stmt:
@@ -81,7 +122,7 @@ def computing_stub(module: ModuleType) -> str:
     """The definitions as in the source, and for each value that is computed its type."""
     parts = ast.parse(inspect.getsource(module)).body
     imports = [part for part in parts if isinstance(part, ast.Import | ast.ImportFrom)]
-    definitions = [reduced(part) for part in parts if isinstance(part, ast.FunctionDef | ast.ClassDef)]
+    definitions = [part for part in parts if isinstance(part, ast.FunctionDef | ast.ClassDef)]
     known = {alias.name for part in imports for alias in part.names}
     known |= {part.name for part in definitions}
     values = [
@@ -93,7 +134,7 @@ def computing_stub(module: ModuleType) -> str:
             *map(ast.unparse, imports),
             f"__all__ = {module.__all__!r}",
             *values,
-            *map(ast.unparse, definitions),
+            *(ast.unparse(reduced(part)) for part in definitions),
             "",
         ]
     )

@@ -2,8 +2,7 @@
 
 import pytest
 
-from codeloom.check import Problem
-from codeloom.excerpt import Excerpt
+from codeloom.cli.excerpt import excerpt
 
 
 @pytest.mark.parametrize(
@@ -23,14 +22,14 @@ from codeloom.excerpt import Excerpt
     ],
 )
 def test_rows_that_fit(row, column, shown, caret):
-    assert Excerpt(row, column) == (shown, caret)
+    assert excerpt(row, column) == (shown, caret)
 
 
 @pytest.mark.parametrize("column", [1, 2, 49, 50, 51, 97, 98, 100, 101])
 @pytest.mark.parametrize("unit", ["abcdefghij", "äöü日本\tghij", "日本語日本語日本語日"])
 def test_long_rows_are_cut_around_the_place(unit, column):
     row = unit * 10
-    shown, caret = Excerpt(row, column, width=40)
+    shown, caret = excerpt(row, column, width=40)
     assert _ShownWidth(shown) <= 40 and len(caret) <= 41
     if column <= len(row):
         at_caret = _AtColumn(shown, len(caret) - 1)
@@ -40,14 +39,14 @@ def test_long_rows_are_cut_around_the_place(unit, column):
 
 
 def test_a_row_as_long_as_a_file():
-    shown, caret = Excerpt("x" * 10_000_000 + ")" + "y" * 10_000_000, 10_000_001, width=20)
+    shown, caret = excerpt("x" * 10_000_000 + ")" + "y" * 10_000_000, 10_000_001, width=20)
     assert shown == "...xxxxxxx)yyyyyy..."
     assert caret == "          ^"
 
 
-def test_a_problem_renders_itself():
-    problem = Problem("a.py", 3, 5, "invalid syntax", "\tx y")
-    assert problem.Rendered() == "a.py:3:5: invalid syntax\n    x y\n       ^"
+def test_what_a_terminal_lacks_is_shown_by_its_number():
+    assert excerpt("é )", 3, encoding="ascii") == ("\\xe9 )", "     ^")
+    assert excerpt("é日 )", 4, encoding="latin-1") == ("é\\u65e5 )", "        ^")
 
 
 def _Widths(shown):

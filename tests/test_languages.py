@@ -1,25 +1,21 @@
 """Language versions: what the engine is told of each."""
 
 import keyword
-import sys
 
 import pytest
 
-from codeloom.check import CheckText
-from codeloom.languages import (
-    DEFAULT_LANGUAGE_NAME,
-    LANGUAGE_NAMES,
-    LanguageNamed,
-    UnknownLanguageError,
-)
+from codeloom import NEWEST, VERSIONS, analyze
+from codeloom.reading.languages import language_named
 
 
-def test_the_default_is_this_interpreter():
-    language = LanguageNamed()
-    assert language.name == DEFAULT_LANGUAGE_NAME
-    assert language.version_triple[:2] == sys.version_info[:2]
-    assert list(language.keywords) == sorted(keyword.kwlist)
-    assert language.is_py3
+def Rows(text, python):
+    """The rows with a problem."""
+    return [problem.range.row for problem in analyze(text, python=python).problems]
+
+
+def test_the_default_is_the_newest():
+    assert NEWEST == VERSIONS[-1] == analyze("").python
+    assert list(language_named(NEWEST).keywords) == sorted(keyword.kwlist)
 
 
 @pytest.mark.parametrize(
@@ -33,21 +29,21 @@ def test_the_default_is_this_interpreter():
     ],
 )
 def test_keywords(name, present, absent):
-    language = LanguageNamed(name)
+    language = language_named(name)
     assert present <= set(language.keywords)
     assert not absent & set(language.keywords)
     assert ("2.7" in language.grammar_file) != language.is_py3
 
 
-@pytest.mark.parametrize("name", ["", "2", "3", "2.6", "3.15", "3.1.2", "three", "3.011"])
+@pytest.mark.parametrize("name", ["", "2", "3", "2.6", "3.99", "3.1.2", "three", "3.011"])
 def test_unknown_versions(name):
-    with pytest.raises(UnknownLanguageError, match=r"choose 2\.7, or one from 3\.0 to 3\.14"):
-        CheckText("x = 1", name)
+    with pytest.raises(ValueError, match=r"python: .*choose 2\.7, or one from 3\.0 to 3\."):
+        analyze("x = 1", python=name)
 
 
-def test_all_names_make_an_analyzer():
-    for name in LANGUAGE_NAMES:
-        assert CheckText("x = 1\n", name) == []
+def test_all_versions_are_known():
+    for name in VERSIONS:
+        assert Rows("x = 1\ny = )\n", name) == [2]
 
 
 @pytest.mark.parametrize(
@@ -56,15 +52,18 @@ def test_all_names_make_an_analyzer():
         ("print 'a', b", {"2.7"}),
         ("exec 'a' in b", {"2.7"}),
         ("raise E, 'text'", {"2.7"}),
+        ("try: pass\nexcept E, (a, b.c): pass", {"2.7"}),
+        ("try: pass\nexcept E, a[0]: pass", {"2.7"}),
         ("x = `y` <> 0777", {"2.7"}),
         ("async = await", {"2.7", "3.6"}),
-        ("nonlocal x", {"3.6", "3.7", "3.12"}),
+        ("def f(): nonlocal x", {"3.6", "3.7", "3.12"}),
         ("if (x := 1): pass", {"3.12"}),
+        ("try: pass\nexcept E, (a, b): pass\nexcept E, a.b: pass\nexcept E, a[0]: pass", {"2.7"}),
         ("x = 1 if y else 2", {"2.7", "3.6", "3.7", "3.12"}),
     ],
 )
 def test_what_is_sound_depends_on_the_version(line, sound_in):
-    sound = {name for name in ("2.7", "3.6", "3.7", "3.12") if not CheckText(line, name)}
+    sound = {name for name in ("2.7", "3.6", "3.7", "3.12") if not Rows(line, name)}
     assert sound == sound_in
 
 
@@ -79,11 +78,8 @@ def test_what_is_sound_depends_on_the_version(line, sound_in):
     ],
 )
 def test_print_is_a_function_in_texts_that_import_it(head, is_function):
-    def Rows(line, version):
-        return [problem.row for problem in CheckText(f"{head}\n{line}", version)]
-
     row = head.count("\n") + 2
-    assert Rows("print(x, file=f)", "2.7") == ([] if is_function else [row])
-    assert Rows("print x", "2.7") == ([row] if is_function else [])
-    assert Rows("print(x)", "2.7") == Rows("print(x, file=f)", "3.8") == []
-    assert Rows("exec 'a' in b", "2.7") == []
+    assert Rows(f"{head}\nprint(x, file=f)", "2.7") == ([] if is_function else [row])
+    assert Rows(f"{head}\nprint x", "2.7") == ([row] if is_function else [])
+    assert Rows(f"{head}\nprint(x)", "2.7") == Rows(f"{head}\nprint(x, file=f)", "3.8") == []
+    assert Rows(f"{head}\nexec 'a' in b", "2.7") == []

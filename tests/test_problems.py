@@ -4,15 +4,15 @@ import threading
 
 import pytest
 
-from codeloom.check import CheckFile, CheckText, Problem
+from codeloom import Range, analyze, analyze_file
 
 
-def Found(text, language="3.12"):
+def Found(text, python="3.12"):
     """Each problem as "row:column", with its message unless that is the plain one."""
     return [
-        f"{problem.row}:{problem.column}"
+        f"{problem.range.row}:{problem.range.column}"
         + ("" if problem.message == "invalid syntax" else f" {problem.message}")
-        for problem in CheckText(text, language)
+        for problem in analyze(text, python=python).problems
     ]
 
 
@@ -41,8 +41,8 @@ def test_sound_texts(text):
     [
         # In the first row and below it, counted in characters.
         ("x = (1))", ["1:8"]),
-        ("\n\n  é = '日本' '\U0001d4b3' )\n", ["3:16"]),
-        ("\tx = 1 1\n", ["1:8"]),
+        ("if a:\n\n  é = '日本' '\U0001d4b3' )\n", ["3:16"]),
+        ("if a:\n\tx = 1 1\n", ["2:8"]),
         ("f(a,\n  b,\n\tc d,\n)\n", ["3:4"]),
         ("x = '''\né''' 1\n", ["2:6"]),
         # Behind the last token, also when that has several rows.
@@ -73,7 +73,7 @@ HINT = "invalid syntax in stringified type hint"
     [
         ("x = f'{a b}'", ["1:10"]),
         ("é = '日本', f'é{a} {{}} {b c}'", ["1:26"]),
-        ("\tf(f'''\n{a}\n\té {b c}\n''')", ["3:7"]),
+        ("if a:\n\tf(f'''\n{a}\n\té {b c}\n''')", ["4:7"]),
         ("f(\n  a, f'''{\n\né b}''')", ["4:3"]),
         # Of equal expressions the first is at fault.
         ("x = f'{a b} {a b}'", ["1:10"]),
@@ -92,10 +92,9 @@ def test_places_within_strings(text, found):
 
 
 def test_place_of_a_walkers_complaint():
-    # It counts rows in another way.
-    (problem,) = CheckText("x = (1,\n f'{f(a for a in b, 1)}')")
+    (problem,) = analyze("x = (1,\n f'{f(a for a in b, 1)}')").problems
     assert problem.message == "Generator expression must be parenthesized if not sole argument"
-    assert problem.row == 2 and problem.column in (6, 7)
+    assert problem.range.row == 2 and problem.range.column in (6, 7)
 
 
 def test_places_of_commented_hints():
@@ -118,19 +117,23 @@ def test_a_line_with_unreadable_characters_has_that_problem_alone(text, found):
 
 
 def test_a_problem_tells_all_of_its_place(write_files):
-    folder = write_files({"a.py": "# coding: latin-1\r\n\té = )\r\n".encode("latin-1")})
+    folder = write_files({"a.py": "# coding: latin-1\r\nif a:\r\n\té = )\r\n".encode("latin-1")})
     path = folder / "a.py"
-    assert CheckFile(path) == [Problem(str(path), 2, 6, "invalid syntax", "\té = )")]
+    (problem,) = analyze_file(path).problems
+    assert (problem.path, problem.range) == (str(path), Range(3, 6, 3, 7))
+    assert (problem.code, problem.message, problem.source_row) == ("CL201", "invalid syntax", "\té = )")
+    assert str(problem) == f"{path}:3:6: CL201 invalid syntax"
     with pytest.raises(FileNotFoundError):
-        CheckFile(folder / "absent.py")
+        analyze_file(folder / "absent.py")
 
 
 def test_a_walk_that_hits_a_limit_prints_nothing(capfd):
-    assert CheckText("a" + ".a" * 2_000 + "\nx = " + "(" * 2_000 + ")" * 2_000) == []
+    analysis = analyze("a" + ".a" * 2_000 + "\nx = " + "(" * 2_000 + ")" * 2_000)
+    assert not analysis.problems and analysis.records
     assert capfd.readouterr() == ("", "")
 
 
-def test_threads_share_the_analyzers():
+def test_threads():
     text = "x = f'{a b}'\ny = [i for i in range(9)]\nz = )\n" * 200
     results = []
     threads = [
@@ -146,8 +149,8 @@ def test_threads_share_the_analyzers():
 
 @pytest.mark.parametrize("seed", range(3))
 def test_a_broken_line_spoils_no_other(seed):
-    sound = ["def f(a):", "    return {'x': a}", "class C: x = 1", "if a: pass", "else: pass"]
+    sound = ["def f(a): return {'x': a}", "x: int = 1", "class C: x = 1", "if a: pass", "with a: pass"]
     broken = ["x = 1 1", "y = 'a", "import", "f(a b)", "z = ]", "x = f'{a b}'"]
     rows = [sound[(i * 7 + seed) % 5] if i % 3 else broken[(i + seed) % 6] for i in range(60)]
-    faulty_rows = {problem.row for problem in CheckText("\n".join(rows))}
+    faulty_rows = {problem.range.row for problem in analyze("\n".join(rows)).problems}
     assert faulty_rows == {i + 1 for i, row in enumerate(rows) if row in broken}
