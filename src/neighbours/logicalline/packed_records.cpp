@@ -1,6 +1,8 @@
 #include "neighbours/logicalline/packed_records.h"
 
+#include <algorithm>
 #include <array>
+#include <cstring>
 
 #include "names/record_kinds.h"
 
@@ -13,8 +15,7 @@ bool HasPrefix(const CRecord& record) {
 }
 
 char* Append(char* to, std::string_view text) {
-    std::memcpy(to, text.data(), text.size());
-    return to + text.size();
+    return std::copy(text.begin(), text.end(), to);
 }
 
 char* AppendPrefix(char* to, char kind) {
