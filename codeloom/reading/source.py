@@ -54,10 +54,9 @@ def source_from_bytes(data: bytes) -> Source:
     encoding = _encoding_of(data)
     data = data.removeprefix(codecs.BOM_UTF8)
     if encoding.name == "utf-8" and _is_utf8(data):
-        source = _without_unusable(data, encoding)
+        source = Source(data) if b"\0" not in data else _without_unusable(data, encoding)
     else:
-        text = data.decode(encoding.name, _MARK_UNDECODABLE)
-        source = _without_unusable(text.encode("utf-8", "surrogatepass"), encoding)
+        source = _encoded(data.decode(encoding.name, _MARK_UNDECODABLE), encoding)
     if encoding.fault is not None:
         # What can't be decoded follows from the wrong encoding and is no fault of its own.
         source.faults = [encoding.fault]
@@ -66,7 +65,7 @@ def source_from_bytes(data: bytes) -> Source:
 
 def source_from_text(text: str) -> Source:
     """The same for a text string, which may hold NUL and lone surrogates, but no other fault."""
-    return _without_unusable(text.encode("utf-8", "surrogatepass"), None)
+    return _encoded(text, None)
 
 
 class _Encoding:
@@ -145,10 +144,17 @@ def _is_utf8(data: bytes) -> bool:
     return True
 
 
+def _encoded(text: str, encoding: _Encoding | None) -> Source:
+    """The text in UTF-8; the encoding is None for a host's text."""
+    try:
+        utf8 = text.encode()
+    except UnicodeEncodeError:  # lone surrogates
+        return _without_unusable(text.encode("utf-8", "surrogatepass"), encoding)
+    return Source(utf8) if b"\0" not in utf8 else _without_unusable(utf8, encoding)
+
+
 def _without_unusable(utf8: bytes, encoding: _Encoding | None) -> Source:
-    """`utf8` with U+FFFD for what the engine can't take; the encoding is None for a host's text."""
-    if b"\0" not in utf8 and (utf8.isascii() or not _UNUSABLE.search(utf8)):
-        return Source(utf8)
+    """`utf8` with U+FFFD for what the engine can't take."""
     pieces, faults, unreadable = [], [], []
     end = length = 0
     end_of_faulty_row = 0
