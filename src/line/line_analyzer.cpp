@@ -79,7 +79,7 @@ bool CLineAnalyzer::CImpl::_AnalyzeStatement(const CRawLogical& part) {
         return _Take(fault, ELimit::kNone);
     if (_fRequest.observer != nullptr) _fRequest.observer->Take(part, _fTree);
     if (_fTree.fIsEmpty) return true;
-    _fHasMoreToTell |= !_fTreeSize.IsWithin(_fTree, kMostVisits, kMostDepth);
+    if (_fRequest.asks_for_more) _fHasMoreToTell |= !_fTreeSize.IsWithin(_fTree, kMostVisits, kMostDepth);
     const CWalkResult names = _fNames.Walk(_fTree, _fTree.fRoot, _fRequest.records);
     return _Take(names.fault, names.limit) && _Take(_fHints.Walk(_fTree, _HintContext()));
 }

@@ -32,6 +32,7 @@ struct CLineRequest {
     CRecords* records = nullptr;         // null when only the fault is wanted
     CFalseHints* false_hints = nullptr;  // of the file; null when all that looks like a hint is one
     CTreeObserver* observer = nullptr;   // null when nobody wants to see the trees
+    bool asks_for_more = false;          // HasMoreToTell will be asked
 };
 
 // Not for two threads at once.
@@ -52,8 +53,9 @@ class CLineAnalyzer {
     // those of each logical embedded in it.
     std::span<const uint32_t> RecordEnds() const;
 
-    // Of the last line: what its records say isn't all that there is to tell. It hit a limit or may hit one
-    // in a walk over every node, or what is embedded in it has records that are kept from the line.
+    // Of the last line, whose request announced the question: what its records say isn't all that there is to
+    // tell. It hit a limit or may hit one in a walk over every node, or what is embedded in it has records
+    // that are kept from the line.
     bool HasMoreToTell() const;
 
   private:

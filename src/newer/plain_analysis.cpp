@@ -98,8 +98,10 @@ bool CPlainAnalysis::CanTake(const CLogicalLine& logical) {
 std::optional<nb::object> CPlainAnalysis::Analyze(CLogicalLine& logical, bool in_async_def,
                                                   bool first_in_def) {
     _MakeRoom();
-    const CLineResult result =
-        _fAnalyzer.Analyze(*logical.Raw(), {in_async_def, first_in_def, &_fRecords, nullptr});
+    const CLineResult result = _fAnalyzer.Analyze(*logical.Raw(), {.in_async_def = in_async_def,
+                                                                   .first_in_def = first_in_def,
+                                                                   .records = &_fRecords,
+                                                                   .asks_for_more = true});
     if (_fAnalyzer.HasMoreToTell()) return std::nullopt;
     logical.fParsed = true;
     _SetRecords(logical);

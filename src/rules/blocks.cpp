@@ -4,7 +4,7 @@
 #include <string>
 #include <utility>
 
-#include "text/char_class.h"
+#include "text/scan.h"
 
 namespace codeloom {
 
@@ -62,10 +62,14 @@ std::string_view WhatComesBefore(EClause clause) {
 
 void CBlockTracker::Enter(const CRawLogical& logical) {
     _fHead = ReadStatementHead(logical);
-    _fHasPlaceProblem = false;
+    _fHasPlaceProblem = _fHaveChanged = false;
     const CRawToken& first = logical.tokens.front();
     const uint32_t token_start = logical.StartOf(first);
     const uint32_t row_start = token_start - static_cast<uint32_t>(first.position.col);
+    if (SkipSpaces(logical.file_text, row_start) == token_start) {
+        _fIsMidRow = false;
+        return _Place({first.position.col, first.position.col});
+    }
     const std::string_view before = logical.file_text.substr(row_start, token_start - row_start);
     _fIsMidRow = std::any_of(before.begin(), before.end(), [](char c) { return !IsBlank(c); });
     if (!_fIsMidRow) _Place(MeasureIndent(before));
@@ -116,6 +120,7 @@ void CBlockTracker::_OpenOdd(const CIndent& indent) {
         reopened.may_follow_anything = true;
         reopened.is_unknown = true;
         reopened.header_depth = header_depth;
+        _fHaveChanged = true;
         _fBlocks.push_back(std::move(reopened));
         return;
     }
@@ -160,6 +165,7 @@ void CBlockTracker::_Open(const CIndent& indent, EClause clause, bool is_unknown
     block.header = _Top().previous;
     block.has_mixed_tabs = _Top().has_mixed_tabs;
     block.is_depth_in_doubt = _fPreviousHasFault || _Top().lacks_block;
+    _fHaveChanged = true;
     _fBlocks.push_back(std::move(block));
     if (_fBlocks.size() > kMostIndents && !std::exchange(_fHasTooMany, true))
         _Report(ECode::kTooManyIndents, _fHead.start, _fHead.end, "too many levels of indentation");
@@ -167,6 +173,7 @@ void CBlockTracker::_Open(const CIndent& indent, EClause clause, bool is_unknown
 
 void CBlockTracker::_CloseTo(size_t count) {
     while (_fBlocks.size() > count) {
+        _fHaveChanged = true;
         _CheckPending(_Top(), _fHead.start, _fHead.end);
         if (_fClosed.size() < _fBlocks.size()) _fClosed.resize(_fBlocks.size());
         _fClosed[_fBlocks.size() - 1] = std::move(_fBlocks.back());

@@ -63,6 +63,8 @@ class CBlockTracker {
 
     // The blocks around the line, the module first.
     const std::vector<CBlock>& Blocks() const { return _fBlocks; }
+    // False when they are those of the line before.
+    bool HaveChanged() const { return _fHaveChanged; }
     const CStatementHead& Head() const { return _fHead; }
 
     // How deep the line lies: zero in the module.
@@ -94,6 +96,7 @@ class CBlockTracker {
     std::vector<CBlock> _fBlocks;
     std::vector<CBlock> _fClosed;  // by depth of the stack, the last block left there
     CStatementHead _fHead;         // of the line entered last
+    bool _fHaveChanged = false;
     bool _fIsMidRow = false;
     bool _fHasPlaceProblem = false;
     bool _fOpensBlock = false;  // the line before is a header without a body on its row

@@ -21,12 +21,14 @@ constexpr uint64_t BitsOf(std::initializer_list<ENodeKind> kinds) {
     return bits;
 }
 
-// Kinds that have a rule; a line with none of them below its statement needs no pass over its nodes.
+// A line with none of these keeps every rule. Lists of arguments have theirs only with an argument that is
+// more than an expression.
 constexpr uint64_t kKindsWithRules =
     BitsOf({ENodeKind::kExprStmt, ENodeKind::kFor, ENodeKind::kCompFor, ENodeKind::kWithItem, ENodeKind::kDel,
             ENodeKind::kUsedArgument, ENodeKind::kNamedExpr, ENodeKind::kLambda, ENodeKind::kFuncdef,
             ENodeKind::kClassdef, ENodeKind::kWithTypeParameters, ENodeKind::kCase, ENodeKind::kImportNames,
-            ENodeKind::kFromImport, ENodeKind::kExceptClause});
+            ENodeKind::kFromImport, ENodeKind::kExceptClause, ENodeKind::kStar});
+constexpr uint64_t kKindsToCheck = kKindsWithRules | CTree::BitOf(ENodeKind::kUsedArglist);
 
 void CheckDefinition(const CRuleContext& context, const CTreeNode& definition) {
     CheckBoundName(context, NameOfFuncdef(context.tree, definition));
@@ -98,12 +100,13 @@ uint64_t KindsBelowRoot(const CTree& tree) {
 
 void CheckLine(const CTree& tree, const CLanguage& language, bool in_class, CProblems& problems) {
     CheckLiterals(tree.Line(), language, problems);
-    if (tree.fIsEmpty || tree.fRoot.IsLeaf()) return;
+    if (tree.fIsEmpty || tree.fRoot.IsLeaf() || (tree.Kinds() & kKindsWithRules) == 0) return;
     const CRuleContext context{tree, language, problems};
     CheckNode(context, tree.fRoot);
     if ((KindsBelowRoot(tree) & kKindsWithRules) != 0) {
         for (const CTreeNode& node : tree.NodesBelowRoot())
-            if (!node.IsLeaf() && !tree.IsRoot(node)) CheckNode(context, node);
+            if ((CTree::BitOf(node.kind) & kKindsToCheck) != 0 && !node.IsLeaf() && !tree.IsRoot(node))
+                CheckNode(context, node);
     }
     if (tree.HasKind(ENodeKind::kStar)) CheckStars(context);
     if (tree.HasKind(ENodeKind::kCompFor)) CheckComprehensions(context, in_class);

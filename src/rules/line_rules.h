@@ -5,7 +5,7 @@
 
 namespace codeloom {
 
-// `in_class` where the line is in the body of a class.
+// `in_class` where the line is in the body of a class and holds a comprehension.
 void CheckLine(const CTree& tree, const CLanguage& language, bool in_class, CProblems& problems);
 
 }  // namespace codeloom

@@ -28,7 +28,7 @@ void CheckBytes(const CRawLogical& line, const CRawToken& token, CProblems& prob
 }  // namespace
 
 void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
-    if (!language.IsPython3()) return;
+    if (!line.may_have_strings || !language.IsPython3()) return;
     const CRawToken* before = nullptr;  // the string right before
     for (const CRawToken& token : line.tokens) {
         if (token.type != kTokenId_STRING) {

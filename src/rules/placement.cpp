@@ -19,17 +19,15 @@ using EScope = CPlacement::EScope;
 constexpr int kMaxDepth = 400;
 
 // Words without which a line has nothing that depends on its place.
-constexpr uint64_t Bit(EWord word) {
-    return uint64_t{1} << static_cast<unsigned>(word);
-}
-constexpr uint64_t kWordsOfInterest = Bit(EWord::kReturn) | Bit(EWord::kYield) | Bit(EWord::kAwait) |
-                                      Bit(EWord::kAsync) | Bit(EWord::kBreak) | Bit(EWord::kContinue) |
-                                      Bit(EWord::kNonlocal) | Bit(EWord::kFrom);
+constexpr uint64_t kWordsOfInterest =
+    WordBits(EWord::kReturn, EWord::kYield, EWord::kAwait, EWord::kAsync, EWord::kBreak, EWord::kContinue,
+             EWord::kNonlocal, EWord::kFrom);
+// Words that may be anywhere in an expression.
+constexpr uint64_t kWordsWithin = WordBits(EWord::kYield, EWord::kAwait, EWord::kAsync);
 
-bool HasWordOfInterest(const CRawLogical& logical) {
-    uint64_t words = 0;
-    for (const CRawToken& token : logical.tokens) words |= Bit(token.word);
-    return (words & kWordsOfInterest) != 0;
+// The statement is known without a look below it: `return a + b`, and not `if a: return b`.
+bool IsPlainReturn(const CTree& tree) {
+    return tree.fRoot.Is(ENodeKind::kReturn) && !tree.Line().MayHaveWords(kWordsWithin);
 }
 
 // A feature of `__future__`, with the version that has it first.
@@ -113,16 +111,18 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
     } else if (!MayPrecedeFuture(logical, tree)) {
         _fIsPastFutures = true;
     }
-    if (tree == nullptr || tree->fIsEmpty || blocks.IsInDoubt() || !HasWordOfInterest(logical)) return;
+    if (tree == nullptr || tree->fIsEmpty || !logical.MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt())
+        return;
     CPlacement place = PlacementIn(blocks.Blocks());
     // A body on the row of its header.
     place.in_except_star |= blocks.Head().clause == EClause::kExceptStar;
     place.in_finally |= blocks.Head().clause == EClause::kFinally;
+    if (IsPlainReturn(*tree)) return _CheckReturn(tree->fRoot, place);
     _Visit(tree->fRoot, place);
 }
 
 void CPlacementRules::CheckEmbedded(const CTree& tree, const CBlockTracker& blocks) {
-    if (tree.fIsEmpty || blocks.IsInDoubt() || !HasWordOfInterest(tree.Line())) return;
+    if (tree.fIsEmpty || !tree.Line().MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt()) return;
     _fTree = &tree;
     _Visit(tree.fRoot, PlacementIn(blocks.Blocks()));
 }

@@ -38,7 +38,9 @@ class CPlacementRules {
         : _fLanguage(language), _fProblems(problems) {}
 
     // Call for every line but comments, in order, once its block is known.
-    void Enter(const CBlockTracker& blocks) { _TrackFunctions(blocks.Blocks()); }
+    void Enter(const CBlockTracker& blocks) {
+        if (blocks.HaveChanged()) _TrackFunctions(blocks.Blocks());
+    }
 
     // Then call this; `tree` is null for one with a fault.
     void Check(const CRawLogical& logical, const CTree* tree, const CBlockTracker& blocks);

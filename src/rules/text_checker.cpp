@@ -46,8 +46,11 @@ void CTextChecker::Enter(const CRawLogical& logical) {
 }
 
 void CTextChecker::Take(const CRawLogical& part, const CTree& tree) {
-    if (!IsHint(part))
-        CheckLine(tree, _fLanguage, !_fBlocks.IsInDoubt() && IsInClass(_fBlocks.Blocks()), _fProblems);
+    if (!IsHint(part)) {
+        const bool in_class = tree.HasKind(ENodeKind::kCompFor) &&  // what alone depends on it
+                              !_fBlocks.IsInDoubt() && IsInClass(_fBlocks.Blocks());
+        CheckLine(tree, _fLanguage, in_class, _fProblems);
+    }
     if (&part == _fLine) {
         _fPlacement.Check(part, &tree, _fBlocks);
     } else {

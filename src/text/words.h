@@ -68,6 +68,14 @@ enum class EWord : uint8_t {
         kCount
 };
 
+static_assert(static_cast<size_t>(EWord::kCount) <= 64);
+
+// A bit for each of the words.
+template <class... Words>
+constexpr uint64_t WordBits(Words... some_words) {
+    return ((uint64_t{1} << static_cast<unsigned>(some_words)) | ...);
+}
+
 #define CODELOOM_WORD_TEXT(name, text) std::string_view(text),
 inline constexpr std::array<std::string_view, static_cast<size_t>(EWord::kCount)> kWordTexts = {
     std::string_view(), CODELOOM_WORDS(CODELOOM_WORD_TEXT)};

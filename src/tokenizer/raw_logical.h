@@ -62,10 +62,17 @@ struct CRawLogical {
     bool in_async_def = false;  // lies in the body or the header of an `async def`
     bool first_in_def = false;  // is the first logical of a def's body
     bool is_method = false;     // is the header of a def right in the body of a class
+    // What its tokens may be, so that most lines need no look at them. An embedded logical may have all.
+    bool may_have_strings = true;
+    bool may_have_comments = true;
+    uint64_t words = ~uint64_t{0};  // a bit for each
     std::vector<CRawToken> tokens;
     std::vector<CRawLogical> embedded;  // in source order
 
     std::string_view Text(const CRawToken& token) const { return TextOf(token, file_text); }
+
+    // False when no token is one of these words, which WordBits gives.
+    bool MayHaveWords(uint64_t some_words) const { return (words & some_words) != 0; }
 
     // The bytes of the file that a token covers.
     uint32_t StartOf(const CRawToken& token) const { return token.start; }

@@ -48,6 +48,9 @@ bool CTokenizer::NextLogical(CRawLogical& logical) {
     } else {
         _CollectStatement(logical);
     }
+    logical.words = _fFacts.words;
+    logical.may_have_strings = _fFacts.has_strings;
+    logical.may_have_comments = _fFacts.embedding.has_comments;
     _fScopes.Visit(logical, _fIndent, is_mid_row);
     if (_fFacts.embedding.Any()) _fEmbedded.Find(logical, _fFacts.embedding);
     return true;
@@ -171,6 +174,7 @@ inline void CTokenizer::_AddName(CRawLogical& logical) {
         return _AddToken(logical);
     const EWord word = WordOfPart(text, pos, end - pos);
     _Add(logical, end, kTokenId_NAME, word);
+    _fFacts.words |= WordBits(word);
     if (word == EWord::kLambda) [[unlikely]]
         _NoteLambda();
 }
@@ -195,6 +199,7 @@ void CTokenizer::_Note(size_t pos, CLexedToken token) {
     const std::string_view text = _fLexer.Text();
     switch (token.type) {
         case kTokenId_STRING:
+            _fFacts.has_strings = true;
             _fFacts.embedding.has_strings |= _fFacts.has_hint_sign;
             _fFacts.embedding.has_fields |= token.has_fields;
             [[fallthrough]];
@@ -211,6 +216,7 @@ void CTokenizer::_Note(size_t pos, CLexedToken token) {
             SkipRowEnd(text, _fPlace);
             break;
         default:
+            _fFacts.words |= WordBits(token.word);
             if (token.word == EWord::kLambda) _NoteLambda();
     }
 }

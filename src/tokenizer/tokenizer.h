@@ -27,6 +27,8 @@ struct CLineFacts {
     int open_lambdas = 0;  // outside brackets, whose ":" is still to come
     bool is_assignment = false;
     bool has_hint_sign = false;  // a ":" or "->"
+    bool has_strings = false;
+    uint64_t words = 0;  // a bit for each
 };
 
 class CTokenizer {

@@ -49,6 +49,7 @@ bool HasArgumentRecords(const CTree& tree, const CTreeNode& funcdef) {
 
 // Looks at the tokens when it is first asked for a line.
 bool CHintWalker::_CommentsMayHoldHints() {
+    if (!_fLine->may_have_comments) return false;
     if (!_fHasMarks)
         _fHasMarks =
             std::any_of(_fLine->tokens.begin(), _fLine->tokens.end(), [this](const CRawToken& token) {
