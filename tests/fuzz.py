@@ -104,7 +104,7 @@ class Fuzzer:
         for logical in [*logicals, *GetLogicalsFromText("x = f(1)")]:
             error = self.engine.AnalyzeSingleLogical(logical, logical.fInAsyncDef, logical.fFirstInDef)
         assert error is None
-        self._Analyze(text, len(logicals))
+        self._Analyze(f"{text}\nx = f(1)")
         self._AskWhileDropping(logicals)
         if self.random.random() < ODDLY_HOSTED_TEXTS:
             for logical in logicals:
@@ -132,10 +132,10 @@ class Fuzzer:
         holds_nothing = command == "tree" and "holds no line" in failures.getvalue()
         assert status in (0, 1) or holds_nothing, (command, options, status, failures.getvalue())
 
-    def _Analyze(self, text: str, line_count: int) -> None:
+    def _Analyze(self, text: str) -> None:
         """The same as users call it."""
-        analysis = analyze(f"{text}\nx = f(1)", python=self.random.choice(LANGUAGES))
-        assert line_count <= len(analysis.lines) <= line_count + 1
+        analysis = analyze(text, python=self.random.choice(LANGUAGES))
+        assert len(analysis.lines) == len(GetLogicalsFromText(analysis.text))
         rows = len(RowTexts(analysis.text))
         for item in (*analysis.problems, *analysis.records):
             place = item.range
