@@ -149,7 +149,7 @@ nb::list CPGenAnalyzerImpl::GetTypeParameterNodes(nb::tuple toks) {
 }
 
 void BindAnalyzer(nb::module_& module) {
-    nb::class_<CPGenAnalyzerImpl, CPGenAnalyzer, TAnalyzerOperations<CPGenAnalyzerImpl>> binding(
+    nb::class_<CPGenAnalyzerImpl, CPGenAnalyzer, THostSubclass<CPGenAnalyzerImpl>> binding(
         module, "CPGenAnalyzerImpl", Collected<CPGenAnalyzerImpl>(),
         " Analyzes logical using a parser implemented via the pgen2 package ");
     const nb::object default_grammar = module.attr("kPy3DefaultGrammar");

@@ -33,10 +33,16 @@ class CPGenAnalyzerImpl : public CPGenAnalyzer {
     void InitFromParts(CAnalyzerParts parts);
 
     nb::object AnalyzeSingleLogical(CLogicalLine& logical, bool in_async_def, bool first_in_def) override;
-    virtual bool _InspectSingleLogical(CLogicalLine& logical, bool in_async_def, bool in_embedded_expression,
-                                       bool first_in_def);
-    virtual void _InspectEmbeddedExpressions(CLogicalLine& logical, CNodeRef node, bool in_async_def,
-                                             bool first_in_def);
+    OPERATIONS_OF(CPGenAnalyzerImpl, CPGenAnalyzer)
+    OPERATION(bool, _InspectSingleLogical,
+              (CLogicalLine& logical, bool in_async_def, bool in_embedded_expression, bool first_in_def),
+              " Inspect given logical.  Raises SyntaxError or ValueError on\n        unparsable logical ",
+              "logical"_a, "in_async_def"_a, "in_embedded_expression"_a = false, "first_in_def"_a = false);
+    OPERATION(void, _InspectEmbeddedExpressions,
+              (CLogicalLine& logical, CNodeRef node, bool in_async_def, bool first_in_def),
+              " Inspect all embedded expressions.  Will raise exceptions on parse errors ", "logical"_a,
+              "node"_a.none(), "in_async_def"_a, "first_in_def"_a);
+    END_OPERATIONS
 
     CNodeRef ParseToNode(CLogicalLine& logical, bool in_async_def);
     CNodeRef ParseTokenListToNode(nb::list logical, bool in_async_def);
@@ -62,18 +68,6 @@ class CPGenAnalyzerImpl : public CPGenAnalyzer {
 
     CRef<CPGenParserImpl> _fLogicalParser;
     nb::object __GetTime = nb::none();
-};
-
-template <class Class>
-class TAnalyzerOperations : public TPGenAnalyzerOperations<Class> {
-    OPERATIONS_BEYOND(TPGenAnalyzerOperations<Class>)
-    OPERATION(_InspectSingleLogical,
-              " Inspect given logical.  Raises SyntaxError or ValueError on\n        unparsable logical ",
-              "logical"_a, "in_async_def"_a, "in_embedded_expression"_a = false, "first_in_def"_a = false)
-    OPERATION(_InspectEmbeddedExpressions,
-              " Inspect all embedded expressions.  Will raise exceptions on parse errors ", "logical"_a,
-              "node"_a.none(), "in_async_def"_a, "first_in_def"_a)
-    END_OPERATIONS
 };
 
 void BindAnalyzer(nb::module_& module);

@@ -8,7 +8,7 @@ nb::object CPGenAnalyzer::AnalyzeSingleLogical(CLogicalLine&, bool, bool) {
 }
 
 void BindPGenAnalyzer(nb::module_& module) {
-    nb::class_<CPGenAnalyzer, NodeConverter, TPGenAnalyzerOperations<CPGenAnalyzer>> binding(
+    nb::class_<CPGenAnalyzer, NodeConverter, THostSubclass<CPGenAnalyzer>> binding(
         module, "CPGenAnalyzer", "What analyzes one logical line at a time; a host may derive its own.");
     binding.def(TInit<>());
     BindOperations(binding);

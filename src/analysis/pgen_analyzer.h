@@ -12,17 +12,12 @@ class CPGenAnalyzer : public NodeConverter {
   public:
     void Init() {}
 
-    virtual nb::object AnalyzeSingleLogical(CLogicalLine& logical, bool in_async_def, bool first_in_def);
-};
-
-template <class Class>
-class TPGenAnalyzerOperations : public TNodeConverterOperations<Class> {
-    OPERATIONS_BEYOND(TNodeConverterOperations<Class>)
-    OPERATION(AnalyzeSingleLogical,
+    OPERATIONS_OF(CPGenAnalyzer, NodeConverter)
+    OPERATION(nb::object, AnalyzeSingleLogical, (CLogicalLine& logical, bool in_async_def, bool first_in_def),
               " Analyze a single logical and return any exception (typically\n"
               "        SyntaxError, but can be other errors). Note that exception is only\n"
               "        returned if logical has not previously been parsed. ",
-              "logical"_a, "in_async_def"_a, "first_in_def"_a = false)
+              "logical"_a, "in_async_def"_a, "first_in_def"_a = false);
     END_OPERATIONS
 };
 

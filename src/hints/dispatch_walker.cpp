@@ -85,7 +85,7 @@ nb::list CDispatchWalker::GetNodeStack() const {
 }
 
 void BindDispatchWalker(nb::module_& module) {
-    nb::class_<CDispatchWalker, TDispatchWalkerOperations<CDispatchWalker>> binding(
+    nb::class_<CDispatchWalker, THostSubclass<CDispatchWalker>> binding(
         module, "CDispatchWalker", Collected<CDispatchWalker>(),
         "A node walker that uses a dispatch dictionary keyed by node types to determine which visit method "
         "to call.");

@@ -24,8 +24,16 @@ class CDispatchWalker : public CHosted {
     // `dispatch_dict` maps node classes to callables of (walker, node), or to False; it may be none.
     void Init(nb::object dispatch_dict);
 
-    virtual void Walk(CNodeRef node, CLogicalLine& logical, bool first_in_def);
-    virtual void _VisitNode(CNodeRef node);
+    OPERATIONS_OF(CDispatchWalker, CNoOperations)
+    OPERATION(
+        void, Walk, (CNodeRef node, CLogicalLine& logical, bool first_in_def),
+        "Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's "
+        "ambiguous. ValueError while a walk is under way.",
+        "node"_a.none(), "logical"_a, "first_in_def"_a);
+    OPERATION(void, _VisitNode, (CNodeRef node),
+              "Visit the node and all children. Dispatches to a visit method based on node type.",
+              "node"_a.none());
+    END_OPERATIONS
 
     nb::object GetDispatchDict() const { return _fDispatch.Dict(); }
     nb::list GetNodeStack() const;
@@ -52,19 +60,6 @@ class CDispatchWalker : public CHosted {
     bool _fIsNative = false;  // no host subclass, whose override of _VisitNode wants every node
     CVisitLimits _fLimits;
     std::vector<CNodeRef> _fNodeStack;  // from the root to the node now visited
-};
-
-template <class Class>
-class TDispatchWalkerOperations : public Class {
-    FIRST_OPERATIONS
-    OPERATION(
-        Walk,
-        "Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's "
-        "ambiguous. ValueError while a walk is under way.",
-        "node"_a.none(), "logical"_a, "first_in_def"_a)
-    OPERATION(_VisitNode, "Visit the node and all children. Dispatches to a visit method based on node type.",
-              "node"_a.none())
-    END_OPERATIONS
 };
 
 void BindDispatchWalker(nb::module_& module);

@@ -187,7 +187,7 @@ bool CTypeHintWalker::_IsDottedName(nb::bytes s) {
 }
 
 void BindTypeHintWalker(nb::module_& module) {
-    nb::class_<CTypeHintWalker, CDispatchWalker, TTypeHintWalkerOperations<CTypeHintWalker>> binding(
+    nb::class_<CTypeHintWalker, CDispatchWalker, THostSubclass<CTypeHintWalker>> binding(
         module, "CTypeHintWalker", Collected<CTypeHintWalker>(),
         "Records the type hints of a logical line: annotations, and hints in comments.");
     binding

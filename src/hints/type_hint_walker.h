@@ -42,26 +42,64 @@ class CTypeHintWalker : public CDispatchWalker {
     void Walk(CNodeRef node, CLogicalLine& logical, bool first_in_def) override;
 
     // The results of visits say by their truth whether the children are to be visited.
-    virtual nb::object _VisitFuncdefStmt(CFuncdefStmt& node);
-    virtual CRewrittenHint _RewriteFuncdefCommentHint(nb::str hint);
-    virtual void _ProcessFuncdefComment(nb::str hint, Py_ssize_t tok_i, CRef<CLogicalLine> funcdef_logical,
-                                        bool is_arg);
-    virtual void _ProcessArgSpecificComment(const CArgument& arg);
-    virtual nb::object _VisitForStmt(CForStmt& node);
-    virtual nb::object _VisitWithStmt(CWithStmt& node);
-    virtual nb::object _VisitExprStmt(CExprStmt& node);
-    virtual void _ProcessTarget(CNode& node, CNodeRef target);
-    virtual void _ProcessNameAndHintNodes(CNodeRef name_node, CNodeRef hint_node, bool is_arg);
-    virtual CFoundText _FindEndingTypeComment(CNode& node);
-    virtual CTextOrNone _GetHintFromComment(nb::str comment);
-    virtual CRowRange _GetRowRange(CNode& node);
-    virtual bool _IsDottedName(nb::bytes s);
-    virtual CFoundText _FindComment(Py_ssize_t row, CRef<CLogicalLine> logical);
-    virtual CBytesOrNone _GetHintInfoStr(CNodeRef node);
-    virtual void _AddSymInfo(nb::object name, nb::object istr, bool is_arg);
-    virtual CNodeRef _ParseHint(nb::str hint, Py_ssize_t tok_i, bool call_general_node_walker);
-    virtual void _RaiseHintSyntaxError(Py_ssize_t tok_i, Py_ssize_t utf8_offset_in_hint);
-    virtual CNodeRef _ParseFuncdefCommentHint(nb::str hint, Py_ssize_t tok_i);
+    OPERATIONS_OF(CTypeHintWalker, CDispatchWalker)
+    OPERATION(nb::object, _VisitFuncdefStmt, (CFuncdefStmt& node),
+              "Record the hints of a def's arguments and of what it returns.", "node"_a);
+    OPERATION(CRewrittenHint, _RewriteFuncdefCommentHint, (nb::str hint),
+              "Rewrite the function hint in a comment so that it parses: the tokens of a `def` with dummy "
+              "names, and for each the offset to report a syntax error at.",
+              "hint"_a);
+    OPERATION(void, _ProcessFuncdefComment,
+              (nb::str hint, Py_ssize_t tok_i, CRef<CLogicalLine> funcdef_logical, bool is_arg),
+              "Record a hint for a `def`. `funcdef_logical` is None for a comment in the body: then the "
+              "arguments go by their indexes. TypeError when it has no records of arguments to name them by.",
+              "hint"_a, "tok_i"_a, "funcdef_logical"_a.none(), "is_arg"_a);
+    OPERATION(void, _ProcessArgSpecificComment, (const CArgument& arg),
+              "Record the hint in a comment immediately after an argument and its comma.", "arg"_a);
+    OPERATION(nb::object, _VisitForStmt, (CForStmt& node),
+              "Record the comment hint of a `for` for its target.", "node"_a);
+    OPERATION(nb::object, _VisitWithStmt, (CWithStmt& node),
+              "Record the comment hint of a `with` for the target of each item.", "node"_a);
+    OPERATION(nb::object, _VisitExprStmt, (CExprStmt& node),
+              "Record the annotation or the comment hint of an assignment.", "node"_a);
+    OPERATION(void, _ProcessTarget, (CNode& node, CNodeRef target),
+              "Record the hint in the comment at the end of `node` for `target`.", "node"_a,
+              "target"_a.none());
+    OPERATION(void, _ProcessNameAndHintNodes, (CNodeRef name_node, CNodeRef hint_node, bool is_arg),
+              "Record a hint for a name. Tuples are paired item by item; what has no partner is passed over.",
+              "name_node"_a.none(), "hint_node"_a.none(), "is_arg"_a = false);
+    OPERATION(CFoundText, _FindEndingTypeComment, (CNode& node),
+              "The hint in the comment on the row on which `node` ends, and the index of its token; "
+              "(None, -1) when there is no comment.",
+              "node"_a);
+    OPERATION(CTextOrNone, _GetHintFromComment, (nb::str comment),
+              "The hint following `type:`, with blanks for all before it, so that offsets stay; None when "
+              "there is none.",
+              "comment"_a);
+    OPERATION(CRowRange, _GetRowRange, (CNode& node), "The first row of `node` and the one behind its last.",
+              "node"_a);
+    OPERATION(bool, _IsDottedName, (nb::bytes s),
+              "True for letters and digits alone that begin with a letter, and for nothing.", "s"_a);
+    OPERATION(CFoundText, _FindComment, (Py_ssize_t row, CRef<CLogicalLine> logical),
+              "The comment on a row of `logical`, by default of the one that is walked, and the index of its "
+              "token; (None, -1) when there is none.",
+              "row"_a, "logical"_a.none()= nb::none());
+    OPERATION(CBytesOrNone, _GetHintInfoStr, (CNodeRef node),
+              "The record of a hint; None when it has no text.", "node"_a.none());
+    OPERATION(void, _AddSymInfo, (nb::object name, nb::object istr, bool is_arg),
+              "Append a record to the logical.", "name"_a, "istr"_a, "is_arg"_a);
+    OPERATION(CNodeRef, _ParseHint, (nb::str hint, Py_ssize_t tok_i, bool call_general_node_walker),
+              "The top node of a hint; None when it isn't one expression. Give it back with "
+              "`_fHintParser.DiscardNode`. SyntaxError with the place in the comment when it doesn't parse.",
+              "hint"_a, "tok_i"_a, "call_general_node_walker"_a);
+    OPERATION(void, _RaiseHintSyntaxError, (Py_ssize_t tok_i, Py_ssize_t utf8_offset_in_hint),
+              "Raise SyntaxError for a place in the hint that the comment token at `tok_i` holds.", "tok_i"_a,
+              "utf8_offset_in_hint"_a);
+    OPERATION(CNodeRef, _ParseFuncdefCommentHint, (nb::str hint, Py_ssize_t tok_i),
+              "The same as _ParseHint for the hint of a function; its names go to "
+              "no walker.",
+              "hint"_a, "tok_i"_a);
+    END_OPERATIONS
 
     template <class Visitor>
     void References(Visitor&& visit) {
@@ -91,59 +129,6 @@ class CTypeHintWalker : public CDispatchWalker {
     void _WalkNamesOf(const CNodeRef& hint_node);
 
     int _fArgCommentCount = 0;  // hints in comments of arguments that the visit of a `def` has taken
-};
-
-template <class Class>
-class TTypeHintWalkerOperations : public TDispatchWalkerOperations<Class> {
-    OPERATIONS_BEYOND(TDispatchWalkerOperations<Class>)
-    OPERATION(_VisitFuncdefStmt, "Record the hints of a def's arguments and of what it returns.", "node"_a)
-    OPERATION(_RewriteFuncdefCommentHint,
-              "Rewrite the function hint in a comment so that it parses: the tokens of a `def` with dummy "
-              "names, and for each the offset to report a syntax error at.",
-              "hint"_a)
-    OPERATION(_ProcessFuncdefComment,
-              "Record a hint for a `def`. `funcdef_logical` is None for a comment in the body: then the "
-              "arguments go by their indexes. TypeError when it has no records of arguments to name them by.",
-              "hint"_a, "tok_i"_a, "funcdef_logical"_a.none(), "is_arg"_a)
-    OPERATION(_ProcessArgSpecificComment,
-              "Record the hint in a comment immediately after an argument and its comma.", "arg"_a)
-    OPERATION(_VisitForStmt, "Record the comment hint of a `for` for its target.", "node"_a)
-    OPERATION(_VisitWithStmt, "Record the comment hint of a `with` for the target of each item.", "node"_a)
-    OPERATION(_VisitExprStmt, "Record the annotation or the comment hint of an assignment.", "node"_a)
-    OPERATION(_ProcessTarget, "Record the hint in the comment at the end of `node` for `target`.", "node"_a,
-              "target"_a.none())
-    OPERATION(_ProcessNameAndHintNodes,
-              "Record a hint for a name. Tuples are paired item by item; what has no partner is passed over.",
-              "name_node"_a.none(), "hint_node"_a.none(), "is_arg"_a = false)
-    OPERATION(_FindEndingTypeComment,
-              "The hint in the comment on the row on which `node` ends, and the index of its token; "
-              "(None, -1) when there is no comment.",
-              "node"_a)
-    OPERATION(_GetHintFromComment,
-              "The hint following `type:`, with blanks for all before it, so that offsets stay; None when "
-              "there is none.",
-              "comment"_a)
-    OPERATION(_GetRowRange, "The first row of `node` and the one behind its last.", "node"_a)
-    OPERATION(_IsDottedName, "True for letters and digits alone that begin with a letter, and for nothing.",
-              "s"_a)
-    OPERATION(_FindComment,
-              "The comment on a row of `logical`, by default of the one that is walked, and the index of its "
-              "token; (None, -1) when there is none.",
-              "row"_a, "logical"_a.none() = nb::none())
-    OPERATION(_GetHintInfoStr, "The record of a hint; None when it has no text.", "node"_a.none())
-    OPERATION(_AddSymInfo, "Append a record to the logical.", "name"_a, "istr"_a, "is_arg"_a)
-    OPERATION(_ParseHint,
-              "The top node of a hint; None when it isn't one expression. Give it back with "
-              "`_fHintParser.DiscardNode`. SyntaxError with the place in the comment when it doesn't parse.",
-              "hint"_a, "tok_i"_a, "call_general_node_walker"_a)
-    OPERATION(_RaiseHintSyntaxError,
-              "Raise SyntaxError for a place in the hint that the comment token at `tok_i` holds.", "tok_i"_a,
-              "utf8_offset_in_hint"_a)
-    OPERATION(_ParseFuncdefCommentHint,
-              "The same as _ParseHint for the hint of a function; its names go to "
-              "no walker.",
-              "hint"_a, "tok_i"_a)
-    END_OPERATIONS
 };
 
 void BindTypeHintWalker(nb::module_& module);

@@ -1,4 +1,4 @@
-// Class set-up: constructors in two steps, operations bound from their mixin, and collection.
+// Class set-up: constructors in two steps, operations bound, and collection.
 #pragma once
 
 #include <nanobind/nanobind.h>
@@ -41,7 +41,7 @@ struct TInit : nb::def_visitor<TInit<Arguments...>> {
 template <class Binding>
 void BindOperations(Binding& binding) {
     using Class = typename Binding::Type;
-    Binding::Alias::VisitOperations(
+    Class::template VisitOperations<Class>(
         [&]<class Declaring>(const char* name, Declaring*, auto function, const auto&... extra) {
             if constexpr (std::is_same_v<Declaring, Class>) binding.def(name, function, extra...);
         });

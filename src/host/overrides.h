@@ -1,21 +1,22 @@
 // Operations that a host subclass may override.
-//   in     a class with virtual operations, and beside it a mixin that lists them
+//   in     a class that lists its virtual operations
 //   out    native code that calls an operation reaches the override of a host subclass, at every depth; the
 //          bound operation is the class's own, so that super() reaches the base exactly once
 //
-// A mixin reads
-//     template <class Class>
-//     class TNodeOperations : public Class {
-//         FIRST_OPERATIONS
-//         OPERATION(GetChild, "The child at an index; none past the end.", "child_i"_a)
+// A class lists its operations, each declared, explained and bound in one place:
+//     class CStmt : public CNode {
+//       public:
+//         OPERATIONS_OF(CStmt, CNode)
+//         OPERATION(CNodeRef, GetChild, (Py_ssize_t child_i), "The child at an index; None past the end.",
+//                   "child_i"_a);
 //         END_OPERATIONS
-//     };
-// and the mixin of a derived class
-//     template <class Class>
-//     class TStmtOperations : public TNodeOperations<Class> {
-//         OPERATIONS_BEYOND(TNodeOperations<Class>)
-//         ...
-// An instance of a native class never pays for this: only instances of host subclasses are made of the mixin.
+//       ...
+// An OPERATION declares a virtual function; a body may follow it in the place of the semicolon. A class
+// without bases says CNoOperations. A class without operations of its own lists nothing, and one that
+// overrides an operation natively declares it as any other function: both are bound as they should be.
+// THostSubclass<CStmt> is CStmt with an override for each operation, its own and inherited.
+// An instance of a native class never pays for this: only instances of host subclasses are made of
+// THostSubclass.
 // The lookup goes by the type, through the interpreter's own cache, so that an operation assigned to the
 // subclass later is honoured, and one put into an instance's own dictionary isn't seen.
 #pragma once
@@ -108,48 +109,77 @@ struct TOperationTraits<Result_ (Owner::*)(Arguments...)> {
     };
 };
 
-// One line of a mixin's list of operations; a line without an operation does nothing.
+// One line of a class's list of operations; a line without an operation does nothing.
 template <int line>
 struct TOperationLine {};
 
+// What a class without bases names as its base.
+struct CNoOperations {
+    template <class Class>
+    struct TOverridden {
+        using Type = Class;
+    };
+    template <class Class, class Visitor>
+    static void VisitOperations(Visitor&&) {}
+};
+
+// Class with overrides for the operations of Base.
+template <class Base, class Class>
+using TOverriddenBy = typename Base::template TOverridden<Class>::Type;
+
+template <class Class>
+using THostSubclass = TOverriddenBy<Class, Class>;
+
 }  // namespace codeloom
 
-#define FIRST_OPERATIONS                      \
-  public:                                     \
-    template <class Visitor>                  \
-    static void _VisitInherited(Visitor&&) {} \
-    _CODELOOM_OPERATIONS
+#define OPERATIONS_OF(Self, Base)                 \
+    using COperationsBase = Base;                 \
+    template <class Class, class Below, int line> \
+    struct TOverrideAt {                          \
+        using Type = Below;                       \
+    };                                            \
+    template <class Class, class Visitor>         \
+    static void _Operation(Visitor&&, ...) {}     \
+    static constexpr int kFirstOperationLine = __LINE__;
 
-#define OPERATIONS_BEYOND(...)                     \
-  public:                                          \
-    template <class Visitor>                       \
-    static void _VisitInherited(Visitor&& visit) { \
-        __VA_ARGS__::VisitOperations(visit);       \
-    }                                              \
-    _CODELOOM_OPERATIONS
-
-#define _CODELOOM_OPERATIONS                  \
-    template <class Visitor>                  \
-    static void _Operation(Visitor&&, ...) {} \
-    static constexpr int _kFirstLine = __LINE__;
-
-#define END_OPERATIONS                                                                       \
-    static constexpr int _kEndLine = __LINE__;                                               \
-    template <class Visitor, int... offset>                                                  \
-    static void _VisitLines(Visitor&& visit, std::integer_sequence<int, offset...>) {        \
-        (_Operation(visit, codeloom::TOperationLine<_kFirstLine + offset>{}), ...);          \
-    }                                                                                        \
-    /* Calls visit(name, DeclaringClass, function, doc, arguments...) for each operation. */ \
-    template <class Visitor>                                                                 \
-    static void VisitOperations(Visitor&& visit) {                                           \
-        _VisitInherited(visit);                                                              \
-        _VisitLines(visit, std::make_integer_sequence<int, _kEndLine - _kFirstLine>{});      \
+// Below, with the overrides of each line from the first to the last.
+#define END_OPERATIONS                                                                                     \
+    static constexpr int kLastOperationLine = __LINE__;                                                    \
+    template <class Class, class Below, int line>                                                          \
+    struct TOverriddenFrom {                                                                               \
+        using Next = typename TOverrideAt<Class, Below, line>::Type;                                       \
+        using Type = typename TOverriddenFrom<Class, Next, line + 1>::Type;                                \
+    };                                                                                                     \
+    template <class Class, class Below>                                                                    \
+    struct TOverriddenFrom<Class, Below, kLastOperationLine> {                                             \
+        using Type = Below;                                                                                \
+    };                                                                                                     \
+    template <class Class>                                                                                 \
+    struct TOverridden                                                                                     \
+        : TOverriddenFrom<Class, codeloom::TOverriddenBy<COperationsBase, Class>, kFirstOperationLine> {}; \
+    template <class Class, class Visitor, int... offset>                                                   \
+    static void _VisitLines(Visitor&& visit, std::integer_sequence<int, offset...>) {                      \
+        (_Operation<Class>(visit, codeloom::TOperationLine<kFirstOperationLine + offset>{}), ...);         \
+    }                                                                                                      \
+    /* Calls visit(name, DeclaringClass, function, doc, arguments...) for each operation. */               \
+    template <class Class, class Visitor>                                                                  \
+    static void VisitOperations(Visitor&& visit) {                                                         \
+        COperationsBase::template VisitOperations<Class>(visit);                                           \
+        _VisitLines<Class>(visit,                                                                          \
+                           std::make_integer_sequence<int, kLastOperationLine - kFirstOperationLine>{});   \
     }
 
-// OPERATION(Name, doc, "argument"_a, "optional_argument"_a = value...): one nb::arg for each parameter.
-#define OPERATION(Name, doc, ...)                                                             \
-    _CODELOOM_OVERRIDE(Name, _CODELOOM_COUNT(__VA_ARGS__))                                    \
-    template <class Visitor>                                                                  \
+// OPERATION(Result, Name, (parameters), doc, "argument"_a, "optional_argument"_a = value...): one nb::arg for
+// each parameter.
+#define OPERATION(Result, Name, parameters, doc, ...)                                         \
+    template <class Class, class Below>                                                       \
+    struct TOverrideAt<Class, Below, __LINE__> {                                              \
+        class Type : public Below {                                                           \
+          public:                                                                             \
+            _CODELOOM_OVERRIDE(Name, _CODELOOM_COUNT(__VA_ARGS__))                            \
+        };                                                                                    \
+    };                                                                                        \
+    template <class Class, class Visitor>                                                     \
     static void _Operation(Visitor&& visit, codeloom::TOperationLine<__LINE__>) {             \
         using Traits = codeloom::TOperationTraits<decltype(&Class::Name)>;                    \
         constexpr auto call = [](Class& self, auto&&... arguments) -> decltype(auto) {        \
@@ -158,7 +188,15 @@ struct TOperationLine {};
         visit(#Name, static_cast<typename Traits::DeclaringClass*>(nullptr),                  \
               typename Traits::template CBound<Class, std::remove_const_t<decltype(call)>>{}, \
               doc __VA_OPT__(, ) __VA_ARGS__);                                                \
-    }
+    }                                                                                         \
+    virtual Result Name parameters
+
+// Part<Below> is derived from Below: what instances of host subclasses do besides.
+#define FOR_HOST_SUBCLASSES(Part)                \
+    template <class Class, class Below>          \
+    struct TOverrideAt<Class, Below, __LINE__> { \
+        using Type = Part<Below>;                \
+    };
 
 #define _CODELOOM_COUNT(...) _CODELOOM_COUNT_OF(0 __VA_OPT__(, ) __VA_ARGS__, 6, 5, 4, 3, 2, 1, 0)
 #define _CODELOOM_COUNT_OF(_0, _1, _2, _3, _4, _5, _6, count, ...) count

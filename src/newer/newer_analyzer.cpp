@@ -45,7 +45,7 @@ void BindNewerAnalyzer(nb::module_& module) {
     BindNewerParser(module);
     RememberClsForState();
     WatchNeighbours();
-    nb::class_<CNewerAnalyzer, CPGenAnalyzerImpl, TAnalyzerOperations<CNewerAnalyzer>> binding(
+    nb::class_<CNewerAnalyzer, CPGenAnalyzerImpl, THostSubclass<CNewerAnalyzer>> binding(
         module, "CNewerAnalyzer", Collected<CNewerAnalyzer>(),
         "Analyzes logical lines of the language up to Python 3.14.");
     binding.def(TInit<nb::object, nb::object, nb::object, bool, nb::object>(), "version_triple"_a.none(),

@@ -158,8 +158,7 @@ CNodeRef CNewerMatchCaseParser::_Parse(nb::tuple toks) {
 }
 
 void BindNewerMatchCaseParser(nb::module_& module) {
-    nb::class_<CNewerMatchCaseParser, CMatchCaseStatementParser,
-               TMatchCaseParserOperations<CNewerMatchCaseParser>>
+    nb::class_<CNewerMatchCaseParser, CMatchCaseStatementParser, THostSubclass<CNewerMatchCaseParser>>
         binding(module, "CNewerMatchCaseParser", Collected<CNewerMatchCaseParser>(),
                 "Parses match and case statements, open and empty sequences and adjacent strings included.");
     binding.def(TInit<CRef<CPGenParserImpl>>(), "pgen_parser"_a.none());

@@ -276,7 +276,7 @@ bool CNewerParser::_IsPlainName(const nb::tuple& toks, Py_ssize_t i) const {
 
 void BindNewerParser(nb::module_& module) {
     BindNewerMatchCaseParser(module);
-    nb::class_<CNewerParser, CPGenParserImpl, TParserDriverOperations<CNewerParser>> binding(
+    nb::class_<CNewerParser, CPGenParserImpl, THostSubclass<CNewerParser>> binding(
         module, "CNewerParser", Collected<CNewerParser>(),
         "Parses the language up to Python 3.14, with the grammar file of that version.");
     binding.def(TInit<nb::object, nb::object, nb::object, bool>(), "version_triple"_a.none(),

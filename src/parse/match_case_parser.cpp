@@ -198,7 +198,7 @@ void CMatchCaseStatementParser::_FailAt(Py_ssize_t error_i) {
 }
 
 void BindMatchCaseParser(nb::module_& module) {
-    nb::class_<CMatchCaseStatementParser, TMatchCaseParserOperations<CMatchCaseStatementParser>> binding(
+    nb::class_<CMatchCaseStatementParser, THostSubclass<CMatchCaseStatementParser>> binding(
         module, "CMatchCaseStatementParser", Collected<CMatchCaseStatementParser>(),
         "Parses match and case statements by hand, since the grammar files don't know them.");
     binding.def(TInit<CRef<CPGenParserImpl>>(), "pgen_parser"_a.none());

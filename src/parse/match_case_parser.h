@@ -32,20 +32,67 @@ class CMatchCaseStatementParser : public CHosted {
     // `pgen_parser` parses what isn't a pattern, and its factory makes the leaves.
     void Init(CRef<CPGenParserImpl> pgen_parser);
 
-    virtual Py_ssize_t _NonNestedFindTokenIndex(nb::str tok, Py_ssize_t start, Py_ssize_t end);
-    virtual nb::tuple _RemoveSkipToks(nb::tuple toks, nb::tuple positions);
-    virtual CNodeRef ParseMatchStmt(nb::tuple toks, nb::tuple positions);
-    virtual CNodeRef _ParseMatchStmtImpl();
-    virtual CNodeRef ParseCaseStmt(nb::tuple toks, nb::tuple positions);
-    virtual CNodeRef _ParseCaseStmtImpl();
-    virtual CNodeRef _NodeForPattern(Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as = true);
-    virtual CNodeRef _NodeForClassPattern(Py_ssize_t start_i, Py_ssize_t end_i);
-    virtual CNodeRef _NodeForDottedNameValue(Py_ssize_t start_i, Py_ssize_t end_i);
-    virtual CNodeRef _NodeForNumberPattern(Py_ssize_t start_i, Py_ssize_t end_i);
-    virtual CNodeRef _TokNode(Py_ssize_t tok_i);
-    virtual CNodeRef _NodeForSequencePattern(Py_ssize_t start_i, Py_ssize_t end_i);
-    virtual CNodeRef _NodeForMappingPattern(Py_ssize_t start_i, Py_ssize_t end_i);
-    virtual nb::object _ParseExceptionAt(Py_ssize_t error_i);
+    OPERATIONS_OF(CMatchCaseStatementParser, CNoOperations)
+    OPERATION(Py_ssize_t, _NonNestedFindTokenIndex, (nb::str tok, Py_ssize_t start, Py_ssize_t end),
+              "The index in [start, end) of the token text `tok` outside brackets; -1 when there is none.",
+              "tok"_a, "start"_a, "end"_a);
+    OPERATION(nb::tuple, _RemoveSkipToks, (nb::tuple toks, nb::tuple positions),
+              "The tokens without comments and line continuations, and their positions: a pair of tuples.",
+              "toks"_a, "positions"_a);
+    OPERATION(CNodeRef, ParseMatchStmt, (nb::tuple toks, nb::tuple positions),
+              "The CMatchStmt of a logical line, given as tuples of token texts and (row, column) positions; "
+              "None when it is no `match` statement (PEP 634). ParseError on a bad subject.",
+              "toks"_a, "positions"_a);
+    OPERATION(CNodeRef, _ParseMatchStmtImpl, (), "ParseMatchStmt for the tokens of the line under way.");
+    OPERATION(CNodeRef, ParseCaseStmt, (nb::tuple toks, nb::tuple positions),
+              "The CCaseStmt of a logical line, given as tuples of token texts and (row, column) positions; "
+              "None when it is no `case` statement (PEP 634). ParseError on a bad pattern, guard or body.",
+              "toks"_a, "positions"_a);
+    OPERATION(CNodeRef, _ParseCaseStmtImpl, (), "ParseCaseStmt for the tokens of the line under way.");
+    OPERATION(CNodeRef, _NodeForPattern, (Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as = true),
+              "The node of the pattern in [start_i, end_i). `allow_as`: the range may end in `as name`.",
+              "start_i"_a, "end_i"_a, "allow_as"_a = true);
+    OPERATION(CNodeRef, _NodeForClassPattern, (Py_ssize_t start_i, Py_ssize_t end_i),
+              "The CClassPatternNode of `Name(pattern, name=pattern)`.", "start_i"_a, "end_i"_a);
+    OPERATION(CNodeRef, _NodeForDottedNameValue, (Py_ssize_t start_i, Py_ssize_t end_i),
+              "The CExpression of `name.name`; its text and context are None.", "start_i"_a, "end_i"_a);
+    OPERATION(CNodeRef, _NodeForNumberPattern, (Py_ssize_t start_i, Py_ssize_t end_i),
+              "The CPatternNode of a number with a sign or an imaginary part.", "start_i"_a, "end_i"_a);
+    OPERATION(CNodeRef, _TokNode, (Py_ssize_t tok_i),
+              "A leaf for the token at `tok_i`, with the token's position as context.", "tok_i"_a);
+    OPERATION(CNodeRef, _NodeForSequencePattern, (Py_ssize_t start_i, Py_ssize_t end_i),
+              "The CSequencePatternNode of a sequence in brackets or parentheses.", "start_i"_a, "end_i"_a);
+    OPERATION(CNodeRef, _NodeForMappingPattern, (Py_ssize_t start_i, Py_ssize_t end_i),
+              "The CSequencePatternNode of a mapping in braces.", "start_i"_a, "end_i"_a);
+    OPERATION(nb::object, _ParseExceptionAt, (Py_ssize_t error_i),
+              "A ParseError at the token `error_i`, with the token's position as context; not raised here.",
+              "error_i"_a);
+
+    template <class Below>
+    class TOfHost : public Below {
+      public:
+        void DoPatternStep(CPatternWork& work, const CPatternStep& step) override {
+            using EKind = CPatternStep::EKind;
+            switch (step.kind) {
+                case EKind::kPattern:
+                    return work.AddNode(this->_NodeForPattern(step.start_i, step.end_i, step.allow_as));
+                case EKind::kClassPattern:
+                    return work.AddNode(this->_NodeForClassPattern(step.start_i, step.end_i));
+                case EKind::kDottedName:
+                    return work.AddNode(this->_NodeForDottedNameValue(step.start_i, step.end_i));
+                case EKind::kNumber:
+                    return work.AddNode(this->_NodeForNumberPattern(step.start_i, step.end_i));
+                case EKind::kSequence:
+                    return work.AddNode(this->_NodeForSequencePattern(step.start_i, step.end_i));
+                case EKind::kMapping:
+                    return work.AddNode(this->_NodeForMappingPattern(step.start_i, step.end_i));
+                default:
+                    return Below::DoPatternStep(work, step);
+            }
+        }
+    };
+    FOR_HOST_SUBCLASSES(TOfHost)
+    END_OPERATIONS
 
     // Does one step of a pattern: plans the parts of a node, or makes it. A parser of a host subclass makes
     // it by its operations.
@@ -114,65 +161,6 @@ class CMatchCaseStatementParser : public CHosted {
     nb::object _fToks = nb::none();       // tuple of the line's token texts; none between two parses
     nb::object _fPositions = nb::none();  // tuple of their positions; none between two parses
     CBracketSteps _fBracketSteps;         // those of _fToks
-};
-
-template <class Class>
-class TMatchCaseParserOperations : public Class {
-    FIRST_OPERATIONS
-    OPERATION(_NonNestedFindTokenIndex,
-              "The index in [start, end) of the token text `tok` outside brackets; -1 when there is none.",
-              "tok"_a, "start"_a, "end"_a)
-    OPERATION(_RemoveSkipToks,
-              "The tokens without comments and line continuations, and their positions: a pair of tuples.",
-              "toks"_a, "positions"_a)
-    OPERATION(ParseMatchStmt,
-              "The CMatchStmt of a logical line, given as tuples of token texts and (row, column) positions; "
-              "None when it is no `match` statement (PEP 634). ParseError on a bad subject.",
-              "toks"_a, "positions"_a)
-    OPERATION(_ParseMatchStmtImpl, "ParseMatchStmt for the tokens of the line under way.")
-    OPERATION(ParseCaseStmt,
-              "The CCaseStmt of a logical line, given as tuples of token texts and (row, column) positions; "
-              "None when it is no `case` statement (PEP 634). ParseError on a bad pattern, guard or body.",
-              "toks"_a, "positions"_a)
-    OPERATION(_ParseCaseStmtImpl, "ParseCaseStmt for the tokens of the line under way.")
-    OPERATION(_NodeForPattern,
-              "The node of the pattern in [start_i, end_i). `allow_as`: the range may end in `as name`.",
-              "start_i"_a, "end_i"_a, "allow_as"_a = true)
-    OPERATION(_NodeForClassPattern, "The CClassPatternNode of `Name(pattern, name=pattern)`.", "start_i"_a,
-              "end_i"_a)
-    OPERATION(_NodeForDottedNameValue, "The CExpression of `name.name`; its text and context are None.",
-              "start_i"_a, "end_i"_a)
-    OPERATION(_NodeForNumberPattern, "The CPatternNode of a number with a sign or an imaginary part.",
-              "start_i"_a, "end_i"_a)
-    OPERATION(_TokNode, "A leaf for the token at `tok_i`, with the token's position as context.", "tok_i"_a)
-    OPERATION(_NodeForSequencePattern, "The CSequencePatternNode of a sequence in brackets or parentheses.",
-              "start_i"_a, "end_i"_a)
-    OPERATION(_NodeForMappingPattern, "The CSequencePatternNode of a mapping in braces.", "start_i"_a,
-              "end_i"_a)
-    OPERATION(_ParseExceptionAt,
-              "A ParseError at the token `error_i`, with the token's position as context; not raised here.",
-              "error_i"_a)
-    END_OPERATIONS
-
-    void DoPatternStep(CPatternWork& work, const CPatternStep& step) override {
-        using EKind = CPatternStep::EKind;
-        switch (step.kind) {
-            case EKind::kPattern:
-                return work.AddNode(this->_NodeForPattern(step.start_i, step.end_i, step.allow_as));
-            case EKind::kClassPattern:
-                return work.AddNode(this->_NodeForClassPattern(step.start_i, step.end_i));
-            case EKind::kDottedName:
-                return work.AddNode(this->_NodeForDottedNameValue(step.start_i, step.end_i));
-            case EKind::kNumber:
-                return work.AddNode(this->_NodeForNumberPattern(step.start_i, step.end_i));
-            case EKind::kSequence:
-                return work.AddNode(this->_NodeForSequencePattern(step.start_i, step.end_i));
-            case EKind::kMapping:
-                return work.AddNode(this->_NodeForMappingPattern(step.start_i, step.end_i));
-            default:
-                return Class::DoPatternStep(work, step);
-        }
-    }
 };
 
 void BindMatchCaseParser(nb::module_& module);

@@ -190,7 +190,7 @@ bool CPGenParserImpl::_ShouldSkipSlash(Py_ssize_t tok_i, CPositions positions) {
 
 void BindParserDriver(nb::module_& module) {
     BindMatchCaseParser(module);
-    nb::class_<CPGenParserImpl, CPGenAnalyzer, TParserDriverOperations<CPGenParserImpl>> binding(
+    nb::class_<CPGenParserImpl, CPGenAnalyzer, THostSubclass<CPGenParserImpl>> binding(
         module, "CPGenParserImpl", Collected<CPGenParserImpl>(),
         " Analyzes logical using a parser implemented via the pgen2 package ");
     binding

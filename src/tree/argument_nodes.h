@@ -6,11 +6,6 @@
 
 namespace codeloom {
 
-template <class Class>
-class TSingleUsedArgumentOperations;
-template <class Class>
-class TFunctionParameterOperations;
-
 // One argument of a call that isn't a plain expression
 //   child    name  '='  value
 //   child    name  ':='  value
@@ -19,15 +14,15 @@ class TFunctionParameterOperations;
 //   index      0      1        2
 class CSingleUsedArgumentNode : public CNode {
   public:
-    template <class Class>
-    using TOperations = TSingleUsedArgumentOperations<Class>;
-
-    virtual CTextOrNone GetPrefix();
-    virtual CNodeRef GetName();
-    virtual CNodeRef GetValue();
-    virtual bool IsUnparenthesizedGenExpr();
-    virtual CNodeRef GetNameAssigned();
-    virtual CNodeRef GetNamedRightHandExpression();
+    OPERATIONS_OF(CSingleUsedArgumentNode, CNode)
+    OPERATION(CTextOrNone, GetPrefix, (), "\"*\" or \"**\"; None without such.");
+    OPERATION(CNodeRef, GetName, (), "What stands in front of `=`; None when there is no `=`.");
+    OPERATION(CNodeRef, GetValue, (), "The value behind `=`; the node itself when there is no `=`.");
+    OPERATION(bool, IsUnparenthesizedGenExpr, (), "True for a comprehension without brackets of its own.");
+    OPERATION(CNodeRef, GetNameAssigned, (), "What stands in front of `:=`; None when there is no `:=`.");
+    OPERATION(CNodeRef, GetNamedRightHandExpression, (),
+              "The value behind `:=`; None when there is no `:=`.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kNameIndex = 0, kOperatorIndex = 1, kValueIndex = 2;
@@ -39,12 +34,12 @@ class CSingleUsedArgumentNode : public CNode {
 //   index     0        1       2
 class CFunctionParameterDef : public CNode {
   public:
-    template <class Class>
-    using TOperations = TFunctionParameterOperations<Class>;
-
-    virtual CNodeRef GetNestedListNode();
-    virtual CNodeRef GetName();
-    virtual CNodeRef GetTypeExpr();
+    OPERATIONS_OF(CFunctionParameterDef, CNode)
+    OPERATION(CNodeRef, GetNestedListNode, (),
+              "The parameters in brackets of the old tuple form; None for an ordinary parameter.");
+    OPERATION(CNodeRef, GetName, (), "The name; None for the tuple form.");
+    OPERATION(CNodeRef, GetTypeExpr, (), "The annotation; None when there is none.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kCount = 3;
@@ -65,27 +60,5 @@ class CUsedArglistNode : public CNode {};
 //   child    '('  [parameters]  ')'
 //   index     0        1
 class CParametersNode : public CNode {};
-
-template <class Class>
-class TSingleUsedArgumentOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetPrefix, "\"*\" or \"**\"; None without such.")
-    OPERATION(GetName, "What stands in front of `=`; None when there is no `=`.")
-    OPERATION(GetValue, "The value behind `=`; the node itself when there is no `=`.")
-    OPERATION(IsUnparenthesizedGenExpr, "True for a comprehension without brackets of its own.")
-    OPERATION(GetNameAssigned, "What stands in front of `:=`; None when there is no `:=`.")
-    OPERATION(GetNamedRightHandExpression, "The value behind `:=`; None when there is no `:=`.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TFunctionParameterOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetNestedListNode,
-              "The parameters in brackets of the old tuple form; None for an ordinary parameter.")
-    OPERATION(GetName, "The name; None for the tuple form.")
-    OPERATION(GetTypeExpr, "The annotation; None when there is none.")
-    END_OPERATIONS
-};
 
 }  // namespace codeloom

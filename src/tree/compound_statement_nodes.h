@@ -6,30 +6,14 @@
 
 namespace codeloom {
 
-template <class Class>
-class TIfStmtOperations;
-template <class Class>
-class TForStmtOperations;
-template <class Class>
-class TWithStmtOperations;
-template <class Class>
-class TWithItemOperations;
-template <class Class>
-class TExceptClauseOperations;
-template <class Class>
-class TMatchStmtOperations;
-template <class Class>
-class TCaseStmtOperations;
-
 // `if test: suite`; an `elif` is read as `if`, and an `else` stands behind an invented `if 0: pass`
 //   child    'if'  test  ':'  suite  ['elif'  test  ':'  suite] ...  ['else'  ':'  suite]
 //   index      0     1    2     3
 class CIfStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TIfStmtOperations<Class>;
-
-    virtual CExpressionRef GetTestExpression();
+    OPERATIONS_OF(CIfStmt, CStmt)
+    OPERATION(CExpressionRef, GetTestExpression, (), "The condition of the first branch.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kTestIndex = 1;
@@ -40,13 +24,12 @@ class CIfStmt : public CStmt {
 //   index      0      1       2      3       4     5                   last
 class CForStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TForStmtOperations<Class>;
-
-    virtual CNodeRef GetTarget();
-    virtual CNodeRef GetInExpression();
-    virtual CNodeRef GetBody();
-    virtual CNodeRef GetElseBody();
+    OPERATIONS_OF(CForStmt, CStmt)
+    OPERATION(CNodeRef, GetTarget, (), "What is bound in each round.");
+    OPERATION(CNodeRef, GetInExpression, (), "What is iterated over.");
+    OPERATION(CNodeRef, GetBody, (), "The body.");
+    OPERATION(CNodeRef, GetElseBody, (), "The body behind `else`; None when there is none.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kTargetIndex = 1, kIterableIndex = 3, kBodyIndex = 5;
@@ -58,11 +41,10 @@ class CForStmt : public CStmt {
 //   index        0         1     2
 class CWithItem : public CNode {
   public:
-    template <class Class>
-    using TOperations = TWithItemOperations<Class>;
-
-    virtual CNodeRef GetExpression();
-    virtual CNodeRef GetTarget();
+    OPERATIONS_OF(CWithItem, CNode)
+    OPERATION(CNodeRef, GetExpression, (), "The expression in front of `as`.");
+    OPERATION(CNodeRef, GetTarget, (), "The target behind `as`.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kExpressionIndex = 0, kTargetIndex = 2;
@@ -74,10 +56,10 @@ using CWithItemList = nb::typed<nb::list, CWithItem>;
 //   child    'with'  item  ','  item ...  ':'  suite
 class CWithStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TWithStmtOperations<Class>;
-
-    virtual CWithItemList GetWithItems();
+    OPERATIONS_OF(CWithStmt, CStmt)
+    OPERATION(CWithItemList, GetWithItems, (),
+              "A new list of the items with `as`; those without are no CWithItem.");
+    END_OPERATIONS
 };
 
 // `except a as b`, and in the 2.7 grammar `except a, b`; an `except` alone is a keyword leaf
@@ -85,11 +67,10 @@ class CWithStmt : public CStmt {
 //   index       0       1
 class CExceptClause : public CNode {
   public:
-    template <class Class>
-    using TOperations = TExceptClauseOperations<Class>;
-
-    virtual CNodeRef GetExceptionType();
-    virtual CNodeRef GetTarget();
+    OPERATIONS_OF(CExceptClause, CNode)
+    OPERATION(CNodeRef, GetExceptionType, (), "The expression behind `except`.");
+    OPERATION(CNodeRef, GetTarget, (), "What the exception is bound to; None when it isn't.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kTypeIndex = 1;
@@ -100,10 +81,9 @@ class CExceptClause : public CNode {
 //   index       0        1      2
 class CMatchStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TMatchStmtOperations<Class>;
-
-    virtual CExpressionRef GetTestExpression();
+    OPERATIONS_OF(CMatchStmt, CStmt)
+    OPERATION(CExpressionRef, GetTestExpression, (), "The subject.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kSubjectIndex = 1;
@@ -115,75 +95,18 @@ class CMatchStmt : public CStmt {
 // The guard is the `if` statement of its condition.
 class CCaseStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TCaseStmtOperations<Class>;
-
-    virtual CNodeRef GetPattern();
-    virtual CNodeRef GetGuard();
-    virtual CNodeRef GetBody();
+    OPERATIONS_OF(CCaseStmt, CStmt)
+    OPERATION(CNodeRef, GetPattern, (), "The pattern.");
+    OPERATION(
+        CNodeRef, GetGuard, (),
+        "The guard; None with fewer than four children. A case without a guard but with a body has four "
+        "as well, and answers its `:`.");
+    OPERATION(CNodeRef, GetBody, (), "The body on the same logical line; None when there is none.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kPatternIndex = 1, kGuardIndex = 2;
     static constexpr Py_ssize_t kLeastCountWithGuard = 4;
-};
-
-template <class Class>
-class TIfStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetTestExpression, "The condition of the first branch.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TForStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetTarget, "What is bound in each round.")
-    OPERATION(GetInExpression, "What is iterated over.")
-    OPERATION(GetBody, "The body.")
-    OPERATION(GetElseBody, "The body behind `else`; None when there is none.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TWithItemOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetExpression, "The expression in front of `as`.")
-    OPERATION(GetTarget, "The target behind `as`.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TWithStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetWithItems, "A new list of the items with `as`; those without are no CWithItem.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TExceptClauseOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetExceptionType, "The expression behind `except`.")
-    OPERATION(GetTarget, "What the exception is bound to; None when it isn't.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TMatchStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetTestExpression, "The subject.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TCaseStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetPattern, "The pattern.")
-    OPERATION(
-        GetGuard,
-        "The guard; None with fewer than four children. A case without a guard but with a body has four "
-        "as well, and answers its `:`.")
-    OPERATION(GetBody, "The body on the same logical line; None when there is none.")
-    END_OPERATIONS
 };
 
 }  // namespace codeloom

@@ -8,27 +8,16 @@
 
 namespace codeloom {
 
-template <class Class>
-class TClassdefOperations;
-template <class Class>
-class TFuncdefOperations;
-template <class Class>
-class TSingleDecoratorOperations;
-template <class Class>
-class TTypeParameterOperations;
-template <class Class>
-class TWithTypeParametersOperations;
-
 // `class name(arguments): suite`
 //   child    'class'  name  ['('  [arguments]  ')']  ':'  suite
 //   index       0      1      2        3
 class CClassdefStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TClassdefOperations<Class>;
-
-    virtual CTextOrNone GetClassName();
-    virtual CArgumentList GetBaseClassList();
+    OPERATIONS_OF(CClassdefStmt, CStmt)
+    OPERATION(CTextOrNone, GetClassName, (), "The name behind `class`.");
+    OPERATION(CArgumentList, GetBaseClassList, (),
+              "A new list of CArgInfo, one for each base and keyword argument; empty without any.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kNameIndex = 1, kOpenIndex = 2, kArgumentsIndex = 3;
@@ -39,13 +28,13 @@ class CClassdefStmt : public CStmt {
 //   index      0      1       2         3      4           last
 class CFuncdefStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TFuncdefOperations<Class>;
-
-    virtual CTextOrNone GetFunctionName();
-    virtual CRef<CParametersNode> GetParameters();
-    virtual CExpressionRef GetReturnType();
-    virtual CNodeRef GetSuite();
+    OPERATIONS_OF(CFuncdefStmt, CStmt)
+    OPERATION(CTextOrNone, GetFunctionName, (), "The name behind `def`.");
+    OPERATION(CRef<CParametersNode>, GetParameters, (), "The parameters with their brackets.");
+    OPERATION(CExpressionRef, GetReturnType, (),
+              "The expression behind `->`; None when the header has no arrow.");
+    OPERATION(CNodeRef, GetSuite, (), "The body; None for a node without children.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kNameIndex = 1, kParametersIndex = 2, kArrowIndex = 3, kReturnTypeIndex = 4;
@@ -56,11 +45,11 @@ class CFuncdefStmt : public CStmt {
 //   index     0    1      2       3         4
 class CSingleDecorator : public CNode {
   public:
-    template <class Class>
-    using TOperations = TSingleDecoratorOperations<Class>;
-
-    virtual CNodeRef GetDottedName();
-    virtual CArgumentList GetUsedArgList();
+    OPERATIONS_OF(CSingleDecorator, CNode)
+    OPERATION(CNodeRef, GetDottedName, (), "The name behind `@`: a CDottedName, or a CNameLiteral.");
+    OPERATION(CArgumentList, GetUsedArgList, (),
+              "A new list of CArgInfo, one for each argument; empty without any.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kNameIndex = 1, kOpenIndex = 2, kArgumentsIndex = 3, kCloseIndex = 4;
@@ -74,12 +63,11 @@ class CMultipleDecorators : public CNode {};
 //   child    ['*' or '**']  name  [':'  bound]
 class CTypeParameter : public CNode {
   public:
-    template <class Class>
-    using TOperations = TTypeParameterOperations<Class>;
-
-    virtual CTextOrNone GetName();
-    virtual CTextOrNone GetPrefix();
-    virtual CNodeRef GetSpecNode();
+    OPERATIONS_OF(CTypeParameter, CNode)
+    OPERATION(CTextOrNone, GetName, (), "The name of the type parameter.");
+    OPERATION(CTextOrNone, GetPrefix, (), "\"*\" or \"**\"; None for a plain type parameter.");
+    OPERATION(CNodeRef, GetSpecNode, (), "The bound behind the colon; None when there is none.");
+    END_OPERATIONS
 };
 
 // Type parameters, then the statement that they belong to (PEP 695). Made by hand, by no grammar state. The
@@ -87,55 +75,10 @@ class CTypeParameter : public CNode {
 //   child    type parameter  type parameter ...  statement
 class CWithTypeParameters : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TWithTypeParametersOperations<Class>;
-
-    virtual CNodeList GetTypeParameters();
-    virtual CNodeRef GetTypeParameterScopedStatement();
-};
-
-template <class Class>
-class TClassdefOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetClassName, "The name behind `class`.")
-    OPERATION(GetBaseClassList,
-              "A new list of CArgInfo, one for each base and keyword argument; empty without any.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TFuncdefOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetFunctionName, "The name behind `def`.")
-    OPERATION(GetParameters, "The parameters with their brackets.")
-    OPERATION(GetReturnType, "The expression behind `->`; None when the header has no arrow.")
-    OPERATION(GetSuite, "The body; None for a node without children.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TSingleDecoratorOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetDottedName, "The name behind `@`: a CDottedName, or a CNameLiteral.")
-    OPERATION(GetUsedArgList, "A new list of CArgInfo, one for each argument; empty without any.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TTypeParameterOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetName, "The name of the type parameter.")
-    OPERATION(GetPrefix, "\"*\" or \"**\"; None for a plain type parameter.")
-    OPERATION(GetSpecNode, "The bound behind the colon; None when there is none.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TWithTypeParametersOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetTypeParameters, "A new list of the CTypeParameter nodes.")
-    OPERATION(GetTypeParameterScopedStatement,
-              "The assignment, class or function that the type parameters belong to.")
+    OPERATIONS_OF(CWithTypeParameters, CStmt)
+    OPERATION(CNodeList, GetTypeParameters, (), "A new list of the CTypeParameter nodes.");
+    OPERATION(CNodeRef, GetTypeParameterScopedStatement, (),
+              "The assignment, class or function that the type parameters belong to.");
     END_OPERATIONS
 };
 

@@ -7,33 +7,6 @@
 
 namespace codeloom {
 
-template <class Class>
-class TExpressionOperations;
-template <class Class>
-class TOperatorExpressionOperations;
-template <class Class>
-class TStarExpressionOperations;
-template <class Class>
-class TLambdaExprOperations;
-template <class Class, class Base>
-class TYieldOperations;
-template <class Class>
-class TTestListStarExprOperations;
-template <class Class>
-class TAtomExprOperations;
-template <class Class>
-class TPowerOperations;
-template <class Class>
-class TFactorExprOperations;
-template <class Class>
-class TNamedExprOperations;
-template <class Class>
-class TCompForOperations;
-template <class Class>
-class TListmakerOperations;
-template <class Class>
-class TTrailerOperations;
-
 class CExpression;
 using CExpressionRef = CRef<CExpression>;
 
@@ -41,11 +14,15 @@ using CExpressionRef = CRef<CExpression>;
 // sub-expressions, which has none in a plain expression.
 class CExpression : public CNode {
   public:
-    template <class Class>
-    using TOperations = TExpressionOperations<Class>;
-
-    virtual CExpressionRef GetSubExpr(int i);
-    virtual int GetSubExprCount();
+    OPERATIONS_OF(CExpression, CNode)
+    OPERATION(CExpressionRef, GetSubExpr, (int i),
+              "The sub-expression at index `i`: None in a plain expression and in a comprehension. "
+              "ValueError past the end of a comma list, and where an item isn't a CExpression.",
+              "i"_a);
+    OPERATION(int, GetSubExprCount, (),
+              "The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a "
+              "comprehension that stands without its brackets.");
+    END_OPERATIONS
 };
 
 // `a if condition else b`
@@ -57,12 +34,16 @@ class CIfElseExpression : public CExpression {};
 // An operator of two words is a node of two leaves.
 class COperatorExpression : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TOperatorExpressionOperations<Class>;
-
-    virtual CTextOrNone GetOperatorStr(int operator_i);
-    virtual int GetTermCount();
-    virtual CNodeRef GetTerm(int term_index);
+    OPERATIONS_OF(COperatorExpression, CExpression)
+    OPERATION(CTextOrNone, GetOperatorStr, (int operator_i),
+              "The text of the operator at `operator_i`, two words with one blank between them; None below "
+              "the first and past the last.",
+              "operator_i"_a);
+    OPERATION(int, GetTermCount, (), "The number of operands; 1 for `not a`, 0 for a leaf.");
+    OPERATION(CNodeRef, GetTerm, (int term_index),
+              "The operand at `term_index`; None past the end. For `not a` it is `a`, whatever the index.",
+              "term_index"_a);
+    END_OPERATIONS
 
   private:
     static CTextOrNone _TextOfTwoWords(const CNodeRef& node);
@@ -72,10 +53,9 @@ class COperatorExpression : public CExpression {
 //   child    '*'  expression
 class CStarExpression : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TStarExpressionOperations<Class>;
-
-    virtual CExpressionRef GetStarredExpression();
+    OPERATIONS_OF(CStarExpression, CExpression)
+    OPERATION(CExpressionRef, GetStarredExpression, (), "The expression behind the star.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kExpressionIndex = 1;
@@ -89,11 +69,11 @@ class CDottedName : public CExpression {};
 //   index       0           1             last
 class CLambdaExpr : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TLambdaExprOperations<Class>;
-
-    virtual CNodeRef GetArgumentsNode();
-    virtual CNodeRef GetBodyExpr();
+    OPERATIONS_OF(CLambdaExpr, CExpression)
+    OPERATION(CNodeRef, GetArgumentsNode, (),
+              "The one parameter, or the list of parameters; None without parameters.");
+    OPERATION(CNodeRef, GetBodyExpr, (), "The expression behind the colon.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kArgumentsIndex = 1;
@@ -106,11 +86,10 @@ class CTestExpr : public CExpression {};
 //   child    'yield'  argument
 class CYieldExpr : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TYieldOperations<Class, CExpression::TOperations<Class>>;
-
-    virtual CNodeRef GetValue();
-    virtual bool IsYieldFrom();
+    OPERATIONS_OF(CYieldExpr, CExpression)
+    OPERATION(CNodeRef, GetValue, (), "What is yielded; None for a bare `yield`.");
+    OPERATION(bool, IsYieldFrom, (), "True for `yield from`.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kArgumentIndex = 1;
@@ -121,25 +100,25 @@ class CYieldExpr : public CExpression {
 //   child    item  comprehension
 class CTestListStarExpr : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TTestListStarExprOperations<Class>;
-
     CExpressionRef GetSubExpr(int i) override;
     int GetSubExprCount() override;
-    virtual bool IsTuple();
-    virtual bool IsGenExpr();
+    OPERATIONS_OF(CTestListStarExpr, CExpression)
+    OPERATION(bool, IsTuple, (), "True for a comma list; False for a comprehension.");
+    OPERATION(bool, IsGenExpr, (), "True for a comprehension, which stands here without its brackets.");
+    END_OPERATIONS
 };
 
 // `await a`, `a.b`, `a(1)[2]`: an atom and its trailers
 //   child    ['await']  atom  trailer  trailer ...
 class CAtomExpr : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TAtomExprOperations<Class>;
-
-    virtual CNodeRef GetPrefix();
-    virtual CNodeRef GetAtom();
-    virtual CNodeRange GetTrailers();
+    OPERATIONS_OF(CAtomExpr, CExpression)
+    OPERATION(CNodeRef, GetPrefix, (),
+              "The leaf of `await` before the atom; None without one, and where `await` is itself the name "
+              "that the trailers belong to.");
+    OPERATION(CNodeRef, GetAtom, (), "The atom in front of the trailers; None for a leaf.");
+    OPERATION(CNodeRange, GetTrailers, (), "The trailers behind the atom, as a new list.");
+    END_OPERATIONS
 
   private:
     Py_ssize_t _AtomIndex();
@@ -150,12 +129,11 @@ class CAtomExpr : public CExpression {
 //   child    atom  trailer  trailer ...  ['**'  exponent]
 class CPower : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TPowerOperations<Class>;
-
-    virtual CNodeRef GetAtom();
-    virtual CNodeRange GetTrailers();
-    virtual CNodeRef GetExponentNode();
+    OPERATIONS_OF(CPower, CExpression)
+    OPERATION(CNodeRef, GetAtom, (), "The atom in front of the trailers, under either grammar.");
+    OPERATION(CNodeRange, GetTrailers, (), "The trailers between the atom and `**`, as a new list.");
+    OPERATION(CNodeRef, GetExponentNode, (), "The exponent; None without `**`.");
+    END_OPERATIONS
 };
 
 // What a chain is made of: a CAtomExpr or a CPower, whose exponent is no part of it.
@@ -173,10 +151,9 @@ CChainParts PartsOf(Chain& chain) {
 //   child    operator  factor
 class CFactorExpr : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TFactorExprOperations<Class>;
-
-    virtual CTextOrNone GetUnaryOperator();
+    OPERATIONS_OF(CFactorExpr, CExpression)
+    OPERATION(CTextOrNone, GetUnaryOperator, (), "\"+\", \"-\" or \"~\"; None for any other text.");
+    END_OPERATIONS
 };
 
 // `a := b`
@@ -184,11 +161,10 @@ class CFactorExpr : public CExpression {
 //   index     0            2
 class CNamedExpr : public CExpression {
   public:
-    template <class Class>
-    using TOperations = TNamedExprOperations<Class>;
-
-    virtual CNodeRef GetAssignedName();
-    virtual CNodeRef GetRightHandExpression();
+    OPERATIONS_OF(CNamedExpr, CExpression)
+    OPERATION(CNodeRef, GetAssignedName, (), "The name in front of `:=`.");
+    OPERATION(CNodeRef, GetRightHandExpression, (), "The expression behind `:=`.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kNameIndex = 0, kExpressionIndex = 2;
@@ -201,11 +177,10 @@ class CBinaryOp : public CNode {};
 //   child    ['from']  value
 class CYieldArg : public CNode {
   public:
-    template <class Class>
-    using TOperations = TYieldOperations<Class, CNode::TOperations<Class>>;
-
-    virtual CNodeRef GetValue();
-    virtual bool IsYieldFrom();
+    OPERATIONS_OF(CYieldArg, CNode)
+    OPERATION(CNodeRef, GetValue, (), "What is yielded; None for a bare `yield`.");
+    OPERATION(bool, IsYieldFrom, (), "True for `yield from`.");
+    END_OPERATIONS
 };
 
 // `for x in y` within a comprehension, with the next `for` or `if`
@@ -214,13 +189,12 @@ class CYieldArg : public CNode {
 //   child    'async'  the clause, a node of this class
 class CCompForNode : public CNode {
   public:
-    template <class Class>
-    using TOperations = TCompForOperations<Class>;
-
-    virtual bool IsAsync();
-    virtual CNodeRef GetTargetNode();
-    virtual CNodeRef GetInNode();
-    virtual CNodeRef GetCompIterNode();
+    OPERATIONS_OF(CCompForNode, CNode)
+    OPERATION(bool, IsAsync, (), "True for `async for`.");
+    OPERATION(CNodeRef, GetTargetNode, (), "The target between `for` and `in`.");
+    OPERATION(CNodeRef, GetInNode, (), "The iterable behind `in`.");
+    OPERATION(CNodeRef, GetCompIterNode, (), "The `for` or `if` that follows; None for the last one.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kTargetIndex = 1, kIterableIndex = 3, kNextIndex = 4;
@@ -236,11 +210,13 @@ class CCompForNode : public CNode {
 //   child    item  comprehension
 class CListmakerNode : public CNode {
   public:
-    template <class Class>
-    using TOperations = TListmakerOperations<Class>;
-
-    virtual int GetSubExprCount();
-    virtual CExpressionRef GetSubExpr(nb::object i);
+    OPERATIONS_OF(CListmakerNode, CNode)
+    OPERATION(int, GetSubExprCount, (), "The number of items; 1 for a comprehension.");
+    OPERATION(CExpressionRef, GetSubExpr, (nb::object i),
+              "The item at index `i`; None past the end, and for a comprehension. TypeError when it isn't a "
+              "CExpression.",
+              "i"_a);
+    END_OPERATIONS
 
   private:
     bool _IsComprehension();
@@ -251,139 +227,16 @@ class CListmakerNode : public CNode {
 //   child    '(' or '['  [contents]  ')' or ']'
 class CTrailer : public CNode {
   public:
-    template <class Class>
-    using TOperations = TTrailerOperations<Class>;
-
-    virtual CTextOrNone GetDotName();
-    virtual CNodeRef GetNestedNode();
-    virtual CTextOrNone GetInitialToken();
+    OPERATIONS_OF(CTrailer, CNode)
+    OPERATION(CTextOrNone, GetDotName, (), "The name of `.name`; None for other trailers.");
+    OPERATION(CNodeRef, GetNestedNode, (),
+              "The contents of `(...)` or `[...]`; None for empty brackets and for `.name`.");
+    OPERATION(CTextOrNone, GetInitialToken, (),
+              "The text of the first token. ValueError for a trailer without children.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kNameIndex = 1, kContentsIndex = 1;
-};
-
-template <class Class>
-class TExpressionOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetSubExpr,
-              "The sub-expression at index `i`: None in a plain expression and in a comprehension. "
-              "ValueError past the end of a comma list, and where an item isn't a CExpression.",
-              "i"_a)
-    OPERATION(GetSubExprCount,
-              "The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a "
-              "comprehension that stands without its brackets.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TOperatorExpressionOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(GetOperatorStr,
-              "The text of the operator at `operator_i`, two words with one blank between them; None below "
-              "the first and past the last.",
-              "operator_i"_a)
-    OPERATION(GetTermCount, "The number of operands; 1 for `not a`, 0 for a leaf.")
-    OPERATION(GetTerm,
-              "The operand at `term_index`; None past the end. For `not a` it is `a`, whatever the index.",
-              "term_index"_a)
-    END_OPERATIONS
-};
-
-template <class Class>
-class TStarExpressionOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(GetStarredExpression, "The expression behind the star.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TLambdaExprOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(GetArgumentsNode, "The one parameter, or the list of parameters; None without parameters.")
-    OPERATION(GetBodyExpr, "The expression behind the colon.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TTestListStarExprOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(IsTuple, "True for a comma list; False for a comprehension.")
-    OPERATION(IsGenExpr, "True for a comprehension, which stands here without its brackets.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TAtomExprOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(GetPrefix,
-              "The leaf of `await` before the atom; None without one, and where `await` is itself the name "
-              "that the trailers belong to.")
-    OPERATION(GetAtom, "The atom in front of the trailers; None for a leaf.")
-    OPERATION(GetTrailers, "The trailers behind the atom, as a new list.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TPowerOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(GetAtom, "The atom in front of the trailers, under either grammar.")
-    OPERATION(GetTrailers, "The trailers between the atom and `**`, as a new list.")
-    OPERATION(GetExponentNode, "The exponent; None without `**`.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TFactorExprOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(GetUnaryOperator, "\"+\", \"-\" or \"~\"; None for any other text.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TNamedExprOperations : public CExpression::TOperations<Class> {
-    OPERATIONS_BEYOND(CExpression::TOperations<Class>)
-    OPERATION(GetAssignedName, "The name in front of `:=`.")
-    OPERATION(GetRightHandExpression, "The expression behind `:=`.")
-    END_OPERATIONS
-};
-
-// Of a `yield`, and of what stands behind it.
-template <class Class, class Base>
-class TYieldOperations : public Base {
-    OPERATIONS_BEYOND(Base)
-    OPERATION(GetValue, "What is yielded; None for a bare `yield`.")
-    OPERATION(IsYieldFrom, "True for `yield from`.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TCompForOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(IsAsync, "True for `async for`.")
-    OPERATION(GetTargetNode, "The target between `for` and `in`.")
-    OPERATION(GetInNode, "The iterable behind `in`.")
-    OPERATION(GetCompIterNode, "The `for` or `if` that follows; None for the last one.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TListmakerOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetSubExprCount, "The number of items; 1 for a comprehension.")
-    OPERATION(GetSubExpr,
-              "The item at index `i`; None past the end, and for a comprehension. TypeError when it isn't a "
-              "CExpression.",
-              "i"_a)
-    END_OPERATIONS
-};
-
-template <class Class>
-class TTrailerOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetDotName, "The name of `.name`; None for other trailers.")
-    OPERATION(GetNestedNode, "The contents of `(...)` or `[...]`; None for empty brackets and for `.name`.")
-    OPERATION(GetInitialToken, "The text of the first token. ValueError for a trailer without children.")
-    END_OPERATIONS
 };
 
 }  // namespace codeloom

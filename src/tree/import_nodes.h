@@ -6,11 +6,6 @@
 
 namespace codeloom {
 
-template <class Class>
-class TImportNamesOperations;
-template <class Class>
-class TFromImportOperations;
-
 // One imported name.
 class CAsName : public CHosted {
   public:
@@ -33,10 +28,9 @@ using CAsNameList = nb::typed<nb::list, CAsName>;
 //   index       0       1
 class CImportNamesStmt : public CNode {
   public:
-    template <class Class>
-    using TOperations = TImportNamesOperations<Class>;
-
-    virtual CAsNameList GetAsNameList();
+    OPERATIONS_OF(CImportNamesStmt, CNode)
+    OPERATION(CAsNameList, GetAsNameList, (), "A new list of CAsName, one for each imported module.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kNamesIndex = 1;
@@ -49,35 +43,18 @@ class CImportNamesStmt : public CNode {
 // The names are one name, a `name as name`, or a list of such.
 class CFromImportStmt : public CNode {
   public:
-    template <class Class>
-    using TOperations = TFromImportOperations<Class>;
-
-    virtual CTextOrNone GetFromString();
-    virtual bool GetImportStar();
-    virtual CAsNameList GetAsNameList();
-    virtual Py_ssize_t _GetImportIndex();
+    OPERATIONS_OF(CFromImportStmt, CNode)
+    OPERATION(
+        CTextOrNone, GetFromString, (),
+        "The module behind `from`, with its dots; None when nothing stands between `from` and `import`.");
+    OPERATION(bool, GetImportStar, (), "True for `from a import *`.");
+    OPERATION(CAsNameList, GetAsNameList, (),
+              "A new list of CAsName, one for each imported name; a star is such a name.");
+    OPERATION(Py_ssize_t, _GetImportIndex, (), "The index of the child `import`; -1 when there is none.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kModuleIndex = 1;
-};
-
-template <class Class>
-class TImportNamesOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetAsNameList, "A new list of CAsName, one for each imported module.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TFromImportOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(
-        GetFromString,
-        "The module behind `from`, with its dots; None when nothing stands between `from` and `import`.")
-    OPERATION(GetImportStar, "True for `from a import *`.")
-    OPERATION(GetAsNameList, "A new list of CAsName, one for each imported name; a star is such a name.")
-    OPERATION(_GetImportIndex, "The index of the child `import`; -1 when there is none.")
-    END_OPERATIONS
 };
 
 // The index of the first child whose text is `text`; -1 when there is none.

@@ -71,17 +71,10 @@ class CNodeKind {
 template <class Class>
 inline CNodeKind kNodeKind;
 
-template <class Class>
-class TNodeOperations;
-
 // Base of all node classes, and the class of every state that has none of its own.
 // A node class stores nothing: it reads fChildren by position or by short search.
 class CNode : public CHosted {
   public:
-    // The mixin of the class's operations; a class with operations of its own names another.
-    template <class Class>
-    using TOperations = TNodeOperations<Class>;
-
     using CAnyOfKind = CNode;
 
     CNode() = default;
@@ -94,13 +87,32 @@ class CNode : public CHosted {
 
     void Init(CRef<CNodeClassInfo> cls_info) { fClsInfo = std::move(cls_info); }
 
-    virtual Py_ssize_t GetChildCount();
+    OPERATIONS_OF(CNode, CNoOperations)
+    OPERATION(Py_ssize_t, GetChildCount, (), "The number of direct children; 0 for a leaf.");
     virtual Py_ssize_t _GetChildCount();
-    virtual CTextOrNone GetChildText(Py_ssize_t child_i);
+    OPERATION(CTextOrNone, GetChildText, (Py_ssize_t child_i),
+              "The text of the child at `child_i`; None at or past the end, and for a child without text.\n"
+              "A negative index counts from the end; IndexError below the start.",
+              "child_i"_a);
     virtual CTextOrNone _GetChildText(Py_ssize_t i);
-    virtual CNodeRef GetChild(Py_ssize_t child_i);
-    virtual CTextOrNone GetStateName();
-    virtual bool _DoesChildTextMatch(nb::str text);
+    OPERATION(CNodeRef, GetChild, (Py_ssize_t child_i),
+              "The child at `child_i`; None at or past the end. A negative index counts from the end;\n"
+              "IndexError below the start.",
+              "child_i"_a);
+    OPERATION(CTextOrNone, GetStateName, (),
+              "The name of the grammar state; the class name of a node without a class record.");
+    OPERATION(bool, _DoesChildTextMatch, (nb::str text), "True when a direct child's text equals `text`.",
+              "text"_a);
+
+    template <class Below>
+    class TOfHost : public Below {
+      public:
+        TOfHost() { this->_fAsksHost = true; }
+        Py_ssize_t _GetChildCount() override { return CNode::CountWithinBounds(this->GetChildCount()); }
+        CTextOrNone _GetChildText(Py_ssize_t i) override { return this->GetChildText(i); }
+    };
+    FOR_HOST_SUBCLASSES(TOfHost)
+    END_OPERATIONS
 
     // Reading by position, for native code. A borrowed child belongs to the tree: whoever runs host code
     // while holding one holds a CNodeRef.
@@ -178,27 +190,6 @@ class CNode : public CHosted {
         return _HasItem(i) ? CTextOrNone(ChildAt(i).fText) : CTextOrNone();
     }
     CNode& _Asked() const { return const_cast<CNode&>(*this); }
-};
-
-template <class Class>
-class TNodeOperations : public Class {
-    FIRST_OPERATIONS
-    OPERATION(GetChildCount, "The number of direct children; 0 for a leaf.")
-    OPERATION(GetChildText,
-              "The text of the child at `child_i`; None at or past the end, and for a child without text.\n"
-              "A negative index counts from the end; IndexError below the start.",
-              "child_i"_a)
-    OPERATION(GetChild,
-              "The child at `child_i`; None at or past the end. A negative index counts from the end;\n"
-              "IndexError below the start.",
-              "child_i"_a)
-    OPERATION(GetStateName, "The name of the grammar state; the class name of a node without a class record.")
-    OPERATION(_DoesChildTextMatch, "True when a direct child's text equals `text`.", "text"_a)
-    END_OPERATIONS
-
-    TNodeOperations() { this->_fAsksHost = true; }
-    Py_ssize_t _GetChildCount() override { return CNode::CountWithinBounds(this->GetChildCount()); }
-    CTextOrNone _GetChildText(Py_ssize_t i) override { return this->GetChildText(i); }
 };
 
 }  // namespace codeloom

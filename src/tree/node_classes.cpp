@@ -23,7 +23,7 @@ template <class Class, class Base>
 void Bind(nb::module_& module, const char* name, const char* doc,
           std::initializer_list<const char*> rules = {}) {
     kNodeKind<Class>.DeriveFrom(kNodeKind<Base>);
-    nb::class_<Class, Base, typename Class::template TOperations<Class>> binding(module, name, doc);
+    nb::class_<Class, Base, THostSubclass<Class>> binding(module, name, doc);
     binding.def(TInit<CRef<CNodeClassInfo>>(), "cls_info"_a.none() = nb::none());
     BindOperations(binding);
     if (rules.size() != 0) binding.attr("kSupportedRules") = Texts(rules);
@@ -43,8 +43,8 @@ void BindClassInfo(nb::module_& module) {
 
 void BindNode(nb::module_& module) {
     kNodeKind<CNode>.DeriveFrom(CNodeKind());
-    nb::class_<CNode, TNodeOperations<CNode>> binding(module, "CNode", Collected<CNode>(),
-                                                      "Base of all syntax tree nodes.");
+    nb::class_<CNode, THostSubclass<CNode>> binding(module, "CNode", Collected<CNode>(),
+                                                    "Base of all syntax tree nodes.");
     binding.def(TInit<CRef<CNodeClassInfo>>(), "cls_info"_a.none() = nb::none())
         .def_prop_ro(
             "fChildren", [](CNode& node) { return node.fChildren.AsHost(); },
@@ -61,7 +61,7 @@ void BindNode(nb::module_& module) {
 }
 
 void BindFactory(nb::module_& module) {
-    nb::class_<CNodeFactory, TNodeFactoryOperations<CNodeFactory>> binding(
+    nb::class_<CNodeFactory, THostSubclass<CNodeFactory>> binding(
         module, "CNodeFactory", Collected<CNodeFactory>(),
         "Makes nodes for one grammar, from the free lists of its class records.");
     binding

@@ -19,14 +19,28 @@ class CNodeFactory : public CHosted {
     void Init(nb::object gram, nb::object cls_for_nodetype, nb::object keywords, nb::object tok_number2name,
               nb::object op_text2number);
 
-    virtual CNodeRef ConvertSingleNode(int type, nb::handle text, nb::handle context, nb::handle children);
-    virtual CNodeRef NewNode(CNodeClassInfo& clsinfo, int type, nb::handle text, nb::handle context,
-                             nb::handle children);
-    virtual CNodeRef NewKeywordNode(nb::handle text, nb::handle context);
-    virtual CNodeRef NewNameNode(nb::handle text, nb::handle context);
-    virtual CNodeRef CreateOperatorNode(nb::handle text, nb::handle context);
-    virtual void DiscardNodes(nb::handle node);
-    virtual CNodeRef RecursiveConvert(nb::tuple raw);
+    OPERATIONS_OF(CNodeFactory, CNoOperations)
+    OPERATION(CNodeRef, ConvertSingleNode,
+              (int type, nb::handle text, nb::handle context, nb::handle children),
+              "The node for a token (children None) or a completed rule (a list of at least two nodes). A\n"
+              "statement followed by its newline is the statement itself.",
+              "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none());
+    OPERATION(CNodeRef, NewNode,
+              (CNodeClassInfo& clsinfo, int type, nb::handle text, nb::handle context, nb::handle children),
+              "A node of the record `clsinfo`, from its free list or new; `type` is ignored.", "clsinfo"_a,
+              "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none());
+    OPERATION(CNodeRef, NewKeywordNode, (nb::handle text, nb::handle context),
+              "A leaf for a keyword; AttributeError on a factory without keywords.", "text"_a.none(),
+              "context"_a.none());
+    OPERATION(CNodeRef, NewNameNode, (nb::handle text, nb::handle context), "A CNameLiteral leaf.",
+              "text"_a.none(), "context"_a.none());
+    OPERATION(CNodeRef, CreateOperatorNode, (nb::handle text, nb::handle context),
+              "A leaf for an operator; None when `text` isn't one.", "text"_a.none(), "context"_a.none());
+    OPERATION(void, DiscardNodes, (nb::handle node), "Give the tree under `node` back to the free lists.",
+              "node"_a.none());
+    OPERATION(CNodeRef, RecursiveConvert, (nb::tuple raw),
+              "Convert a raw tree of (type, text, context, children) tuples.", "raw"_a);
+    END_OPERATIONS
 
     // ConvertSingleNode for native parsers, whose factory has no overrides: for a token, and for a rule whose
     // children, all of them nodes, stand on a stack from `first` to its top. They leave it.
@@ -57,25 +71,6 @@ class CNodeFactory : public CHosted {
     CRef<CNodeClassInfo> _fKeywordClassInfo;            // one for all keywords; empty without keywords
     nb::object _fKeywords = nb::none();                 // keyword texts as keys
     mutable CKeyFilter _fKeywordFilter;                 // of _fKeywords
-};
-
-template <class Class>
-class TNodeFactoryOperations : public Class {
-    FIRST_OPERATIONS
-    OPERATION(ConvertSingleNode,
-              "The node for a token (children None) or a completed rule (a list of at least two nodes). A\n"
-              "statement followed by its newline is the statement itself.",
-              "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none())
-    OPERATION(NewNode, "A node of the record `clsinfo`, from its free list or new; `type` is ignored.",
-              "clsinfo"_a, "type"_a, "text"_a.none(), "context"_a.none(), "children"_a.none())
-    OPERATION(NewKeywordNode, "A leaf for a keyword; AttributeError on a factory without keywords.",
-              "text"_a.none(), "context"_a.none())
-    OPERATION(NewNameNode, "A CNameLiteral leaf.", "text"_a.none(), "context"_a.none())
-    OPERATION(CreateOperatorNode, "A leaf for an operator; None when `text` isn't one.", "text"_a.none(),
-              "context"_a.none())
-    OPERATION(DiscardNodes, "Give the tree under `node` back to the free lists.", "node"_a.none())
-    OPERATION(RecursiveConvert, "Convert a raw tree of (type, text, context, children) tuples.", "raw"_a)
-    END_OPERATIONS
 };
 
 }  // namespace codeloom

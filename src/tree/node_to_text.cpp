@@ -210,14 +210,13 @@ void CNodeToTextConverterImpl::AppendTextForStringLiteral(std::string& text, CSt
 }
 
 void BindNodeToText(nb::module_& module) {
-    nb::class_<CNodeToTextConverter, TNodeToTextConverterOperations<CNodeToTextConverter>> interface(
+    nb::class_<CNodeToTextConverter, THostSubclass<CNodeToTextConverter>> interface(
         module, "CNodeToTextConverter", Plain(),
         "What turns nodes into short texts; a host may derive its own.");
     interface.def(TInit<>());
     BindOperations(interface);
 
-    nb::class_<CNodeToTextConverterImpl, CNodeToTextConverter,
-               TNodeToTextConverterImplOperations<CNodeToTextConverterImpl>>
+    nb::class_<CNodeToTextConverterImpl, CNodeToTextConverter, THostSubclass<CNodeToTextConverterImpl>>
         converter(module, "CNodeToTextConverterImpl", "Turns nodes into short texts, as names are recorded.");
     converter
         .def(TInit<bool, bool, bool>(), "include_bracket_text"_a = false, "include_string_contents"_a = false,

@@ -25,22 +25,20 @@ class CNodeToTextConverter : public CHosted {
   public:
     void Init() {}
 
-    virtual CBytesOrNone TextForNode(CNode& node, bool dotted_name_only = false,
-                                     bool discard_simple_parens = true, bool literal_only = false,
-                                     bool add_parens_if_operator = false);
-};
-
-template <class Class>
-class TNodeToTextConverterOperations : public Class {
-    FIRST_OPERATIONS
-    OPERATION(TextForNode,
+    OPERATIONS_OF(CNodeToTextConverter, CNoOperations)
+    OPERATION(CBytesOrNone, TextForNode,
+              (CNode& node, bool dotted_name_only = false, bool discard_simple_parens = true,
+               bool literal_only = false, bool add_parens_if_operator = false),
               "The text of a node as UTF-8; None for what can't be rendered. With `dotted_name_only` a chain "
               "ends before its first call or subscript, and what isn't a name or a chain gives None. With "
               "`literal_only` a plain name gives None.",
               "node"_a, "dotted_name_only"_a = false, "discard_simple_parens"_a = true,
-              "literal_only"_a = false, "add_parens_if_operator"_a = false)
+              "literal_only"_a = false, "add_parens_if_operator"_a = false);
     END_OPERATIONS
 };
+
+// Appends what an operation of a host gave; false for none, TypeError for what is no text.
+bool AppendHostText(std::string& text, const nb::object& host_text);
 
 class CNodeToTextConverterImpl : public CNodeToTextConverter {
   public:
@@ -48,11 +46,39 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
 
     CBytesOrNone TextForNode(CNode& node, bool dotted_name_only = false, bool discard_simple_parens = true,
                              bool literal_only = false, bool add_parens_if_operator = false) override;
-    virtual nb::bytes _TextForStringLiteral(CStringLiteral& node);
-    virtual CBytesOrNone TextForAtomPlusTrailers(CNode& atom, const CNodeRange& trailers,
-                                                 bool dotted_name_only = false,
-                                                 bool discard_simple_parens = true,
-                                                 bool literal_only = false);
+    OPERATIONS_OF(CNodeToTextConverterImpl, CNodeToTextConverter)
+    OPERATION(nb::bytes, _TextForStringLiteral, (CStringLiteral& node),
+              "The text of a string literal as UTF-8: its own where that is wanted and harmless, else a "
+              "pair of quotes with the mark of its kind.",
+              "node"_a);
+    OPERATION(CBytesOrNone, TextForAtomPlusTrailers,
+              (CNode& atom, const CNodeRange& trailers, bool dotted_name_only = false,
+               bool discard_simple_parens = true, bool literal_only = false),
+              "The text of an atom and the trailers behind it as UTF-8; None when the atom has none. "
+              "ValueError for a trailer that begins with none of `.`, `(` and `[`.",
+              "atom"_a, "trailers"_a, "dotted_name_only"_a = false, "discard_simple_parens"_a = true,
+              "literal_only"_a = false);
+
+    template <class Below>
+    class TOfHost : public Below {
+      public:
+        bool AppendTextForNode(std::string& text, CNode& node, const CNodeTextOptions& options) override {
+            return AppendHostText(
+                text, this->TextForNode(node, options.dotted_name_only, options.discard_simple_parens,
+                                        options.literal_only, options.add_parens_if_operator));
+        }
+        void AppendTextForStringLiteral(std::string& text, CStringLiteral& node) override {
+            AppendHostText(text, this->_TextForStringLiteral(node));
+        }
+        bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, const CNodeRange& trailers,
+                                           const CNodeTextOptions& options) override {
+            return AppendHostText(
+                text, this->TextForAtomPlusTrailers(atom, trailers, options.dotted_name_only,
+                                                    options.discard_simple_parens, options.literal_only));
+        }
+    };
+    FOR_HOST_SUBCLASSES(TOfHost)
+    END_OPERATIONS
 
     // The operations as native code calls them: they append to `text`, and answer false for none, which
     // leaves `text` with an unfinished piece. A converter of a host subclass goes through its overrides.
@@ -78,39 +104,6 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
     bool _AppendJoinedChildren(std::string& text, CNode& node, const CNodeTextOptions& options);
     bool _AppendTrailer(std::string& text, CTrailer& trailer, const CNodeTextOptions& options);
     void _AppendNested(std::string& text, CTrailer& trailer, std::string_view brackets, bool with_contents);
-};
-
-// Appends what an operation of a host gave; false for none, TypeError for what is no text.
-bool AppendHostText(std::string& text, const nb::object& host_text);
-
-template <class Class>
-class TNodeToTextConverterImplOperations : public TNodeToTextConverterOperations<Class> {
-    OPERATIONS_BEYOND(TNodeToTextConverterOperations<Class>)
-    OPERATION(_TextForStringLiteral,
-              "The text of a string literal as UTF-8: its own where that is wanted and harmless, else a "
-              "pair of quotes with the mark of its kind.",
-              "node"_a)
-    OPERATION(TextForAtomPlusTrailers,
-              "The text of an atom and the trailers behind it as UTF-8; None when the atom has none. "
-              "ValueError for a trailer that begins with none of `.`, `(` and `[`.",
-              "atom"_a, "trailers"_a, "dotted_name_only"_a = false, "discard_simple_parens"_a = true,
-              "literal_only"_a = false)
-    END_OPERATIONS
-
-    bool AppendTextForNode(std::string& text, CNode& node, const CNodeTextOptions& options) override {
-        return AppendHostText(text,
-                              this->TextForNode(node, options.dotted_name_only, options.discard_simple_parens,
-                                                options.literal_only, options.add_parens_if_operator));
-    }
-    void AppendTextForStringLiteral(std::string& text, CStringLiteral& node) override {
-        AppendHostText(text, this->_TextForStringLiteral(node));
-    }
-    bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, const CNodeRange& trailers,
-                                       const CNodeTextOptions& options) override {
-        return AppendHostText(
-            text, this->TextForAtomPlusTrailers(atom, trailers, options.dotted_name_only,
-                                                options.discard_simple_parens, options.literal_only));
-    }
 };
 
 void BindNodeToText(nb::module_& module);

@@ -7,17 +7,6 @@
 
 namespace codeloom {
 
-template <class Class>
-class TExprStmtOperations;
-template <class Class>
-class TAnnotatedAssignOperations;
-template <class Class>
-class TReturnStmtOperations;
-template <class Class>
-class TDelStmtOperations;
-template <class Class>
-class TNameListOperations;
-
 // Names as text strings.
 using CNameList = nb::typed<nb::list, nb::str>;
 
@@ -26,11 +15,10 @@ using CNameList = nb::typed<nb::list, nb::str>;
 //   index     0       1         2     3
 class CAnnotatedAssignNode : public CNode {
   public:
-    template <class Class>
-    using TOperations = TAnnotatedAssignOperations<Class>;
-
-    virtual CNodeRef GetTypeHintNode();
-    virtual CNodeRef GetPostEqualsTestExpr();
+    OPERATIONS_OF(CAnnotatedAssignNode, CNode)
+    OPERATION(CNodeRef, GetTypeHintNode, (), "The annotation behind the colon.");
+    OPERATION(CNodeRef, GetPostEqualsTestExpr, (), "The value behind `=`; None for a bare annotation.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kHintIndex = 1, kValueIndex = 3;
@@ -43,14 +31,23 @@ class CAnnotatedAssignNode : public CNode {
 //   index      0         1
 class CExprStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TExprStmtOperations<Class>;
-
-    virtual Py_ssize_t GetEqualCount();
-    virtual CRef<CAnnotatedAssignNode> GetAnnotatedAssignNode();
-    virtual CNodeRef GetInitialTestExpr();
-    virtual CNodeRef GetPostEqualsTestExpr(int equal_num);
-    virtual CTextOrNone GetAugAssignOp();
+    OPERATIONS_OF(CExprStmt, CStmt)
+    OPERATION(
+        Py_ssize_t, GetEqualCount, (),
+        "The number of `=` of the statement itself; those of arguments, and of an annotated assignment, "
+        "don't count.");
+    OPERATION(CRef<CAnnotatedAssignNode>, GetAnnotatedAssignNode, (),
+              "The annotation and its value; None when there is no annotation.");
+    OPERATION(CNodeRef, GetInitialTestExpr, (),
+              "The first target, or the expression in front of an operator.");
+    OPERATION(CNodeRef, GetPostEqualsTestExpr, (int equal_num),
+              "The target or value behind the `=` numbered `equal_num`, from zero; ValueError when there are "
+              "fewer.",
+              "equal_num"_a);
+    OPERATION(CTextOrNone, GetAugAssignOp, (),
+              "The operator of an augmented assignment, such as \"+=\"; None when there is none. The "
+              "operators \"|=\" and \"@=\" aren't told.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kTargetIndex = 0, kOperatorIndex = 1, kFirstValueIndex = 2;
@@ -60,10 +57,9 @@ class CExprStmt : public CStmt {
 //   child    'return'  value
 class CReturnStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TReturnStmtOperations<Class>;
-
-    virtual CNodeRef GetValue();
+    OPERATIONS_OF(CReturnStmt, CStmt)
+    OPERATION(CNodeRef, GetValue, (), "The expression that is returned; None when there is none.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kValueIndex = 1;
@@ -73,10 +69,10 @@ class CReturnStmt : public CStmt {
 //   child    'del'  expression or comma list
 class CDelStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TDelStmtOperations<Class>;
-
-    virtual CNodeList GetExpressions();
+    OPERATIONS_OF(CDelStmt, CStmt)
+    OPERATION(CNodeList, GetExpressions, (),
+              "A new list of the expressions that are deleted. One in brackets is a single expression.");
+    END_OPERATIONS
 
   private:
     static constexpr Py_ssize_t kExpressionIndex = 1;
@@ -86,72 +82,21 @@ class CDelStmt : public CStmt {
 //   child    'global'  name  ','  name ...
 class CGlobalStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TNameListOperations<Class>;
-
-    virtual CNameList GetUtf8NameList();
+    OPERATIONS_OF(CGlobalStmt, CStmt)
+    OPERATION(CNameList, GetUtf8NameList, (), "A new list of the names, as text strings.");
+    END_OPERATIONS
 };
 
 // `nonlocal a, b`
 //   child    'nonlocal'  name  ','  name ...
 class CNonlocalStmt : public CStmt {
   public:
-    template <class Class>
-    using TOperations = TNameListOperations<Class>;
-
-    virtual CNameList GetUtf8NameList();
+    OPERATIONS_OF(CNonlocalStmt, CStmt)
+    OPERATION(CNameList, GetUtf8NameList, (), "A new list of the names, as text strings.");
+    END_OPERATIONS
 };
 
 // Declared for hosts: `pass` is a keyword leaf.
 class CPassStmt : public CStmt {};
-
-template <class Class>
-class TAnnotatedAssignOperations : public CNode::TOperations<Class> {
-    OPERATIONS_BEYOND(CNode::TOperations<Class>)
-    OPERATION(GetTypeHintNode, "The annotation behind the colon.")
-    OPERATION(GetPostEqualsTestExpr, "The value behind `=`; None for a bare annotation.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TExprStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(
-        GetEqualCount,
-        "The number of `=` of the statement itself; those of arguments, and of an annotated assignment, "
-        "don't count.")
-    OPERATION(GetAnnotatedAssignNode, "The annotation and its value; None when there is no annotation.")
-    OPERATION(GetInitialTestExpr, "The first target, or the expression in front of an operator.")
-    OPERATION(GetPostEqualsTestExpr,
-              "The target or value behind the `=` numbered `equal_num`, from zero; ValueError when there are "
-              "fewer.",
-              "equal_num"_a)
-    OPERATION(GetAugAssignOp,
-              "The operator of an augmented assignment, such as \"+=\"; None when there is none. The "
-              "operators \"|=\" and \"@=\" aren't told.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TReturnStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetValue, "The expression that is returned; None when there is none.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TDelStmtOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetExpressions,
-              "A new list of the expressions that are deleted. One in brackets is a single expression.")
-    END_OPERATIONS
-};
-
-template <class Class>
-class TNameListOperations : public CStmt::TOperations<Class> {
-    OPERATIONS_BEYOND(CStmt::TOperations<Class>)
-    OPERATION(GetUtf8NameList, "A new list of the names, as text strings.")
-    END_OPERATIONS
-};
 
 }  // namespace codeloom

@@ -129,7 +129,7 @@ void Set(CNodeWalker& walker, CTruth value) {
 }  // namespace
 
 void BindNodeWalker(nb::module_& module) {
-    nb::class_<CNodeWalker, TNodeWalkerOperations<CNodeWalker>> binding(
+    nb::class_<CNodeWalker, THostSubclass<CNodeWalker>> binding(
         module, "CNodeWalker", Collected<CNodeWalker>(), "Records what a logical line does with names.");
     binding.def(TInit<nb::tuple>(), "version_triple"_a)
         .def_prop_rw("_fIncludeExprText", Get<&CNodeWalker::_fIncludeExprText>,

@@ -18,8 +18,8 @@ constexpr const char* kLogicalLineDoc =
     "utils.GetLogicalsFromText makes them from source text.";
 
 void BindLogicalLine(nb::module_& module) {
-    nb::class_<CLogicalLine, TLogicalLineOperations<CLogicalLine>> binding(
-        module, "CLogicalLine", Collected<CLogicalLine>(), kLogicalLineDoc);
+    nb::class_<CLogicalLine, THostSubclass<CLogicalLine>> binding(module, "CLogicalLine",
+                                                                  Collected<CLogicalLine>(), kLogicalLineDoc);
     binding
         .def(TInit<nb::object, nb::tuple, nb::tuple, int32_t, nb::tuple, nb::object>(), "type"_a, "toks"_a,
              "positions"_a, "first_line"_a = 0, "exp_logicals"_a = nb::tuple(), "tok_types"_a = nb::none())

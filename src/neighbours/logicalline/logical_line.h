@@ -38,12 +38,20 @@ class CLogicalLine : public CHosted {
     // its arguments, and those of each embedded logical. Requires: the tokenizer made the record.
     void SetRecords(CPackedRecords equivs, CPackedRecords arg_equivs, std::vector<CPackedRecords> embedded);
 
-    virtual int GetTokenType(Py_ssize_t i);
-    virtual void AppendTypeEquiv(nb::handle name, nb::handle equiv);
-    virtual void AppendArgTypeEquiv(nb::handle name, nb::handle equiv);
-    virtual void MarkParsed(bool parsed);
-    virtual void ClearDerivedInfo();
-    virtual nb::object GetExpLogicals();
+    OPERATIONS_OF(CLogicalLine, CNoOperations)
+    OPERATION(int, GetTokenType, (Py_ssize_t i), "The token type, an integer, of the token at index `i`.",
+              "i"_a);
+    OPERATION(void, AppendTypeEquiv, (nb::handle name, nb::handle equiv),
+              "Append the pair (name, equiv) of UTF-8 byte strings to `fTypeEquivs`.", "name"_a, "equiv"_a);
+    OPERATION(void, AppendArgTypeEquiv, (nb::handle name, nb::handle equiv),
+              "Append the pair (name, equiv) of UTF-8 byte strings to `fArgTypeEquivs`.", "name"_a,
+              "equiv"_a);
+    OPERATION(void, MarkParsed, (bool parsed),
+              "Set or clear `fParsed`; a logical that is marked isn't analyzed again.", "parsed"_a);
+    OPERATION(void, ClearDerivedInfo, (),
+              "Drop all that analysis has recorded on this logical and on its embedded logicals.");
+    OPERATION(nb::object, GetExpLogicals, (), "The embedded logicals, a tuple in source order.");
+    END_OPERATIONS
 
     // The host's tuples, made on demand; none in a record whose Init failed.
     virtual nb::object GetToks();
@@ -94,22 +102,6 @@ class CLogicalLine : public CHosted {
 
 // The record of a logical that the tokenizer made; it lies in `source`.
 nb::object HostLogical(const CRawLogical& raw, const CSourceTextRef& source);
-
-template <class Class>
-class TLogicalLineOperations : public Class {
-    FIRST_OPERATIONS
-    OPERATION(GetTokenType, "The token type, an integer, of the token at index `i`.", "i"_a)
-    OPERATION(AppendTypeEquiv, "Append the pair (name, equiv) of UTF-8 byte strings to `fTypeEquivs`.",
-              "name"_a, "equiv"_a)
-    OPERATION(AppendArgTypeEquiv, "Append the pair (name, equiv) of UTF-8 byte strings to `fArgTypeEquivs`.",
-              "name"_a, "equiv"_a)
-    OPERATION(MarkParsed, "Set or clear `fParsed`; a logical that is marked isn't analyzed again.",
-              "parsed"_a)
-    OPERATION(ClearDerivedInfo,
-              "Drop all that analysis has recorded on this logical and on its embedded logicals.")
-    OPERATION(GetExpLogicals, "The embedded logicals, a tuple in source order.")
-    END_OPERATIONS
-};
 
 // The positions of a token tuple: a tuple of (row, col), those of a logical, or none.
 class CPositions {

@@ -49,20 +49,20 @@ void BindGrammar(nb::module_& module) {
 }
 
 void BindNodeConverter(nb::module_& module) {
-    nb::class_<NodeConverter, TNodeConverterOperations<NodeConverter>> binding(
+    nb::class_<NodeConverter, THostSubclass<NodeConverter>> binding(
         module, "NodeConverter", Plain(), "Makes the nodes of a parse; derive from it to make your own.");
     binding.def(TInit<>());
     BindOperations(binding);
 }
 
 void BindParser(nb::module_& module) {
-    nb::class_<Parser, TParserOperations<Parser>> binding(
+    nb::class_<Parser, THostSubclass<Parser>> binding(
         module, "Parser", Plain(), "What takes the tokens of a text one by one. CreateParser makes one.");
     binding.def(TInit<>());
     BindOperations(binding);
 
-    nb::class_<ParserImpl, Parser, TParserOperations<ParserImpl>> impl(
-        module, "ParserImpl", Collected<ParserImpl>(), kParserImplDoc);
+    nb::class_<ParserImpl, Parser, THostSubclass<ParserImpl>> impl(module, "ParserImpl",
+                                                                   Collected<ParserImpl>(), kParserImplDoc);
     impl.def(TInit<CGrammar&, CRef<NodeConverter>, bool>(), "grammar"_a, "node_converter"_a = nb::none(),
              "promotesinglechild"_a = true);
     BindOperations(impl);
