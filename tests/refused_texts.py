@@ -126,10 +126,15 @@ class _Watched:
                 source = bytes(source).decode()
             except UnicodeDecodeError:
                 return
-        if isinstance(source, str) and "\0" not in source and len(source) < 20_000:
+        if isinstance(source, str) and self._IsMeant(source):
             self._fNote(source)
             if textwrap.dedent(source) != source:
                 self._fNote(textwrap.dedent(source))
+
+    @staticmethod
+    def _IsMeant(source: str) -> bool:
+        """A byte order mark is refused in a text, but not in a file that begins with it."""
+        return "\0" not in source and source[:1] != "\ufeff" and len(source) < 20_000
 
 
 def _BadFiles() -> Iterator[str]:

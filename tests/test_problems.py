@@ -22,7 +22,7 @@ def Found(text, python="3.12"):
         "",
         "\n\n",
         "# only a comment",
-        "\\\n",
+        "\\\n\n",
         "x = 1",
         "x = [\n\n1,  # one\n\n]\r\ny = '''\r\n'''\rz = 3\n",
         "if x: pass\nelif y: pass\nelse: pass\n",
@@ -128,7 +128,7 @@ def test_a_problem_tells_all_of_its_place(write_files):
 
 
 def test_a_walk_that_hits_a_limit_prints_nothing(capfd):
-    analysis = analyze("a" + ".a" * 2_000 + "\nx = " + "(" * 2_000 + ")" * 2_000)
+    analysis = analyze("a" + ".a" * 2_000 + "\nx = " + "-" * 2_000 + "1")
     assert not analysis.problems and analysis.records
     assert capfd.readouterr() == ("", "")
 

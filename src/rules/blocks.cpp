@@ -4,6 +4,7 @@
 #include <string>
 #include <utility>
 
+#include "rules/patterns.h"
 #include "text/scan.h"
 
 namespace codeloom {
@@ -62,7 +63,14 @@ std::string_view WhatComesBefore(EClause clause) {
 
 void CBlockTracker::Enter(const CRawLogical& logical) {
     _fHead = ReadStatementHead(logical);
+    _fText = logical.file_text;
+    _fTakesAll = {};
     _fHasPlaceProblem = _fHaveChanged = false;
+    _FindPlace(logical);
+    if (_fHead.IsHeader()) _CheckFrames();
+}
+
+void CBlockTracker::_FindPlace(const CRawLogical& logical) {
     const CRawToken& first = logical.tokens.front();
     const uint32_t token_start = logical.StartOf(first);
     const uint32_t row_start = token_start - static_cast<uint32_t>(first.position.col);
@@ -73,6 +81,36 @@ void CBlockTracker::Enter(const CRawLogical& logical) {
     const std::string_view before = logical.file_text.substr(row_start, token_start - row_start);
     _fIsMidRow = std::any_of(before.begin(), before.end(), [](char c) { return !IsBlank(c); });
     if (!_fIsMidRow) _Place(MeasureIndent(before));
+}
+
+// The frames that the interpreter keeps for a block while it runs.
+uint32_t CBlockTracker::_FramesOf(const CStatementHead& head) const {
+    constexpr int kCountsHandlerTwice = 309;
+    switch (head.clause) {
+        case EClause::kFor:
+        case EClause::kAsyncFor:
+        case EClause::kWhile:
+        case EClause::kTry:
+        case EClause::kFinally:
+            return 1;
+        case EClause::kWith:
+        case EClause::kAsyncWith:
+            return head.with_item_count;
+        case EClause::kExcept:
+        case EClause::kBareExcept:
+        case EClause::kExceptStar:
+            if (!_fLanguage.IsPython3()) return 0;
+            return _fLanguage.version >= kCountsHandlerTwice ? 2 : 1;
+        default:
+            return 0;
+    }
+}
+
+// The interpreter's limit, reported once: 20, and from 3.13 on 21, where an `async def` needs one for itself.
+void CBlockTracker::_CheckFrames() {
+    const uint32_t most = _fLanguage.version >= 313 ? 21 : 20;
+    if (_Top().frame_count + _FramesOf(_fHead) <= most || std::exchange(_fHasTooManyFrames, true)) return;
+    _Report(ECode::kTooManyBlocks, _fHead.start, _fHead.end, "too many statically nested blocks");
 }
 
 void CBlockTracker::_Place(const CIndent& indent) {
@@ -163,6 +201,10 @@ void CBlockTracker::_Open(const CIndent& indent, EClause clause, bool is_unknown
     block.clause = clause;
     block.is_unknown = is_unknown;
     block.header = _Top().previous;
+    const bool is_scope =
+        clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass;
+    block.frame_count = is_scope ? clause == EClause::kAsyncDef && _fLanguage.version >= 313
+                                 : _Top().frame_count + _FramesOf(block.header);
     block.has_mixed_tabs = _Top().has_mixed_tabs;
     block.is_depth_in_doubt = _fPreviousHasFault || _Top().lacks_block;
     _fHaveChanged = true;
@@ -241,6 +283,7 @@ void CBlockTracker::Leave(bool has_fault) {
         block.bare_except_start = _fHead.start;
         block.bare_except_end = _fHead.end;
     }
+    if (_fHead.clause == EClause::kCase) block.takes_all = _fTakesAll;
     if (_fHead.clause == EClause::kElse) block.is_of_try = IsHandler(block.previous.clause);
     block.is_first = block.is_empty;
     block.is_empty = false;
@@ -270,6 +313,7 @@ void CBlockTracker::_CheckClause(CBlock& block) {
         return _CheckPending(block, _fHead.start, _fHead.end);
     const bool ends_try = IsHandler(clause) || clause == EClause::kFinally;
     if (before == EClause::kTry && !ends_try) return _CheckPending(block, _fHead.start, _fHead.end);
+    if (clause == EClause::kCase) return _CheckCase(block);
     if (!IsContinuation(clause)) return;
     if (!_MayFollow(block, clause)) {
         std::string message = Quoted(KeywordOf(clause));
@@ -294,6 +338,14 @@ bool CBlockTracker::_MayFollow(const CBlock& block, EClause clause) const {
         default:
             return before == EClause::kTry || IsHandler(before);
     }
+}
+
+void CBlockTracker::_CheckCase(CBlock& block) {
+    const CSpan name = std::exchange(block.takes_all, {});
+    if (name.start == name.end) return;
+    CProblem& problem = _Report(ECode::kPatternsUnreachable, name.start, name.end,
+                                WordsOfUnreachable(_fText.substr(name.start, name.end - name.start)));
+    problem.related.push_back({_fHead.start, _fHead.end, "a case after it"});
 }
 
 void CBlockTracker::_CheckExcept(CBlock& block) {

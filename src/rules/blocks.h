@@ -14,6 +14,8 @@
 
 #include "rules/problem.h"
 #include "rules/statement_head.h"
+#include "syntax/language.h"
+#include "syntax/nodes.h"
 #include "tokenizer/raw_logical.h"
 
 namespace codeloom {
@@ -46,14 +48,22 @@ struct CBlock {
     bool is_of_try = false;            // the `else` before is that of a `try`
     EClause lacking_clause = EClause::kSimple;
     uint32_t bare_except_start = 0, bare_except_end = 0;  // of the `try` under way; equal where it has none
+    CSpan takes_all;  // in the pattern of a case before that leaves nothing to others; empty for none
+    uint32_t frame_count = 0;  // of the function's blocks that the interpreter keeps a frame for, here
 };
 
 class CBlockTracker {
   public:
-    explicit CBlockTracker(CProblems& problems) : _fProblems(problems) { _fBlocks.emplace_back(); }
+    CBlockTracker(const CLanguage& language, CProblems& problems)
+        : _fLanguage(language), _fProblems(problems) {
+        _fBlocks.emplace_back();
+    }
 
     // Finds the block of a line by its indentation, before the line is analysed. Not for comments.
     void Enter(const CRawLogical& logical);
+
+    // The line that was entered last is a `case` whose pattern takes everything by this name.
+    void TakeAllCases(const CSpan& name) { _fTakesAll = name; }
 
     // Takes note of the line that was entered last: whether it has a fault of its own.
     void Leave(bool has_fault);
@@ -77,6 +87,7 @@ class CBlockTracker {
     static constexpr size_t kMostIndents = 100;  // of the interpreter
 
     CBlock& _Top() { return _fBlocks.back(); }
+    void _FindPlace(const CRawLogical& logical);
     void _Place(const CIndent& indent);
     void _PlaceDeeper(const CIndent& indent);
     void _PlaceOut(const CIndent& indent);
@@ -89,19 +100,26 @@ class CBlockTracker {
     void _CheckClause(CBlock& block);
     bool _MayFollow(const CBlock& block, EClause clause) const;
     void _CheckExcept(CBlock& block);
+    void _CheckCase(CBlock& block);
+    uint32_t _FramesOf(const CStatementHead& head) const;
+    void _CheckFrames();
     void _DropPlacementSince(uint32_t start);
     CProblem& _Report(ECode code, uint32_t start, uint32_t end, std::string message);
 
+    const CLanguage& _fLanguage;
     CProblems& _fProblems;
+    std::string_view _fText;  // of the file
     std::vector<CBlock> _fBlocks;
     std::vector<CBlock> _fClosed;  // by depth of the stack, the last block left there
     CStatementHead _fHead;         // of the line entered last
+    CSpan _fTakesAll;              // in it
     bool _fHaveChanged = false;
     bool _fIsMidRow = false;
     bool _fHasPlaceProblem = false;
     bool _fOpensBlock = false;  // the line before is a header without a body on its row
     bool _fPreviousHasFault = false;
     bool _fHasTooMany = false;
+    bool _fHasTooManyFrames = false;
 };
 
 }  // namespace codeloom

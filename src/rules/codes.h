@@ -9,8 +9,11 @@ namespace codeloom {
 
 enum class ECode : uint16_t {
     kUnreadable = 101,
+    kBackslashAtEnd = 111,
     kBytesNotAscii = 121,
     kMixedBytesAndText = 122,
+    kInvalidEscape = 123,
+    kNumberRunsOn = 131,
 
     kInvalidSyntax = 201,
 
@@ -73,6 +76,9 @@ enum class ECode : uint16_t {
 
     kTooManyIndents = 901,
     kLineTooLong = 902,
+    kTooManyBlocks = 903,
+    kTooManyParentheses = 904,
+    kFieldsTooDeep = 905,
 };
 
 // A statement or an expression that stands where it may not.

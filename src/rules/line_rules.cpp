@@ -98,10 +98,12 @@ uint64_t KindsBelowRoot(const CTree& tree) {
 
 }  // namespace
 
-void CheckLine(const CTree& tree, const CLanguage& language, bool in_class, CProblems& problems) {
+void CheckLine(const CTree& tree, const CLanguage& language, const CLineSetting& setting,
+               CProblems& problems) {
     CheckLiterals(tree.Line(), language, problems);
     if (tree.fIsEmpty || tree.fRoot.IsLeaf() || (tree.Kinds() & kKindsWithRules) == 0) return;
     const CRuleContext context{tree, language, problems};
+    if (setting.defers_annotations) CheckAnnotations(context);
     CheckNode(context, tree.fRoot);
     if ((KindsBelowRoot(tree) & kKindsWithRules) != 0) {
         for (const CTreeNode& node : tree.NodesBelowRoot())
@@ -109,7 +111,7 @@ void CheckLine(const CTree& tree, const CLanguage& language, bool in_class, CPro
                 CheckNode(context, node);
     }
     if (tree.HasKind(ENodeKind::kStar)) CheckStars(context);
-    if (tree.HasKind(ENodeKind::kCompFor)) CheckComprehensions(context, in_class);
+    if (tree.HasKind(ENodeKind::kCompFor)) CheckComprehensions(context, setting.in_class);
     const bool is_alias = tree.Line().type == ELogicalType::kTypeStatement;
     if (is_alias && tree.fRoot.Is(ENodeKind::kExprStmt))
         CheckDeferred(context, ValueOfAssignment(tree, tree.fRoot), "a type alias");

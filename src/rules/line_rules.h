@@ -5,7 +5,13 @@
 
 namespace codeloom {
 
-// `in_class` where the line is in the body of a class and holds a comprehension.
-void CheckLine(const CTree& tree, const CLanguage& language, bool in_class, CProblems& problems);
+// What the rules must know of the text around a line.
+struct CLineSetting {
+    bool in_class = false;            // in the body of a class, with a comprehension
+    bool defers_annotations = false;  // they aren't evaluated with the statement that they are in
+};
+
+void CheckLine(const CTree& tree, const CLanguage& language, const CLineSetting& setting,
+               CProblems& problems);
 
 }  // namespace codeloom

@@ -1,8 +1,12 @@
 #include "rules/literals.h"
 
 #include <algorithm>
+#include <array>
 
+#include "rules/escapes.h"
+#include "rules/fields.h"
 #include "syntax/atoms.h"
+#include "text/words.h"
 
 namespace codeloom {
 
@@ -25,16 +29,73 @@ void CheckBytes(const CRawLogical& line, const CRawToken& token, CProblems& prob
                         {}});
 }
 
-}  // namespace
+void CheckFields(const CRawLogical& line, const CRawToken& token, const CLanguage& language,
+                 CProblems& problems) {
+    const int most_levels = language.version >= 312 ? 3 : 2;
+    const std::string_view text = line.Text(token);
+    if (std::count(text.begin(), text.end(), '{') <= most_levels) return;
+    constexpr int kMostStrings = 149;
+    const CStringFields fields = ReadFields(line, token);
+    const char* const message = fields.levels > most_levels ? "f-string: expressions nested too deeply"
+                                : fields.string_levels > kMostStrings ? "too many nested f-strings"
+                                                                      : nullptr;
+    if (message != nullptr)
+        problems.push_back({ECode::kFieldsTooDeep, token.start, line.EndOf(token), message, {}, {}});
+}
 
-void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
-    if (!line.may_have_strings || !language.IsPython3()) return;
+// A number that a keyword follows without a blank.
+bool RunsOn(std::string_view number, const CRawToken& next, char letter, const CLanguage& language) {
+    if (number == "0" && (letter == 'o' || letter == 'x' || letter == 'b')) return true;
+    constexpr int kRefusesOtherWords = 310;
+    constexpr auto kMayFollow = std::to_array<EWord>({EWord::kAnd, EWord::kElse, EWord::kFor, EWord::kIf,
+                                                      EWord::kIn, EWord::kIs, EWord::kNot, EWord::kOr});
+    return language.version >= kRefusesOtherWords &&
+           std::find(kMayFollow.begin(), kMayFollow.end(), next.word) == kMayFollow.end();
+}
+
+void CheckNumber(const CRawLogical& line, const CRawToken& token, const CRawToken& next,
+                 const CLanguage& language, CProblems& problems) {
+    if (next.start != line.EndOf(token) || next.type != kTokenId_NAME) return;
+    const char letter = AsLower(line.Text(next)[0]);
+    if (!RunsOn(line.Text(token), next, letter, language)) return;
+    const char* const message = letter == 'o'   ? "invalid octal literal"
+                                : letter == 'x' ? "invalid hexadecimal literal"
+                                : letter == 'b' ? "invalid binary literal"
+                                                : "invalid decimal literal";
+    problems.push_back({ECode::kNumberRunsOn, token.start, line.EndOf(next), message, {}, {}});
+}
+
+void CheckNumbers(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
+    for (size_t i = 0; i + 1 < line.tokens.size(); ++i)
+        if (line.tokens[i].type == kTokenId_NUMBER)
+            CheckNumber(line, line.tokens[i], line.tokens[i + 1], language, problems);
+}
+
+void CheckParentheses(const CRawLogical& line, CProblems& problems) {
+    constexpr int kMostOpen = 200;
+    int open_count = 0;
+    for (const CRawToken& token : line.tokens) {
+        open_count += IsOpenerType(token.type) - IsCloserType(token.type);
+        if (open_count <= kMostOpen) continue;
+        return problems.push_back({ECode::kTooManyParentheses,
+                                   token.start,
+                                   line.EndOf(token),
+                                   "too many nested parentheses",
+                                   {},
+                                   {}});
+    }
+}
+
+void CheckStrings(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
     const CRawToken* before = nullptr;  // the string right before
     for (const CRawToken& token : line.tokens) {
         if (token.type != kTokenId_STRING) {
             if (before != nullptr && !IsPassedOver(token) && token.type != kTokenId_NEWLINE) before = nullptr;
             continue;
         }
+        CheckEscapes(line, token, language, problems);
+        if (!language.IsPython3()) continue;
+        if (HasFields(line.Text(token))) CheckFields(line, token, language, problems);
         const bool is_bytes = IsBytesText(line.Text(token));
         if (is_bytes) CheckBytes(line, token, problems);
         if (before != nullptr && is_bytes != IsBytesText(line.Text(*before)))
@@ -46,6 +107,29 @@ void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems
                                 {}});
         before = &token;
     }
+}
+
+}  // namespace
+
+void CheckEnd(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
+    constexpr int kRefusesBackslash = 308;
+    const CRawToken& last = line.tokens.back();
+    if (last.type != kTokenId_BACKSLASH || language.version < kRefusesBackslash) return;
+    const uint32_t end = line.EndOf(last);
+    if (end + RowEndLength(line.file_text, end) < line.file_text.size()) return;
+    problems.push_back(
+        {ECode::kBackslashAtEnd, last.start, end, "unexpected end of file after a backslash", {}, {}});
+}
+
+void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
+    constexpr size_t kMayNestDeeply = 400;
+    constexpr int kLimitsParentheses = 309;
+    if (line.tokens.size() > kMayNestDeeply && language.version >= kLimitsParentheses)
+        CheckParentheses(line, problems);
+    if (line.may_have_strings) CheckStrings(line, language, problems);
+    // Words that may follow a number: as part of it, or as what may not.
+    constexpr uint64_t kMayRunOn = WordBits(EWord::kOr, EWord::kAs, EWord::kAsync, EWord::kFrom);
+    if (line.MayHaveWords(kMayRunOn)) CheckNumbers(line, language, problems);
 }
 
 }  // namespace codeloom

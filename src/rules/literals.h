@@ -1,4 +1,4 @@
-// Strings and bytes by their tokens.
+// Strings, bytes, numbers and parentheses by their tokens.
 #pragma once
 
 #include "rules/problem.h"
@@ -8,5 +8,8 @@ namespace codeloom {
 
 // Requires: the line parses, so that neighbouring strings are one expression.
 void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems);
+
+// A backslash at the end of the file has no row to go on with.
+void CheckEnd(const CRawLogical& line, const CLanguage& language, CProblems& problems);
 
 }  // namespace codeloom

@@ -76,6 +76,14 @@ void CheckBound(const CRuleContext& context, const CTreeNode& bound, EStars star
     CheckDeferred(context, bound, is_tuple ? "a TypeVar constraint" : "a TypeVar bound");
 }
 
+template <class Visit>
+void ForEachAnnotation(const CTree& tree, const CTreeNode& function, Visit visit) {
+    ForEachParameter(tree, ParametersOfFuncdef(tree, function), [&](const CParameter& parameter) {
+        if (parameter.type_expr != nullptr) visit(*parameter.type_expr);
+    });
+    if (const CTreeNode* const result = ReturnTypeOfFuncdef(tree, function)) visit(*result);
+}
+
 // Annotations, bases and an alias's value are evaluated where the type parameters are known.
 void CheckScopedStatement(const CRuleContext& context, const CTreeNode& statement) {
     const CTree& tree = context.tree;
@@ -83,11 +91,8 @@ void CheckScopedStatement(const CRuleContext& context, const CTreeNode& statemen
         if (const CTreeNode* const bases = BasesOfClassdef(tree, statement))
             CheckDeferred(context, *bases, kGeneric);
     } else if (statement.Is(ENodeKind::kFuncdef)) {
-        ForEachParameter(tree, ParametersOfFuncdef(tree, statement), [&](const CParameter& parameter) {
-            if (parameter.type_expr != nullptr) CheckDeferred(context, *parameter.type_expr, kGeneric);
-        });
-        if (const CTreeNode* const result = ReturnTypeOfFuncdef(tree, statement))
-            CheckDeferred(context, *result, kGeneric);
+        ForEachAnnotation(tree, statement,
+                          [&](const CTreeNode& annotation) { CheckDeferred(context, annotation, kGeneric); });
     } else if (statement.Is(ENodeKind::kExprStmt)) {
         CheckDeferred(context, LastChild(tree, statement), "a type alias");
     }
@@ -97,6 +102,22 @@ void CheckScopedStatement(const CRuleContext& context, const CTreeNode& statemen
 
 void CheckDeferred(const CRuleContext& context, const CTreeNode& expression, std::string_view where) {
     CDeferredCheck(context, where).Visit(expression, false, 0);
+}
+
+void CheckAnnotations(const CRuleContext& context) {
+    const CTree& tree = context.tree;
+    const auto check = [&](const CTreeNode& annotation) {
+        CheckDeferred(context, annotation, "an annotation");
+    };
+    const auto check_statement = [&](const CTreeNode& node) {
+        if (node.IsLeaf()) return;
+        if (node.Is(ENodeKind::kFuncdef)) ForEachAnnotation(tree, node, check);
+        if (node.Is(ENodeKind::kAnnotatedAssign)) check(HintOfAnnotatedAssign(tree, node));
+    };
+    check_statement(tree.fRoot);
+    if (tree.HasKind(ENodeKind::kFuncdef) || tree.HasKind(ENodeKind::kAnnotatedAssign))
+        for (const CTreeNode& node : tree.NodesBelowRoot())
+            if (!tree.IsRoot(node)) check_statement(node);
 }
 
 void CheckParameters(const CRuleContext& context, const CTreeNode& parameters) {
@@ -128,6 +149,8 @@ void CheckTypeParameters(const CRuleContext& context, const CTreeNode& statement
                 Joined("non-default type parameter '", tree.Text(name), "' follows default type parameter"));
         has_default |= parts.value != nullptr;
         if (parts.bound != nullptr) CheckBound(context, *parts.bound, stars);
+        if (parts.value != nullptr && parts.value->Is(ENodeKind::kStar) && stars != EStars::kOne)
+            context.Report(ECode::kMisplacedStar, *parts.value, "can't use starred expression here");
         if (parts.value != nullptr)
             CheckDeferred(context, *parts.value, Joined("a ", KindOfTypeParameter(stars), " default"));
     }

@@ -12,6 +12,9 @@ void CheckParameters(const CRuleContext& context, const CTreeNode& parameters);
 void CheckTypeParameters(const CRuleContext& context, const CTreeNode& statement);
 
 // `yield`, `await` and `:=` in an expression that is evaluated on demand; `where` says in what.
+// Annotations that aren't evaluated where they are.
+void CheckAnnotations(const CRuleContext& context);
+
 void CheckDeferred(const CRuleContext& context, const CTreeNode& expression, std::string_view where);
 
 }  // namespace codeloom

@@ -21,14 +21,30 @@ bool IsGroup(const CTree& tree, const CTreeNode& node) {
     return node.kind == ENodeKind::kPattern && HasTokenAt(tree, node, 0, kTokenId_LPAR);
 }
 
-// The name or the wildcard that takes everything; null for a pattern that may fail.
+bool IsAlternatives(const CTree& tree, const CTreeNode& node) {
+    return node.kind == ENodeKind::kPattern && HasTokenAt(tree, node, 1, kTokenId_VBAR);
+}
+
+bool IsStarPattern(const CTree& tree, const CTreeNode& node) {
+    return node.kind == ENodeKind::kPattern && HasTokenAt(tree, node, 0, kTokenId_STAR);
+}
+
+// The name or the wildcard that takes everything; null for a pattern that may fail. Of alternatives only the
+// last one may.
 const CTreeNode* TakesAll(const CTree& tree, const CTreeNode& pattern) {
     const CTreeNode* node = &pattern;
     for (;;) {
         if (node->Is(ENodeKind::kNameLiteral)) return node;
-        const bool is_capture = !node->IsLeaf() && IsCapturePattern(tree, *node);
-        if (!is_capture && !IsGroup(tree, *node)) return nullptr;
-        node = &tree.Child(*node, is_capture ? 0 : 1);
+        if (node->IsLeaf()) return nullptr;
+        if (IsAlternatives(tree, *node)) {
+            node = &LastChild(tree, *node);
+        } else if (IsCapturePattern(tree, *node)) {
+            node = &tree.Child(*node, 0);
+        } else if (IsGroup(tree, *node)) {
+            node = &tree.Child(*node, 1);
+        } else {
+            return nullptr;
+        }
     }
 }
 
@@ -58,6 +74,12 @@ std::string ValueOfKey(const CTree& tree, const CTreeNode& key) {
     const bool is_number = !digits.empty() && digits[0] >= '0' && digits[0] <= '9';
     if (is_number && digits.find_first_not_of("0._jJ") == std::string_view::npos) return "0";
     return text;
+}
+
+// Only a sequence holds them.
+void CheckNoStar(const CRuleContext& context, const CTreeNode& pattern) {
+    if (IsStarPattern(context.tree, pattern))
+        context.Report(ECode::kMisplacedStar, pattern, "cannot use starred expression here");
 }
 
 class CPatternCheck {
@@ -94,15 +116,18 @@ class CPatternCheck {
 
     void _VisitPattern(const CTreeNode& node, CNameSet& names) {
         if (node.IsLeaf()) return;
-        if (HasTokenAt(_fTree, node, 1, kTokenId_VBAR)) return _VisitAlternatives(node, names);
+        if (IsAlternatives(_fTree, node)) return _VisitAlternatives(node, names);
         if (IsCapturePattern(_fTree, node)) {
             Visit(_fTree.Child(node, 0), names);
             const CTreeNode& name = LastChild(_fTree, node);
             if (!IsWord(name, EWord::kUnderscore)) return _Bind(name, names);
             return _fContext.Report(ECode::kCannotAssign, name, "cannot use '_' as a target");
         }
-        if (IsGroup(_fTree, node)) return Visit(_fTree.Child(node, 1), names);
-        if (HasTokenAt(_fTree, node, 0, kTokenId_STAR)) return _Bind(LastChild(_fTree, node), names);
+        if (IsGroup(_fTree, node)) {
+            CheckNoStar(_fContext, _fTree.Child(node, 1));
+            return Visit(_fTree.Child(node, 1), names);
+        }
+        if (IsStarPattern(_fTree, node)) return _Bind(LastChild(_fTree, node), names);
         _CheckNumber(node);
     }
 
@@ -133,10 +158,7 @@ class CPatternCheck {
     }
 
     void _ReportUnreachable(const CTreeNode& name) {
-        _fContext.Report(ECode::kPatternsUnreachable, name,
-                         IsWord(name, EWord::kUnderscore) ? "wildcard makes remaining patterns unreachable"
-                                                          : Joined("name capture '", _fTree.Text(name),
-                                                                   "' makes remaining patterns unreachable"));
+        _fContext.Report(ECode::kPatternsUnreachable, name, WordsOfUnreachable(_fTree.Text(name)));
     }
 
     void _CheckNumber(const CTreeNode& node) {
@@ -164,7 +186,7 @@ class CPatternCheck {
     void _VisitSequence(const CTreeNode& node, CNameSet& names) {
         bool has_star = false;
         for (const CTreeNode& child : _fTree.Children(node)) {
-            const bool is_star = !child.IsLeaf() && HasTokenAt(_fTree, child, 0, kTokenId_STAR);
+            const bool is_star = IsStarPattern(_fTree, child);
             if (is_star && has_star)
                 return _fContext.Report(ECode::kMultipleStars, child,
                                         "multiple starred names in sequence pattern");
@@ -185,10 +207,17 @@ class CPatternCheck {
                     keys.push_back({ValueOfKey(_fTree, key), &key});
             }
             const uint32_t value_i = i + (is_rest ? 1 : 2);
-            if (value_i < node.child_count) Visit(_fTree.Child(node, value_i), names);
+            if (value_i < node.child_count) _VisitValue(_fTree.Child(node, value_i), is_rest, names);
             i = value_i + 1;
         }
         _CheckKeys(keys);
+    }
+
+    void _VisitValue(const CTreeNode& value, bool is_rest, CNameSet& names) {
+        if (is_rest && IsWord(value, EWord::kUnderscore))
+            _fContext.Report(ECode::kMisplacedPattern, value, "cannot use '_' as a target");
+        CheckNoStar(_fContext, value);
+        Visit(value, names);
     }
 
     struct CKey {
@@ -219,12 +248,12 @@ class CPatternCheck {
                 if (!attributes.Add(_fTree.Text(name)))
                     _fContext.Report(ECode::kRepeatedPatternAttribute, name,
                                      Joined("attribute name repeated in class pattern: ", _fTree.Text(name)));
-                Visit(_fTree.Child(child, 2), names);
+                _VisitValue(_fTree.Child(child, 2), false, names);
             } else {
                 if (!attributes.Names().empty())
                     return _fContext.Report(ECode::kMisplacedPattern, child,
                                             "positional patterns follow keyword patterns");
-                Visit(child, names);
+                _VisitValue(child, false, names);
             }
         }
     }
@@ -236,8 +265,21 @@ class CPatternCheck {
 
 }  // namespace
 
+std::string WordsOfUnreachable(std::string_view name) {
+    return name == "_" ? "wildcard makes remaining patterns unreachable"
+                       : Joined("name capture '", name, "' makes remaining patterns unreachable");
+}
+
+const CTreeNode* TakesAllCases(const CTree& tree, const CTreeNode& statement) {
+    if (!statement.Is(ENodeKind::kCase)) return nullptr;
+    const CTreeNode* const guard = GuardOfCase(tree, statement);
+    const bool has_guard = guard != nullptr && !IsToken(*guard, kTokenId_COLON);
+    return has_guard ? nullptr : TakesAll(tree, PatternOfCase(tree, statement));
+}
+
 void CheckPattern(const CRuleContext& context, const CTreeNode& pattern) {
     CNameSet names;
+    CheckNoStar(context, pattern);
     CPatternCheck(context).Visit(pattern, names);
 }
 

@@ -5,6 +5,8 @@
 #include <string>
 #include <string_view>
 
+#include "rules/fields.h"
+#include "syntax/atoms.h"
 #include "syntax/expressions.h"
 #include "syntax/imports.h"
 #include "syntax/statements.h"
@@ -14,6 +16,7 @@ namespace codeloom {
 namespace {
 
 using EScope = CPlacement::EScope;
+using EComprehension = CPlacement::EComprehension;
 
 // Deeper than any text that the interpreter takes.
 constexpr int kMaxDepth = 400;
@@ -47,9 +50,11 @@ constexpr auto kFeatures = std::to_array<CFeature>({{"nested_scopes", 0},
                                                     {"generator_stop", 305},
                                                     {"annotations", 307}});
 
-// The statement is a string alone, or imports from `__future__`: what may come before such an import.
-bool MayPrecedeFuture(const CRawLogical& logical, const CTree* tree) {
-    return logical.type == ELogicalType::kStringExpression || tree == nullptr;
+// A docstring, or a string alone in Python 2: what may come before an import from `__future__`.
+bool IsDocstring(const CRawLogical& logical, const CLanguage& language) {
+    if (logical.type != ELogicalType::kStringExpression) return false;
+    const std::string_view text = logical.Text(logical.tokens.front());
+    return !language.IsPython3() || !(HasFields(text) || IsBytesText(text));
 }
 
 bool IsFutureImport(const CTree& tree, const CTreeNode& statement) {
@@ -108,9 +113,11 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
     _fTree = tree;
     if (is_future) {
         _CheckFuture(tree->fRoot, blocks);
-    } else if (!MayPrecedeFuture(logical, tree)) {
-        _fIsPastFutures = true;
+    } else if (tree != nullptr) {
+        const bool may_be_docstring = !_fHasStatement || (!_fLanguage.IsPython3() && _fHasFutures);
+        _fIsPastFutures |= !may_be_docstring || !IsDocstring(logical, _fLanguage);
     }
+    _fHasStatement = true;
     if (tree == nullptr || tree->fIsEmpty || !logical.MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt())
         return;
     CPlacement place = PlacementIn(blocks.Blocks());
@@ -167,6 +174,7 @@ void CPlacementRules::_CheckFuture(const CTreeNode& statement, const CBlockTrack
                               {}});
         return;
     }
+    _fHasFutures = true;
     if (const CTreeNode* const star = StarOfFromImport(tree, statement)) return _CheckFeature(*star);
     ForEachImportedName(tree, NamesOfFromImport(tree, statement),
                         [&](const CImportedName& imported) { _CheckFeature(*imported.name); });
@@ -176,7 +184,10 @@ void CPlacementRules::_CheckFeature(const CTreeNode& name) {
     const std::string_view text = _fTree->Text(name);
     const auto feature = std::find_if(kFeatures.begin(), kFeatures.end(),
                                       [&](const CFeature& candidate) { return candidate.name == text; });
-    if (feature != kFeatures.end() && feature->version <= _fLanguage.version) return;
+    if (feature != kFeatures.end() && feature->version <= _fLanguage.version) {
+        _fHasFutureAnnotations |= text == "annotations";
+        return;
+    }
     const CSpan span = SpanOf(*_fTree, name);
     std::string message = "future feature ";
     message.append(text).append(" is not defined");
@@ -215,14 +226,8 @@ void CPlacementRules::_Visit(const CTreeNode& node, CPlacement place) {
             return _CheckNonlocal(node, place);
         case ENodeKind::kAtom:
             return _VisitAtom(node, place);
-        case ENodeKind::kUsedArglist:
-            place.in_display = false;
-            break;
         case ENodeKind::kUsedArgument:
-            place.in_display = false;
-            return _VisitComprehensionList(node, place);
-        case ENodeKind::kTestList:
-            return _VisitComprehensionList(node, place);
+            return _VisitArgument(node, place);
         case ENodeKind::kKeywordLiteral:
             return _CheckKeyword(node, place);
         case ENodeKind::kNode:
@@ -289,26 +294,53 @@ void CPlacementRules::_VisitLambda(const CTreeNode& node, const CPlacement& plac
 }
 
 void CPlacementRules::_VisitAtom(const CTreeNode& node, CPlacement place) {
-    place.in_display = !HasTokenAt(*_fTree, node, 0, kTokenId_LPAR);
+    const CTreeNode* const contents = ContentsOfBrackets(*_fTree, node);
+    if (contents != nullptr && !contents->IsLeaf() && LastChild(*_fTree, *contents).Is(ENodeKind::kCompFor)) {
+        if (BracketOf(*_fTree, node) == EBracket::kParenthesis) {
+            _EnterGenerator(place);
+        } else {
+            _EnterDisplay(node, place);
+        }
+    }
     _VisitChildren(node, place);
 }
 
-// A comma list or an argument too, which aren't generator expressions.
-void CPlacementRules::_VisitComprehensionList(const CTreeNode& list, CPlacement place) {
-    if (IsComprehensionList(*_fTree, list) && !place.in_display && !IsAsyncScope(place.scope))
-        place.may_await = place.in_first_clause = true;
-    _VisitChildren(list, place);
+void CPlacementRules::_VisitArgument(const CTreeNode& node, CPlacement place) {
+    if (IsComprehensionList(*_fTree, node)) _EnterGenerator(place);
+    _VisitChildren(node, place);
+}
+
+// An asynchronous one makes the comprehensions around it asynchronous, since 3.11, up to a generator
+// expression, which may always be.
+void CPlacementRules::_EnterDisplay(const CTreeNode& atom, CPlacement& place) const {
+    constexpr int kAllowsInComprehension = 311;
+    place.outer_comprehension = place.comprehension;
+    place.outer_blamed = place.blamed;
+    place.in_first_clause = true;
+    const bool is_outermost = place.comprehension == EComprehension::kNone;
+    const bool is_judged = is_outermost || _fLanguage.version < kAllowsInComprehension;
+    place.comprehension = EComprehension::kDisplay;
+    if (is_judged) place.blamed = is_outermost && IsAsyncScope(place.scope) ? nullptr : &atom;
+}
+
+void CPlacementRules::_EnterGenerator(CPlacement& place) const {
+    place.outer_comprehension = place.comprehension;
+    place.outer_blamed = place.blamed;
+    place.in_first_clause = true;
+    place.comprehension = EComprehension::kGenerator;
+    place.blamed = nullptr;
 }
 
 void CPlacementRules::_VisitComprehension(const CTreeNode& node, const CPlacement& place) {
     const CCompClause clause = CompClauseOf(*_fTree, node);
-    if (clause.is_async && place.in_display && !IsAsyncScope(place.scope) && !place.may_await)
-        _Report(ECode::kOutsideAsyncFunction, SpanOf(*_fTree, node),
-                "asynchronous comprehension outside of an asynchronous function");
+    if (clause.is_async) _ReportAsyncDisplay(place);
     CPlacement inside = place;
     inside.in_first_clause = false;
     CPlacement iterable = inside;
-    if (place.in_first_clause) iterable.may_await = false;
+    if (place.in_first_clause) {
+        iterable.comprehension = place.outer_comprehension;
+        iterable.blamed = place.outer_blamed;
+    }
     _Visit(*clause.target, inside);
     _Visit(*clause.iterable, iterable);
     if (clause.next != nullptr) _Visit(*clause.next, inside);
@@ -344,9 +376,7 @@ void CPlacementRules::_CheckKeyword(const CTreeNode& leaf, const CPlacement& pla
             _CheckYield(leaf, place);
             break;
         case EWord::kAwait:
-            if (!IsAsyncScope(place.scope) && !place.may_await)
-                _Report(place.IsInFunction() ? ECode::kOutsideAsyncFunction : ECode::kOutsideFunction,
-                        SpanOf(*_fTree, leaf), Outside("await", place));
+            _CheckAwait(leaf, place);
             break;
         case EWord::kBreak:
         case EWord::kContinue:
@@ -355,6 +385,13 @@ void CPlacementRules::_CheckKeyword(const CTreeNode& leaf, const CPlacement& pla
         default:
             break;
     }
+}
+
+void CPlacementRules::_CheckAwait(const CTreeNode& leaf, const CPlacement& place) {
+    if (place.comprehension != EComprehension::kNone) return _ReportAsyncDisplay(place);
+    if (!IsAsyncScope(place.scope))
+        _Report(place.IsInFunction() ? ECode::kOutsideAsyncFunction : ECode::kOutsideFunction,
+                SpanOf(*_fTree, leaf), Outside("await", place));
 }
 
 void CPlacementRules::_CheckJump(const CTreeNode& leaf, const CPlacement& place) {
@@ -386,6 +423,12 @@ void CPlacementRules::_CheckNonlocal(const CTreeNode& node, const CPlacement& pl
 void CPlacementRules::_ReportInExceptStar(const CSpan& span) {
     _Report(ECode::kJumpOutOfExceptStar, span,
             "'break', 'continue' and 'return' cannot appear in an except* block");
+}
+
+void CPlacementRules::_ReportAsyncDisplay(const CPlacement& place) {
+    if (place.blamed != nullptr)
+        _Report(ECode::kOutsideAsyncFunction, SpanOf(*_fTree, *place.blamed),
+                "asynchronous comprehension outside of an asynchronous function");
 }
 
 void CPlacementRules::_Report(ECode code, const CSpan& span, std::string message) {

@@ -19,15 +19,21 @@ namespace codeloom {
 // What the place of a statement or an expression allows.
 struct CPlacement {
     enum class EScope : uint8_t { kModule, kClass, kFunction, kAsyncFunction, kLambda };
+    enum class EComprehension : uint8_t { kNone, kDisplay, kGenerator };
 
     EScope scope = EScope::kModule;
     bool in_loop = false;
-    bool in_except_star = false;   // nearer than the loop and the function
-    bool in_finally = false;       // nearer than the loop
-    bool in_display = false;       // the innermost brackets are those of a list, set or dictionary
-    bool may_await = false;        // a generator expression, which becomes asynchronous then
-    bool in_first_clause = false;  // of a generator expression, whose iterable is read outside it
+    bool in_except_star = false;  // nearer than the loop and the function
+    bool in_finally = false;      // nearer than the loop
     int depth = 0;
+
+    // The innermost comprehension, and the one to blame where it is asynchronous: null where it may be.
+    EComprehension comprehension = EComprehension::kNone;
+    const CTreeNode* blamed = nullptr;
+    // The same around it, for the first iterable, which is read there.
+    EComprehension outer_comprehension = EComprehension::kNone;
+    const CTreeNode* outer_blamed = nullptr;
+    bool in_first_clause = false;
 
     bool IsInFunction() const { return scope >= EScope::kFunction; }
 };
@@ -47,6 +53,9 @@ class CPlacementRules {
 
     // An expression embedded in the line that was checked last.
     void CheckEmbedded(const CTree& tree, const CBlockTracker& blocks);
+
+    // Annotations aren't evaluated where they are: since 3.14 (PEP 649), or by `from __future__` (PEP 563).
+    bool DefersAnnotations() const { return _fHasFutureAnnotations || _fLanguage.version >= 314; }
 
     // Call once, after the last line.
     void Finish() { _TrackFunctions({}); }
@@ -73,15 +82,19 @@ class CPlacementRules {
     void _VisitLoop(const CTreeNode& node, const CPlacement& place);
     void _VisitLambda(const CTreeNode& node, const CPlacement& place);
     void _VisitAtom(const CTreeNode& node, CPlacement place);
-    void _VisitComprehensionList(const CTreeNode& list, CPlacement place);
+    void _VisitArgument(const CTreeNode& node, CPlacement place);
+    void _EnterDisplay(const CTreeNode& atom, CPlacement& place) const;
+    void _EnterGenerator(CPlacement& place) const;
     void _VisitComprehension(const CTreeNode& node, const CPlacement& place);
     void _CheckReturn(const CTreeNode& node, const CPlacement& place);
     void _CheckYield(const CTreeNode& node, const CPlacement& place);
     void _CheckKeyword(const CTreeNode& leaf, const CPlacement& place);
+    void _CheckAwait(const CTreeNode& leaf, const CPlacement& place);
     void _CheckJump(const CTreeNode& leaf, const CPlacement& place);
     void _CheckImportStar(const CTreeNode& node, const CPlacement& place);
     void _CheckNonlocal(const CTreeNode& node, const CPlacement& place);
     void _ReportInExceptStar(const CSpan& span);
+    void _ReportAsyncDisplay(const CPlacement& place);
     void _Report(ECode code, const CSpan& span, std::string message);
 
     const CLanguage& _fLanguage;
@@ -89,6 +102,9 @@ class CPlacementRules {
     const CTree* _fTree = nullptr;
     std::vector<CAsyncFunction> _fFunctions;  // by depth; only those whose body is under way
     bool _fIsPastFutures = false;
+    bool _fHasStatement = false;  // something came before
+    bool _fHasFutures = false;    // an import from `__future__` did
+    bool _fHasFutureAnnotations = false;
 };
 
 }  // namespace codeloom

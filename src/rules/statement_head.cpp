@@ -96,6 +96,22 @@ EClause ClauseOfWord(EWord word) {
     }
 }
 
+// The items of a `with`, in parentheses or not.
+uint32_t CountWithItems(const CRawLogical& logical) {
+    uint32_t count_outside = 1, count_inside = 1;
+    int depth = 0;
+    bool is_in_parentheses = true;  // all of it
+    size_t token_i = 0;
+    while (const CRawToken* const token = NextSignificant(logical.tokens, token_i)) {
+        if (token->word == EWord::kWith || token->word == EWord::kAsync) continue;
+        if (depth == 0 && token->type == kTokenId_COLON) break;
+        is_in_parentheses &= depth > 0 || token->type == kTokenId_LPAR || token->type == kTokenId_RPAR;
+        if (token->type == kTokenId_COMMA) (depth == 0 ? count_outside : count_inside) += depth < 2;
+        depth += IsOpenerType(token->type) - IsCloserType(token->type);
+    }
+    return is_in_parentheses ? count_inside : count_outside;
+}
+
 }  // namespace
 
 CStatementHead ReadStatementHead(const CRawLogical& logical) {
@@ -116,6 +132,8 @@ CStatementHead ReadStatementHead(const CRawLogical& logical) {
     } else {
         head.clause = ClauseOfWord(first->word);
     }
+    if (head.clause == EClause::kWith || head.clause == EClause::kAsyncWith)
+        head.with_item_count = CountWithItems(logical);
     for (size_t last_i = logical.tokens.size(); last_i-- > 0;) {
         if (!IsSignificant(logical.tokens[last_i])) continue;
         head.ends_in_colon = logical.tokens[last_i].type == kTokenId_COLON;

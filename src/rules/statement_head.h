@@ -37,6 +37,7 @@ struct CStatementHead {
     uint32_t start = 0;  // bytes of the first token
     uint32_t end = 0;
     bool ends_in_colon = false;  // its last token, comments apart
+    uint32_t with_item_count = 0;
 
     bool IsHeader() const { return clause > EClause::kDecorator; }
 };

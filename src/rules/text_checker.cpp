@@ -3,6 +3,8 @@
 #include <algorithm>
 
 #include "rules/line_rules.h"
+#include "rules/literals.h"
+#include "rules/patterns.h"
 
 namespace codeloom {
 
@@ -46,17 +48,22 @@ void CTextChecker::Enter(const CRawLogical& logical) {
 }
 
 void CTextChecker::Take(const CRawLogical& part, const CTree& tree) {
-    if (!IsHint(part)) {
-        const bool in_class = tree.HasKind(ENodeKind::kCompFor) &&  // what alone depends on it
-                              !_fBlocks.IsInDoubt() && IsInClass(_fBlocks.Blocks());
-        CheckLine(tree, _fLanguage, in_class, _fProblems);
-    }
+    if (!IsHint(part)) CheckLine(tree, _fLanguage, _Setting(tree), _fProblems);
     if (&part == _fLine) {
         _fPlacement.Check(part, &tree, _fBlocks);
+        if (!tree.fIsEmpty && _fProblems.size() == _fFirstProblem)
+            if (const CTreeNode* const name = TakesAllCases(tree, tree.fRoot))
+                _fBlocks.TakeAllCases(SpanOf(tree, *name));
     } else {
         _fPlacement.CheckEmbedded(tree, _fBlocks);
     }
     DropNested(_fProblems, _fFirstProblem);
+}
+
+CLineSetting CTextChecker::_Setting(const CTree& tree) const {
+    return {.in_class =
+                tree.HasKind(ENodeKind::kCompFor) && !_fBlocks.IsInDoubt() && IsInClass(_fBlocks.Blocks()),
+            .defers_annotations = _fPlacement.DefersAnnotations()};
 }
 
 // What the trees of a line show doesn't count beside a fault of its grammar.
@@ -65,6 +72,8 @@ void CTextChecker::Leave(const CRawLogical& logical, bool has_fault) {
     if (has_fault) {
         _fProblems.resize(_fFirstProblem);
         _fPlacement.Check(logical, nullptr, _fBlocks);
+    } else {
+        CheckEnd(logical, _fLanguage, _fProblems);
     }
     _fBlocks.Leave(has_fault);
 }

@@ -3,6 +3,7 @@
 
 #include "line/tree_observer.h"
 #include "rules/blocks.h"
+#include "rules/line_rules.h"
 #include "rules/placement.h"
 #include "rules/problem.h"
 #include "syntax/language.h"
@@ -14,7 +15,10 @@ class CTextChecker final : public CTreeObserver {
   public:
     // Both must outlive the checker.
     CTextChecker(const CLanguage& language, CProblems& problems)
-        : _fLanguage(language), _fProblems(problems), _fBlocks(problems), _fPlacement(language, problems) {}
+        : _fLanguage(language),
+          _fProblems(problems),
+          _fBlocks(language, problems),
+          _fPlacement(language, problems) {}
 
     // Call for every line in order, before its analysis, which hands its trees over, and after that.
     void Enter(const CRawLogical& logical);
@@ -25,6 +29,8 @@ class CTextChecker final : public CTreeObserver {
     void Finish();
 
   private:
+    CLineSetting _Setting(const CTree& tree) const;
+
     const CLanguage& _fLanguage;
     CProblems& _fProblems;
     CBlockTracker _fBlocks;
