@@ -99,8 +99,9 @@ class TestItems:
         assert analyze("x = 1").records[0] != analyze(" x = 1").records[0]
         with pytest.raises(AttributeError):
             one.records[0].name = "y"
-        with pytest.raises(TypeError):
-            type(one.records[0])()
+        for made_inside in (one.records[0], one.records, one.problems):
+            with pytest.raises(TypeError, match="cannot create"):
+                type(made_inside).__new__(type(made_inside))
 
     def test_copies(self):
         analysis = analyze(TEXT.encode() + b"'\xff'", path="é", python="3.8", false_hints=True)

@@ -9,6 +9,7 @@
 #include "face/items.h"
 #include "face/kinds.h"
 #include "host/errors.h"
+#include "host/refuse_new.h"
 #include "host/sequence_slots.h"
 #include "host/text.h"
 
@@ -83,7 +84,8 @@ void BindRange(nb::module_& module) {
     nb::class_<CRange> range(
         module, "Range",
         "A piece of a text. Rows and columns count from 1, columns in characters; the end is "
-        "after the last character.");
+        "after the last character.",
+        nb::pooled());
     range.def(nb::init<uint32_t, uint32_t, uint32_t, uint32_t>(), "row"_a, "column"_a, "end_row"_a,
               "end_column"_a);
     range.def_ro("row", &CRange::row);
@@ -113,7 +115,7 @@ void BindRange(nb::module_& module) {
 // What every item has.
 template <class Item>
 nb::class_<Item> BindItem(nb::module_& module, const char* name, const char* documentation) {
-    nb::class_<Item> binding(module, name, documentation);
+    nb::class_<Item> binding(module, name, documentation, nb::pooled(), nb::type_slots(kNotMadeByHost));
     BindEquality(binding);
     BindCopies(binding);
     binding.def(
@@ -192,7 +194,7 @@ void BindRecord(nb::module_& module) {
         "kind", [](const CRecordItem& self) { return RecordKindOf(self.Data().kind); },
         nb::sig("def kind(self) -> RecordKind"), "What is said.");
     record.def_prop_ro(
-        "name", [](const CRecordItem& self) { return TextFromUtf8(self.Name()); },
+        "name", [](const CRecordItem& self) { return self.file->HostName(self.Data().name); },
         nb::sig("def name(self) -> str"), "The name; a chain such as `a.b` is one too.");
     record.def_prop_ro(
         "payload", [](const CRecordItem& self) { return TextFromUtf8(self.Payload()); },
@@ -207,7 +209,7 @@ void BindRecord(nb::module_& module) {
     record.def_prop_ro(
         "range",
         [](const CRecordItem& self) -> nb::object {
-            return self.HasPlace() ? nb::cast(self.Range()) : nb::none();
+            return self.HasPlace() ? NewObject<CRange>(self.Range()) : nb::none();
         },
         nb::sig("def range(self) -> Range | None"), "Where the name stands; None where it stands nowhere.");
     record.def_prop_ro("line", &CRecordItem::Line, "The line that says it.");

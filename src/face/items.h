@@ -21,6 +21,16 @@ struct CRange {
 
 CRange RangeOfBytes(const CSourceFile& file, uint32_t start, uint32_t end);
 
+// An object of the host around a new Class, made without a look for its class.
+template <class Class, class... Arguments>
+nb::object NewObject(Arguments&&... arguments) {
+    static const nb::handle type = nb::type<Class>();
+    nb::object made = nb::inst_alloc(type);
+    new (nb::inst_ptr<Class>(made)) Class{std::forward<Arguments>(arguments)...};
+    nb::inst_mark_ready(made);
+    return made;
+}
+
 // What every item has. `operator==` of items compares what they show.
 struct CItem {
     CSourceFilePtr file;
@@ -102,7 +112,7 @@ struct TItems {
     size_t IndexOf(size_t i) const { return first + i * static_cast<size_t>(step); }
     Item_ At(size_t i) const { return Item_(file, static_cast<uint32_t>(IndexOf(i))); }
 
-    nb::object Item(size_t i) const { return NewItem(file, static_cast<uint32_t>(IndexOf(i))); }
+    nb::object Item(size_t i) const { return NewObject<Item_>(file, static_cast<uint32_t>(IndexOf(i))); }
 
     nb::object Slice(size_t slice_first, ptrdiff_t slice_step, size_t slice_count) const {
         return nb::cast(
@@ -123,15 +133,6 @@ struct TItems {
     }
 
     size_t Hash() const { return count == 0 ? 0 : At(0).Hash() * 31 + count; }
-
-    // An object of the host, made without a look for its class.
-    static nb::object NewItem(const CSourceFilePtr& file, uint32_t i) {
-        static const nb::handle type = nb::type<Item_>();
-        nb::object made = nb::inst_alloc(type);
-        new (nb::inst_ptr<Item_>(made)) Item_(file, i);
-        nb::inst_mark_ready(made);
-        return made;
-    }
 };
 
 using CProblemItems = TItems<CProblemItem>;

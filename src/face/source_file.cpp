@@ -1,6 +1,7 @@
 #include "face/source_file.h"
 
 #include "host/errors.h"
+#include "host/text.h"
 
 namespace codeloom {
 
@@ -39,6 +40,14 @@ const CRowIndex& CSourceFile::Rows() const {
 nb::str CSourceFile::HostText() const {
     if (!_fHostText.is_valid()) _fHostText = nb::str(_fUtf8.c_str(), _fUtf8.size());
     return nb::borrow<nb::str>(_fHostText);
+}
+
+nb::object CSourceFile::HostName(uint32_t number) const {
+    const CNameTable& names = WithRecords().records.names;
+    if (_fHostNames.empty()) _fHostNames.resize(names.Count());
+    nb::object& name = _fHostNames[number];
+    if (!name.is_valid()) name = TextFromUtf8(names.Text(number));
+    return name;
 }
 
 }  // namespace codeloom

@@ -9,6 +9,7 @@
 #include <memory>
 #include <optional>
 #include <string_view>
+#include <vector>
 
 #include <nanobind/nanobind.h>
 
@@ -43,6 +44,8 @@ class CSourceFile {
 
     const CRowIndex& Rows() const;
     nb::str HostText() const;
+    // A name of the records, by its number; the same object each time.
+    nb::object HostName(uint32_t number) const;
 
   private:
     const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records) const;
@@ -56,6 +59,7 @@ class CSourceFile {
     mutable std::unique_ptr<const CFileAnalysis> _fWithRecords;
     mutable std::unique_ptr<const CRowIndex> _fRows;
     mutable nb::object _fHostText;
+    mutable std::vector<nb::object> _fHostNames;  // by number, made when they are asked for
 };
 
 using CSourceFilePtr = std::shared_ptr<const CSourceFile>;

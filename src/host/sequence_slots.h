@@ -10,6 +10,7 @@
 #include <nanobind/nanobind.h>
 
 #include "host/errors.h"
+#include "host/refuse_new.h"
 
 namespace nb = nanobind;
 
@@ -97,6 +98,7 @@ inline PyType_Slot kSequenceSlots[] = {
     {Py_sq_item, reinterpret_cast<void*>(slots::Item<Items>)},
     {Py_mp_subscript, reinterpret_cast<void*>(slots::Subscript<Items>)},
     {Py_tp_iter, reinterpret_cast<void*>(PySeqIter_New)},
+    {Py_tp_new, reinterpret_cast<void*>(RefuseNew)},
     {0, nullptr},
 };
 
