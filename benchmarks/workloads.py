@@ -21,10 +21,10 @@ def split(sources: Iterable[bytes]) -> None:
 
 def line_by_line(sources: Iterable[bytes]) -> None:
     """Each logical line analysed by a call of its own, as a host does it."""
-    from codeloom.treesift import CNewerAnalyzer
+    from codeloom.treesift import CExtendedAnalyzer
     from codeloom.utils import GetLogicalsFromText
 
-    analyze = CNewerAnalyzer((3, 14, 0)).AnalyzeSingleLogical
+    analyze = CExtendedAnalyzer((3, 14, 0)).AnalyzeSingleLogical
     for source in sources:
         for logical in GetLogicalsFromText(source.decode()):
             analyze(logical, logical.fInAsyncDef, logical.fFirstInDef)

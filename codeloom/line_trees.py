@@ -11,7 +11,7 @@ from codeloom.logicalline import CLogicalLine, kCommentedTypeHint
 from codeloom.optpgen import ParseError
 from codeloom.reading.languages import Language, language_of
 from codeloom.rows import ROW_END, RowTexts
-from codeloom.treesift import CNewerParser, CNode, CPGenParserImpl, CreateSyntaxError
+from codeloom.treesift import CExtendedParser, CNode, CPGenParserImpl, CreateSyntaxError
 from codeloom.utils import GetLogicalsFromText
 
 # Problems that keep a line from being parsed: it can't be read, or is too long.
@@ -50,7 +50,7 @@ class LineTree:
 
 def new_parser(language: Language) -> CPGenParserImpl:
     """A parser of a language version, for the caller alone."""
-    make = CNewerParser if language.is_py3 else CPGenParserImpl
+    make = CExtendedParser if language.is_py3 else CPGenParserImpl
     return make(language.version_triple, language.grammar_file, language.keywords, language.is_py3)
 
 

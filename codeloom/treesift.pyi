@@ -1883,7 +1883,7 @@ class CPGenAnalyzerImpl(CPGenAnalyzer):
         Inspect all embedded expressions.  Will raise exceptions on parse errors
         """
 
-class CNewerMatchCaseParser(CMatchCaseStatementParser):
+class CExtendedMatchCaseParser(CMatchCaseStatementParser):
     """
     Parses match and case statements, open and empty sequences and adjacent strings included.
     """
@@ -1917,7 +1917,7 @@ class CNewerMatchCaseParser(CMatchCaseStatementParser):
         The node of the pattern in [start_i, end_i). `allow_as`: the range may end in `as name`.
         """
 
-class CNewerParser(CPGenParserImpl):
+class CExtendedParser(CPGenParserImpl):
     """
     Parses the language up to Python 3.14, with the grammar file of that version.
     """
@@ -1979,7 +1979,7 @@ class CNewerParser(CPGenParserImpl):
     def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:
         """The node of the one type parameter in [start, end), or None."""
 
-class CNewerAnalyzer(CPGenAnalyzerImpl):
+class CExtendedAnalyzer(CPGenAnalyzerImpl):
     """Analyzes logical lines of the language up to Python 3.14."""
 
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: bool=True, hint_grammar_file: object='Python-Grammar-3.14') -> None:

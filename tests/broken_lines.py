@@ -23,10 +23,10 @@ from pathlib import Path
 from faults import KINDS, Edit, Line, Lines, OpensTriple, TypedAbove
 
 from codeloom.logicalline import CLogicalLine
-from codeloom.treesift import CNewerAnalyzer, CPGenAnalyzerImpl
+from codeloom.treesift import CExtendedAnalyzer, CPGenAnalyzerImpl
 from codeloom.utils import GetLogicalsFromText
 
-ANALYZERS = {"older": CPGenAnalyzerImpl((3, 8, 0)), "newer": CNewerAnalyzer((3, 11, 0))}
+ANALYZERS = {"older": CPGenAnalyzerImpl((3, 8, 0)), "newer": CExtendedAnalyzer((3, 11, 0))}
 
 # What the interpreter says of code that its grammar holds and that it refuses afterwards.
 AFTER_THE_GRAMMAR = (

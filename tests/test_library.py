@@ -14,7 +14,7 @@ import pytest
 from codeloom import treesift
 from codeloom.logicalline import kComment
 from codeloom.optpgen import ParseError
-from codeloom.treesift import CNewerAnalyzer, CNode, CPGenParserImpl
+from codeloom.treesift import CExtendedAnalyzer, CNode, CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
 
 VERSION = (3, 11, 0)
@@ -75,7 +75,7 @@ SAMPLE_OR_ALL = pytest.mark.parametrize(
 
 @SAMPLE_OR_ALL
 def test_no_sound_line_is_refused(count, no_swallowing, seed):
-    analyzer = CNewerAnalyzer(VERSION)
+    analyzer = CExtendedAnalyzer(VERSION)
     refused = [
         (seed, str(path), logical.fFirstLine + error.lineno, error.text)
         for path, text, _ in LibraryTexts(count, seed)
@@ -97,7 +97,7 @@ def Shape(node):
 
 @SAMPLE_OR_ALL
 def test_the_newer_grammar_keeps_the_shape_of_every_tree(count, seed):
-    older, newer = (CPGenParserImpl(VERSION, f"Python-Grammar-{version}") for version in ("3.8", "3.14"))
+    older, extended = (CPGenParserImpl(VERSION, f"Python-Grammar-{version}") for version in ("3.8", "3.14"))
     for path, text, _ in LibraryTexts(count, seed):
         for logical in GetLogicalsFromText(text):
             try:
@@ -105,14 +105,14 @@ def test_the_newer_grammar_keeps_the_shape_of_every_tree(count, seed):
             except ParseError:
                 continue
             if tree:
-                same = newer.ParseToNode(logical, logical.fInAsyncDef)
+                same = extended.ParseToNode(logical, logical.fInAsyncDef)
                 assert list(Shape(tree)) == list(Shape(same)), (seed, path, logical.fFirstLine)
                 older.DiscardNode(tree)
-                newer.DiscardNode(same)
+                extended.DiscardNode(same)
 
 
 def test_a_second_pass_makes_no_nodes():
-    analyzer = CNewerAnalyzer(VERSION)
+    analyzer = CExtendedAnalyzer(VERSION)
     texts = [text for _, text, _ in LibraryTexts(40, 1)]
 
     def Pass():

@@ -6,10 +6,10 @@ import sys
 import pytest
 
 from codeloom._fastaccess import kTokenId_NAME
-from codeloom.treesift import CNewerAnalyzer
+from codeloom.treesift import CExtendedAnalyzer
 from codeloom.utils import GetLogicalsFromText
 
-ANALYZER = CNewerAnalyzer((3, 11, 0))
+ANALYZER = CExtendedAnalyzer((3, 11, 0))
 TEXT = 'def f(é: "int", x=f"{y}{z}"): # type: (...) -> str\n    return é + \\\n        x; del z\n'
 
 

@@ -20,10 +20,10 @@ from codeloom.treesift import (
     CAtomExpr,
     CClassArgumentPatternNode,
     CClassPatternNode,
+    CExtendedAnalyzer,
+    CExtendedMatchCaseParser,
+    CExtendedParser,
     CMatchCaseStatementParser,
-    CNewerAnalyzer,
-    CNewerMatchCaseParser,
-    CNewerParser,
     CPatternNode,
     CPGenAnalyzerImpl,
     CPGenParserImpl,
@@ -33,9 +33,9 @@ from codeloom.utils import GetLogicalsFromText
 
 VERSION = (3, 11, 0)
 ANALYZER = CPGenAnalyzerImpl(VERSION)
-NEWER_ANALYZER = CNewerAnalyzer(VERSION)
+EXTENDED_ANALYZER = CExtendedAnalyzer(VERSION)
 DRIVER = CPGenParserImpl(VERSION)
-NEWER_DRIVER = CNewerParser(VERSION)
+NEWER_DRIVER = CExtendedParser(VERSION)
 
 
 def Place(text, analyzer=ANALYZER):
@@ -162,7 +162,7 @@ def test_open_sequences_have_it_too(patterns):
     assert ("sequence", *parts) == ExpectedForm(tree.body[0].cases[0].pattern)
 
 
-# Bad patterns, each with the place of its fault: those of bad_patterns.places that the newer parser takes.
+# Bad patterns, each with the place of its fault: those of bad_patterns.places that the extended parser takes.
 NO_LONGER_BAD = {"case ():", "case a, b:", "case *a, b:", 'case "a" "b":'}
 
 
@@ -184,8 +184,8 @@ def test_the_place_of_the_fault(text, place):
 
 
 @Tables("bad_patterns", "bad_for_newer")
-def test_the_place_of_the_fault_for_the_newer_parser(text, place):
-    assert Place(text, NEWER_ANALYZER) == (None if text in NO_LONGER_BAD else place)
+def test_the_place_of_the_fault_for_the_extended_parser(text, place):
+    assert Place(text, EXTENDED_ANALYZER) == (None if text in NO_LONGER_BAD else place)
 
 
 def test_places_in_lines_of_several_rows():
@@ -199,7 +199,7 @@ def test_places_in_lines_of_several_rows():
         ("match \\\n  a \\\n  b:", (3, 3)),
         ("case é, \\\n  b: c d", (2, 8)),
     ]:
-        assert Place(text, NEWER_ANALYZER) == place
+        assert Place(text, EXTENDED_ANALYZER) == place
 
 
 def test_brackets_of_unlike_kinds():
@@ -281,10 +281,10 @@ def test_overrides_at_every_depth():
     assert {name for name, *_ in calls} == names
 
 
-def test_overrides_of_the_newer_parser():
+def test_overrides_of_the_extended_parser():
     calls = []
 
-    class Parser(CNewerMatchCaseParser):
+    class Parser(CExtendedMatchCaseParser):
         def _NodeForPattern(self, start_i, end_i, allow_as=True):
             calls.append((start_i, end_i, allow_as))
             return super()._NodeForPattern(start_i, end_i, allow_as)

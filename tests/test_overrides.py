@@ -118,9 +118,9 @@ def test_a_subclass_without_the_base_constructor():
         (treesift.CPGenAnalyzer, ()),
         (treesift.CPGenAnalyzerImpl, ()),
         (treesift.CPGenParserImpl, ()),
-        (treesift.CNewerAnalyzer, (VERSION,)),
-        (treesift.CNewerParser, (VERSION,)),
-        (treesift.CNewerMatchCaseParser, (None,)),
+        (treesift.CExtendedAnalyzer, (VERSION,)),
+        (treesift.CExtendedParser, (VERSION,)),
+        (treesift.CExtendedMatchCaseParser, (None,)),
         (treesift.CTypeHintWalker, (None,)),
         (treesift.CNodeToTextConverterImpl, ()),
         (CNameLiteral, ()),
@@ -187,7 +187,7 @@ def test_indexes_beyond_all_tokens(start, end):
         with suppress(IndexError, TypeError, ValueError, SyntaxError, ParseError):
             operation(*arguments)
 
-    class Parser(treesift.CNewerMatchCaseParser):
+    class Parser(treesift.CExtendedMatchCaseParser):
         def _ParseCaseStmtImpl(self):
             for kind in ("Pattern", "ClassPattern", "DottedNameValue", "NumberPattern", "SequencePattern"):
                 Try(getattr(self, f"_NodeFor{kind}"), start, end)
@@ -202,7 +202,7 @@ def test_indexes_beyond_all_tokens(start, end):
         def GetEqualCount(self):
             return start
 
-    driver = treesift.CNewerParser(VERSION)
+    driver = treesift.CExtendedParser(VERSION)
     logical = Logical("case [A(x), *y]:  # type: int")
     toks, places = logical.fToks, logical.fPositions
     Parser(driver).ParseCaseStmt(toks, places)
@@ -218,7 +218,7 @@ def test_indexes_beyond_all_tokens(start, end):
         Node(treesift.CForStmt, *map(Leaf, "ab")), logical, False
     )
     Try(CNodeWalker(VERSION)._VisitAssignment, Node(Statement, Leaf("a")))
-    Try(treesift.CNewerParser, (2**31 - 1, 2**31 - 1))
+    Try(treesift.CExtendedParser, (2**31 - 1, 2**31 - 1))
 
 
 def test_host_node_classes_are_made_and_asked():

@@ -12,7 +12,7 @@ from sentences import COMMENTS, Sentences
 
 from codeloom import treesift
 from codeloom.reading.languages import language_named
-from codeloom.treesift import CNewerAnalyzer
+from codeloom.treesift import CExtendedAnalyzer
 from codeloom.utils import GetLogicalsFromText
 
 VERSIONS = ["3.4", "3.8", "3.11", "3.14"]
@@ -106,7 +106,7 @@ DEEP = [
 ]
 
 
-class Hosted(CNewerAnalyzer):
+class Hosted(CExtendedAnalyzer):
     """A class of the host's own has its lines analysed in the hosted form."""
 
 
@@ -114,7 +114,7 @@ class Hosted(CNewerAnalyzer):
 def Analyzers(version):
     language = language_named(version)
     parameters = language.version_triple, language.grammar_file, language.keywords, language.is_py3
-    return CNewerAnalyzer(*parameters), Hosted(*parameters)
+    return CExtendedAnalyzer(*parameters), Hosted(*parameters)
 
 
 def Seen(analyzer, logical):
@@ -179,7 +179,7 @@ def test_the_interpreters_library(version):
 
 @pytest.fixture
 def analyzer():
-    return CNewerAnalyzer((3, 14, 0))
+    return CExtendedAnalyzer((3, 14, 0))
 
 
 def Records(analyzer, text):
@@ -224,7 +224,7 @@ def test_other_node_classes_count(monkeypatch):
             return 0
 
     monkeypatch.setitem(treesift.CPGenParserImpl.kClsForState, "expr_stmt", COwnStmt)
-    assert (b"x", b":s:") not in Records(CNewerAnalyzer((3, 14, 0)), "x = 1")
+    assert (b"x", b":s:") not in Records(CExtendedAnalyzer((3, 14, 0)), "x = 1")
 
 
 def test_records_belong_to_the_host_once_it_looks(analyzer):

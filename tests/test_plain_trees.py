@@ -24,7 +24,7 @@ def Snippets():
     """The snippets of all files, and the sources of the golden files."""
     for path in sorted((TESTS / "snippets").glob("*.snippets")):
         yield from (row.replace("\\n", "\n") for row in path.read_text("utf-8").splitlines())
-    for folder, suffix in [("trees", ".tree"), ("trees/newer", ".tree"), ("records", ".records")]:
+    for folder, suffix in [("trees", ".tree"), ("trees/extended", ".tree"), ("records", ".records")]:
         yield from (case.values[0].source for case in Cases(TESTS / folder, suffix))
 
 

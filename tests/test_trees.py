@@ -4,7 +4,7 @@ A row of a tree shows a node: its class, the grammar state, the text of a leaf, 
 token. Beneath it, behind dots, stand the answers to what its class can be asked, and for brackets those of
 the functions, a node as its tokens; None, False, an empty list and the node itself aren't shown. An operation
 that takes an index is asked for one after another. Behind `---` stand the grammars; where both give the same
-tree it is there once. The files in trees/newer/ hold what the newer parser alone takes.
+tree it is there once. The files in trees/extended/ hold what the extended parser alone takes.
 """
 
 import re
@@ -20,7 +20,7 @@ from codeloom.optpgen import ParseError
 from codeloom.treesift import (
     CAtom,
     CExpression,
-    CNewerParser,
+    CExtendedParser,
     CNode,
     DropSimpleParens,
     IsGenExpression,
@@ -127,8 +127,8 @@ NEVER_SHOWN = {"CTestExpr", "CBinaryOp", "CMappingPatternNode", "CPassStmt", "Is
 NEVER_SHOWN |= {"CMultipleDecorators", "GetElseBody"}
 
 CASES = Cases(Path(__file__).parent / "trees", ".tree")
-NEWER_CASES = Cases(Path(__file__).parent / "trees/newer", ".tree")
-NEWER_DRIVER = CNewerParser((3, 14, 0))
+EXTENDED_CASES = Cases(Path(__file__).parent / "trees/extended", ".tree")
+NEWER_DRIVER = CExtendedParser((3, 14, 0))
 # What ended with Python 2, and an empty list.
 NEWER_REFUSES = {
     "an old octal number",
@@ -143,19 +143,19 @@ def test_tree(case, rewrite):
     Check(case, Output(case.source), rewrite)
 
 
-@pytest.mark.parametrize("case", NEWER_CASES)
-def test_tree_of_the_newer_parser(case, rewrite):
+@pytest.mark.parametrize("case", EXTENDED_CASES)
+def test_tree_of_the_extended_parser(case, rewrite):
     Check(case, f"--- 3.14\n{Outcome(case.source, NEWER_DRIVER)}", rewrite)
 
 
 def Shape(outcome):
     """The rows of a tree without the names of grammar states and the places of single tokens."""
-    outcome = outcome.replace("CExpression ELLIPSIS", "CNode ELLIPSIS")  # as the newer parser has it
+    outcome = outcome.replace("CExpression ELLIPSIS", "CNode ELLIPSIS")  # as the extended parser has it
     return re.sub(r"(?m)^( *\w+) \w+(.*?)(?: @\S.*)?$", r"\1\2", outcome)
 
 
 @pytest.mark.parametrize("case", CASES)
-def test_the_newer_parser_keeps_trees_and_answers(case):
+def test_the_extended_parser_keeps_trees_and_answers(case):
     outcome = Outcome(case.source, DRIVERS["3.8"])
     if case.title in NEWER_REFUSES:
         with pytest.raises((SyntaxError, ParseError)):

@@ -3,10 +3,10 @@
 #include <optional>
 
 #include "analysis/embedded.h"
-#include "analysis/syntax_error.h"
 #include "host/errors.h"
 #include "host/neighbour_call.h"
 #include "neighbours/imported_names.h"
+#include "parse/syntax_error.h"
 
 namespace codeloom {
 

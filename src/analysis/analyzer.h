@@ -7,10 +7,10 @@
 
 #include <nanobind/nanobind.h>
 
-#include "analysis/pgen_analyzer.h"
 #include "hints/type_hint_walker.h"
 #include "host/errors.h"
 #include "parse/parser_driver.h"
+#include "parse/pgen_analyzer.h"
 #include "walker/node_walker.h"
 
 namespace codeloom {

@@ -1,7 +1,7 @@
 #include "analysis/embedded.h"
 
-#include "analysis/syntax_error.h"
 #include "neighbours/imported_names.h"
+#include "parse/syntax_error.h"
 
 namespace codeloom {
 

@@ -5,14 +5,14 @@
 
 #include "_fastaccess/bind.h"
 #include "analysis/analyzer.h"
-#include "analysis/syntax_error.h"
+#include "extended/extended_analyzer.h"
 #include "hints/dispatch_walker.h"
 #include "host/module_entry.h"
 #include "host/neighbour_call.h"
 #include "host/restore.h"
 #include "neighbours/imported_names.h"
-#include "newer/newer_analyzer.h"
 #include "parse/parser_driver.h"
+#include "parse/syntax_error.h"
 #include "strutils/bind.h"
 #include "strutils/text.h"
 #include "symbolinfo/bind.h"
@@ -93,7 +93,7 @@ void BindClasses(nb::module_& module) {
     BindDispatchWalker(module);
     BindTypeHintWalker(module);
     BindAnalyzer(module);
-    BindNewerAnalyzer(module);
+    BindExtendedAnalyzer(module);
 }
 
 }  // namespace

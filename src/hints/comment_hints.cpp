@@ -1,13 +1,13 @@
 // The comment side of CTypeHintWalker.
 #include <algorithm>
 
-#include "analysis/syntax_error.h"
 #include "hints/type_hint_walker.h"
 #include "host/errors.h"
 #include "host/neighbour_call.h"
 #include "host/restore.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
+#include "parse/syntax_error.h"
 #include "symbolinfo/module_constants.h"
 #include "text/token_type.h"
 #include "tree/token_end.h"

@@ -7,9 +7,9 @@
 
 #include <nanobind/nanobind.h>
 
-#include "analysis/pgen_analyzer.h"
 #include "neighbours/optpgen/parser.h"
 #include "parse/match_case_parser.h"
+#include "parse/pgen_analyzer.h"
 #include "tree/node_factory.h"
 
 namespace codeloom {

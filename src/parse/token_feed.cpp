@@ -1,7 +1,7 @@
 #include "parse/token_feed.h"
 
-#include "analysis/syntax_error.h"
 #include "host/text.h"
+#include "parse/syntax_error.h"
 #include "text/token_type.h"
 
 namespace codeloom {

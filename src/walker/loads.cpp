@@ -1,12 +1,12 @@
 // Names that are read: alone, in chains, in calls, in comprehensions and decorators.
 #include <algorithm>
 
-#include "analysis/syntax_error.h"
 #include "host/errors.h"
 #include "host/restore.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
 #include "neighbours/symbolinfo/info_bytes.h"
+#include "parse/syntax_error.h"
 #include "strutils/text.h"
 #include "symbolinfo/module_constants.h"
 #include "tree/node_helpers.h"

@@ -1,8 +1,8 @@
 // Statements and expressions that bind names by a target, and those that hand a value on.
-#include "analysis/syntax_error.h"
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
+#include "parse/syntax_error.h"
 #include "strutils/text.h"
 #include "symbolinfo/vocabulary.h"
 #include "walker/node_walker.h"

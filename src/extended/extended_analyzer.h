@@ -2,11 +2,11 @@
 #pragma once
 
 #include "analysis/analyzer.h"
-#include "newer/plain_analysis.h"
+#include "extended/plain_analysis.h"
 
 namespace codeloom {
 
-class CNewerAnalyzer : public CPGenAnalyzerImpl {
+class CExtendedAnalyzer : public CPGenAnalyzerImpl {
   public:
     void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq, bool py3_grammar,
               nb::object hint_grammar_file);
@@ -22,6 +22,6 @@ class CNewerAnalyzer : public CPGenAnalyzerImpl {
 };
 
 // Binds the analyzer and its parsers.
-void BindNewerAnalyzer(nb::module_& module);
+void BindExtendedAnalyzer(nb::module_& module);
 
 }  // namespace codeloom

@@ -10,9 +10,9 @@
 
 #include <nanobind/nanobind.h>
 
+#include "extended/extended_parser.h"
 #include "line/line_analyzer.h"
 #include "neighbours/logicalline/logical_line.h"
-#include "newer/newer_parser.h"
 
 namespace codeloom {
 
@@ -30,7 +30,7 @@ class CPlainAnalysis {
     // Null where the plain analyzer wouldn't do the same: for a mixture of versions, another grammar file,
     // node classes or functions of the host.
     static std::unique_ptr<CPlainAnalysis> TryMake(const CAnalyzerParameters& parameters,
-                                                   const CNewerParser& parser);
+                                                   const CExtendedParser& parser);
 
     explicit CPlainAnalysis(const CLanguage& language) : _fAnalyzer(language) {}
 

@@ -14,7 +14,7 @@
 
 namespace codeloom {
 
-class CNewerForms {
+class CExtendedForms {
   public:
     // A form that a node of one grammar state shows: the child at fault, or -1.
     struct CNodeForm {
@@ -61,7 +61,7 @@ class CNewerForms {
 };
 
 template <class NumberOfState>
-void CNewerForms::WatchStates(NumberOfState number_of_state) {
+void CExtendedForms::WatchStates(NumberOfState number_of_state) {
     for (const CNodeForm& form : _NodeForms())
         if (form.form.version > _fVersion) _Watch(number_of_state(form.state), &form);
 }

@@ -1,4 +1,4 @@
-#include "analysis/syntax_error.h"
+#include "parse/syntax_error.h"
 
 #include "host/collections.h"
 #include "host/errors.h"

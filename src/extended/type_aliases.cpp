@@ -1,9 +1,9 @@
-// The part of CNewerParser that tells `type` the keyword from `type` the name.
+// The part of CExtendedParser that tells `type` the keyword from `type` the name.
+#include "extended/extended_parser.h"
+#include "extended/outside_brackets.h"
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
-#include "newer/newer_parser.h"
-#include "newer/outside_brackets.h"
 #include "parse/token_copy.h"
 #include "parse/token_search.h"
 #include "tokenizer/keywords.h"
@@ -45,8 +45,8 @@ bool IsBehindType(const nb::tuple& toks, Py_ssize_t i) {
 }  // namespace
 
 // `type` is a name like any other, unless it begins an alias.
-CNodeRef CNewerParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool in_async_def,
-                                                          CPositions positions, Py_ssize_t i) {
+CNodeRef CExtendedParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool in_async_def,
+                                                             CPositions positions, Py_ssize_t i) {
     const bool is_type = IsToken(toks, i, "type");
     if (is_type && !_BeginsTypeAlias(toks, i)) return CNodeRef();
     CNodeRef node = CPGenParserImpl::_ParseSpecialCaseWithTypeParameter(toks, in_async_def, positions, i);
@@ -59,7 +59,7 @@ CNodeRef CNewerParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, bool i
 
 //   type X = int    type X[T] = list[T]
 //          ^                  ^             tells it from `type`, the name
-bool CNewerParser::_BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i) {
+bool CExtendedParser::_BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i) {
     const Py_ssize_t name_i = _FindNextNonSkipIndex(toks, type_i);
     if (!_IsPlainName(toks, name_i)) return false;
     Py_ssize_t i = _FindNextNonSkipIndex(toks, name_i);
@@ -72,14 +72,14 @@ bool CNewerParser::_BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i) {
 }
 
 // The assignment that an alias is parsed as has one `=`, and one expression behind it.
-void CNewerParser::_RequireAlias(const CNode& node) {
+void CExtendedParser::_RequireAlias(const CNode& node) {
     const CNode& assignment = node.As<CWithTypeParameters>() ? node.ChildAt(-1) : node;
     if (ListedCount(assignment) > 3) _RaiseParseError(assignment.ChildAt(3).fContext);
     _RequireSingle(assignment.ChildAt(2));
 }
 
 // In a body behind its header the grammar doesn't know an alias, and stumbles over its name.
-CNodeRef CNewerParser::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, CPositions positions) {
+CNodeRef CExtendedParser::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, CPositions positions) {
     try {
         return CPGenParserImpl::_ParseToksToNodeImpl(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
@@ -94,8 +94,8 @@ CNodeRef CNewerParser::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, C
 
 //   if a: type X = int; type Y[T] = list[T]
 //         ^^^^          ^^^^  ^^^             removed, once each alias has been parsed by itself
-nb::tuple CNewerParser::_WithoutAliases(const nb::tuple& toks, bool in_async_def,
-                                        const CPositions& positions) {
+nb::tuple CExtendedParser::_WithoutAliases(const nb::tuple& toks, bool in_async_def,
+                                           const CPositions& positions) {
     const Py_ssize_t count = TupleSize(toks);
     nb::tuple rest = toks;
     ForEachStatement(toks, _FindNextNonSkipIndex(toks, -1), [&](Py_ssize_t start, Py_ssize_t end) {

@@ -1,8 +1,8 @@
-// newer/: the language beyond Python 3.8 for those who read whole files of it.
+// extended/: the language beyond Python 3.8 for those who read whole files of it.
 //   in     the same as the classes beneath
 //   out    the same node classes, so that walkers need nothing new
 //   keeps  the same
-//   start  at CNewerParser, which a host could have written with the operations that it overrides
+//   start  at CExtendedParser, which a host could have written with the operations that it overrides
 //
 // What one token can decide is in the grammar file of 3.14. Here is the rest:
 //   with (x := f()) as y:   with (yield):   async with (a as b, c as d):   brackets that are and aren't
@@ -11,18 +11,18 @@
 //   type is x                               `type` as a name in front of a keyword: type_aliases.cpp
 //   if a: type X = int                      an alias in a body on the row of its header
 //   def f[T: int = str]():                  defaults of type parameters
-//   case a, b:                              in newer_match_case_parser.h
-// What a line has that is newer than the version asked for is refused by its name: newer_forms.h.
+//   case a, b:                              in extended_match_case_parser.h
+// What a line has that is newer than the version asked for is refused by its name: extended_forms.h.
 #pragma once
 
-#include "newer/newer_forms.h"
+#include "extended/extended_forms.h"
 #include "parse/parser_driver.h"
 
 namespace codeloom {
 
 inline constexpr const char* kNewerGrammar = "Python-Grammar-3.14";
 
-class CNewerParser : public CPGenParserImpl {
+class CExtendedParser : public CPGenParserImpl {
   public:
     void Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq, bool py3_grammar);
 
@@ -78,9 +78,9 @@ class CNewerParser : public CPGenParserImpl {
                            Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors);
     void _RequireSingle(const CNode& node);
 
-    CNewerForms _fForms;
+    CExtendedForms _fForms;
 };
 
-void BindNewerParser(nb::module_& module);
+void BindExtendedParser(nb::module_& module);
 
 }  // namespace codeloom

@@ -1,4 +1,4 @@
-#include "analysis/pgen_analyzer.h"
+#include "parse/pgen_analyzer.h"
 
 namespace codeloom {
 

@@ -1,4 +1,4 @@
-#include "newer/plain_analysis.h"
+#include "extended/plain_analysis.h"
 
 #include <fstream>
 #include <iterator>
@@ -7,12 +7,12 @@
 #include <unordered_set>
 
 #include "analysis/embedded.h"
-#include "analysis/syntax_error.h"
 #include "host/neighbour_call.h"
 #include "host/neighbour_watch.h"
 #include "host/text.h"
 #include "line/fault_words.h"
 #include "neighbours/imported_names.h"
+#include "parse/syntax_error.h"
 #include "syntax/grammar_texts.h"
 #include "syntax/syntax_grammar.h"
 
@@ -80,7 +80,7 @@ void WatchNeighbours() {
 }
 
 std::unique_ptr<CPlainAnalysis> CPlainAnalysis::TryMake(const CAnalyzerParameters& parameters,
-                                                        const CNewerParser& parser) {
+                                                        const CExtendedParser& parser) {
     const int version = PlainVersionOf(parameters.version_triple);
     if (version == 0 || !parameters.py3_grammar || !gNeighbours.IsUntouched()) return nullptr;
     const CLanguage& language = LanguageOf(version);

@@ -12,7 +12,7 @@ import pytest
 from codeloom import VERSIONS as ALL_VERSIONS
 from codeloom import analyze
 from codeloom.records import FormatRecord, RecordsOfLogical
-from codeloom.treesift import CNewerAnalyzer
+from codeloom.treesift import CExtendedAnalyzer
 from codeloom.utils import GetLogicalsFromText
 
 ONLY_IN_2_7 = r"""
@@ -191,7 +191,7 @@ def test_accepted_from_its_version_on_and_named_before(since, statement, told):
 )
 def test_three_dots_are_an_expression(statement, records):
     (logical,) = GetLogicalsFromText(statement)
-    assert CNewerAnalyzer((3, 14)).AnalyzeSingleLogical(logical, False) is None
+    assert CExtendedAnalyzer((3, 14)).AnalyzeSingleLogical(logical, False) is None
     assert [FormatRecord(record) for record in RecordsOfLogical(logical)] == records
 
 

@@ -12,7 +12,7 @@
 
 namespace codeloom {
 
-class CNewerMatchCaseParser : public CMatchCaseStatementParser {
+class CExtendedMatchCaseParser : public CMatchCaseStatementParser {
   public:
     nb::tuple _RemoveSkipToks(nb::tuple toks, nb::tuple positions) override;
     CNodeRef ParseMatchStmt(nb::tuple toks, nb::tuple positions) override;
@@ -47,6 +47,6 @@ class CNewerMatchCaseParser : public CMatchCaseStatementParser {
     nb::object _fLinePositions = nb::none();  // tuple of their positions; none between two parses
 };
 
-void BindNewerMatchCaseParser(nb::module_& module);
+void BindExtendedMatchCaseParser(nb::module_& module);
 
 }  // namespace codeloom

@@ -1,4 +1,4 @@
-#include "newer/newer_match_case_parser.h"
+#include "extended/extended_match_case_parser.h"
 
 #include "host/errors.h"
 #include "host/restore.h"
@@ -25,7 +25,7 @@ bool IsSubject(const CNode& node) {
 }  // namespace
 
 // Removed tokens are none of the statement's: those in front of the bound in `def f[T: match.a]()`.
-nb::tuple CNewerMatchCaseParser::_RemoveSkipToks(nb::tuple toks, nb::tuple positions) {
+nb::tuple CExtendedMatchCaseParser::_RemoveSkipToks(nb::tuple toks, nb::tuple positions) {
     nb::list kept_toks, kept_positions;
     for (Py_ssize_t i = 0; i < TupleSize(toks); ++i) {
         if (TupleItem(toks, i).is_none()) continue;
@@ -35,19 +35,19 @@ nb::tuple CNewerMatchCaseParser::_RemoveSkipToks(nb::tuple toks, nb::tuple posit
     return CMatchCaseStatementParser::_RemoveSkipToks(nb::tuple(kept_toks), nb::tuple(kept_positions));
 }
 
-CNodeRef CNewerMatchCaseParser::ParseMatchStmt(nb::tuple toks, nb::tuple positions) {
+CNodeRef CExtendedMatchCaseParser::ParseMatchStmt(nb::tuple toks, nb::tuple positions) {
     const CRestoreOnExit<nb::object> line_toks(_fLineToks, toks);
     const CRestoreOnExit<nb::object> line_positions(_fLinePositions, positions);
     return CMatchCaseStatementParser::ParseMatchStmt(std::move(toks), std::move(positions));
 }
 
-CNodeRef CNewerMatchCaseParser::ParseCaseStmt(nb::tuple toks, nb::tuple positions) {
+CNodeRef CExtendedMatchCaseParser::ParseCaseStmt(nb::tuple toks, nb::tuple positions) {
     const CRestoreOnExit<nb::object> line_toks(_fLineToks, toks);
     const CRestoreOnExit<nb::object> line_positions(_fLinePositions, positions);
     return CMatchCaseStatementParser::ParseCaseStmt(std::move(toks), std::move(positions));
 }
 
-CNodeRef CNewerMatchCaseParser::_ParseMatchStmtImpl() {
+CNodeRef CExtendedMatchCaseParser::_ParseMatchStmtImpl() {
     if (_fLineToks.is_none()) return CMatchCaseStatementParser::_ParseMatchStmtImpl();
     return _MatchStmt([this] {
         CNodeRef node = _Parse(
@@ -58,7 +58,7 @@ CNodeRef CNewerMatchCaseParser::_ParseMatchStmtImpl() {
     });
 }
 
-CNodeRef CNewerMatchCaseParser::_ParseCaseStmtImpl() {
+CNodeRef CExtendedMatchCaseParser::_ParseCaseStmtImpl() {
     if (_fLineToks.is_none()) return CMatchCaseStatementParser::_ParseCaseStmtImpl();
     return _CaseStmt([this](Py_ssize_t start_i, Py_ssize_t end_i) {
         const nb::tuple toks = nb::borrow<nb::tuple>(_fLineToks);
@@ -69,7 +69,7 @@ CNodeRef CNewerMatchCaseParser::_ParseCaseStmtImpl() {
 }
 
 // `case x if lambda: 1:`, each lambda of a guard has a colon of its own.
-Py_ssize_t CNewerMatchCaseParser::_FindCaseColon() {
+Py_ssize_t CExtendedMatchCaseParser::_FindCaseColon() {
     int lambda_count = 0;
     Py_ssize_t start_i = kPatternIndex;
     for (;;) {
@@ -82,14 +82,14 @@ Py_ssize_t CNewerMatchCaseParser::_FindCaseColon() {
     }
 }
 
-CNodeRef CNewerMatchCaseParser::_NodeForPattern(Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as) {
+CNodeRef CExtendedMatchCaseParser::_NodeForPattern(Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as) {
     const CRecursionScope recursion;  // for overrides, which call one another
     CPatternWork work;
-    CNewerMatchCaseParser::DoPatternStep(work, {CPatternStep::EKind::kPattern, start_i, end_i, allow_as});
+    CExtendedMatchCaseParser::DoPatternStep(work, {CPatternStep::EKind::kPattern, start_i, end_i, allow_as});
     return _Finish(work);
 }
 
-void CNewerMatchCaseParser::DoPatternStep(CPatternWork& work, const CPatternStep& step) {
+void CExtendedMatchCaseParser::DoPatternStep(CPatternWork& work, const CPatternStep& step) {
     const bool is_pattern = step.kind == CPatternStep::EKind::kPattern;
     if (is_pattern) _RefuseWhatNoPatternIs(step);
     if (step.kind == CPatternStep::EKind::kToken && !_IsTok(step.start_i, "as")) _RefuseKeyword(step.start_i);
@@ -101,35 +101,35 @@ void CNewerMatchCaseParser::DoPatternStep(CPatternWork& work, const CPatternStep
 }
 
 // The parser beneath takes keywords for names, and a bar at the end.
-void CNewerMatchCaseParser::_RefuseWhatNoPatternIs(const CPatternStep& step) {
+void CExtendedMatchCaseParser::_RefuseWhatNoPatternIs(const CPatternStep& step) {
     if (step.start_i + 1 == step.end_i) _RefuseKeyword(step.start_i);
     if (step.start_i + 1 < step.end_i && _IsTok(step.end_i - 1, "|")) _FailAt(step.end_i);
 }
 
-void CNewerMatchCaseParser::_RefuseKeyword(Py_ssize_t tok_i) {
+void CExtendedMatchCaseParser::_RefuseKeyword(Py_ssize_t tok_i) {
     const nb::object tok = _Tok(tok_i);
     if (_fPGenParser->IsKeyword(tok) && !TextIsOneOf(tok, "None", "True", "False")) _FailAt(tok_i);
 }
 
 // Of the ranges that begin behind `case`, the whole pattern is the only one with a comma outside brackets.
-bool CNewerMatchCaseParser::_IsOpenSequence(const CPatternStep& step) {
+bool CExtendedMatchCaseParser::_IsOpenSequence(const CPatternStep& step) {
     return step.start_i == kPatternIndex && step.allow_as && _Find(",", step.start_i, step.end_i) != -1;
 }
 
-bool CNewerMatchCaseParser::_BeginsWithStrings(const CPatternStep& step) {
+bool CExtendedMatchCaseParser::_BeginsWithStrings(const CPatternStep& step) {
     if (step.start_i + 1 >= step.end_i || _TokType(step.start_i) != kTokenId_STRING) return false;
     const bool is_capture = step.allow_as && step.start_i + 2 < step.end_i && _IsTok(step.end_i - 2, "as");
     return !is_capture && _Find("|", step.start_i, step.end_i) == -1;
 }
 
-bool CNewerMatchCaseParser::_IsEmptySequence(const CPatternStep& step) const {
+bool CExtendedMatchCaseParser::_IsEmptySequence(const CPatternStep& step) const {
     return step.start_i + 2 == step.end_i && _IsTok(step.start_i, "(") && _IsTok(step.start_i + 1, ")");
 }
 
 //   case a, *b:
 //        ^^^^^
 //   a CSequencePatternNode: the patterns with the commas, without brackets
-void CNewerMatchCaseParser::_PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
+void CExtendedMatchCaseParser::_PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
     _PlanPatterns(plan, start_i, end_i);
     plan.Build<CSequencePatternNode>();
 }
@@ -137,7 +137,7 @@ void CNewerMatchCaseParser::_PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, 
 //   case "a" "b":
 //        ^^^^^^^
 //   a CAtom, as in an expression: a leaf for each string
-void CNewerMatchCaseParser::_PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
+void CExtendedMatchCaseParser::_PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
     for (Py_ssize_t i = start_i; i < end_i; ++i) {
         if (_TokType(i) != kTokenId_STRING) _FailAt(i);
         plan.Token(i);
@@ -146,20 +146,20 @@ void CNewerMatchCaseParser::_PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py_ss
 }
 
 // Where a token stands among those of the line, comments and backslashes included.
-Py_ssize_t CNewerMatchCaseParser::_IndexInLine(Py_ssize_t tok_i) const {
+Py_ssize_t CExtendedMatchCaseParser::_IndexInLine(Py_ssize_t tok_i) const {
     const nb::object position = _Position(tok_i);
     for (Py_ssize_t i = tok_i; i < TupleSize(_fLinePositions); ++i)
         if (position.is(TupleItem(_fLinePositions, i))) return i;
     return tok_i;
 }
 
-CNodeRef CNewerMatchCaseParser::_Parse(nb::tuple toks) {
+CNodeRef CExtendedMatchCaseParser::_Parse(nb::tuple toks) {
     return _fPGenParser->_ParseToksToNodeImpl(std::move(toks), true, CPositions(_fLinePositions));
 }
 
-void BindNewerMatchCaseParser(nb::module_& module) {
-    nb::class_<CNewerMatchCaseParser, CMatchCaseStatementParser, THostSubclass<CNewerMatchCaseParser>>
-        binding(module, "CNewerMatchCaseParser", Collected<CNewerMatchCaseParser>(),
+void BindExtendedMatchCaseParser(nb::module_& module) {
+    nb::class_<CExtendedMatchCaseParser, CMatchCaseStatementParser, THostSubclass<CExtendedMatchCaseParser>>
+        binding(module, "CExtendedMatchCaseParser", Collected<CExtendedMatchCaseParser>(),
                 "Parses match and case statements, open and empty sequences and adjacent strings included.");
     binding.def(TInit<CRef<CPGenParserImpl>>(), "pgen_parser"_a.none());
     BindOperations(binding);

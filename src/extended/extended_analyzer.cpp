@@ -1,17 +1,17 @@
-#include "newer/newer_analyzer.h"
+#include "extended/extended_analyzer.h"
 
-#include "newer/newer_parser.h"
+#include "extended/extended_parser.h"
 #include "parse/class_table.h"
 
 namespace codeloom {
 
-void CNewerAnalyzer::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-                          bool py3_grammar, nb::object hint_grammar_file) {
-    const CRef<CNewerParser> parser =
-        NewInstance<CNewerParser>(version_triple, grammar_file, keyword_seq, py3_grammar);
+void CExtendedAnalyzer::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
+                             bool py3_grammar, nb::object hint_grammar_file) {
+    const CRef<CExtendedParser> parser =
+        NewInstance<CExtendedParser>(version_triple, grammar_file, keyword_seq, py3_grammar);
     _fPlain.reset();
     // Hints in comments are read by type checkers, which know the forms of all versions.
-    const CRef<CNewerParser> hint_parser = NewInstance<CNewerParser>(version_triple, hint_grammar_file);
+    const CRef<CExtendedParser> hint_parser = NewInstance<CExtendedParser>(version_triple, hint_grammar_file);
     hint_parser->TakeAllForms();
     InitFromParts(PartsAround(CRef<CPGenParserImpl>(parser.get()), version_triple,
                               CRef<CPGenParserImpl>(hint_parser.get())));
@@ -21,7 +21,8 @@ void CNewerAnalyzer::Init(nb::object version_triple, nb::object grammar_file, nb
         {version_triple, grammar_file, keyword_seq, py3_grammar, hint_grammar_file}, *parser);
 }
 
-nb::object CNewerAnalyzer::AnalyzeSingleLogical(CLogicalLine& logical, bool in_async_def, bool first_in_def) {
+nb::object CExtendedAnalyzer::AnalyzeSingleLogical(CLogicalLine& logical, bool in_async_def,
+                                                   bool first_in_def) {
     if (_fPlain && !logical.fParsed && _AreWalkersAsMade() && CPlainAnalysis::CanTake(logical))
         if (const std::optional<nb::object> error = _fPlain->Analyze(logical, in_async_def, first_in_def))
             return *error;
@@ -29,7 +30,7 @@ nb::object CNewerAnalyzer::AnalyzeSingleLogical(CLogicalLine& logical, bool in_a
 }
 
 // A host may set fields of the walkers, and the visits in the dictionary.
-bool CNewerAnalyzer::_AreWalkersAsMade() const {
+bool CExtendedAnalyzer::_AreWalkersAsMade() const {
     const CNodeToTextConverterImpl& to_text = *_fNodeWalker->_fToText;
     const CNodeToTextConverterImpl& hint_text = *_fTypeHintWalker->_fHintConv;
     const CNodeToTextConverterImpl& name_text = *_fTypeHintWalker->_fNameConv;
@@ -41,12 +42,12 @@ bool CNewerAnalyzer::_AreWalkersAsMade() const {
            DictVersion(_fTypeHintWalker->GetDispatchDict()) == _fVisitsVersion;
 }
 
-void BindNewerAnalyzer(nb::module_& module) {
-    BindNewerParser(module);
+void BindExtendedAnalyzer(nb::module_& module) {
+    BindExtendedParser(module);
     RememberClsForState();
     WatchNeighbours();
-    nb::class_<CNewerAnalyzer, CPGenAnalyzerImpl, THostSubclass<CNewerAnalyzer>> binding(
-        module, "CNewerAnalyzer", Collected<CNewerAnalyzer>(),
+    nb::class_<CExtendedAnalyzer, CPGenAnalyzerImpl, THostSubclass<CExtendedAnalyzer>> binding(
+        module, "CExtendedAnalyzer", Collected<CExtendedAnalyzer>(),
         "Analyzes logical lines of the language up to Python 3.14.");
     binding.def(TInit<nb::object, nb::object, nb::object, bool, nb::object>(), "version_triple"_a.none(),
                 "grammar_file"_a = kNewerGrammar, "keyword_seq"_a = nb::none(), "py3_grammar"_a = true,

@@ -1,10 +1,10 @@
-#include "newer/newer_parser.h"
+#include "extended/extended_parser.h"
 
+#include "extended/extended_match_case_parser.h"
+#include "extended/outside_brackets.h"
 #include "host/errors.h"
 #include "host/text.h"
 #include "neighbours/imported_names.h"
-#include "newer/newer_match_case_parser.h"
-#include "newer/outside_brackets.h"
 #include "parse/class_table.h"
 #include "parse/parentheses.h"
 #include "parse/pseudo_node.h"
@@ -39,33 +39,33 @@ CWithContents ReadWithContents(const nb::tuple& toks, Py_ssize_t open_i, Py_ssiz
 
 }  // namespace
 
-void CNewerParser::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
-                        bool py3_grammar) {
+void CExtendedParser::Init(nb::object version_triple, nb::object grammar_file, nb::object keyword_seq,
+                           bool py3_grammar) {
     CPGenParserImpl::Init(std::move(version_triple), std::move(grammar_file), std::move(keyword_seq),
                           py3_grammar);
-    const CRef<CNewerMatchCaseParser> match_case_parser = NewInstance<CNewerMatchCaseParser>(Self());
+    const CRef<CExtendedMatchCaseParser> match_case_parser = NewInstance<CExtendedMatchCaseParser>(Self());
     _fMatchCaseStatementParser = CRef<CMatchCaseStatementParser>(match_case_parser.get());
     _fForms.SetVersion(_fVersionTriple);
     _fForms.WatchStates(
         [this](const char* state) { return _HasSymbol(state) ? _NumberOfSymbol(state) : -1; });
 }
 
-nb::object CNewerParser::convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
-                                 nb::handle children) {
+nb::object CExtendedParser::convert(nb::handle grammar, int type, nb::handle value, nb::handle context,
+                                    nb::handle children) {
     return _Noted(type, CPGenParserImpl::convert(grammar, type, value, context, children));
 }
 
-nb::object CNewerParser::ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
-                                     size_t first) {
+nb::object CExtendedParser::ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
+                                        size_t first) {
     return _Noted(type, CPGenParserImpl::ConvertRule(grammar, type, context, stack, first));
 }
 
-nb::object CNewerParser::_Noted(int type, nb::object node) {
+nb::object CExtendedParser::_Noted(int type, nb::object node) {
     if (_fForms.AreWatched(type)) _fForms.NoteNode(type, *Instance<CNode>(node));
     return node;
 }
 
-CNodeRef CNewerParser::ParseToNode(CLogicalLine& logical, bool in_async_def) {
+CNodeRef CExtendedParser::ParseToNode(CLogicalLine& logical, bool in_async_def) {
     _fForms.Reset();
     CNodeRef node = CPGenParserImpl::ParseToNode(logical, in_async_def);
     if (!_fForms.HasFound()) return node;
@@ -76,17 +76,17 @@ CNodeRef CNewerParser::ParseToNode(CLogicalLine& logical, bool in_async_def) {
 
 // A star before any expression has a rule of its own in the grammar, since `star_expr` takes less. And `...`
 // is an expression, so that what holds one loses no records.
-nb::list CNewerParser::_WithNewerClasses(nb::list classes) const {
+nb::list CExtendedParser::_WithNewerClasses(nb::list classes) const {
     if (_HasSymbol("star_test")) classes[_NumberOfSymbol("star_test")] = nb::type<CStarExpression>();
     classes[static_cast<int>(kTokenId_ELLIPSIS)] = nb::type<CExpression>();
     return classes;
 }
 
-nb::list CNewerParser::_BuildClsForStateList() {
+nb::list CExtendedParser::_BuildClsForStateList() {
     return _WithNewerClasses(CPGenParserImpl::_BuildClsForStateList());
 }
 
-bool CNewerParser::HasOriginalClasses() const {
+bool CExtendedParser::HasOriginalClasses() const {
     const nb::list original = _WithNewerClasses(OriginalClsForStateList(_fGrammar));
     if (!nb::isinstance<nb::list>(_fClsForStateList) || ListSize(_fClsForStateList) != ListSize(original))
         return false;
@@ -95,7 +95,7 @@ bool CNewerParser::HasOriginalClasses() const {
     return true;
 }
 
-CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
+CNodeRef CExtendedParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPositions positions) {
     const Py_ssize_t i = _FindNextNonSkipIndex(toks, -1);
     if (i >= TupleSize(toks)) return CNodeRef();
     const CUtf8 text(TupleItem(toks, i));
@@ -109,8 +109,8 @@ CNodeRef CNewerParser::_ParseSpecialCases(nb::tuple toks, bool in_async_def, CPo
     return CPGenParserImpl::_ParseSpecialCases(std::move(toks), in_async_def, std::move(positions));
 }
 
-CNodeRef CNewerParser::_ParseMatchOrCase(const nb::tuple& toks, bool in_async_def,
-                                         const CPositions& positions, Py_ssize_t word_i) {
+CNodeRef CExtendedParser::_ParseMatchOrCase(const nb::tuple& toks, bool in_async_def,
+                                            const CPositions& positions, Py_ssize_t word_i) {
     CNodeRef node = _ParseMatchCaseOrName(toks, in_async_def, positions, word_i);
     if (node && node->As<CMatchStmt>()) _fForms.Note(forms::kMatch, nb::int_(word_i));
     if (node && node->As<CCaseStmt>()) _fForms.Note(forms::kCase, nb::int_(word_i));
@@ -118,8 +118,8 @@ CNodeRef CNewerParser::_ParseMatchOrCase(const nb::tuple& toks, bool in_async_de
 }
 
 // `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
-CNodeRef CNewerParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def,
-                                             const CPositions& positions, Py_ssize_t word_i) {
+CNodeRef CExtendedParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def,
+                                                const CPositions& positions, Py_ssize_t word_i) {
     try {
         return CPGenParserImpl::_ParseSpecialCases(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
@@ -136,8 +136,8 @@ CNodeRef CNewerParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_asyn
 
 //   with (open(a) as f, open(b)):    items
 //   with (a), (b):   with (a)[0]:    with (x := f()) as y:    with (yield):    none
-CNodeRef CNewerParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def,
-                                                          CPositions positions, Py_ssize_t i) {
+CNodeRef CExtendedParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool in_async_def,
+                                                             CPositions positions, Py_ssize_t i) {
     _RefuseLastComma(toks, i);
     const Py_ssize_t open_i = _FindNextNonSkipIndex(toks, i);
     if (!IsToken(toks, open_i, "(")) return CNodeRef();
@@ -152,7 +152,7 @@ CNodeRef CNewerParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, bool i
 
 //   with a, b,:
 //             ^    stands within brackets only, which are off when the grammar reads the items
-void CNewerParser::_RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i) {
+void CExtendedParser::_RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i) {
     bool is_behind_comma = false;
     ForEachOutsideBrackets(toks, with_i + 1, TupleSize(toks), [&](Py_ssize_t i, std::string_view text) {
         if (is_behind_comma && text == ":") _RaiseParseError(nb::int_(i));
@@ -163,8 +163,8 @@ void CNewerParser::_RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i) {
 
 //   except A, B:         may lack its brackets (PEP 758)
 //   except A, B as e:    may not, which the grammar doesn't tell
-CNodeRef CNewerParser::_ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async_def, CPositions positions,
-                                                   Py_ssize_t i) {
+CNodeRef CExtendedParser::_ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                      Py_ssize_t i) {
     Py_ssize_t comma_i = -1, as_i = -1;
     ForEachOutsideBrackets(toks, i + 1, TupleSize(toks), [&](Py_ssize_t tok_i, std::string_view text) {
         if (comma_i == -1 && text == ",") comma_i = tok_i;
@@ -180,8 +180,8 @@ CNodeRef CNewerParser::_ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async
 //   @a.b(c)    the grammar's
 //   @a[0].b    parsed as `(a[0].b)`
 //   a CSingleDecorator: `@`, the expression, the end of the row
-CNodeRef CNewerParser::_ParseDecorator(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
-                                       Py_ssize_t at_i) {
+CNodeRef CExtendedParser::_ParseDecorator(const nb::tuple& toks, bool in_async_def,
+                                          const CPositions& positions, Py_ssize_t at_i) {
     if (_FitsDecoratorRule(toks, at_i)) return CNodeRef();
     const Py_ssize_t count = TupleSize(toks);
     if (_FindNextNonSkipIndex(toks, at_i) == count) _RaiseParseError(nb::int_(count));
@@ -202,7 +202,7 @@ CNodeRef CNewerParser::_ParseDecorator(const nb::tuple& toks, bool in_async_def,
 }
 
 // `@name.name`, perhaps called: the form that the grammar has a tree for.
-bool CNewerParser::_FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i) {
+bool CExtendedParser::_FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i) {
     Py_ssize_t i = at_i;
     do {
         i = _FindNextNonSkipIndex(toks, i);
@@ -218,16 +218,17 @@ bool CNewerParser::_FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i) {
 }
 
 //   def f[]():    an empty list is none
-nb::list CNewerParser::_NodesForTypeParameters(nb::tuple toks, bool in_async_def, CPositions positions,
-                                               Py_ssize_t start, Py_ssize_t end, bool raise_errors) {
+nb::list CExtendedParser::_NodesForTypeParameters(nb::tuple toks, bool in_async_def, CPositions positions,
+                                                  Py_ssize_t start, Py_ssize_t end, bool raise_errors) {
     if (raise_errors && _FindNextNonSkipIndex(toks, start) >= end) _RaiseParseError(nb::int_(end));
     return CPGenParserImpl::_NodesForTypeParameters(toks, in_async_def, positions, start, end, raise_errors);
 }
 
 //   T = int        name '=' default
 //   T: a = b       name ':' node, a CNode of the bound, '=' and the default
-CNodeRef CNewerParser::_CreateSingleTypeParameterNode(nb::tuple toks, bool in_async_def, CPositions positions,
-                                                      Py_ssize_t start, Py_ssize_t end, bool raise_errors) {
+CNodeRef CExtendedParser::_CreateSingleTypeParameterNode(nb::tuple toks, bool in_async_def,
+                                                         CPositions positions, Py_ssize_t start,
+                                                         Py_ssize_t end, bool raise_errors) {
     const Py_ssize_t equal_i = _NonNestedFindTokenIndex(nb::str("="), toks, start, end);
     if (equal_i == -1)
         return CPGenParserImpl::_CreateSingleTypeParameterNode(toks, in_async_def, positions, start, end,
@@ -251,8 +252,8 @@ CNodeRef CNewerParser::_CreateSingleTypeParameterNode(nb::tuple toks, bool in_as
 }
 
 // The default behind the `=` at `equal_i`; none when it is refused and errors aren't raised.
-CNodeRef CNewerParser::_ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
-                                     Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors) {
+CNodeRef CExtendedParser::_ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
+                                        Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors) {
     const bool is_missing = _FindNextNonSkipIndex(toks, equal_i) >= end;
     if (is_missing && raise_errors) _RaiseParseError(nb::int_(end));
     if (is_missing) return CNodeRef();
@@ -263,21 +264,21 @@ CNodeRef CNewerParser::_ParseDefault(const nb::tuple& toks, bool in_async_def, c
 }
 
 // A ParseError at what makes more of a node than one expression: a comma, a comprehension, `=`, `yield`, `*`.
-void CNewerParser::_RequireSingle(const CNode& node) {
+void CExtendedParser::_RequireSingle(const CNode& node) {
     if (node.As<CTestListStarExpr>() || !node.As<CExpression>()) _RaiseParseError(node.ChildAt(1).fContext);
     if (node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield"))
         _RaiseParseError(node.fContext);
 }
 
 // A name that is no keyword.
-bool CNewerParser::_IsPlainName(const nb::tuple& toks, Py_ssize_t i) const {
+bool CExtendedParser::_IsPlainName(const nb::tuple& toks, Py_ssize_t i) const {
     return i < TupleSize(toks) && IsName(toks, i) && !IsKeyword(TupleItem(toks, i));
 }
 
-void BindNewerParser(nb::module_& module) {
-    BindNewerMatchCaseParser(module);
-    nb::class_<CNewerParser, CPGenParserImpl, THostSubclass<CNewerParser>> binding(
-        module, "CNewerParser", Collected<CNewerParser>(),
+void BindExtendedParser(nb::module_& module) {
+    BindExtendedMatchCaseParser(module);
+    nb::class_<CExtendedParser, CPGenParserImpl, THostSubclass<CExtendedParser>> binding(
+        module, "CExtendedParser", Collected<CExtendedParser>(),
         "Parses the language up to Python 3.14, with the grammar file of that version.");
     binding.def(TInit<nb::object, nb::object, nb::object, bool>(), "version_triple"_a.none(),
                 "grammar_file"_a = kNewerGrammar, "keyword_seq"_a = nb::none(), "py3_grammar"_a = true);

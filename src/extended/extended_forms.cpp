@@ -1,10 +1,10 @@
-#include "newer/newer_forms.h"
+#include "extended/extended_forms.h"
 
 #include <algorithm>
 
-#include "analysis/syntax_error.h"
 #include "host/errors.h"
 #include "host/text.h"
+#include "parse/syntax_error.h"
 #include "text/token_type.h"
 #include "tree/child_list.h"
 #include "tree/expression_nodes.h"
@@ -65,7 +65,7 @@ int VersionOf(nb::handle version_triple) {
 
 }  // namespace
 
-const std::vector<CNewerForms::CNodeForm>& CNewerForms::_NodeForms() {
+const std::vector<CExtendedForms::CNodeForm>& CExtendedForms::_NodeForms() {
     static const std::vector<CNodeForm> node_forms = {
         {"annassign", forms::kVariableAnnotation, Always<0>},
         {"namedexpr_test", forms::kWalrus, Always<1>},
@@ -86,13 +86,13 @@ const std::vector<CNewerForms::CNodeForm>& CNewerForms::_NodeForms() {
     return node_forms;
 }
 
-void CNewerForms::SetVersion(nb::handle version_triple) {
+void CExtendedForms::SetVersion(nb::handle version_triple) {
     _fVersion = VersionOf(version_triple);
     _Watch(kTokenId_STRING, nullptr);
     _Watch(kTokenId_NUMBER, nullptr);
 }
 
-void CNewerForms::_Watch(int type, const CNodeForm* form) {
+void CExtendedForms::_Watch(int type, const CNodeForm* form) {
     if (type < 0) return;
     const size_t type_i = static_cast<size_t>(type);
     if (type_i >= _fWatched.size()) {
@@ -103,7 +103,7 @@ void CNewerForms::_Watch(int type, const CNodeForm* form) {
     _fNodeForm[type_i] = form;
 }
 
-void CNewerForms::NoteNode(int type, const CNode& node) {
+void CExtendedForms::NoteNode(int type, const CNode& node) {
     if (type == kTokenId_STRING || type == kTokenId_NUMBER) {
         const CUtf8 text(node.fText);
         if (text->empty()) return;  // of a node that a host made
@@ -117,13 +117,13 @@ void CNewerForms::NoteNode(int type, const CNode& node) {
     if (child_i >= 0) Note(node_form.form, node.ChildAt(child_i).fContext);
 }
 
-void CNewerForms::Note(const CForm& form, nb::handle context) {
+void CExtendedForms::Note(const CForm& form, nb::handle context) {
     if (_fFound || form.version <= _fVersion) return;
     _fFound = &form;
     _fContext = nb::borrow(context);
 }
 
-nb::object CNewerForms::ErrorIn(CLogicalLine& logical) const {
+nb::object CExtendedForms::ErrorIn(CLogicalLine& logical) const {
     const CForm& found = *_fFound;
     const nb::object context = _fContext;
     const int major = found.version / kVersionsOfMajor, minor = found.version % kVersionsOfMajor;
