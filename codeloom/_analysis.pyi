@@ -82,6 +82,48 @@ class LimitKind(enum.Enum):
     TOO_MANY_NODES = 'too many nodes'
     TOO_DEEP = 'too deep'
 
+class Role(enum.Enum):
+    """What a name does where it appears; docs/names.md tells of each."""
+    READ = 'read'
+    BIND = 'bind'
+    AUGMENT = 'augment'
+    DELETE = 'delete'
+    IMPORT = 'import'
+    PARAMETER = 'parameter'
+    TYPE_PARAMETER = 'type parameter'
+    GLOBAL = 'global'
+    NONLOCAL = 'nonlocal'
+    ATTRIBUTE = 'attribute'
+    ATTRIBUTE_BIND = 'attribute bind'
+    ATTRIBUTE_AUGMENT = 'attribute augment'
+    ATTRIBUTE_DELETE = 'attribute delete'
+    KEYWORD = 'keyword'
+    ORIGIN = 'origin'
+
+class ScopeKind(enum.Enum):
+    """What makes a scope; docs/names.md tells of each."""
+    MODULE = 'module'
+    CLASS = 'class'
+    FUNCTION = 'function'
+    LAMBDA = 'lambda'
+    LIST_COMPREHENSION = 'list comprehension'
+    SET_COMPREHENSION = 'set comprehension'
+    DICT_COMPREHENSION = 'dict comprehension'
+    GENERATOR = 'generator'
+    TYPE_PARAMETERS = 'type parameters'
+    TYPE_ALIAS = 'type alias'
+    TYPE_VARIABLE = 'type variable'
+    ANNOTATION = 'annotation'
+
+class Resolution(enum.Enum):
+    """
+    Where a name is bound: in a scope of the text, nowhere in it as a builtin, perhaps by `import *` or on a line with a fault, or nowhere that can be seen.
+    """
+    SCOPE = 'scope'
+    BUILTIN = 'builtin'
+    PERHAPS = 'perhaps'
+    UNKNOWN = 'unknown'
+
 class Range:
     """
     A piece of a text. Rows and columns count from 1, columns in characters; the end is after the last character.
@@ -221,6 +263,12 @@ class Line:
     @property
     def records(self) -> Records:
         """What it says of names; nothing when it has a problem."""
+
+    @property
+    def occurrences(self) -> Occurrences:
+        """
+        Every appearance of a name on it, in their order; nothing when it has a problem of its grammar.
+        """
 
     def __repr__(self) -> str:
         ...
@@ -476,6 +524,288 @@ class Limits(Sequence[Limit]):
     def __reduce__(self) -> tuple[Any, ...]:
         ...
 
+class Scope:
+    """
+    A module, class, function or other part of a text that has names of its own.
+    """
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
+    @property
+    def kind(self) -> ScopeKind:
+        """What makes it a scope."""
+
+    @property
+    def name(self) -> str:
+        """Of a class, a function or an alias; empty for others."""
+
+    @property
+    def parent(self) -> Scope | None:
+        """The scope around it; None for the module."""
+
+    @property
+    def range(self) -> Range:
+        """From its header or expression to the end of its last line."""
+
+    @property
+    def symbols(self) -> tuple[Symbol, ...]:
+        """Its names, in the order in which they come up."""
+
+    def __repr__(self) -> str:
+        ...
+
+class Symbol:
+    """
+    A name in a scope. It answers as the interpreter's module `symtable` does.
+    """
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    @property
+    def name(self) -> str:
+        """The name, as a class around it mangles it."""
+
+    @property
+    def scope(self) -> Scope:
+        """The scope."""
+
+    @property
+    def is_local(self) -> bool:
+        """The scope binds it."""
+
+    @property
+    def is_global(self) -> bool:
+        """It is a name of the module, or none known."""
+
+    @property
+    def is_free(self) -> bool:
+        """A function around the scope binds it."""
+
+    @property
+    def is_declared_global(self) -> bool:
+        """A `global` names it."""
+
+    @property
+    def is_nonlocal(self) -> bool:
+        """A `nonlocal` names it."""
+
+    @property
+    def is_referenced(self) -> bool:
+        """The scope reads it."""
+
+    @property
+    def is_assigned(self) -> bool:
+        """It gets a value, but by an import or a call."""
+
+    @property
+    def is_parameter(self) -> bool:
+        """It is a parameter."""
+
+    @property
+    def is_imported(self) -> bool:
+        """An import binds it."""
+
+    @property
+    def is_annotated(self) -> bool:
+        """It is annotated."""
+
+    @property
+    def is_type_parameter(self) -> bool:
+        """It is a type parameter."""
+
+    @property
+    def is_namespace(self) -> bool:
+        """A definition right in the scope binds it."""
+
+    def __repr__(self) -> str:
+        ...
+
+class Occurrence:
+    """One appearance of a name in a text."""
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
+    @property
+    def name(self) -> str:
+        """The name as written; `*` for what `import *` binds."""
+
+    @property
+    def role(self) -> Role:
+        """What the name does there."""
+
+    @property
+    def range(self) -> Range:
+        """Where it stands."""
+
+    @property
+    def line(self) -> Line:
+        """The line that it stands on."""
+
+    @property
+    def scope(self) -> Scope:
+        """The scope that it stands in."""
+
+    @property
+    def resolution(self) -> Resolution | None:
+        """
+        Where its name is bound; None for what belongs to no scope, such as an attribute.
+        """
+
+    @property
+    def home(self) -> Scope | None:
+        """
+        The scope that binds its name; None where none of the text is known to.
+        """
+
+    @property
+    def symbol(self) -> Symbol | None:
+        """Its name in its scope; None for what belongs to no scope."""
+
+    @property
+    def object(self) -> Range | None:
+        """Of an attribute, what it hangs on: `a` for the `b` of `a.b`."""
+
+    @property
+    def mangled(self) -> str:
+        """
+        The name as the class around mangles it: `_A__x` for `__x`, else the name itself.
+        """
+
+    @property
+    def is_definition(self) -> bool:
+        """It is the name of a `def` or a `class`."""
+
+    @property
+    def in_f_string(self) -> bool:
+        """It stands in a field of an f-string."""
+
+    @property
+    def in_quotes(self) -> bool:
+        """It stands in a hint in quotes."""
+
+    @property
+    def in_comment(self) -> bool:
+        """It stands in a hint in a comment."""
+
+    def __repr__(self) -> str:
+        ...
+
+class Occurrences(Sequence[Occurrence]):
+
+    def __len__(self) -> int:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: typing.SupportsIndex, /) -> Occurrence:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: slice, /) -> typing.Self:
+        ...
+
+    def __iter__(self) -> collections.abc.Iterator[Occurrence]:
+        ...
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def index(self, value: object, start: int=0, stop: int | None=None) -> int:
+        ...
+
+    def count(self, value: object) -> int:
+        ...
+
+    def __repr__(self) -> str:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
+class Scopes(Sequence[Scope]):
+
+    def __len__(self) -> int:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: typing.SupportsIndex, /) -> Scope:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: slice, /) -> typing.Self:
+        ...
+
+    def __iter__(self) -> collections.abc.Iterator[Scope]:
+        ...
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def index(self, value: object, start: int=0, stop: int | None=None) -> int:
+        ...
+
+    def count(self, value: object) -> int:
+        ...
+
+    def __repr__(self) -> str:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
 class Analysis:
     """What a text says. Each part is worked out when it is first asked for."""
 
@@ -523,6 +853,41 @@ class Analysis:
 
     def __deepcopy__(self, memo: object) -> Self:
         ...
+
+    @property
+    def occurrences(self) -> Occurrences:
+        """
+        Every appearance of a name, in the order of the text. What runs can't be known: names that are made by `exec`, `globals()` or `setattr` don't appear.
+        """
+
+    @property
+    def scopes(self) -> Scopes:
+        """The scopes, in the order in which they begin; the module is the first."""
+
+    def definitions(self, name: str) -> tuple[Occurrence, ...]:
+        """
+        Where the name gets a value, in any scope. Which of them is the one at run time isn't known.
+        """
+
+    def references(self, occurrence: Occurrence) -> tuple[Occurrence, ...]:
+        """
+        All occurrences of the name that its scope binds, this one included; nothing for an attribute, whose object isn't known. ValueError for one of another analysis.
+        """
+
+    def occurrence_at(self, row: int, column: int) -> Occurrence | None:
+        """
+        The occurrence at a place, or that ends there. Both count from 1, columns in characters; ValueError for less.
+        """
+
+    def unused(self, *, parameters: bool=False) -> tuple[Occurrence, ...]:
+        """
+        The first binding of each import and of each local name of a function that nothing in the text reads; with `parameters` theirs too. Names that begin with `_` aren't told, nor what `__all__` lists. What other modules read, and what a name is looked up by as text, isn't known.
+        """
+
+    def undefined(self) -> tuple[Occurrence, ...]:
+        """
+        What is read although nothing in the text binds it and no builtin has the name; nothing is told that `import *` or a line with a fault may bind. Whether a binding runs before isn't known.
+        """
 
 def DumpNames(text: str, version: int, has_print_function: bool=False, with_records: bool=True) -> list[tuple[int, int, int, list[tuple[bytes, bytes, bool, int, int]]]]:
     """

@@ -15,6 +15,8 @@ STEPS = [
     ["typing"],
     ["line"],
     ["rules"],
+    ["occurrences"],
+    ["scopes"],
     ["file"],
     ["host"],
     ["neighbours", "strutils", "_fastaccess", "symbolinfo"],

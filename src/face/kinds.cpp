@@ -11,7 +11,19 @@ namespace {
 
 // For each byte, the member that stands for it. They live as long as the process.
 using CMembers = std::array<nb::handle, 256>;
-CMembers gRecordKinds, gLineKinds, gLimitKinds;
+CMembers gRecordKinds, gLineKinds, gLimitKinds, gRoles, gScopeKinds, gResolutions;
+
+constexpr auto kRoleWords = std::to_array<std::string_view>({
+#define CODELOOM_ROLE_WORD(name, word, meaning) word,
+    CODELOOM_ROLES(CODELOOM_ROLE_WORD)
+#undef CODELOOM_ROLE_WORD
+});
+
+constexpr auto kScopeKindWords = std::to_array<std::string_view>({
+#define CODELOOM_SCOPE_KIND_WORD(name, word, meaning) word,
+    CODELOOM_SCOPE_KINDS(CODELOOM_SCOPE_KIND_WORD)
+#undef CODELOOM_SCOPE_KIND_WORD
+});
 
 std::array<const CRecordKind*, 256> gTableOfRecordKinds;
 
@@ -79,6 +91,43 @@ void BindKinds(nb::module_& module) {
     MakeEnum(module, "LimitKind", "Why a line has not all of its records.",
              {{ByteOf(ELimit::kTooManyVisits), "too many nodes"}, {ByteOf(ELimit::kTooDeep), "too deep"}},
              gLimitKinds);
+
+    std::vector<CMember> roles, scope_kinds;
+    for (size_t i = 0; i < kRoleWords.size(); ++i) roles.push_back({ByteOf(i), kRoleWords[i]});
+    for (size_t i = 0; i < kScopeKindWords.size(); ++i)
+        scope_kinds.push_back({ByteOf(i), kScopeKindWords[i]});
+    MakeEnum(module, "Role", "What a name does where it appears; docs/names.md tells of each.", roles,
+             gRoles);
+    MakeEnum(module, "ScopeKind", "What makes a scope; docs/names.md tells of each.", scope_kinds,
+             gScopeKinds);
+    MakeEnum(module, "Resolution",
+             "Where a name is bound: in a scope of the text, nowhere in it as a builtin, "
+             "perhaps by `import *` or on a line with a fault, or nowhere that can be seen.",
+             {{ByteOf(EResolution::kScope), "scope"},
+              {ByteOf(EResolution::kBuiltin), "builtin"},
+              {ByteOf(EResolution::kPerhaps), "perhaps"},
+              {ByteOf(EResolution::kUnknown), "unknown"}},
+             gResolutions);
+}
+
+nb::object RoleOf(ERole role) {
+    return Member(gRoles, ByteOf(role));
+}
+
+nb::object ScopeKindOf(EScopeKind kind) {
+    return Member(gScopeKinds, ByteOf(kind));
+}
+
+nb::object ResolutionOf(EResolution resolution) {
+    return resolution == EResolution::kNone ? nb::none() : Member(gResolutions, ByteOf(resolution));
+}
+
+std::string_view WordOfRole(ERole role) {
+    return kRoleWords[static_cast<size_t>(role)];
+}
+
+std::string_view WordOfScopeKind(EScopeKind kind) {
+    return kScopeKindWords[static_cast<size_t>(kind)];
 }
 
 nb::object RecordKindOf(char kind) {

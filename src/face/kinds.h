@@ -4,6 +4,7 @@
 #include <nanobind/nanobind.h>
 
 #include "file/file_analysis.h"
+#include "scopes/queries.h"
 
 namespace nb = nanobind;
 
@@ -16,6 +17,13 @@ void BindKinds(nb::module_& module);
 nb::object RecordKindOf(char kind);
 nb::object LineKindOf(ELogicalType type);
 nb::object LimitKindOf(ELimit limit);
+nb::object RoleOf(ERole role);
+nb::object ScopeKindOf(EScopeKind kind);
+nb::object ResolutionOf(EResolution resolution);
+
+// The word for a role and for a kind of scope.
+std::string_view WordOfRole(ERole role);
+std::string_view WordOfScopeKind(EScopeKind kind);
 
 // The form of a kind's payload, and the word for the kind.
 std::string_view PayloadFormOf(char kind);

@@ -15,11 +15,12 @@ CSourceFile::CSourceFile(nb::bytes utf8, nb::str path, nb::str python, const CFi
     if (_fUtf8.size() > kMaxTextSize) RaiseHost(PyExc_ValueError, "source is longer than 2 GB");
 }
 
-const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>& kept,
-                                            bool wants_records) const {
+const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
+                                            bool wants_names) const {
     if (kept) return *kept;
     CFileSettings settings = _fSettings;
     settings.wants_records = wants_records;
+    settings.wants_names = wants_names;
     // Made before the interpreter's lock is given up: a process forked meanwhile would wait for it forever.
     LanguageOf(settings.version);
     if (settings.version < 300) LanguageOf(settings.version, true);
@@ -42,10 +43,9 @@ nb::str CSourceFile::HostText() const {
     return nb::borrow<nb::str>(_fHostText);
 }
 
-nb::object CSourceFile::HostName(uint32_t number) const {
-    const CNameTable& names = WithRecords().records.names;
-    if (_fHostNames.empty()) _fHostNames.resize(names.Count());
-    nb::object& name = _fHostNames[number];
+nb::object CSourceFile::_Named(const CNameTable& names, std::vector<nb::object>& made, uint32_t number) {
+    if (made.empty()) made.resize(names.Count());
+    nb::object& name = made[number];
     if (!name.is_valid()) name = TextFromUtf8(names.Text(number));
     return name;
 }

@@ -38,17 +38,26 @@ class CSourceFile {
 
     // The pass over the text; other threads of the host run meanwhile.
     const CFileAnalysis& Analysis() const {
-        return _fWithRecords ? *_fWithRecords : _Analyzed(_fQuick, false);
+        if (_fWithRecords) return *_fWithRecords;
+        return _fWithNames ? *_fWithNames : _Analyzed(_fQuick, false);
     }
     const CFileAnalysis& WithRecords() const { return _Analyzed(_fWithRecords, true); }
+    const CTextNames& Names() const { return _Analyzed(_fWithNames, false, true).names; }
 
     const CRowIndex& Rows() const;
     nb::str HostText() const;
-    // A name of the records, by its number; the same object each time.
-    nb::object HostName(uint32_t number) const;
+    // A name of the records, and one of the occurrences, by its number; the same object each time.
+    nb::object HostName(uint32_t number) const {
+        return _Named(WithRecords().records.names, _fHostNames, number);
+    }
+    nb::object HostNameOfOccurrence(uint32_t number) const {
+        return _Named(Names().occurrences.names, _fHostNamesOfOccurrences, number);
+    }
 
   private:
-    const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records) const;
+    static nb::object _Named(const CNameTable& names, std::vector<nb::object>& made, uint32_t number);
+    const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
+                                   bool wants_names = false) const;
 
     nb::bytes _fUtf8;
     nb::str _fPath;
@@ -57,9 +66,12 @@ class CSourceFile {
     CUnreadable _fUnreadable;
     mutable std::unique_ptr<const CFileAnalysis> _fQuick;  // without records
     mutable std::unique_ptr<const CFileAnalysis> _fWithRecords;
+    mutable std::unique_ptr<const CFileAnalysis> _fWithNames;
     mutable std::unique_ptr<const CRowIndex> _fRows;
     mutable nb::object _fHostText;
-    mutable std::vector<nb::object> _fHostNames;  // by number, made when they are asked for
+    // By number, made when they are asked for.
+    mutable std::vector<nb::object> _fHostNames;
+    mutable std::vector<nb::object> _fHostNamesOfOccurrences;
 };
 
 using CSourceFilePtr = std::shared_ptr<const CSourceFile>;

@@ -1,6 +1,7 @@
 // file/: a text through the whole road in one pass.
 //   in     UTF-8 bytes, settings, and what of them was no text
-//   out    a CFileAnalysis: problems, lines, records and limits, each with the bytes of the text it is about
+//   out    a CFileAnalysis: problems, lines, records, names and limits, each with the bytes of the text it is
+//          about
 //   keeps  nothing
 //   start  at AnalyzeFile in file/file_analyzer.h
 #pragma once
@@ -12,6 +13,7 @@
 #include "line/line_analyzer.h"
 #include "names/records.h"
 #include "rules/problem.h"
+#include "scopes/text_names.h"
 #include "syntax/language.h"
 #include "tokenizer/logical_types.h"
 
@@ -21,6 +23,7 @@ struct CFileSettings {
     int version = CLanguage::kNewest;
     bool false_hints = false;  // take all that looks like a type hint for one
     bool wants_records = true;
+    bool wants_names = false;  // occurrences and scopes
 };
 
 // A logical line: from its first token to the end of its last one, a comment at its end included.
@@ -42,6 +45,7 @@ struct CFileAnalysis {
     std::vector<CLine> lines;
     CRecords records;  // empty unless the settings ask for them
     std::vector<CLineLimit> limits;
+    CTextNames names;  // empty unless the settings ask for them
 
     // The records of a line are those from FirstRecord(line_i) up to FirstRecord(line_i + 1).
     uint32_t FirstRecord(size_t line_i) const {

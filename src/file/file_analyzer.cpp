@@ -8,6 +8,7 @@
 #include "line/fault_words.h"
 #include "line/line_length.h"
 #include "rules/text_checker.h"
+#include "scopes/name_collector.h"
 #include "syntax/forms.h"
 #include "tokenizer/tokenizer.h"
 #include "typing/false_hints.h"
@@ -49,7 +50,7 @@ ECode CodeOf(const CFault& fault, const CRawLogical& logical) {
 }
 
 // One analysis of one text.
-class CFileAnalyzer {
+class CFileAnalyzer final : CTreeObserver {
   public:
     CFileAnalyzer(std::string_view text, const CFileSettings& settings, const CUnreadable& unreadable)
         : _fText(text),
@@ -59,12 +60,17 @@ class CFileAnalyzer {
           _fFalseHints(text),
           _fChecker(LanguageOf(settings.version), _fResult.problems) {
         _fAnalyzer.emplace(LanguageOf(settings.version));
+        if (settings.wants_names) _fNames.emplace(LanguageOf(settings.version), _fResult.names);
     }
 
     CFileAnalysis Run();
 
   private:
+    void Take(const CRawLogical& part, const CTree& tree) override;
+    void TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) override;
     void _AnalyzeLine(const CRawLogical& logical);
+    void _Enter(const CRawLogical& logical);
+    void _Leave(const CRawLogical& logical, bool has_fault);
     CLineResult _Analyze(const CRawLogical& logical, const CLine& line);
     void _AddUnreadable();
     void _AddFault(const CRawLogical& logical, const CFault& fault);
@@ -79,6 +85,7 @@ class CFileAnalyzer {
     std::optional<CLineAnalyzer> _fAnalyzer;
     CFileAnalysis _fResult;
     CTextChecker _fChecker;
+    std::optional<CNameCollector> _fNames;
 };
 
 CFileAnalysis CFileAnalyzer::Run() {
@@ -86,10 +93,32 @@ CFileAnalysis CFileAnalyzer::Run() {
     CRawLogical logical;
     while (tokenizer.NextLogical(logical)) _AnalyzeLine(logical);
     _fChecker.Finish();
+    if (_fNames) _fNames->Finish();
     _AddUnreadable();
     std::stable_sort(_fResult.problems.begin(), _fResult.problems.end(),
                      [](const CProblem& one, const CProblem& other) { return one.start < other.start; });
     return std::move(_fResult);
+}
+
+// What the rules see, those see who look for names.
+
+void CFileAnalyzer::Take(const CRawLogical& part, const CTree& tree) {
+    _fChecker.Take(part, tree);
+    if (_fNames) _fNames->Take(part, tree);
+}
+
+void CFileAnalyzer::TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) {
+    if (_fNames) _fNames->TakeHint(tree, node, shift);
+}
+
+void CFileAnalyzer::_Enter(const CRawLogical& logical) {
+    _fChecker.Enter(logical);
+    if (_fNames) _fNames->BeginLine(logical, _fChecker.Blocks());
+}
+
+void CFileAnalyzer::_Leave(const CRawLogical& logical, bool has_fault) {
+    _fChecker.Leave(logical, has_fault);
+    if (_fNames) _fNames->EndLine(logical, has_fault, _fChecker.Blocks());
 }
 
 void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
@@ -102,15 +131,15 @@ void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
     if (_fSettings.version < 300 && ImportsPrintFunction(logical))
         _fAnalyzer.emplace(LanguageOf(_fSettings.version, true));
 
-    _fChecker.Enter(logical);
+    _Enter(logical);
     if (const ETooLong too_long = _fLength.Take(logical); too_long != ETooLong::kNot) [[unlikely]] {
-        _fChecker.Leave(logical, true);
+        _Leave(logical, true);
         const CRawToken& first = logical.tokens.front();
         return _AddProblem(ECode::kLineTooLong, logical.StartOf(first), logical.EndOf(first),
                            CLengthLimits::Message(too_long, logical));
     }
     const CLineResult result = _Analyze(logical, line);
-    _fChecker.Leave(logical, static_cast<bool>(result.fault));
+    _Leave(logical, static_cast<bool>(result.fault));
     if (result.fault) {
         if (!_IsUnreadable(line)) _AddFault(logical, result.fault);
         return;
@@ -130,7 +159,7 @@ CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical, const CLine& lin
                                          .first_in_def = logical.first_in_def,
                                          .records = records,
                                          .false_hints = _fSettings.false_hints ? nullptr : &_fFalseHints,
-                                         .observer = &_fChecker});
+                                         .observer = this});
 }
 
 void CFileAnalyzer::_AddFault(const CRawLogical& logical, const CFault& fault) {

@@ -3,9 +3,9 @@
 #include <algorithm>
 #include <vector>
 
-#include "line/tree_observer.h"
 #include "names/name_walker.h"
 #include "syntax/line_parser.h"
+#include "syntax/tree_observer.h"
 #include "syntax/tree_size.h"
 #include "typing/hint_walker.h"
 
@@ -117,7 +117,7 @@ bool CLineAnalyzer::CImpl::_Take(const CHintResult& hints) {
 }
 
 CHintContext CLineAnalyzer::CImpl::_HintContext() const {
-    return {_fRequest.records, _fStart.records, _fRequest.false_hints};
+    return {_fRequest.records, _fStart.records, _fRequest.false_hints, _fRequest.observer};
 }
 
 CLineAnalyzer::CImpl::CMark CLineAnalyzer::CImpl::_Mark() const {

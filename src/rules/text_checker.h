@@ -1,12 +1,12 @@
 // The rules for one text: what is around its lines, and what may stand where.
 #pragma once
 
-#include "line/tree_observer.h"
 #include "rules/blocks.h"
 #include "rules/line_rules.h"
 #include "rules/placement.h"
 #include "rules/problem.h"
 #include "syntax/language.h"
+#include "syntax/tree_observer.h"
 #include "tokenizer/raw_logical.h"
 
 namespace codeloom {
@@ -27,6 +27,8 @@ class CTextChecker final : public CTreeObserver {
 
     // Call once, after the last line.
     void Finish();
+
+    const CBlockTracker& Blocks() const { return _fBlocks; }
 
   private:
     CLineSetting _Setting(const CTree& tree) const;

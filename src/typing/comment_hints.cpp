@@ -171,6 +171,8 @@ void CHintWalker::_GiveUp() {
 
 // The names that a hint in a comment uses are read by the line that it stands on.
 void CHintWalker::_WalkNames(const CHint& hint) {
+    if (_fContext.observer != nullptr)
+        _fContext.observer->TakeHint(*hint.tree.tree, *hint.node, hint.tree.shift);
     CRecords* const records = _fContext.records;
     const size_t first = records != nullptr ? records->records.size() : 0;
     const CWalkResult walked = _fNames.Walk(*hint.tree.tree, *hint.node, records);

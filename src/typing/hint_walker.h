@@ -17,6 +17,7 @@
 #include <vector>
 
 #include "names/name_walker.h"
+#include "syntax/tree_observer.h"
 #include "syntax/tree_size.h"
 #include "typing/false_hints.h"
 #include "typing/hint_parser.h"
@@ -28,6 +29,7 @@ struct CHintContext {
     CRecords* records = nullptr;         // null when only the fault is wanted
     size_t first_record = 0;             // of the line
     CFalseHints* false_hints = nullptr;  // at this line; null when all that looks like a hint is one
+    CTreeObserver* observer = nullptr;   // null when nobody wants to see the trees of hints in comments
 };
 
 struct CHintResult {

@@ -15,6 +15,10 @@ class CTreeObserver {
     // The tree is good during the call.
     virtual void Take(const CRawLogical& part, const CTree& tree) = 0;
 
+    // A part of a tree that a hint in a comment of the line was made into. `shift` leads from its places to
+    // those in the file, as unsigned numbers wrap.
+    virtual void TakeHint(const CTree& /*tree*/, const CTreeNode& /*node*/, uint32_t /*shift*/) {}
+
   protected:
     ~CTreeObserver() = default;
 };

@@ -1,0 +1,37 @@
+// The names of a text, line by line, as the pass over it goes on.
+#pragma once
+
+#include "occurrences/occurrence_finder.h"
+#include "rules/blocks.h"
+#include "scopes/block_scopes.h"
+#include "scopes/text_names.h"
+
+namespace codeloom {
+
+class CNameCollector {
+  public:
+    CNameCollector(const CLanguage& language, CTextNames& names)
+        : _fNames(names), _fFinder(language, names.occurrences) {}
+
+    // Call for every line, in order. The blocks around a comment are those of the line before.
+    void BeginLine(const CRawLogical& line, const CBlockTracker& blocks);
+    void Take(const CRawLogical& part, const CTree& tree) { _fFinder.Take(part, tree); }
+    void TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) {
+        _fFinder.TakeHint(tree, node, shift);
+    }
+    void EndLine(const CRawLogical& line, bool has_fault, const CBlockTracker& blocks);
+
+    // Call once, after the last line.
+    void Finish();
+
+  private:
+    void _NoteLostLine(const CRawLogical& line);
+    uint32_t _AddLostScope(const CRawLogical& line, const CStatementHead& head);
+
+    CTextNames& _fNames;
+    COccurrenceFinder _fFinder;
+    CBlockScopes _fBlocks;
+    std::vector<uint32_t> _fLostLines;  // by number
+};
+
+}  // namespace codeloom

@@ -1,0 +1,315 @@
+"""The occurrences and scopes of whole files against the interpreter's own `ast`, `tokenize` and `symtable`.
+
+    python tests/names_against_interpreter.py FOLDER ...
+
+prints each kind of disagreement with its count and first examples. No kind is expected but those in
+`KNOWN`, each with its reason.
+"""
+
+import ast
+import io
+import keyword
+import symtable
+import sys
+import tokenize
+import unicodedata
+import warnings
+from collections import Counter, defaultdict
+from pathlib import Path
+
+from codeloom import Role, ScopeKind, analyze
+
+KNOWN: dict[str, str] = {}
+
+CONTEXT_ROLES = {ast.Load: Role.READ, ast.Store: Role.BIND, ast.Del: Role.DELETE}
+ATTRIBUTE_ROLES = {
+    ast.Load: Role.ATTRIBUTE,
+    ast.Store: Role.ATTRIBUTE_BIND,
+    ast.Del: Role.ATTRIBUTE_DELETE,
+}
+AUGMENTED = {Role.BIND: Role.AUGMENT, Role.ATTRIBUTE_BIND: Role.ATTRIBUTE_AUGMENT}
+# Roles of what a tree names without a place: whatever isn't a name, an attribute, a parameter or a keyword.
+
+
+class Expected(ast.NodeVisitor):
+    """What a tree says: (role, name) of each, and for most the place of its first character."""
+
+    def __init__(self, rows):
+        self.rows = rows
+        self.facts = []
+        self.in_f_string = False
+        self.augmented = None
+
+    def add(self, role, name, row=None, byte=None):
+        place = None
+        if row is not None and not self.in_f_string:
+            place = (row, len(self.rows[row - 1].encode()[:byte].decode()) + 1)
+        self.facts.append((role, name, place))
+
+    def add_last(self, role, name, node, written=None):
+        """A name that ends where its node does."""
+        if node.end_lineno is not None and self.rows[node.end_lineno - 1].isascii():
+            self.add(role, name, node.end_lineno, node.end_col_offset - len(written or name))
+        else:
+            self.add(role, name)
+
+    def visit_JoinedStr(self, node):
+        outer, self.in_f_string = self.in_f_string, True
+        self.generic_visit(node)
+        self.in_f_string = outer
+
+    def visit_Name(self, node):
+        role = CONTEXT_ROLES[type(node.ctx)]
+        self.add(AUGMENTED[role] if node is self.augmented else role, node.id, node.lineno, node.col_offset)
+
+    def visit_Attribute(self, node):
+        role = ATTRIBUTE_ROLES[type(node.ctx)]
+        self.add_last(AUGMENTED[role] if node is self.augmented else role, node.attr, node)
+        self.generic_visit(node)
+
+    def visit_AugAssign(self, node):
+        self.augmented = node.target
+        self.generic_visit(node)
+
+    def visit_arg(self, node):
+        self.add(Role.PARAMETER, node.arg, node.lineno, node.col_offset)
+        self.generic_visit(node)
+
+    def visit_keyword(self, node):
+        if node.arg is not None:
+            self.add(Role.KEYWORD, node.arg, node.lineno, node.col_offset)
+        self.generic_visit(node)
+
+    def visit_FunctionDef(self, node):
+        self.add(Role.BIND, node.name)
+        self.generic_visit(node)
+
+    visit_AsyncFunctionDef = visit_ClassDef = visit_FunctionDef
+
+    def visit_Import(self, node):
+        for alias in node.names:
+            first, *others = alias.name.split(".")
+            self.add(Role.ORIGIN if alias.asname else Role.IMPORT, first, alias.lineno, alias.col_offset)
+            for other in others:
+                self.add(Role.ORIGIN, other)
+            self.add_bound(alias)
+
+    def visit_ImportFrom(self, node):
+        for part in node.module.split(".") if node.module else []:
+            self.add(Role.ORIGIN, part)
+        for alias in node.names:
+            role = Role.ORIGIN if alias.asname else Role.IMPORT
+            self.add(role, alias.name, alias.lineno, alias.col_offset)
+            self.add_bound(alias)
+
+    def add_bound(self, alias):
+        if alias.asname:
+            self.add_last(Role.IMPORT, alias.asname, alias)
+
+    def visit_Global(self, node):
+        for name in node.names:
+            self.add(Role.GLOBAL, name)
+
+    def visit_Nonlocal(self, node):
+        for name in node.names:
+            self.add(Role.NONLOCAL, name)
+
+    def visit_ExceptHandler(self, node):
+        if node.name:
+            self.add(Role.BIND, node.name)
+        self.generic_visit(node)
+
+    def visit_MatchAs(self, node):
+        if node.name:
+            self.add_last(Role.BIND, node.name, node)
+        self.generic_visit(node)
+
+    visit_MatchStar = visit_MatchAs
+
+    def visit_MatchMapping(self, node):
+        if node.rest:
+            self.add(Role.BIND, node.rest)
+        self.generic_visit(node)
+
+    def visit_MatchClass(self, node):
+        for name in node.kwd_attrs:
+            self.add(Role.KEYWORD, name)
+        self.generic_visit(node)
+
+
+def normal(name):
+    return name if name.isascii() else unicodedata.normalize("NFKC", name)
+
+
+def occurrence_disagreements(text, analysis):
+    """(kind, what) for each disagreement with `ast` and `tokenize`."""
+    rows = io.StringIO(text).read().split("\n")
+    expected = Expected(rows)
+    expected.visit(ast.parse(text))
+    ours, by_place = Counter(), {}
+    for occurrence in analysis.occurrences:
+        if occurrence.in_quotes or occurrence.in_comment:
+            continue
+        place = (occurrence.range.row, occurrence.range.column)
+        name = normal(occurrence.name)
+        shown = rows[place[0] - 1][place[1] - 1 : occurrence.range.end_column - 1]
+        if shown != occurrence.name:
+            yield "wrong range", f"{place} {occurrence.name} is {shown!r}"
+        if place in by_place:
+            yield "two at one place", f"{place} {name}"
+        by_place[place] = (occurrence.role, name)
+        ours[occurrence.role, name] += 1
+    theirs = Counter((role, name) for role, name, _ in expected.facts)
+    for role, name in theirs - ours:
+        yield f"missing {role.name}", name
+    for role, name in ours - theirs:
+        yield f"unexpected {role.name}", name
+    for role, name, place in expected.facts:
+        if place is not None and by_place.get(place, (None, None)) != (role, name):
+            yield f"misplaced {role.name}", f"{place} {name}: {by_place.get(place)}"
+    yield from token_disagreements(text, by_place)
+
+
+def token_disagreements(text, by_place):
+    """Each name among the tokens has an occurrence. Soft keywords may be none."""
+    for token in tokenize.generate_tokens(io.StringIO(text).readline):
+        is_name = token.type == tokenize.NAME and token.string not in {*keyword.kwlist, *keyword.softkwlist}
+        if is_name and (place := (token.start[0], token.start[1] + 1)) not in by_place:
+            yield "name without an occurrence", f"{place} {token.string}"
+
+
+# Scopes
+
+# What `symtable` calls its tables of comprehensions and lambdas, and the kind that each stands for.
+SCOPE_KINDS = {
+    "listcomp": ScopeKind.LIST_COMPREHENSION,
+    "setcomp": ScopeKind.SET_COMPREHENSION,
+    "dictcomp": ScopeKind.DICT_COMPREHENSION,
+    "genexpr": ScopeKind.GENERATOR,
+    "lambda": ScopeKind.LAMBDA,
+}
+FLAGS = (
+    "is_local",
+    "is_global",
+    "is_free",
+    "is_declared_global",
+    "is_nonlocal",
+    "is_referenced",
+    "is_assigned",
+    "is_parameter",
+    "is_imported",
+    "is_annotated",
+    "is_namespace",
+)
+
+
+def their_scopes(table):
+    """(kind, name, row, symbols, scopes within) of a table, in a form that compares."""
+    name, kind = table.get_name(), ScopeKind[table.get_type().upper()]
+    if kind is ScopeKind.FUNCTION and name in SCOPE_KINDS and is_nameless(table):
+        kind, name = SCOPE_KINDS[name], ""
+    if kind is ScopeKind.MODULE:
+        name = ""
+    row = table.get_lineno() if name else 0
+    symbols = {
+        symbol.get_name(): frozenset(flag for flag in FLAGS if getattr(symbol, flag)())
+        for symbol in table.get_symbols()
+        if symbol.get_name() not in IMPLICIT
+    }
+    return kind, name, row, symbols, ordered(map(their_scopes, table.get_children()))
+
+
+# Parameters that the interpreter makes up.
+IMPLICIT = {".0"}
+
+
+def is_nameless(table):
+    """True for a comprehension or a lambda, not for a function that is called so."""
+    return table.get_name() == "lambda" or ".0" in table.get_identifiers()
+
+
+def ordered(scopes):
+    return sorted(
+        scopes, key=lambda scope: (scope[0].value, scope[1], scope[2], sorted(scope[3]), repr(scope[4]))
+    )
+
+
+def our_scopes(analysis):
+    within = defaultdict(list)
+    for scope in analysis.scopes:
+        if scope.kind is not ScopeKind.ANNOTATION:
+            within[scope.parent].append(scope)
+
+    def shown(scope):
+        symbols = {
+            normal(symbol.name): frozenset(flag for flag in FLAGS if getattr(symbol, flag))
+            for symbol in scope.symbols
+        }
+        row = scope.range.row if scope.name else 0
+        return scope.kind, normal(scope.name), row, symbols, ordered(map(shown, within[scope]))
+
+    (module,) = within[None]
+    return shown(module)
+
+
+def differences(ours, theirs, where):
+    if ours[:2] != theirs[:2] or len(ours[4]) != len(theirs[4]):
+        yield "scopes differ", f"{where}: {[s[:3] for s in ours[4]]} {[s[:3] for s in theirs[4]]}"
+        return
+    if ours[2] != theirs[2]:
+        yield "row of a scope differs", f"{where}: {ours[2]} {theirs[2]}"
+    for name in {*ours[3], *theirs[3]}:
+        mine, flags = ours[3].get(name), theirs[3].get(name)
+        if mine is None or flags is None:
+            yield f"symbol {'missing' if mine is None else 'unexpected'}", f"{where}.{name} {flags or mine}"
+            continue
+        for flag in mine ^ flags:
+            if flag == "is_namespace" and name.startswith("_") and "__" in name[1:]:
+                continue  # the interpreter looks for the scope by the mangled name and finds none
+            yield f"{flag} is {flag in mine}", f"{where}.{name}"
+    for mine, other in zip(ours[4], theirs[4], strict=True):
+        yield from differences(mine, other, f"{where}.{mine[1] or mine[0].value}")
+
+
+def texts_of(folders):
+    for folder in folders:
+        for path in sorted(Path(folder).rglob("*.py")):
+            try:
+                with tokenize.open(path) as file:
+                    text = file.read()
+                symtable.symtable(text, str(path), "exec")
+            except (SyntaxError, ValueError, UnicodeDecodeError, RecursionError):
+                continue
+            yield path, text
+
+
+def disagreements_of(text):
+    """(kind, what) for each disagreement over a text; none for one that the interpreter refuses."""
+    try:
+        table = symtable.symtable(text, "<string>", "exec")
+    except SyntaxError:
+        return
+    analysis = analyze(text, python="3.11")
+    yield from occurrence_disagreements(text, analysis)
+    yield from differences(our_scopes(analysis), their_scopes(table), "module")
+
+
+def main(folders):
+    warnings.simplefilter("ignore")
+    sys.setrecursionlimit(20_000)
+    found, counts = defaultdict(list), Counter()
+    for path, text in texts_of(folders):
+        for kind, what in disagreements_of(text):
+            found[kind].append((path, what))
+        analysis = analyze(text, python="3.11")
+        counts["files"] += 1
+        counts["occurrences"] += len(analysis.occurrences)
+        counts["scopes"] += len(analysis.scopes)
+        counts["symbols"] += sum(len(scope.symbols) for scope in analysis.scopes)
+    print(*(f"{count:,} {what}" for what, count in counts.items()), sep=", ")
+    for kind, examples in sorted(found.items(), key=lambda item: -len(item[1])):
+        print(f"{kind}: {len(examples)}", *(f"    {path}: {what}" for path, what in examples[:5]), sep="\n")
+
+
+if __name__ == "__main__":
+    main(sys.argv[1:])

@@ -1,0 +1,152 @@
+"""Every appearance of a name: its role, its place, its scope, and where it is bound."""
+
+import random
+import warnings
+from collections import Counter
+from pathlib import Path
+
+import pytest
+from golden import Cases, Check
+from names_against_interpreter import KNOWN, disagreements_of
+from test_library import LibraryTexts
+
+from codeloom import Role, analyze
+
+FOLDER = Path(__file__).parent / "occurrences"
+
+# One character a role, drawn under each name.
+MARKS = {
+    Role.READ: "r",
+    Role.BIND: "b",
+    Role.AUGMENT: "u",
+    Role.DELETE: "d",
+    Role.IMPORT: "i",
+    Role.PARAMETER: "p",
+    Role.TYPE_PARAMETER: "t",
+    Role.GLOBAL: "g",
+    Role.NONLOCAL: "n",
+    Role.ATTRIBUTE: ".",
+    Role.ATTRIBUTE_BIND: "B",
+    Role.ATTRIBUTE_AUGMENT: "U",
+    Role.ATTRIBUTE_DELETE: "D",
+    Role.KEYWORD: "k",
+    Role.ORIGIN: "o",
+}
+
+
+def VersionOf(case):
+    """The first word of a title may be a version."""
+    first = case.title.split()[0]
+    return first if first[0].isdecimal() else "3.12"
+
+
+@pytest.mark.parametrize("case", Cases(FOLDER, ".roles"))
+def test_roles(case, rewrite):
+    analysis = analyze(case.source, python=VersionOf(case))
+    rows = case.source.split("\n")
+    marks = [[" "] * (len(row) + 1) for row in rows]
+    for occurrence in analysis.occurrences:
+        place = occurrence.range
+        for column in range(place.column - 1, place.end_column - 1):
+            assert marks[place.row - 1][column] == " "
+            marks[place.row - 1][column] = MARKS[occurrence.role]
+    drawn = ["---"]
+    for row, mark in zip(rows, marks, strict=True):
+        drawn.append(row)
+        if "".join(mark).strip():
+            drawn.append("".join(mark).rstrip())
+    Check(case, "\n".join(drawn), rewrite)
+
+
+FLAGS = (
+    "local",
+    "global",
+    "free",
+    "declared_global",
+    "nonlocal",
+    "referenced",
+    "assigned",
+    "parameter",
+    "imported",
+    "annotated",
+    "type_parameter",
+    "namespace",
+)
+
+
+def TitleOf(scope):
+    return f"{scope.kind.value} {scope.name}".rstrip()
+
+
+@pytest.mark.parametrize("case", Cases(FOLDER, ".scopes"))
+def test_scopes(case, rewrite):
+    analysis = analyze(case.source, python=VersionOf(case))
+    rows = ["---"]
+    depths = {}
+    for scope in analysis.scopes:
+        depths[scope] = depth = depths[scope.parent] + 1 if scope.parent else 0
+        indent = "    " * depth
+        rows.append(f"{indent}{TitleOf(scope)} {scope.range.row}-{scope.range.end_row}")
+        for symbol in scope.symbols:
+            flags = [flag.replace("_", " ") for flag in FLAGS if getattr(symbol, f"is_{flag}")]
+            rows.append(f"{indent}  {symbol.name:<8} {', '.join(flags)}".rstrip())
+    rows.append("")
+    for occurrence in analysis.occurrences:
+        if occurrence.resolution is not None:
+            home = TitleOf(occurrence.home) if occurrence.home else occurrence.resolution.value
+            place = f"{occurrence.range.row}:{occurrence.range.column}"
+            rows.append(f"{place:<6} {occurrence.mangled:<8} {home}")
+    Check(case, "\n".join(rows), rewrite)
+
+
+@pytest.mark.parametrize("count", [30, pytest.param(None, marks=pytest.mark.slow)])
+def test_against_the_interpreter(count, seed):
+    found = []
+    for path, text, _ in LibraryTexts(count, seed):
+        with warnings.catch_warnings():
+            warnings.simplefilter("ignore")
+            found += [(path, kind, what) for kind, what in disagreements_of(text) if kind not in KNOWN]
+    assert not found, found[:20]
+
+
+# A broken line is a gap: all others say what they said.
+
+
+def Broken(text, random_source):
+    """The text with one in twenty of its lines of a single row broken, and the numbers of these rows."""
+    lines = analyze(text, python="3.11").lines
+    count = Counter(line.range.row for line in lines)
+    single = [line.range for line in lines if line.range.row == line.range.end_row]
+    single = [place for place in single if count[place.row] == 1]
+    rows = text.split("\n")
+    broken = random_source.sample(single, len(single) // 20)
+    for place in broken:
+        row = rows[place.row - 1]
+        indent = row[: place.column - 1]
+        damages = (" = = ", " )", ":(")
+        rows[place.row - 1] = (
+            f"{indent}{row[place.column - 1 :].split('#')[0]}{random_source.choice(damages)}"
+        )
+    return "\n".join(rows), {place.row for place in broken}
+
+
+def ByPlace(text, left_out):
+    """For each occurrence what it is, and where it is bound."""
+    found = {}
+    for occurrence in analyze(text, python="3.11").occurrences:
+        place, home = occurrence.range, occurrence.home
+        if place.row not in left_out:
+            key = (place.row, place.column, place.end_column, occurrence.name, occurrence.role)
+            found[key] = (home.kind, home.name, home.range.row) if home else occurrence.resolution
+    return found
+
+
+def test_broken_lines_leave_the_others_alone(seed):
+    count = same = 0
+    for path, text, _ in LibraryTexts(20, seed):
+        broken_text, broken = Broken(text, random.Random(f"{seed} {path.name}"))
+        sound, spoilt = ByPlace(text, broken), ByPlace(broken_text, broken)
+        assert sound.keys() == spoilt.keys(), path
+        count += len(sound)
+        same += sum(spoilt[key] == home for key, home in sound.items())
+    assert same > 0.97 * count
