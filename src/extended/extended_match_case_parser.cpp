@@ -131,7 +131,7 @@ bool CExtendedMatchCaseParser::_IsEmptySequence(const CPatternStep& step) const 
 //   a CSequencePatternNode: the patterns with the commas, without brackets
 void CExtendedMatchCaseParser::_PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
     _PlanPatterns(plan, start_i, end_i);
-    plan.Build<CSequencePatternNode>();
+    plan.Build(&NewPseudoNode<CSequencePatternNode>);
 }
 
 //   case "a" "b":
@@ -142,7 +142,7 @@ void CExtendedMatchCaseParser::_PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py
         if (_TokType(i) != kTokenId_STRING) _FailAt(i);
         plan.Token(i);
     }
-    plan.Build<CAtom>();
+    plan.Build(&NewPseudoNode<CAtom>);
 }
 
 // Where a token stands among those of the line, comments and backslashes included.

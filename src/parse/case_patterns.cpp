@@ -107,7 +107,7 @@ void CMatchCaseStatementParser::_PlanCapture(CPlan& plan, Py_ssize_t start_i, Py
     if (_TokType(end_i - 1) != kTokenId_NAME) plan.Fail(end_i - 1);
     plan.Token(end_i - 2);
     plan.Token(end_i - 1);
-    plan.Build<CPatternNode>();
+    plan.Build(&NewPseudoNode<CPatternNode>);
 }
 
 //   case a | b | c:
@@ -120,7 +120,7 @@ void CMatchCaseStatementParser::_PlanAlternatives(CPlan& plan, Py_ssize_t start_
         if (bar_i != end_i) plan.Token(bar_i);
         i = bar_i + 1;
     }
-    plan.Build<CPatternNode>();
+    plan.Build(&NewPseudoNode<CPatternNode>);
 }
 
 //   case (a | b):
@@ -131,7 +131,7 @@ void CMatchCaseStatementParser::_PlanGroup(CPlan& plan, Py_ssize_t start_i, Py_s
     if (!_IsTok(end_i - 1, ")")) plan.Fail(end_i - 1);
     plan.TokenBefore(start_i);
     plan.Token(end_i - 1);
-    plan.Build<CPatternNode>();
+    plan.Build(&NewPseudoNode<CPatternNode>);
 }
 
 //   case x:   case _:   case None:   case 1:   case "a":
@@ -153,7 +153,7 @@ void CMatchCaseStatementParser::_PlanStar(CPlan& plan, Py_ssize_t start_i, Py_ss
     if (!is_named || name_i + 1 != end_i) _FailAt(start_i);
     plan.Token(start_i);
     plan.Token(name_i);
-    plan.Build<CPatternNode>();
+    plan.Build(&NewPseudoNode<CPatternNode>);
 }
 
 //   case -1 + 2j:
@@ -174,7 +174,7 @@ void CMatchCaseStatementParser::_PlanNumberPattern(CPlan&& plan, Py_ssize_t star
         if (!take_number()) return;
     }
     if (i != end_i) return plan.Fail(i);
-    plan.Build<CPatternNode>();
+    plan.Build(&NewPseudoNode<CPatternNode>);
 }
 
 //   case a.b.c:
@@ -188,7 +188,7 @@ void CMatchCaseStatementParser::_PlanDottedNameValue(CPlan&& plan, Py_ssize_t st
         dot_is_due = !dot_is_due;
     }
     if (!dot_is_due) return plan.Fail(end_i - 1);
-    plan.Build<CExpression>();
+    plan.Build(&NewPseudoNode<CExpression>);
 }
 
 //   case [a, b]:   case (a, b):
@@ -202,7 +202,7 @@ void CMatchCaseStatementParser::_PlanSequencePattern(CPlan&& plan, Py_ssize_t st
     if (_IsTok(start_i, "[") && !_IsTok(close_i, "]")) plan.Fail(close_i);
     if (_IsTok(start_i, "(") && !_IsTok(close_i, ")")) plan.Fail(close_i);
     plan.Token(close_i);
-    plan.Build<CSequencePatternNode>();
+    plan.Build(&NewPseudoNode<CSequencePatternNode>);
 }
 
 void CMatchCaseStatementParser::_PlanPatterns(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
@@ -234,7 +234,7 @@ void CMatchCaseStatementParser::_PlanMappingPattern(CPlan&& plan, Py_ssize_t sta
     }
     if (!_IsTok(close_i, "}")) plan.Fail(close_i);
     plan.Token(close_i);
-    plan.Build<CSequencePatternNode>();
+    plan.Build(&NewPseudoNode<CSequencePatternNode>);
 }
 
 //   case Point(0, y=0):
@@ -253,7 +253,7 @@ void CMatchCaseStatementParser::_PlanClassPattern(CPlan&& plan, Py_ssize_t start
         i = part_end + 1;
     }
     if (!_IsTok(end_i - 1, ")")) plan.Fail(end_i - 1);
-    plan.Build<CClassPatternNode>();
+    plan.Build(&NewPseudoNode<CClassPatternNode>);
 }
 
 //   case Point(0, y=0):
@@ -266,7 +266,7 @@ void CMatchCaseStatementParser::_PlanClassArgument(CPlan&& plan, Py_ssize_t star
     plan.Token(start_i);
     plan.Token(eq_i);
     plan.Pattern(eq_i + 1, end_i);
-    plan.Build<CClassArgumentPatternNode>();
+    plan.Build(&NewPseudoNode<CClassArgumentPatternNode>);
 }
 
 }  // namespace codeloom

@@ -32,6 +32,8 @@ void CMatchCaseParser::_DoStep(const CCasePatternStep& step) {
         case EKind::kToken:
             if (_Token(start_i).word != EWord::kAs) _RefuseKeyword(start_i);
             return _fWork.AddNode(_Leaf(start_i));
+        case EKind::kTokenBefore:
+            return _fWork.AddNodeBeforeLast(_Leaf(start_i));
         case EKind::kFail:
             _FailAt(start_i);
         case EKind::kBuild:
