@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "syntax/span_parser.h"
+#include "syntax/tree_check.h"
 
 namespace codeloom {
 
@@ -22,6 +23,7 @@ CFault RefusedAt(const CRawLogical& logical, const CRefusal& refusal) {
 void Finish(const CParsed& node, CTree& tree) {
     tree.fIsEmpty = !static_cast<bool>(node);
     if (node) tree.fRoot = *node;
+    CheckTree(tree);
 }
 
 }  // namespace

@@ -1,5 +1,7 @@
 #include "tree/node.h"
 
+#include <cassert>
+
 #include "host/errors.h"
 
 namespace codeloom {
@@ -14,6 +16,7 @@ void CNodeClassInfo::Init(nb::object cls, int nodetype, nb::object name) {
 CNodeRef CNodeClassInfo::TakeFree() {
     CNodeRef node = std::move(fFirstFree);
     if (!node) return node;
+    assert(node->fIsFree && node->fText.is_none() && node->fChildren.IsNone());
     fFirstFree = node->fNextFree;
     node->fIsFree = false;
     return node;

@@ -1,6 +1,7 @@
 #include "tree/recycling.h"
 
 #include <algorithm>
+#include <cassert>
 #include <utility>
 #include <vector>
 
@@ -16,6 +17,26 @@ CNodeRef NodeToRecycle(nb::handle node) {
     if (node.is_none()) throw nb::attribute_error("'NoneType' object has no attribute 'fClsInfo'");
     return CNodeRef(Instance<CNode>(node));
 }
+
+#ifndef NDEBUG
+
+// A free list holds free nodes only, each once. Of a long one the start counts.
+void CheckFreeList(const CNodeClassInfo& record) {
+    constexpr size_t kMostLooked = 64;
+    std::vector<const CNode*> seen;
+    for (const CNode* node = record.fFirstFree.get(); node != nullptr && seen.size() < kMostLooked;
+         node = node->fNextFree.get()) {
+        assert(node->fIsFree);
+        assert(std::find(seen.begin(), seen.end(), node) == seen.end());
+        seen.push_back(node);
+    }
+}
+
+#else
+
+void CheckFreeList(const CNodeClassInfo&) {}
+
+#endif
 
 // Takes a tree apart. Whatever is dropped may run host code, and that may ask for nodes, or give this tree
 // back once more: so a node goes on its free list when nothing is left of it, and what it held is dropped
@@ -57,7 +78,9 @@ class CRecycling {
         const nb::object list = _TakeChildren(node, part.depth + 1);
         const nb::object text = std::exchange(node.fText, nb::none());
         const nb::object context = std::exchange(node.fContext, nb::none());
-        if (node.fClsInfo) node.fClsInfo->PutBack(std::move(part.node));
+        if (!node.fClsInfo) return;
+        node.fClsInfo->PutBack(std::move(part.node));
+        CheckFreeList(*node.fClsInfo);
     }
 
     // The first child comes next. A child of the host's that is no node leaves the node as it is.
