@@ -20,11 +20,11 @@ $(BIN)/python:
 	$(BIN)/pip install --quiet --upgrade pip
 
 $(VENV)/.tools: pyproject.toml | $(BIN)/python
-	$(BIN)/pip install --quiet 'scikit-build-core>=1.1' 'nanobind>=3.1,<3.2' 'cmake>=3.26' 'ninja>=1.11'
+	$(BIN)/pip install --quiet --group build
 	touch $@
 
 $(STAMP): $(SOURCES) $(VENV)/.tools
-	$(BIN)/pip install --quiet --no-build-isolation '.[test,lint]'
+	$(BIN)/pip install --quiet --no-build-isolation . --group test --group lint
 	touch $@
 
 run: build

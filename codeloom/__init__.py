@@ -28,8 +28,9 @@ if TYPE_CHECKING:
         ScopeKind,
         Symbol,
     )
-    from codeloom._face import analyze, analyze_file, analyze_paths
+    from codeloom._face import analyze, analyze_file, analyze_paths, read_notebook
     from codeloom.reading.languages import NEWEST, VERSIONS
+    from codeloom.reading.notebooks import Notebook
 
 __version__ = "0.1.0"
 
@@ -41,6 +42,7 @@ __all__ = [
     "LimitKind",
     "Line",
     "LineKind",
+    "Notebook",
     "Occurrence",
     "Problem",
     "Range",
@@ -54,12 +56,14 @@ __all__ = [
     "analyze",
     "analyze_file",
     "analyze_paths",
+    "read_notebook",
 ]
 
 # Where the names are, which are imported when they are first asked for, so that `import codeloom` is cheap.
 _MODULES = {
-    **dict.fromkeys(("analyze", "analyze_file", "analyze_paths"), "codeloom._face"),
+    **dict.fromkeys(("analyze", "analyze_file", "analyze_paths", "read_notebook"), "codeloom._face"),
     **dict.fromkeys(("NEWEST", "VERSIONS"), "codeloom.reading.languages"),
+    "Notebook": "codeloom.reading.notebooks",
 }
 
 

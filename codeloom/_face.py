@@ -7,9 +7,17 @@ from functools import partial
 from itertools import chain, islice
 
 from codeloom._analysis import Analysis
-from codeloom.reading.files import StandardInput, find_files, read_file
+from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput, find_files, read_file
 from codeloom.reading.languages import NEWEST, version_number
 from codeloom.reading.source import source_from_bytes, source_from_text
+
+TYPE_CHECKING = False  # `typing` takes longer to import than this module
+if TYPE_CHECKING:
+    from typing import TypeVar
+
+    from codeloom.reading.notebooks import Notebook
+
+    Result = TypeVar("Result")
 
 # How many files are read ahead for each thread.
 _AHEAD_PER_JOB = 4
@@ -52,10 +60,31 @@ def analyze(
 def analyze_file(
     path: str | os.PathLike[str], *, python: str = NEWEST, false_hints: bool = False
 ) -> Analysis:
-    """The same for a file; OSError when it can't be read."""
+    """The same for a file; OSError when it can't be read.
+
+    Of a notebook it is the text of its code cells; `read_notebook` gives the cell of each row.
+    """
     name = _path_text(path)
     version_number(python)
-    return analyze(read_file(name), path=name, python=python, false_hints=false_hints)
+    data = read_file(name)
+    is_notebook = name.lower().endswith(NOTEBOOK_SUFFIX)
+    source = _notebook(data, name).text if is_notebook else data
+    return analyze(source, path=name, python=python, false_hints=false_hints)
+
+
+def read_notebook(path: str | os.PathLike[str]) -> "Notebook":
+    """The code cells of a Jupyter notebook as one text; OSError when it can't be read.
+
+    Its `text` is what `analyze` takes, and its `place(row)` gives the cell and the row there, from 1.
+    """
+    name = _path_text(path)
+    return _notebook(read_file(name), name)
+
+
+def _notebook(data: bytes, name: str) -> "Notebook":
+    from codeloom.reading.notebooks import read_notebook as read  # it loads a parser of JSON
+
+    return read(data, name)
 
 
 def analyze_paths(
@@ -100,25 +129,25 @@ def analyze_paths(
 
 def read_all(
     found: Iterator[str | OSError],
-    read: Callable[[str], Analysis],
+    read: "Callable[[str], Result]",
     jobs: int,
     on_error: Callable[[OSError], None] | None,
-) -> Iterator[Analysis]:
+) -> "Iterator[Result]":
     """What `read` makes of each path, in their order, ahead and in `jobs` threads."""
     for result in _results(found, read, jobs):
         try:
-            analysis = result()
+            value = result()
         except OSError as error:
             if on_error is None:
                 raise
             on_error(error)
         else:
-            yield analysis
+            yield value
 
 
 def _results(
-    found: Iterator[str | OSError], read: Callable[[str], Analysis], jobs: int
-) -> Iterator[Callable[[], Analysis]]:
+    found: Iterator[str | OSError], read: "Callable[[str], Result]", jobs: int
+) -> "Iterator[Callable[[], Result]]":
     """For each path a call that gives, or raises, what came of it."""
     first = list(islice(found, 2))
     if jobs == 1 or len(first) < 2:  # one file is nothing to share
@@ -128,7 +157,7 @@ def _results(
     from concurrent.futures import ThreadPoolExecutor
 
     pool = ThreadPoolExecutor(jobs, "codeloom")
-    ahead: deque[Callable[[], Analysis]] = deque()
+    ahead: deque[Callable[[], Result]] = deque()
     try:
         for path in chain(first, found):
             if isinstance(path, StandardInput):  # can't be read ahead: it may be a terminal
@@ -143,7 +172,7 @@ def _results(
         pool.shutdown(cancel_futures=True)
 
 
-def _read_one(read: Callable[[str], Analysis], path: str | OSError) -> Analysis:
+def _read_one(read: "Callable[[str], Result]", path: str | OSError) -> "Result":
     if isinstance(path, OSError):
         raise path
     return read(path)

@@ -27,6 +27,7 @@ class Fault:
     column: int
     message: str
     source_row: str
+    code: str = "CL201"
 
     def __str__(self) -> str:
         return f"{self.path}:{self.row}:{self.column}: {self.message}"
@@ -112,7 +113,9 @@ class _TreeReader:
         for problem in self._hindrances:
             if problem.range.row - 1 in rows:
                 place = problem.range
-                return Fault(self._path, place.row, place.column, problem.message, problem.source_row)
+                return Fault(
+                    self._path, place.row, place.column, problem.message, problem.source_row, problem.code
+                )
         return None
 
     def _refusal(self, error: SyntaxError, origin: tuple[int, int]) -> Fault:

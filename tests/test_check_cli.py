@@ -42,15 +42,15 @@ def test_output(write_files, run_cli):
     done = run_cli("check", "a b.py", "c.py")
     assert done.stdout.splitlines() == [
         "a b.py:2:11: CL201 invalid syntax",
-        "        y = '日本' )",
-        "                   ^",
+        "    2 |     y = '日本' )",
+        "      |                ^",
         "c.py:1:2: CL101 byte 0xE9 can't be read as utf-8: save the file as UTF-8, or name its encoding "
         "in the first row, as in `# coding: latin-1`",
-        "    '\ufffd'",
-        "     ^",
+        "    1 | '\ufffd'",
+        "      |  ^",
         "c.py:2:7: CL201 invalid syntax",
-        "    " + ("z = 1 ) " + "+ 1 " * 60)[:90] + "...",
-        " " * 10 + "^",
+        "    2 | " + ("z = 1 ) " + "+ 1 " * 60)[:86] + "...",
+        "      |       ^",
         "3 problems in 2 of 2 files, 4 logical lines",
     ]
 
@@ -74,13 +74,18 @@ def test_the_examples(run_cli):
     ("arguments", "words"),
     [
         ([], "COMMAND"),
-        (["mend", "a.py"], "invalid choice: 'mend'"),
+        (["mend", "a.py"], "no command 'mend'"),
+        (["chek", "a.py"], "did you mean 'check'?"),
         (["check"], "FILE-OR-FOLDER"),
+        (["check", "--statistic", "a.py"], "no option --statistic: did you mean '--statistics'?"),
+        (["check", "--format", "jsn", "a.py"], "did you mean 'json'?"),
+        (["check", "--select", "E9", "a.py"], "'E9' is no code"),
+        (["check", "--jobs", "0", "a.py"], "a number from 1"),
         (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.14"),
         (["check", "--fast", "a.py"], "--fast"),
         (["tree"], "FILE:ROW -c is required"),
         (["tree", "f.py:1", "-c", "x"], "not allowed with"),
-        (["tree", "-c", "x", "--format", "xml"], "invalid choice: 'xml'"),
+        (["tree", "-c", "x", "--format", "xml"], "there is no 'xml' here"),
     ],
 )
 def test_wrong_use(run_cli, arguments, words):
@@ -153,7 +158,7 @@ class TestFiles:
         assert done.stderr.splitlines() == [
             "codeloom: can't read pipe: it is no regular file",
             "codeloom: can't read /dev/zero: it is no regular file",
-            "codeloom: can't read a.ipynb: notebooks aren't read: export it as a .py file",
+            "codeloom: can't read a.ipynb: it is no notebook: it has no cells",
         ]
 
     def test_a_pipe_of_the_shell(self, run_cli, tmp_path):
@@ -184,7 +189,7 @@ class TestFiles:
     def test_standard_input(self, checked, run_cli):
         assert checked("-", "-", stdin=b")") == ["<stdin>"]
         done = run_cli("check", "-", stdin=b"# coding: latin-1\r'\xe9' )\r")
-        assert done.stdout.splitlines()[:2] == ["<stdin>:2:5: CL201 invalid syntax", "    'é' )"]
+        assert done.stdout.splitlines()[:2] == ["<stdin>:2:5: CL201 invalid syntax", "    2 | 'é' )"]
 
 
 class TestEndings:
@@ -247,7 +252,7 @@ class TestEndings:
         cli_environment["PYTHONIOENCODING"] = "ascii"
         stdout, _ = start_cli("a.py").communicate(timeout=30)
         _, row, caret, _ = stdout.decode("ascii").splitlines()
-        assert row[caret.index("^")] == ")" and row.strip().startswith("\\xe9 = '\\u65e5'")
+        assert row[caret.index("^")] == ")" and "| \\xe9 = '\\u65e5'" in row
 
     @pytest.mark.parametrize(("no_colour", "coloured"), [(None, True), ("", True), ("1", False)])
     def test_colour_on_a_terminal(self, write_files, start_cli, cli_environment, no_colour, coloured):

@@ -16,7 +16,9 @@ from test_library import LibraryTexts
 
 from codeloom import analyze, analyze_file
 from codeloom.cli.console import Console
-from codeloom.cli.hints import TextFormat
+from codeloom.cli.hints import HintsCommand
+from codeloom.cli.items import Finding, show_items
+from codeloom.cli.source import Source
 from codeloom.signatures import Argument, Value, signatures_of
 
 
@@ -26,8 +28,10 @@ def Signatures(text, python="3.12"):
 
 def Printed(source):
     stream = StringIO()
+    analysis = Source("<string>", analyze(source, python="3.12"))
+    findings = [Finding.of(analysis, problem) for problem in analysis.problems]
     with redirect_stdout(stream):
-        TextFormat(Console()).add(analyze(source, python="3.12"))
+        show_items(HintsCommand().items(analysis, findings), Console())
     return f"---\n{stream.getvalue()}".replace("<string>:", "").rstrip("\n")
 
 
@@ -105,7 +109,7 @@ def test_what_a_signature_is_written_as():
     ("arguments", "status", "rows"),
     [
         (["a.py"], 0, ["a.py:1:1: def f(a)", "    a      int", "    gives  int 1"]),
-        (["b.py", "a.py"], 1, ["b.py:1:9: CL201 invalid syntax", "    def f(a b): pass"]),
+        (["b.py", "a.py"], 1, ["b.py:1:9: CL201 invalid syntax", "    1 | def f(a b): pass"]),
         (["absent.py", "b.py"], 2, ["b.py:1:9: CL201 invalid syntax"]),
         (["--python", "2.7", "old.py"], 0, ["old.py:1:1: def f(a, b, c)", "    a  = 1, int"]),
         (["c.py"], 0, ["c.py:1:1: def f(a)"]),
@@ -130,10 +134,10 @@ def test_the_command(run_cli, write_files, arguments, status, rows):
 def test_rows_of_json(run_cli, write_files):
     write_files({"a.py": "async def f(a: int = 1, *b):\n  yield\n  yield c\ndef g(h i): pass\n"})
     done = run_cli("hints", "--format", "jsonl", "a.py")
-    f, g = map(json.loads, done.stdout.splitlines())
+    _, f, g, _ = map(json.loads, done.stdout.splitlines())
     assert f["is_async"] and f["yields"] == [{"row": 3, "type": None, "text": "c"}]
     assert f["arguments"] == [
         {"name": "a", "prefix": "", "hint": "int", "default": {"row": 1, "type": "int", "text": "1"}},
         {"name": "b", "prefix": "*", "hint": None, "default": None},
     ]
-    assert (g["name"], g["row"], g["error"]) == ("g", 4, {"row": 4, "column": 9, "message": "invalid syntax"})
+    assert (g["type"], g["row"], g["column"], g["message"]) == ("problem", 4, 9, "invalid syntax")

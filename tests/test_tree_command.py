@@ -53,7 +53,7 @@ def test_several_lines(run_cli):
         ("f.py:5", ["f.py:5:5: # nothing"]),
         ("f.py:6", ["f.py:6:5: d = 1", 'f.py:6:12: return f"{b + c!r}"', "f.py:6:22: b + c"]),
         ("f.py:9:3:", ["f.py:9:1: y = 2"]),
-        ("f.py:8", ["f.py:8:7: invalid syntax"]),
+        ("f.py:8", ["f.py:8:7: CL201 invalid syntax"]),
     ],
 )
 def test_the_row_of_a_file(write_files, run_cli, place, headings):
@@ -75,14 +75,14 @@ def test_a_broken_line(run_cli):
     done = run_cli("tree", "-c", "x = [é, 1")
     assert (done.returncode, done.stderr) == (1, "")
     assert done.stdout.splitlines() == [
-        "<string>:1:10: invalid syntax",
-        "    x = [é, 1",
-        "             ^",
+        "<string>:1:10: CL201 invalid syntax",
+        "    1 | x = [é, 1",
+        "      |          ^",
     ]
     # The place of a fault in an expression is a place of the file.
     done = run_cli("tree", "-c", "\nx = f'é{a b}'")
-    assert Headings(done.stdout)[-1] == "<string>:2:11: invalid syntax"
-    assert run_cli("tree", "-c", "case [a b]: pass").stdout.startswith("<string>:1:9: invalid")
+    assert Headings(done.stdout)[-1] == "<string>:2:11: CL201 invalid syntax"
+    assert run_cli("tree", "-c", "case [a b]: pass").stdout.startswith("<string>:1:9: CL201 invalid")
 
 
 def test_what_cannot_be_read(write_files, run_cli):
@@ -101,7 +101,7 @@ def test_what_cannot_be_read(write_files, run_cli):
         assert done.stderr == f"codeloom: {message}\n"
     done = run_cli("tree", "f.py")
     assert done.returncode == 1 and "CExprStmt" in done.stdout
-    assert Headings(done.stdout)[1].startswith("f.py:2:6: byte 0xE9 can't be read as utf-8")
+    assert Headings(done.stdout)[1].startswith("f.py:2:6: CL101 byte 0xE9 can't be read as utf-8")
 
 
 def test_other_grammars(run_cli):
@@ -118,9 +118,13 @@ def test_json(write_files, run_cli):
     def Texts(node):
         return [node["text"]] if "text" in node else [t for c in node["children"] for t in Texts(c)]
 
-    (line,) = json.loads(run_cli("tree", "-c", CODE, "--format", "json").stdout)
+    def Items(*arguments):
+        return json.loads(run_cli("tree", *arguments, "--format=json").stdout)["items"]
+
+    (line,) = Items("-c", CODE)
     tree = line.pop("tree")
-    assert line == {"path": "<string>", "row": 1, "column": 1, "text": CODE, "error": None}
+    place = {"row": 1, "column": 1, "end_row": 1, "end_column": 1}
+    assert line == {"type": "tree", "path": "<string>", **place, "text": CODE, "problem": None}
     assert Texts(tree) == ["x", "=", "foo", "(", '"é\\n"', ")"]
     assert tree["children"][2]["children"][1] == {
         "class": "CTrailer",
@@ -133,20 +137,18 @@ def test_json(write_files, run_cli):
         ],
     }
     write_files({"f.py": FILE})
-    done = run_cli("tree", "f.py", "--format=json")
-    lines = json.loads(done.stdout)
-    assert done.returncode == 1 and len(lines) == 8
-    assert [(line["row"], line["error"]) for line in lines if line["tree"] is None] == [
-        (8, {"row": 8, "column": 7, "message": "invalid syntax"})
-    ]
-    (line,) = json.loads(run_cli("tree", "-c", "case a: b", "--format=json").stdout)
+    lines = Items("f.py")
+    assert len(lines) == 8
+    (line,) = (line for line in lines if line["tree"] is None)
+    assert (line["problem"]["row"], line["problem"]["column"], line["problem"]["code"]) == (8, 7, "CL201")
+    (line,) = Items("-c", "case a: b")
     assert line["tree"]["children"][1]["position"] == [0, 5]
 
 
 def test_dot(run_cli):
     done = run_cli("tree", "-c", 'x = "\\\\\\""; y = (', "--format=dot")
     assert done.returncode == 1
-    assert done.stderr.startswith("<string>:1:18: invalid syntax\n")
+    assert done.stderr.startswith("<string>:1:18: CL201 invalid syntax\n")
     assert done.stdout.splitlines() == [
         "digraph tree {",
         '  node [fontname="monospace"]; edge [arrowhead=none];',

@@ -1,17 +1,19 @@
-"""What commands print: results on the standard output, failures on the standard error."""
+"""What commands print: results on the output, failures on the standard error."""
 
 import io
 import os
 import shutil
 import sys
 from enum import StrEnum
+from typing import TextIO
 
-from codeloom._analysis import Problem
-from codeloom.cli.excerpt import excerpt, printable
+from codeloom.cli.excerpt import Mark, excerpt, fits, printable
+from codeloom.cli.source import printable_path
 
-_INDENT = "    "
 _WIDTH_WITHOUT_TERMINAL = 100
 _LEAST_WIDTH = 20
+# The room before a row of source: its number, blanks and a bar.
+_GUTTER = 8
 
 _PLAIN = "\033[0m"
 
@@ -27,41 +29,66 @@ class Colour(StrEnum):
 
 
 class Console:
-    """The standard streams, as the terminal or the pipe behind them wants them.
+    """The output, as the terminal, the pipe or the file behind it wants it.
 
-    `width` is the room for a row after the indentation, in columns of the terminal.
+    `width` is the room for a row after the indentation, in columns of the terminal. `colour` is "auto",
+    "always" or "never".
     """
 
-    def __init__(self) -> None:
-        if isinstance(sys.stdout, io.TextIOWrapper):
-            sys.stdout.reconfigure(errors="backslashreplace")
+    def __init__(self, stream: TextIO | None = None, colour: str = "auto") -> None:
+        self._stream = sys.stdout if stream is None else stream
+        if isinstance(self._stream, io.TextIOWrapper):
+            self._stream.reconfigure(errors="backslashreplace")
         columns = shutil.get_terminal_size((_WIDTH_WITHOUT_TERMINAL, 0)).columns
-        self.width = max(columns - len(_INDENT), _LEAST_WIDTH)
-        self._encoding = getattr(sys.stdout, "encoding", None) or "utf-8"
-        self._has_colour = _is_colour_wanted()
+        self.width = max(columns - 4, _LEAST_WIDTH)
+        self._source_width = max(columns - _GUTTER, _LEAST_WIDTH)
+        self._encoding = getattr(self._stream, "encoding", None) or "utf-8"
+        self._has_colour = _is_colour_wanted(self._stream, colour)
 
-    def print_problem(self, problem: Problem) -> None:
-        """A problem's place and message, its row of source and a caret under the place."""
-        start = problem.range
-        message = f"{problem.code} {problem.message}"
-        self.print_fault(problem.path, start.row, start.column, message, problem.source_row)
+    @property
+    def is_terminal(self) -> bool:
+        """True when a person looks at the output as it is written."""
+        return self._stream is not None and self._stream.isatty()
 
-    def print_fault(self, path: str, row: int, column: int, message: str, source_row: str) -> None:
-        """The same for any fault; row and column count from 1."""
-        place = f"{printable_path(path)}:{row}:{column}:"
-        shown, caret = excerpt(source_row, column, self.width, self._encoding)
-        print(self.coloured(Colour.BOLD, place), printable(message))
-        print(_INDENT + shown)
-        print(_INDENT + self.coloured(Colour.RED, caret))
+    def use_utf8(self) -> None:
+        """Write UTF-8 whatever the terminal takes, for programs that expect it."""
+        if isinstance(self._stream, io.TextIOWrapper):
+            self._stream.reconfigure(encoding="utf-8")
+            self._encoding = "utf-8"
+
+    def print_source(self, number: int, source_row: str, marks: list[Mark], said: str = "") -> None:
+        """A row of source with its number, and below it its marks and what is said of them."""
+        shown, marked = excerpt(source_row, marks, self._source_width, self._encoding)
+        self.print_row(self._gutter(number) + shown)
+        if said and len(marked) + 1 + len(said) <= self._source_width:
+            marked, said = f"{marked} {printable(said)}", ""
+        colour = Colour.RED if "^" in marked else Colour.CYAN
+        self.print_row(self._gutter(None) + self.coloured(colour, marked))
+        if said:
+            self.print_row(self._gutter(None) + self.coloured(colour, printable(said)))
+
+    def print_gap(self) -> None:
+        """What parts rows of source that aren't neighbours."""
+        self.print_row(self.coloured(Colour.DIM, "  ..."))
+
+    def fits(self, source_row: str) -> bool:
+        """True when a row of source needn't be cut."""
+        return fits(source_row, self._source_width, self._encoding)
 
     def print_failure(self, error: OSError) -> None:
         """What can't be read, and why."""
         reason = error.strerror or str(error)
-        self.print_error(f"codeloom: can't read {printable_path(error.filename)}: {reason}")
+        path = "?" if error.filename is None else printable_path(os.fsdecode(error.filename))
+        self.print_error(f"codeloom: can't read {path}: {reason}")
 
     def print_row(self, row: str) -> None:
         """A row of a command's result."""
-        print(row)
+        print(row, file=self._stream)
+
+    def write(self, text: str) -> None:
+        """A piece of a command's result."""
+        if self._stream is not None:
+            self._stream.write(text)
 
     def print_error(self, text: str) -> None:
         """What is no part of the result, after what was printed before."""
@@ -70,23 +97,23 @@ class Console:
 
     def flush(self) -> None:
         """Bring what was printed to its reader."""
-        if sys.stdout is not None:
-            sys.stdout.flush()
+        if self._stream is not None:
+            self._stream.flush()
 
     def coloured(self, colour: Colour, text: str) -> str:
         """`text` in a colour, where the output is a terminal that takes it."""
         return f"{colour}{text}{_PLAIN}" if self._has_colour else text
 
-
-def printable_path(path: str) -> str:
-    """`path` as a row of a terminal can show it, whatever bytes it is made of."""
-    return printable(os.fsencode(path).decode(errors="backslashreplace"))
+    def _gutter(self, number: int | None) -> str:
+        return self.coloured(Colour.DIM, f"{'' if number is None else number:>5} |") + " "
 
 
-def _is_colour_wanted() -> bool:
-    return (
-        sys.stdout is not None
-        and sys.stdout.isatty()
-        and not os.environ.get("NO_COLOR")
-        and os.environ.get("TERM") != "dumb"
-    )
+def _is_colour_wanted(stream: TextIO | None, colour: str) -> bool:
+    """What the option says, else the environment, else whether a terminal is there to show it."""
+    if colour != "auto":
+        return colour == "always"
+    if os.environ.get("NO_COLOR"):
+        return False
+    if os.environ.get("FORCE_COLOR"):
+        return True
+    return stream is not None and stream.isatty() and os.environ.get("TERM") != "dumb"

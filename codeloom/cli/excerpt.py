@@ -1,4 +1,4 @@
-"""A place in a row of source as a terminal shows it: the row, cut where it is long, and a caret."""
+"""Places in a row of source as a terminal shows them: the row, cut where it is long, and marks below it."""
 
 import re
 import unicodedata
@@ -12,15 +12,20 @@ _UNPRINTABLE = frozenset({"Cc", "Cf", "Cs", "Cn", "Zl", "Zp"})
 _COMBINING = frozenset({"Mn", "Me"})
 _WIDE = frozenset({"W", "F"})
 
+# From column to column, counted in characters from 1, the end after the last one; and the sign to mark it.
+Mark = tuple[int, int, str]
 
-def excerpt(source_row: str, column: int, width: int = 100, encoding: str = "utf-8") -> tuple[str, str]:
-    """What to print of `source_row`, and the row with the caret to print below it.
 
-    `column` counts characters from 1 and may lie after the row's end. `width` is in terminal columns;
-    a wider row is cut on either side of the place. What the terminal's encoding lacks is shown by its
-    number.
+def excerpt(
+    source_row: str, marks: Sequence[Mark], width: int = 100, encoding: str = "utf-8"
+) -> tuple[str, str]:
+    """What to print of `source_row`, and the row with the marks to print below it.
+
+    A mark may lie after the row's end, and one of no width is a single sign. `width` is in terminal
+    columns; a wider row is cut on either side of the first mark's start. Of two marks in one place the
+    earlier one shows. What the terminal's encoding lacks is shown by its number.
     """
-    place_i = min(column - 1, len(source_row))
+    place_i = min(marks[0][0] - 1, len(source_row))
     # No more than this can be shown, and a row may be as long as a file.
     first_i = max(0, place_i - width)
     cells = list(_cells(source_row[first_i : place_i + width + 1], encoding))
@@ -30,8 +35,16 @@ def excerpt(source_row: str, column: int, width: int = 100, encoding: str = "utf
     cut_before = _CUT if first_i + start > 0 else ""
     cut_after = _CUT if first_i + end < len(source_row) else ""
     shown = "".join(cell for cell, _ in cells[start:end])
-    blanks = len(cut_before) + sum(width for _, width in cells[start : place_i - first_i])
-    return cut_before + shown + cut_after, " " * blanks + "^"
+    widths = [cell_width for _, cell_width in cells[start:end]]
+    marked = _marked(widths, marks, first_i + start, min(len(source_row), first_i + end))
+    return cut_before + shown + cut_after, " " * len(cut_before) + marked
+
+
+def fits(source_row: str, width: int, encoding: str) -> bool:
+    """True when a row needn't be cut."""
+    if len(source_row) > width:
+        return False
+    return sum(cell_width for _, cell_width in _cells(source_row, encoding)) <= width
 
 
 def printable(text: str) -> str:
@@ -46,6 +59,17 @@ def printable(text: str) -> str:
 def on_one_row(text: str) -> str:
     """`text` with a blank for each end of a row and the blanks around it, as hints in quotes may have."""
     return _ROW_END.sub(" ", text.strip())
+
+
+def _marked(widths: Sequence[int], marks: Sequence[Mark], first_i: int, row_end_i: int) -> str:
+    """The row of marks below the cells from `first_i` on."""
+    signs = [" " * width for width in widths] + [" "]
+    for column, end_column, sign in reversed(marks):
+        start = min(column - 1, row_end_i) - first_i
+        end = max(min(end_column - 1, row_end_i) - first_i, start + 1)
+        for i in range(max(start, 0), min(end, len(signs))):
+            signs[i] = sign * len(signs[i])
+    return "".join(signs).rstrip()
 
 
 def _cells(chars: str, encoding: str) -> Iterator[tuple[str, int]]:

@@ -1,14 +1,14 @@
 """`codeloom hints`: each def with its arguments, their types, and what it gives back."""
 
-import json
-from abc import abstractmethod
-from collections.abc import Iterable, Iterator, Mapping
-from typing import TYPE_CHECKING, Any, ClassVar
+from collections.abc import Iterable, Iterator
+from typing import TYPE_CHECKING, Any
 
-from codeloom._analysis import Analysis
-from codeloom.cli.console import Colour, printable_path
+from codeloom._analysis import Range
+from codeloom.cli.console import Colour, Console
 from codeloom.cli.excerpt import on_one_row, printable
-from codeloom.cli.item_command import ItemCommand, ItemFormat
+from codeloom.cli.items import Finding, Item
+from codeloom.cli.source import Source
+from codeloom.cli.source_command import SourceCommand
 
 if TYPE_CHECKING:
     from codeloom.signatures import Argument, Signature, Value
@@ -17,39 +17,62 @@ _INDENT = "    "
 _CUT = "..."
 
 
-class HintsFormat(ItemFormat):
-    """Prints each def."""
+class SignatureItem(Item):
+    """A def that is sound."""
 
-    def add(self, analysis: Analysis) -> bool:
-        """Print the defs of a file, or what is wrong with their lines."""
-        from codeloom.signatures import signatures_of  # it loads the engine
+    def __init__(self, source: Source, signature: "Signature") -> None:
+        self._source = source
+        self._signature = signature
 
-        signatures = signatures_of(analysis)
-        for signature in signatures:
-            self._add_signature(signature)
-        return all(signature.problem is None for signature in signatures)
+    @property
+    def _place(self) -> Range:
+        row, column = self._signature.row, self._signature.column
+        return Range(row, column, row, column)
 
-    @abstractmethod
-    def _add_signature(self, signature: "Signature") -> None:
-        """Print one def."""
-
-
-class TextFormat(HintsFormat):
-    """For people: the def's place and names, and below it a row for whatever has a type."""
-
-    def _add_signature(self, signature: "Signature") -> None:
-        if signature.problem is not None:
-            self._console.print_problem(signature.problem)
-            return
-        place = f"{printable_path(signature.path)}:{signature.row}:{signature.column}:"
-        self._console.print_row(f"{self._console.coloured(Colour.BOLD, place)} {printable(_head(signature))}")
-        rows = [(label, on_one_row(text)) for label, text in _rows(signature) if text]
+    def show(self, console: Console) -> None:
+        """The def's place and names, and below it a row for whatever has a type."""
+        place = console.coloured(Colour.BOLD, self._source.label(self._place))
+        console.print_row(f"{place} {printable(_head(self._signature))}")
+        rows = [(label, on_one_row(text)) for label, text in _rows(self._signature) if text]
         width = max((len(label) for label, _ in rows), default=0)
-        room = self._console.width - width - 2
+        room = console.width - width - 2
         for label, text in rows:
             shown = text if len(text) <= room else text[: room - len(_CUT)] + _CUT
-            label = self._console.coloured(Colour.CYAN, f"{printable(label):<{width}}")
-            self._console.print_row(f"{_INDENT}{label}  {printable(shown)}")
+            label = console.coloured(Colour.CYAN, f"{printable(label):<{width}}")
+            console.print_row(f"{_INDENT}{label}  {printable(shown)}")
+
+    def rows(self) -> Iterator[str]:
+        """The def's place and names, and what has a type after it."""
+        types = "; ".join(f"{label} {on_one_row(text)}" for label, text in _rows(self._signature) if text)
+        row = f"{self._source.label(self._place)} {_head(self._signature)}"
+        yield printable(f"{row}: {types}" if types else row)
+
+    def fields(self) -> Iterator[dict[str, Any]]:
+        """An object with all that is known of the def."""
+        signature = self._signature
+        arguments = signature.arguments
+        yield {
+            "type": "signature",
+            **self._source.fields(self._place),
+            "name": signature.name,
+            "is_async": signature.is_async,
+            "type_parameters": list(signature.type_parameters),
+            "arguments": None if arguments is None else [self._argument(argument) for argument in arguments],
+            "return_hint": signature.return_hint,
+            "returns": [self._value(value) for value in signature.returns],
+            "yields": [self._value(value) for value in signature.yields],
+        }
+
+    def _argument(self, argument: "Argument") -> dict[str, Any]:
+        return {
+            "name": argument.name,
+            "prefix": argument.prefix,
+            "hint": argument.hint,
+            "default": argument.default and self._value(argument.default),
+        }
+
+    def _value(self, value: "Value") -> dict[str, Any]:
+        return {"row": self._source.cell_and_row(value.row)[1], "type": value.type, "text": value.text}
 
 
 def _head(signature: "Signature") -> str:
@@ -91,56 +114,30 @@ def _shown(value: "Value") -> str:
     return value.type if value.text is None else f"{value.type} {value.text}"
 
 
-class JsonLinesFormat(HintsFormat):
-    """For programs: an object for each def on a row of its own."""
-
-    def _add_signature(self, signature: "Signature") -> None:
-        """The fields of the signature, with its fault as `error`."""
-        self._console.print_row(json.dumps(_fields(signature)))
-
-
-def _fields(signature: "Signature") -> dict[str, Any]:
-    problem = signature.problem
-    arguments = signature.arguments
-    return {
-        "path": signature.path,
-        "row": signature.row,
-        "column": signature.column,
-        "name": signature.name,
-        "is_async": signature.is_async,
-        "type_parameters": signature.type_parameters,
-        "arguments": None if arguments is None else [_argument_fields(argument) for argument in arguments],
-        "return_hint": signature.return_hint,
-        "returns": [_value_fields(value) for value in signature.returns],
-        "yields": [_value_fields(value) for value in signature.yields],
-        "error": problem
-        and {"row": problem.range.row, "column": problem.range.column, "message": problem.message},
-    }
-
-
-def _argument_fields(argument: "Argument") -> dict[str, Any]:
-    return {
-        "name": argument.name,
-        "prefix": argument.prefix,
-        "hint": argument.hint,
-        "default": argument.default and _value_fields(argument.default),
-    }
-
-
-def _value_fields(value: "Value") -> dict[str, Any]:
-    return {"row": value.row, "type": value.type, "text": value.text}
-
-
-class HintsCommand(ItemCommand):
-    """Prints the signatures of each file."""
+class HintsCommand(SourceCommand):
+    """Shows the signatures of each file."""
 
     NAME = "hints"
-    HELP = "show each def with the types of its arguments and what it gives back"
     DESCRIPTION = (
         "Show each def with its arguments: their types from annotations or comments, their defaults, "
-        "and what `return` and `yield` are known to give. A def that isn't sound stands in its place "
-        "with its fault; other faults are the business of `codeloom check`. The exit status is 0 when "
-        "all defs are sound, 1 when some aren't, 2 on wrong use or when a file can't be read."
+        "and what `return` and `yield` are known to give. A def that isn't sound is shown with its fault; "
+        "other faults are for `codeloom check`. The exit status is 0 when all defs are sound, 1 when some "
+        "aren't, 2 on wrong use or when a file can't be read."
     )
-    FORMATS: ClassVar[Mapping[str, type[ItemFormat]]] = {"text": TextFormat, "jsonl": JsonLinesFormat}
-    FORMAT_HELP = "text; or jsonl, with an object for each def on a row"
+    EXAMPLES = (
+        "codeloom hints src/a.py",
+        "codeloom hints --format json src | jq '.items[] | select(.return_hint == null).name'",
+    )
+    NEEDS_RECORDS = True
+
+    def items(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
+        """The defs, and the problems of those that aren't sound."""
+        from codeloom.signatures import signatures_of  # it loads the engine
+
+        by_place = {(finding.range, finding.code): finding for finding in findings}
+        for signature in signatures_of(source.analysis):
+            problem = signature.problem
+            if problem is None:
+                yield SignatureItem(source, signature)
+            elif finding := by_place.get((problem.range, problem.code)):
+                yield finding

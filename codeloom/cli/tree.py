@@ -3,13 +3,18 @@
 import argparse
 import os
 import re
+from collections.abc import Iterator
 from itertools import chain
 
-from codeloom._analysis import Analysis
 from codeloom._face import analyze
-from codeloom.cli.command import Command, ExitStatus, add_python_argument, as_named, read_path
-from codeloom.cli.console import Console, printable_path
-from codeloom.cli.tree_formats import FORMATS
+from codeloom.cli.command import Command, ExitStatus
+from codeloom.cli.console import Console
+from codeloom.cli.formats import FOR_TREES, format_named
+from codeloom.cli.options import Options, add_output_arguments, add_python_argument
+from codeloom.cli.run import as_named, opened_console, read_source
+from codeloom.cli.source import Source, printable_path
+from codeloom.cli.tally import Tally
+from codeloom.cli.tree_items import TreeItem
 
 # A place as `codeloom check` prints it; the column doesn't matter here.
 _PLACE = re.compile(r"(?P<path>.+?):(?P<row>\d{1,9})(?::\d+)?:?", re.ASCII | re.DOTALL)
@@ -19,16 +24,19 @@ class TreeCommand(Command):
     """Prints the tree of each logical line that is asked for."""
 
     NAME = "tree"
-    HELP = "show the syntax tree of a line"
     DESCRIPTION = (
         "Show the syntax tree of a line: of each node its class, the grammar rule or kind of token, "
-        "the text of a leaf, and behind @ the index of its first token. Expressions within the "
+        "the text of a leaf, and after @ the index of its first token. Expressions within the "
         "line, in f-strings and quoted hints, follow as lines of their own. The exit status is 0 "
         "when all lines are sound, 1 when some aren't, 2 on wrong use or when the line can't be read."
     )
 
-    def __init__(self) -> None:
-        self._console = Console()
+    EXAMPLES = (
+        "codeloom tree -c 'x = foo(1)'",
+        "codeloom tree src/a.py:12",
+        "codeloom tree --format dot -c 'a + b * c' | dot -Tsvg > tree.svg",
+    )
+    FORMATS = FOR_TREES
 
     @classmethod
     def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
@@ -42,50 +50,58 @@ class TreeCommand(Command):
             "- is the standard input",
         )
         what.add_argument("-c", dest="code", metavar="CODE", help="the line itself, or several")
-        parser.add_argument(
-            "--format",
-            choices=FORMATS,
-            default="text",
-            help="text, with a row for each node; json; or dot, for Graphviz (default: %(default)s)",
-        )
         add_python_argument(parser)
+        add_output_arguments(parser, cls.FORMATS)
 
-    def run(self, arguments: argparse.Namespace) -> ExitStatus:
+    def run(self, options: Options) -> ExitStatus:
         """Print the trees of the code, of the row or of the file."""
-        if arguments.code is not None:
-            return self._print(analyze(arguments.code, python=arguments.python), arguments, None)
-        path, row = _path_and_row(arguments.place)
-        if os.path.isdir(path):
-            return self._fail(f"{printable_path(path)} is a folder: name a file in it")
-        try:
-            analysis = read_path(as_named(path), arguments)
-        except OSError as error:
-            self._console.print_failure(error)
-            return ExitStatus.FAILURE
-        return self._print(analysis, arguments, row)
+        with opened_console(options) as console:
+            if options.code is not None:
+                analysis = analyze(options.code, python=options.version)
+                return _print(Source(analysis.path, analysis), options, None, console)
+            path, row = _path_and_row(options.place or "")
+            if os.path.isdir(path):
+                return _fail(f"{printable_path(path)} is a folder: name a file in it", console)
+            try:
+                source = read_source(as_named(path), options, options.version)
+            except OSError as error:
+                console.print_failure(error)
+                return ExitStatus.FAILURE
+            return _print(source, options, row, console)
 
-    def _print(self, analysis: Analysis, arguments: argparse.Namespace, row: int | None) -> ExitStatus:
-        from codeloom.line_trees import line_trees  # it loads the engine
 
-        lines = line_trees(analysis, row)
-        first = next(lines, None)
-        if first is None:
-            return self._fail(_nothing_there(analysis, row))
-        second = next(lines, None)
-        has_headings = arguments.code is None or second is not None
-        tree_format = FORMATS[arguments.format](self._console)
-        tree_format.begin()
-        status = ExitStatus.SOUND
-        for line in chain([first], [] if second is None else [second], lines):
-            tree_format.add(line, has_headings)
-            if line.fault is not None:
-                status = ExitStatus.PROBLEMS
-        tree_format.end()
-        return status
+def _print(source: Source, options: Options, row: int | None, console: Console) -> ExitStatus:
+    from codeloom.line_trees import line_trees  # it loads the engine
 
-    def _fail(self, message: str) -> ExitStatus:
-        self._console.print_error(f"codeloom: {message}")
-        return ExitStatus.FAILURE
+    lines = line_trees(source.analysis, row)
+    first = next(lines, None)
+    if first is None:
+        return _fail(_nothing_there(source, row), console)
+    second = next(lines, None)
+    has_headings = options.code is None or second is not None
+    tally = Tally()
+    tally.files = 1
+
+    def items() -> Iterator[TreeItem]:
+        for i, line in enumerate(chain([first], [] if second is None else [second], lines)):
+            item = TreeItem(source, line, has_headings, is_first=i == 0)
+            tally.lines += 1
+            if item.finding is not None:
+                tally.problems += 1
+                tally.by_code[item.finding.code] += 1
+            yield item
+
+    tree_format = format_named(options.format)(console, TreeCommand.NAME)
+    tree_format.begin()
+    tree_format.add(source, items())
+    tally.faulty_files = int(tally.problems > 0)
+    tree_format.end(tally)
+    return ExitStatus.PROBLEMS if tally.problems and not options.exit_zero else ExitStatus.SOUND
+
+
+def _fail(message: str, console: Console) -> ExitStatus:
+    console.print_error(f"codeloom: {message}")
+    return ExitStatus.FAILURE
 
 
 def _path_and_row(place: str) -> tuple[str, int | None]:
@@ -93,15 +109,15 @@ def _path_and_row(place: str) -> tuple[str, int | None]:
     return (match["path"], int(match["row"])) if match else (place, None)
 
 
-def _nothing_there(analysis: Analysis, row: int | None) -> str:
+def _nothing_there(source: Source, row: int | None) -> str:
     from codeloom.line_trees import count_rows
 
-    path = printable_path(analysis.path)
+    path = printable_path(source.path)
     if row is None:
         return f"{path} holds no line"
     if row == 0:
         return f"{path} has no row 0: rows count from 1"
-    count = count_rows(analysis.text)
+    count = count_rows(source.analysis.text)
     if row > count:
         return f"{path} has no row {row}: it ends with row {count}"
     return f"row {row} of {path} is blank"

@@ -5,9 +5,10 @@ import os
 import stat
 from collections.abc import Iterator, Sequence
 
-_SUFFIXES = (".py", ".pyi", ".pyw")
-_NOTEBOOK_SUFFIX = ".ipynb"
-_CACHE_FOLDER = "__pycache__"
+from codeloom.reading.exclusion import Exclusion, FolderExclusion
+
+NOTEBOOK_SUFFIX = ".ipynb"
+_SUFFIXES = (".py", ".pyi", ".pyw", NOTEBOOK_SUFFIX)
 _ENVIRONMENT_MARK = "pyvenv.cfg"
 
 # Where the files lie that a process has open: pipes there were handed over by the shell.
@@ -25,9 +26,7 @@ class StandardInput(str):
 
 
 def read_file(path: str) -> bytes:
-    """The bytes of a file; OSError when it can't be read, also for devices, pipes and notebooks."""
-    if path.lower().endswith(_NOTEBOOK_SUFFIX):
-        raise OSError(errno.EINVAL, "notebooks aren't read: export it as a .py file", path)
+    """The bytes of a file; OSError when it can't be read, also for devices and pipes."""
     mode = os.stat(path).st_mode
     is_handed_over = stat.S_ISFIFO(mode) and path.startswith(_OPEN_FILES)
     if stat.S_ISDIR(mode):
@@ -38,14 +37,15 @@ def read_file(path: str) -> bytes:
         return file.read()
 
 
-def find_files(paths: Sequence[str]) -> Iterator[str | OSError]:
+def find_files(paths: Sequence[str], exclusion: Exclusion | None = None) -> Iterator[str | OSError]:
     """The paths of the files that `paths` name, and an error for each folder that can't be listed.
 
-    A folder stands for the Python files below it, in the order of their names. Hidden folders,
-    caches and virtual environments are left out, unless they are named themselves; links to folders
-    aren't followed. No file is found twice, whatever its names.
+    A folder stands for the Python files and notebooks below it, in the order of their names. What
+    `exclusion` names is left out, hidden folders and caches unless told otherwise, and virtual
+    environments; unless they are named themselves. Links to folders aren't followed. No file is found
+    twice, whatever its names.
     """
-    return _FileFinder(paths).files()
+    return _FileFinder(paths, exclusion or Exclusion()).files()
 
 
 # What is the same for all names of a file or a folder: device and number, or else the path.
@@ -65,8 +65,9 @@ def _identity_of(path: str) -> _Identity:
 class _FileFinder:
     """Goes through files and folders, and remembers what it has seen."""
 
-    def __init__(self, paths: Sequence[str]) -> None:
+    def __init__(self, paths: Sequence[str], exclusion: Exclusion) -> None:
         self._paths = paths
+        self._exclusion = exclusion
         self._seen: set[_Identity] = set()
 
     def files(self) -> Iterator[str | OSError]:
@@ -74,6 +75,8 @@ class _FileFinder:
             if isinstance(path, StandardInput):
                 if self._is_new(path):
                     yield path
+            elif self._exclusion.leaves_out_named(path):
+                continue
             elif os.path.isdir(path):
                 yield from self._files_below(path)
             elif self._is_new(path):
@@ -82,6 +85,7 @@ class _FileFinder:
     def _files_below(self, folder: str) -> Iterator[str | OSError]:
         # What is still to be looked at, the next one last; folders end in a separator.
         pending = [os.path.join(folder, "")]
+        exclusion = self._exclusion.below_named(folder)
         is_named = True
         while pending:
             path = pending.pop()
@@ -90,12 +94,12 @@ class _FileFinder:
                     yield path
                 continue
             try:
-                pending += self._children(folder if is_named else path, is_named)
+                pending += self._children(folder if is_named else path, is_named, exclusion)
             except OSError as error:
                 yield error
             is_named = False
 
-    def _children(self, folder: str, is_named: bool) -> list[str]:
+    def _children(self, folder: str, is_named: bool, exclusion: Exclusion) -> list[str]:
         """What is of interest in a folder, in reverse order; nothing if it was looked at before."""
         if not self._is_new(folder):
             return []
@@ -103,7 +107,8 @@ class _FileFinder:
             entries = sorted(scan, key=lambda entry: entry.name, reverse=True)
         if not is_named and any(entry.name == _ENVIRONMENT_MARK for entry in entries):
             return []
-        return [path for entry in entries if (path := _path_of_interest(entry)) is not None]
+        here = exclusion.in_folder(folder)
+        return [path for entry in entries if (path := _path_of_interest(entry, here)) is not None]
 
     def _is_new(self, path: str) -> bool:
         """False for what was found before, by this name or another."""
@@ -114,14 +119,16 @@ class _FileFinder:
         return True
 
 
-def _path_of_interest(entry: os.DirEntry[str]) -> str | None:
+def _path_of_interest(entry: os.DirEntry[str], exclusion: FolderExclusion) -> str | None:
     """The path of a folder, with a separator, or of a Python file; None for anything else."""
-    is_hidden = entry.name.startswith(".")
-    if entry.is_dir(follow_symlinks=False):
-        is_left_out = is_hidden or entry.name == _CACHE_FOLDER
-        return None if is_left_out else entry.path + os.sep
-    if not entry.name.lower().endswith(_SUFFIXES):
+    is_folder = entry.is_dir(follow_symlinks=False)
+    if not is_folder and not entry.name.lower().endswith(_SUFFIXES):
         return None
+    if exclusion.leaves_out(entry.name, is_folder):
+        return None
+    if is_folder:
+        return entry.path + os.sep
+    is_hidden = entry.name.startswith(".")
     try:
         is_broken = entry.is_symlink() and not os.path.exists(entry.path)
         # A broken link is a failure when it is read; hidden ones are the locks of editors.

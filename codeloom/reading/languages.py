@@ -21,6 +21,8 @@ _PY2_KEYWORDS = _KEYWORDS | {"exec", "print"}
 _PY2_GRAMMAR = "Python-Grammar-2.7"
 _PY3_KEYWORDS = _KEYWORDS | {"False", "None", "True", "nonlocal"}
 _ASYNC_KEYWORDS = frozenset({"async", "await"})
+_VERSION_NAME = re.compile(r"(?:py(?:thon)?-?)?(?P<major>[23])(?:\.?(?P<minor>\d+)(?:\.\d+)*)?")
+_CLAUSE = re.compile(r"(?P<operator>===?|~=|!=|<=?|>=?)\s*(?P<version>\d+(?:\.\d+)*)(?P<wildcard>\.\*)?\S*")
 _PRINT_FUNCTION = re.compile(
     r"^from[ \t]+__future__[ \t]+import\b(?:[^\n(#]|\([^)]*)*\bprint_function\b", re.MULTILINE
 )
@@ -39,6 +41,60 @@ def version_number(name: str) -> int:
         )
     major, minor = name.split(".")
     return int(major) * 100 + int(minor)
+
+
+def version_named(name: str) -> str:
+    """One of `VERSIONS`, from any way in which tools write it: "3.12", "3.12.4", "py312" or "python3.12".
+
+    A "3" is the newest version of Python 3, a "2" that of Python 2. ValueError for an unknown one.
+    """
+    match = _VERSION_NAME.fullmatch(name.strip().lower())
+    if match is None:
+        version_number(name)  # raises what is wrong
+        return name
+    major, minor = match["major"], match["minor"]
+    if minor is None:
+        minor = VERSIONS[-1 if major == "3" else 0].partition(".")[2]
+    try:
+        version_number(f"{major}.{minor}")
+    except ValueError:
+        version_number(name)
+    return f"{major}.{minor}"
+
+
+def oldest_admitted(requirement: str) -> str | None:
+    """The oldest version that a `requires-python` such as ">=3.9,<4" admits; None for none.
+
+    Python 3 goes before Python 2: code for both is written for the newer one.
+    """
+    clauses = [_CLAUSE.fullmatch(clause.strip()) for clause in requirement.split(",") if clause.strip()]
+    if None in clauses:
+        return None
+    for name in (*VERSIONS[1:], VERSIONS[0]):
+        number = tuple(map(int, name.split(".")))
+        if all(_is_admitted(number, clause) for clause in clauses if clause is not None):
+            return name
+    return None
+
+
+def _is_admitted(version: tuple[int, ...], clause: re.Match[str]) -> bool:
+    """True when a clause admits any patch release of a version."""
+    operator, wildcard = clause["operator"], clause["wildcard"]
+    named = tuple(map(int, clause["version"].split(".")))
+    bound = (*named, 0)[:2]
+    match operator:
+        case ">=" | ">":
+            return version >= bound
+        case "<=":
+            return version[: len(named)] <= named[:2]
+        case "<":
+            return version < bound or (version == bound and any(named[2:]))
+        case "~=":
+            return version == bound if len(named) > 2 else version >= bound and version[0] == bound[0]
+        case "!=":
+            return not (wildcard and version[: len(named)] == named)
+        case _:
+            return version[: len(named)] == named[:2]
 
 
 class Language:

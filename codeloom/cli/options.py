@@ -1,0 +1,281 @@
+"""What a run is asked to do, and the arguments that several commands share.
+
+The command line goes before the settings of the project, and these before the defaults.
+"""
+
+import argparse
+import os
+from collections.abc import Callable, Mapping, Sequence
+from typing import TYPE_CHECKING, Any
+
+from codeloom.cli.formats import FORMATS
+from codeloom.cli.project import Project, WrongUseError, checked_settings, nearest
+from codeloom.reading.exclusion import DEFAULT_PATTERNS, Exclusion
+from codeloom.reading.files import StandardInput
+from codeloom.reading.languages import NEWEST, VERSIONS, oldest_admitted, version_named
+
+if TYPE_CHECKING:
+    from codeloom.cli.command import Command
+
+COLOURS = ("auto", "always", "never")
+
+
+class Options:
+    """All that a run may be asked, with the defaults."""
+
+    command: "type[Command]"
+    paths: Sequence[str] = ()
+    place: str | None = None
+    code: str | None = None
+    shell: str = ""
+    python: str | None = None
+    false_hints: bool = False
+    stdin_filename: str | None = None
+    jobs: int | None = None
+    config: str | None = None
+
+    exclude: Sequence[str] = DEFAULT_PATTERNS
+    extend_exclude: Sequence[str] = ()
+    force_exclude: bool = False
+    gitignore: bool = True
+    show_files: bool = False
+
+    select: Sequence[str] = ()
+    ignore: Sequence[str] = ()
+    baseline: str | None = None
+    diff: str | None = None
+
+    format: str = "text"
+    output: str | None = None
+    color: str = "auto"
+    statistics: bool = False
+    exit_zero: bool = False
+    quiet: int = 0
+    verbose: bool = False
+    watch: bool = False
+
+    project: Project
+
+    def __init__(self, given: Mapping[str, Any]) -> None:
+        """From what the command line gives; WrongUseError where it or a setting is wrong."""
+        named = [path for path in given.get("paths", ()) if path != StandardInput.NAME]
+        named += [given[name] for name in ("stdin_filename",) if name in given]
+        self.project = Project(named or ["."], given.get("config"))
+        for name, value in checked_settings(self.project, _READERS):
+            setattr(self, name.replace("-", "_"), value)
+        if self.baseline is not None:
+            self.baseline = os.path.join(self.project.root, self.baseline)
+        self._keep_format_of(given)
+        for name, value in given.items():
+            setattr(self, name, value)
+
+    @property
+    def version(self) -> str:
+        """The version of Python that sources are written in."""
+        if self.python is not None:
+            return self.python
+        requirement = self.project.requires_python
+        return (requirement and oldest_admitted(requirement)) or NEWEST
+
+    @property
+    def exclusion(self) -> Exclusion:
+        """What a search through folders leaves out."""
+        patterns = (*self.exclude, *self.extend_exclude)
+        return Exclusion(self.project.root, patterns, gitignore=self.gitignore, force=self.force_exclude)
+
+    def _keep_format_of(self, given: Mapping[str, Any]) -> None:
+        """A format in the settings is for the commands that have it."""
+        command = given.get("command")
+        if command is not None and self.format not in command.FORMATS:
+            self.format = "text"
+
+
+def add_source_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]) -> None:
+    """Add what every command has that goes through files."""
+    parser.add_argument(
+        "paths",
+        nargs="+",
+        metavar="FILE-OR-FOLDER",
+        help="a file; a folder, with all Python files and notebooks below it; or - for the standard input",
+    )
+    _add_reading(parser)
+    _add_finding(parser)
+    _add_selecting(parser)
+    _add_running(add_output_arguments(parser, formats))
+
+
+def _add_reading(parser: argparse.ArgumentParser) -> None:
+    add_python_argument(parser)
+    parser.add_argument(
+        "--false-hints",
+        action="store_true",
+        help="take all that looks like a type hint for one, as the engine itself does: prose after "
+        "`# type:`, error codes after `# type: ignore`, sentences in quoted annotations",
+    )
+    parser.add_argument(
+        "--jobs", type=_as_argument(_count), metavar="N", help="threads (default: one a processor)"
+    )
+    parser.add_argument("--config", metavar="FILE", help="the settings, in place of those of the project")
+
+
+def _add_finding(parser: argparse.ArgumentParser) -> None:
+    group = parser.add_argument_group("which files")
+    patterns: dict[str, Any] = {"type": _as_argument(_patterns), "action": "extend", "metavar": "PATTERN"}
+    group.add_argument(
+        "--exclude",
+        **patterns,
+        help="leave out what fits, as in a .gitignore file; in place of the defaults "
+        f"{' '.join(DEFAULT_PATTERNS)}",
+    )
+    group.add_argument("--extend-exclude", **patterns, help="leave this out too")
+    group.add_argument(
+        "--force-exclude", action="store_true", help="leave it out also where it is named itself"
+    )
+    group.add_argument(
+        "--no-gitignore", dest="gitignore", action="store_false", help="read what .gitignore files name too"
+    )
+    group.add_argument("--show-files", action="store_true", help="print which files would be read, and end")
+
+
+def _add_selecting(parser: argparse.ArgumentParser) -> None:
+    group = parser.add_argument_group("which problems")
+    codes: dict[str, Any] = {"type": _as_argument(_selectors), "action": "extend", "metavar": "CODES"}
+    group.add_argument("--select", **codes, help="only these: codes such as CL301, or CL3 for all such")
+    group.add_argument("--ignore", **codes, help="not these; the longer of two that fit decides")
+    group.add_argument(
+        "--baseline", metavar="FILE", help="only what isn't in this report, which --format json wrote"
+    )
+    group.add_argument(
+        "--diff",
+        metavar="REVISION",
+        help="only on lines that differ from this git revision, such as HEAD or main",
+    )
+    group.add_argument("--exit-zero", action="store_true", help="end with 0 also when there are problems")
+
+
+def _add_running(group: "argparse._ArgumentGroup") -> None:
+    group.add_argument(
+        "--statistics", action="store_true", help="how often each code was reported, at the end"
+    )
+    group.add_argument("--watch", action="store_true", help="run again whenever a file changes")
+
+
+def add_output_arguments(
+    parser: argparse.ArgumentParser, formats: Sequence[str]
+) -> "argparse._ArgumentGroup":
+    """Add what every command has that writes results."""
+    group = parser.add_argument_group("output")
+    group.add_argument(
+        "--format",
+        choices=formats,
+        type=_as_argument(lambda name: _one_of(name, formats)),
+        metavar="FORMAT",
+        help=f"{', '.join(formats[:-1])} or {formats[-1]} (default: text)",
+    )
+    group.add_argument("-o", "--output", metavar="FILE", help="write to this file")
+    group.add_argument(
+        "--color",
+        choices=COLOURS,
+        type=_as_argument(lambda name: _one_of(name, COLOURS)),
+        metavar="WHEN",
+        help="auto, always or never; NO_COLOR and FORCE_COLOR in the environment count too",
+    )
+    group.add_argument("-q", "--quiet", action="count", help="no summary; twice: no problems either")
+    group.add_argument("-v", "--verbose", action="store_true", help="say what settings and version hold")
+    return group
+
+
+def add_python_argument(parser: argparse.ArgumentParser) -> None:
+    """Add `python` and `stdin_filename`."""
+    parser.add_argument(
+        "--python",
+        type=_as_argument(version_named),
+        metavar="VERSION",
+        help=f"the version of Python that the source is written in, {VERSIONS[0]} or {VERSIONS[1]} to "
+        f"{NEWEST}, as in 3.12, py312 or 3 (default: the oldest that the project's requires-python "
+        f"admits, or {NEWEST})",
+    )
+    parser.add_argument(
+        "--stdin-filename", metavar="FILE", help="the file that the standard input stands for"
+    )
+
+
+def _as_argument(read: Callable[[str], Any]) -> Callable[[str], Any]:
+    """A reader of settings as the standard library's parser of arguments wants it."""
+
+    def read_argument(text: str) -> Any:
+        try:
+            return read(text)
+        except ValueError as error:
+            raise argparse.ArgumentTypeError(str(error).removeprefix("python: ")) from None
+
+    return read_argument
+
+
+def _selectors(value: str | list[str]) -> list[str]:
+    from codeloom.cli.filters.codes import selectors_of
+
+    return [selector for text in _texts(value) for selector in selectors_of(text)]
+
+
+def _patterns(value: str | list[str]) -> list[str]:
+    return _texts(value)
+
+
+def _texts(value: object) -> list[str]:
+    texts = [value] if isinstance(value, str) else value
+    if not isinstance(texts, list) or not all(isinstance(text, str) for text in texts):
+        raise TypeError("it must be a list of texts")
+    return texts
+
+
+def _text(value: object) -> str:
+    if not isinstance(value, str):
+        raise TypeError("it must be a text")
+    return value
+
+
+def _flag(value: object) -> bool:
+    if not isinstance(value, bool):
+        raise TypeError("it must be true or false")
+    return value
+
+
+def _count(value: object) -> int:
+    if isinstance(value, bool) or not isinstance(value, int | str):
+        raise TypeError("it must be a number")
+    try:
+        count = int(value)
+    except ValueError:
+        count = 0
+    if count < 1:
+        raise ValueError(f"it must be a number from 1, not {value}")
+    return count
+
+
+def _one_of(value: object, names: Sequence[str]) -> str:
+    if value not in names:
+        suggestion = nearest(str(value), names) or f": choose {', '.join(names[:-1])} or {names[-1]}"
+        raise ValueError(f"there is no {value!r} here{suggestion}")
+    return str(value)
+
+
+# The settings, each with what makes its value of what the file holds.
+_READERS: Mapping[str, Callable[[Any], Any]] = {
+    "python": lambda value: version_named(_text(value)),
+    "false-hints": _flag,
+    "jobs": _count,
+    "exclude": _patterns,
+    "extend-exclude": _patterns,
+    "force-exclude": _flag,
+    "gitignore": _flag,
+    "select": _selectors,
+    "ignore": _selectors,
+    "baseline": _text,
+    "exit-zero": _flag,
+    "format": lambda value: _one_of(value, tuple(FORMATS)),
+    "color": lambda value: _one_of(value, COLOURS),
+    "statistics": _flag,
+}
+
+__all__ = ["Options", "WrongUseError", "add_output_arguments", "add_python_argument", "add_source_arguments"]

@@ -1,0 +1,163 @@
+"""One run over files: which are read, which of their problems count, and where it is written."""
+
+import sys
+from collections.abc import Iterator, Sequence
+from contextlib import contextmanager
+from typing import TYPE_CHECKING
+
+from codeloom._face import analyze, processor_count, read_all
+from codeloom.cli.command import ExitStatus
+from codeloom.cli.console import Console
+from codeloom.cli.filters import Filter
+from codeloom.cli.filters.codes import CodeFilter, not_ignored_by_comments
+from codeloom.cli.formats import format_named
+from codeloom.cli.items import Finding
+from codeloom.cli.options import Options
+from codeloom.cli.progress import Progress
+from codeloom.cli.project import WrongUseError
+from codeloom.cli.source import Source
+from codeloom.cli.tally import Tally
+from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput, find_files, read_file
+from codeloom.reading.notebooks import read_notebook
+
+if TYPE_CHECKING:
+    from codeloom.cli.filters.changes import Changes
+
+STDIN_NAME = "<stdin>"
+
+
+class Run:
+    """What the options come to: files, filters, a format, counts."""
+
+    def __init__(self, options: Options, console: Console, *, with_records: bool) -> None:
+        self.options = options
+        self.console = console
+        self.tally = Tally()
+        self.format = format_named(options.format)(console, options.command.NAME)
+        self._with_records = with_records
+        self._needs_fingerprints = self.format.NEEDS_FINGERPRINTS or options.baseline is not None
+        self._filters, self._changes = _filters_of(options)
+        self._version = options.version
+
+    def files(self) -> Iterator[str | OSError]:
+        """The paths of the files to read, and what keeps a folder from being listed."""
+        for path in files_of(self.options):
+            is_named = isinstance(path, OSError | StandardInput)
+            if is_named or self._changes is None or self._changes.concern(str(path)):
+                yield path
+
+    def sources(self) -> Iterator[tuple[Source, list[Finding]]]:
+        """Each file with the problems that count; what can't be read is reported."""
+
+        def read(path: str) -> Source:
+            source = read_source(path, self.options, self._version)
+            analysis = source.analysis
+            _ = analysis.records if self._with_records else analysis.problems  # worked out in this thread
+            return source
+
+        jobs = self.options.jobs or processor_count()
+        with Progress(self.console) as progress:
+            for source in read_all(self.files(), read, jobs, self._on_error):
+                progress.clear()
+                yield source, self._findings(source)
+                progress.show(self.tally)
+
+    def end(self) -> ExitStatus:
+        """Write what goes after all files, and give the exit status."""
+        self.format.end(self.tally)
+        if not self.format.IS_FOR_PROGRAMS:
+            self._print_counts()
+        status = self.tally.status()
+        return ExitStatus.SOUND if self.options.exit_zero and status == ExitStatus.PROBLEMS else status
+
+    def _print_counts(self) -> None:
+        options = self.options
+        if options.statistics:
+            for count, code, message in self.tally.statistics():
+                self.console.print_row(f"{count:>7,}  {code}  {message}")
+        if options.command.HAS_SUMMARY and options.format == "text" and not options.quiet:
+            self.console.print_row(str(self.tally))
+
+    def _findings(self, source: Source) -> list[Finding]:
+        findings: Sequence[Finding] = [Finding.of(source, problem) for problem in source.problems]
+        if findings and self._needs_fingerprints:
+            from codeloom.cli.filters.baseline import add_fingerprints
+
+            add_fingerprints(findings, self.options.project.root)
+        for passes in self._filters if findings else ():
+            findings = passes(source, findings)
+        return list(findings)
+
+    def _on_error(self, error: OSError) -> None:
+        self.tally.unread += 1
+        self.console.print_failure(error)
+        self.format.add_failure(error)
+
+
+def files_of(options: Options) -> Iterator[str | OSError]:
+    """The paths of the files that the options name, and what keeps a folder from being listed."""
+    exclusion = options.exclusion
+    for path in find_files([as_named(path) for path in options.paths], exclusion):
+        name = options.stdin_filename
+        is_excluded = isinstance(path, StandardInput) and name and exclusion.leaves_out_named(name)
+        if not is_excluded:
+            yield path
+
+
+def read_source(path: str, options: Options, version: str) -> Source:
+    """One file, or the standard input, analysed; OSError when it can't be read."""
+    name = path
+    if not isinstance(path, StandardInput):
+        data = read_file(path)
+    elif sys.stdin is None:
+        raise OSError(0, "there is no standard input", path)
+    else:
+        data = sys.stdin.buffer.read()
+        name = options.stdin_filename or STDIN_NAME
+    notebook = read_notebook(data, name) if name.lower().endswith(NOTEBOOK_SUFFIX) else None
+    text = data if notebook is None else notebook.text
+    analysis = analyze(text, path=name, python=version, false_hints=options.false_hints)
+    return Source(name, analysis, notebook)
+
+
+def as_named(path: str) -> str:
+    """A path as it is meant on the command line, where - is the standard input."""
+    return StandardInput() if path == StandardInput.NAME else path
+
+
+@contextmanager
+def opened_console(options: Options) -> Iterator[Console]:
+    """The output that the options name."""
+    if options.output is None:
+        yield Console(None, options.color)
+        return
+    with open(options.output, "w", encoding="utf-8", newline="\n") as stream:
+        yield Console(stream, options.color)
+
+
+def print_facts(options: Options) -> None:
+    """Say what holds for a run, on the standard error."""
+    settings = options.project.settings_file or "none"
+    print(f"codeloom: settings: {settings}", file=sys.stderr)
+    print(f"codeloom: Python {options.version} is what sources are written in", file=sys.stderr)
+    print(f"codeloom: {options.jobs or processor_count()} threads", file=sys.stderr)
+
+
+def _filters_of(options: Options) -> tuple[list[Filter], "Changes | None"]:
+    filters: list[Filter] = [not_ignored_by_comments]
+    changes = None
+    if options.select or options.ignore:
+        filters.append(CodeFilter(options.select, options.ignore))
+    try:
+        if options.diff is not None:
+            from codeloom.cli.filters.changes import Changes
+
+            changes = Changes(options.diff)
+            filters.append(changes)
+        if options.baseline is not None:
+            from codeloom.cli.filters.baseline import Baseline
+
+            filters.append(Baseline(options.baseline))
+    except ValueError as error:
+        raise WrongUseError(str(error)) from None
+    return filters, changes

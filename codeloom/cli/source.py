@@ -1,0 +1,104 @@
+"""A file as a run has read it: what it says, and how its places are named."""
+
+import os
+from bisect import bisect_right
+from functools import cached_property
+from typing import Any
+
+from codeloom._analysis import Analysis, Problem, Range
+from codeloom.cli.excerpt import printable
+from codeloom.reading.notebooks import Notebook
+from codeloom.rows import RowTexts
+
+# What a cell of a notebook may do and a module may not.
+_NOTEBOOK_FORMS = ("'await' outside function", "'async ", "asynchronous comprehension")
+
+
+class Source:
+    """A file, or the standard input, with its analysis; for a notebook the one of its cells."""
+
+    def __init__(self, path: str, analysis: Analysis, notebook: Notebook | None = None) -> None:
+        self.path = path
+        self.analysis = analysis
+        self._notebook = notebook
+
+    @property
+    def is_notebook(self) -> bool:
+        """True when rows count in cells."""
+        return self._notebook is not None
+
+    @property
+    def problems(self) -> list[Problem]:
+        """What is wrong, without what a notebook allows."""
+        problems = self.analysis.problems
+        if self._notebook is None:
+            return list(problems)
+        return [problem for problem in problems if not self._is_for_notebooks(problem)]
+
+    @cached_property
+    def rows(self) -> list[str]:
+        """The rows of the text, without their ends."""
+        return RowTexts(self.analysis.text)
+
+    def cell_and_row(self, row: int) -> tuple[int | None, int]:
+        """The cell of a notebook, or None, and the row in it; for a row of the analysis."""
+        return (None, row) if self._notebook is None else self._notebook.place(row)
+
+    def row_label(self, row: int) -> str:
+        """The file and a row in it, as people read it."""
+        cell, row = self.cell_and_row(row)
+        return f"{printable_path(self.path)}:{'' if cell is None else f'cell {cell}:'}{row}"
+
+    def label(self, place: Range) -> str:
+        """The file and where a range begins in it."""
+        return f"{self.row_label(place.row)}:{place.column}:"
+
+    def fields(self, place: Range) -> dict[str, Any]:
+        """The same for programs."""
+        return {**self.path_fields(), **self.place_fields(place)}
+
+    def path_fields(self) -> dict[str, str]:
+        """The path, and its bytes where it is no text."""
+        return path_fields(self.path)
+
+    def place_fields(self, place: Range) -> dict[str, int]:
+        """A range in the file's own rows."""
+        cell, row = self.cell_and_row(place.row)
+        end_cell, end_row = self.cell_and_row(place.end_row)
+        end_column = place.end_column
+        if end_cell != cell:  # what goes on in the next cell is shown in the first one
+            end_row, end_column = row, place.column
+        fields = {} if cell is None else {"cell": cell}
+        return {**fields, "row": row, "column": place.column, "end_row": end_row, "end_column": end_column}
+
+    def line_rows(self, row: int) -> tuple[int, int]:
+        """The first and the last row of the logical lines that lie on a row."""
+        first = last = row
+        i = bisect_right(self._line_rows, (row, 1 << 32))
+        for start, end in self._line_rows[max(i - 2, 0) : i]:  # one may end on it and another begin
+            if end >= row:
+                first, last = min(first, start), max(last, end)
+        return first, last
+
+    @cached_property
+    def _line_rows(self) -> list[tuple[int, int]]:
+        """The rows of all lines that have more than one."""
+        ranges = (line.range for line in self.analysis.lines)
+        return [(place.row, place.end_row) for place in ranges if place.end_row > place.row]
+
+    def _is_for_notebooks(self, problem: Problem) -> bool:
+        return problem.message.startswith(_NOTEBOOK_FORMS) and not problem.source_row[:1].isspace()
+
+
+def printable_path(path: str) -> str:
+    """`path` as a row of a terminal can show it, whatever bytes it is made of."""
+    return printable(os.fsencode(path).decode(errors="backslashreplace"))
+
+
+def path_fields(path: str) -> dict[str, str]:
+    """A path for programs: `path` as text, and `path_bytes` in hexadecimal where it is none."""
+    raw = os.fsencode(path)
+    try:
+        return {"path": raw.decode()}
+    except UnicodeDecodeError:
+        return {"path": raw.decode(errors="replace"), "path_bytes": raw.hex()}

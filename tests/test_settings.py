@@ -1,0 +1,191 @@
+"""What a run is asked: settings, versions, files that are left out."""
+
+import os
+
+import pytest
+
+from codeloom.reading.languages import oldest_admitted, version_named
+
+
+class TestSettings:
+    def test_the_nearest_file_holds(self, write_files, run_cli):
+        write_files(
+            {
+                "pyproject.toml": "[tool.codeloom]\nignore = ['CL4']\npython = '3.11'\n[project]\n",
+                "a/codeloom.toml": "select = ['CL401']\n",
+                "a/pyproject.toml": "[tool.codeloom]\nselect = []\n",
+                "a/b/pyproject.toml": "[project]\nrequires-python = '>=3.8'\n",
+                "a/b/x.py": "f() = 1\ntype A = 1\n)\n",
+                "y.py": "f() = 1\ntype A = 1\n",
+            }
+        )
+
+        def Codes(*arguments):
+            rows = run_cli("check", "--format", "concise", *arguments).stdout.splitlines()
+            return [row.split()[1] for row in rows]
+
+        assert Codes("a/b/x.py") == ["CL401"]
+        assert Codes("y.py") == ["CL701"]
+        assert Codes("y.py", "--python", "3.12") == []
+        assert Codes("y.py", "--ignore", "CL7") == ["CL401"]
+        assert Codes("y.py", "--config", "a/codeloom.toml") == ["CL401"]
+        assert "must be" not in run_cli("check", "-v", "a/b/x.py").stderr
+        assert "a/codeloom.toml" in run_cli("check", "-v", "a/b/x.py").stderr
+        assert "Python 3.8 is" in run_cli("check", "-v", "a/b/x.py").stderr
+
+    @pytest.mark.parametrize(
+        ("text", "words"),
+        [
+            ("selct = []", "codeloom.toml: selct is no setting: did you mean 'select'?"),
+            ("select = 'CL9x'", "codeloom.toml: select: 'CL9X' is no code"),
+            ("jobs = true", "codeloom.toml: jobs: it must be a number"),
+            ("python = 3.12", "codeloom.toml: python: it must be a text"),
+            ("python = '4'", "codeloom.toml: python: python: unknown version '4'"),
+            ("exclude = [1]", "codeloom.toml: exclude: it must be a list of texts"),
+            ("exit-zero = 'no'", "codeloom.toml: exit-zero: it must be true or false"),
+            ("format = 'xml'", "codeloom.toml: format: there is no 'xml' here"),
+            ("a = ", "codeloom.toml: Invalid value"),
+        ],
+    )
+    def test_wrong_ones(self, write_files, run_cli, text, words):
+        write_files({"codeloom.toml": text, "a.py": "x\n"})
+        done = run_cli("check", "a.py")
+        assert (done.returncode, done.stdout) == (2, "")
+        assert words in done.stderr and done.stderr.count("\n") == 1
+
+    def test_a_format_is_for_the_commands_that_have_it(self, write_files, run_cli):
+        write_files({"codeloom.toml": "format = 'github'\n", "a.py": ")\n"})
+        assert run_cli("check", "a.py").stdout.startswith("::error")
+        assert run_cli("names", "a.py").stdout.startswith("a.py:1:1: CL201")
+
+
+class TestVersions:
+    @pytest.mark.parametrize(
+        ("name", "version"),
+        [
+            ("3.12", "3.12"),
+            ("py312", "3.12"),
+            ("3", "3.14"),
+            ("2", "2.7"),
+            ("python3.8", "3.8"),
+            ("3.9.1", "3.9"),
+        ],
+    )
+    def test_names(self, name, version):
+        assert version_named(name) == version
+
+    @pytest.mark.parametrize("name", ["", "4", "3.99", "py", "py3.x", "2.6", "3."])
+    def test_unknown_names(self, name):
+        with pytest.raises(ValueError, match="unknown version"):
+            version_named(name)
+
+    @pytest.mark.parametrize(
+        ("requirement", "version"),
+        [
+            (">=3.9", "3.9"),
+            (">=3.9,<4", "3.9"),
+            ("~=3.8", "3.8"),
+            ("~=3.8.1", "3.8"),
+            ("==3.11.*", "3.11"),
+            (">3.7, !=3.8.*", "3.7"),
+            (">=3.8, !=3.8.*", "3.9"),
+            (">=2.7, !=3.0.*, !=3.1.*", "3.2"),
+            ("<3", "2.7"),
+            (">=3.99", None),
+            ("nonsense", None),
+            ("", "3.0"),
+        ],
+    )
+    def test_requirements(self, requirement, version):
+        assert oldest_admitted(requirement) == version
+
+
+class TestExclusion:
+    @pytest.fixture
+    def found(self, run_cli):
+        return lambda *arguments: run_cli("check", "--show-files", *arguments).stdout.split()
+
+    def test_patterns(self, write_files, found):
+        write_files(dict.fromkeys(["a.py", "b/c.py", "b/d/e.py", "t/b/c.py", ".h/x.py", "n.ipynb"], ""))
+        everything = ["./a.py", "./b/c.py", "./b/d/e.py", "./n.ipynb", "./t/b/c.py"]
+        assert found(".") == everything
+        assert found(".", "--extend-exclude", "/b") == ["./a.py", "./n.ipynb", "./t/b/c.py"]
+        assert found(".", "--extend-exclude", "c.py,") == everything
+        assert found(".", "--extend-exclude", "c.py", "--extend-exclude", "*.ipynb") == [
+            "./a.py",
+            "./b/d/e.py",
+        ]
+        assert "./.h/x.py" in found(".", "--exclude", "b/")
+        assert found("b/c.py", "--extend-exclude", "/b") == ["b/c.py"]
+        assert found("b/c.py", "a.py", "--extend-exclude", "/b", "--force-exclude") == ["a.py"]
+
+    def test_gitignore_files(self, write_files, found):
+        write_files(
+            {
+                **dict.fromkeys(["a.py", "gen/x.py", "b/gen.py", "b/keep.py", "b/c/local.py"], ""),
+                ".git/HEAD": "",
+                ".gitignore": "gen/\nkeep.py\n!\nlocal.py\n",
+                "b/.gitignore": "!keep.py\n/gen.py\n",
+                "b/c/.gitignore": b"\xff\n",
+            }
+        )
+        assert found(".") == ["./a.py", "./b/keep.py"]
+        assert found("b") == ["b/keep.py"]
+        assert len(found(".", "--no-gitignore")) == 5
+        assert found("gen") == ["gen/x.py"]
+        assert found("b/c/local.py", "--force-exclude") == []
+
+    def test_the_standard_input(self, write_files, run_cli):
+        write_files({"codeloom.toml": "exclude = ['gen/']\nforce-exclude = true\n"})
+        done = run_cli("check", "--stdin-filename", "gen/a.py", "-", stdin=b")")
+        assert (done.returncode, done.stdout) == (0, "0 problems in 0 files, 0 logical lines\n")
+        assert run_cli("check", "--stdin-filename", "src/a.py", "-", stdin=b")").stdout.startswith(
+            "src/a.py:1:1:"
+        )
+
+
+def test_completion(run_cli, tmp_path):
+    import subprocess
+
+    script = tmp_path / "bash"
+    script.write_text(run_cli("completion", "bash").stdout)
+    probe = (
+        f'source {script}; complete_words() {{ COMP_WORDS=(codeloom "$@"); COMP_CWORD=$#; _codeloom; '
+        'echo "${COMPREPLY[@]}"; }; complete_words ch; complete_words check --fo; '
+        "complete_words check --format js; complete_words names --format s"
+    )
+    done = subprocess.run(["bash", "-c", probe], capture_output=True, text=True)
+    assert done.stdout.splitlines() == ["check", "--force-exclude --format", "json jsonl", ""], done.stderr
+    assert "#compdef codeloom" in run_cli("completion", "zsh").stdout
+    fish = run_cli("completion", "fish").stdout
+    assert "-l format -x -a 'text concise" in fish and "-f -a check" in fish
+
+
+def test_colours(write_files, run_cli, cli_environment):
+    write_files({"a.py": ")\n"})
+    assert "\033[" not in run_cli("check", "a.py").stdout
+    assert "\033[" in run_cli("check", "--color", "always", "a.py").stdout
+    cli_environment["FORCE_COLOR"] = "1"
+    assert "\033[" in run_cli("check", "a.py").stdout
+    assert "\033[" not in run_cli("check", "--color", "never", "a.py").stdout
+    assert "\033[" not in run_cli("check", "--format", "json", "a.py").stdout
+    cli_environment["NO_COLOR"] = "1"
+    assert "\033[" not in run_cli("check", "a.py").stdout
+
+
+@pytest.mark.skipif(not hasattr(os, "fork"), reason="needs a signal")
+def test_watching(write_files, tmp_path, cli_environment):
+    import signal
+    import subprocess
+    import sys
+
+    folder = write_files({"a.py": ")\n"})
+    command = [sys.executable, "-m", "codeloom", "check", "--watch", "--format", "concise", "a.py"]
+    process = subprocess.Popen(command, cwd=folder, env=cli_environment, stdout=subprocess.PIPE, text=True)
+    try:
+        assert process.stdout.readline() == "a.py:1:1: CL201 invalid syntax\n"
+        (folder / "a.py").write_text("x = )\n")
+        assert process.stdout.readline() == "a.py:1:5: CL201 invalid syntax\n"
+    finally:
+        process.send_signal(signal.SIGINT)
+        process.communicate(timeout=30)
