@@ -13,7 +13,7 @@ import pytest
 from run_python import RunPython
 
 import codeloom
-from codeloom import LineKind, Range, RecordKind, analyze, analyze_file, analyze_paths
+from codeloom import LineKind, Range, RecordKind, analyze, analyze_file, analyze_paths, read_notebook
 
 TEXT = "import a\n\nclass B:\n\tdef f(self, é=1):  # why\n\t\treturn é.c; x = )\n"
 
@@ -126,7 +126,7 @@ class TestItems:
         (lambda: analyze_paths("a.py"), TypeError, "paths must be an iterable"),
         (lambda: analyze_paths([], jobs=0), ValueError, "jobs must be at least 1"),
         (lambda: analyze_paths([], jobs="2"), TypeError, "jobs must be an int"),
-        (lambda: analyze_file("a.ipynb"), OSError, "notebooks aren't read"),
+        (lambda: read_notebook(3), TypeError, "path must be"),
     ],
 )
 def test_wrong_arguments(call, error, words):

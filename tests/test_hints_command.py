@@ -82,9 +82,11 @@ def test_an_api_of_values(tmp_path):
 
 
 def test_depth():
-    text = "[" * 20_000 + "]" * 20_000
+    text = "[" * 199 + "]" * 199
     (signature,) = Signatures(f"def f(a={text}): pass")
     assert signature.arguments[0].default.text == text
+    (signature,) = Signatures(f"def f(a={'[' * 20_000}{']' * 20_000}): pass")
+    assert signature.problem.code == "CL904"
     (signature,) = Signatures(f"def f({'(' * 20_000}a,{')' * 20_000}): pass", "2.7")
     assert signature.arguments is None
 
