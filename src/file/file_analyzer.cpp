@@ -8,6 +8,7 @@
 #include "line/fault_words.h"
 #include "line/line_length.h"
 #include "rules/text_checker.h"
+#include "scopes/declarations.h"
 #include "scopes/name_collector.h"
 #include "syntax/forms.h"
 #include "tokenizer/tokenizer.h"
@@ -60,7 +61,8 @@ class CFileAnalyzer final : CTreeObserver {
           _fFalseHints(text),
           _fChecker(LanguageOf(settings.version), _fResult.problems) {
         _fAnalyzer.emplace(LanguageOf(settings.version));
-        if (settings.wants_names) _fNames.emplace(LanguageOf(settings.version), _fResult.names);
+        if (settings.wants_names || MayDeclareNames(text))
+            _fNames.emplace(LanguageOf(settings.version), _fResult.names);
     }
 
     CFileAnalysis Run();
@@ -72,6 +74,7 @@ class CFileAnalyzer final : CTreeObserver {
     void _Enter(const CRawLogical& logical);
     void _Leave(const CRawLogical& logical, bool has_fault);
     CLineResult _Analyze(const CRawLogical& logical, const CLine& line);
+    void _FinishNames();
     void _AddUnreadable();
     void _AddFault(const CRawLogical& logical, const CFault& fault);
     void _AddProblem(ECode code, uint32_t start, uint32_t end, std::string message);
@@ -93,7 +96,7 @@ CFileAnalysis CFileAnalyzer::Run() {
     CRawLogical logical;
     while (tokenizer.NextLogical(logical)) _AnalyzeLine(logical);
     _fChecker.Finish();
-    if (_fNames) _fNames->Finish();
+    if (_fNames) _FinishNames();
     _AddUnreadable();
     std::stable_sort(_fResult.problems.begin(), _fResult.problems.end(),
                      [](const CProblem& one, const CProblem& other) { return one.start < other.start; });
@@ -171,6 +174,12 @@ void CFileAnalyzer::_AddFault(const CRawLogical& logical, const CFault& fault) {
 
 void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::string message) {
     _fResult.problems.push_back({code, start, end, std::move(message), {}, {}});
+}
+
+void CFileAnalyzer::_FinishNames() {
+    _fNames->Finish();
+    CheckDeclarations(_fResult.names, _fSettings.version, _fResult.problems);
+    if (!_fSettings.wants_names) _fResult.names = {};
 }
 
 void CFileAnalyzer::_AddUnreadable() {

@@ -17,8 +17,14 @@ constexpr int kDefersAnnotations = 314;  // PEP 649
 uint32_t COccurrenceFinder::_AddScope(EScopeKind kind, uint32_t name, uint32_t parent,
                                       const CTreeNode& node) {
     const CSpan span = SpanOf(*_fTree, node);
-    _fFound.scopes.push_back({kind, false, name, parent, span.start + _fShift, span.end + _fShift});
+    _fFound.scopes.push_back({kind, false, false, name, parent, span.start + _fShift, span.end + _fShift});
     return static_cast<uint32_t>(_fFound.scopes.size() - _fFirstScope);
+}
+
+uint32_t COccurrenceFinder::_AddAnnotationScope(uint32_t parent, const CTreeNode& node, bool is_text) {
+    const uint32_t scope = _AddScope(EScopeKind::kAnnotation, _fNoName, parent, node);
+    _fFound.scopes.back().is_text = is_text;
+    return scope;
 }
 
 // Functions
@@ -61,7 +67,7 @@ void COccurrenceFinder::_VisitLambda(const CTreeNode& node) {
 void COccurrenceFinder::_VisitAnnotation(const CTreeNode& node, uint32_t header_scope) {
     if (!_DefersAnnotations()) return _VisitIn(header_scope, node);
     if (_fAnnotationScope == 0)
-        _fAnnotationScope = _AddScope(EScopeKind::kAnnotation, _fNoName, header_scope, node);
+        _fAnnotationScope = _AddAnnotationScope(header_scope, node, _fHasDeferredAnnotations);
     const uint32_t scope = _fAnnotationScope;
     _VisitIn(scope, node);
     CInnerScope& added = _fFound.scopes[_fFirstScope + scope - 1];

@@ -58,7 +58,7 @@ void COccurrenceFinder::Take(const CRawLogical& part, const CTree& tree) {
             _fFlags |= around->flags;
         }
         if ((_fFlags & COccurrence::kInQuotes) != 0 && !_IsInAnnotation(_fScope))
-            _fScope = _AddScope(EScopeKind::kAnnotation, _fNoName, _fScope, tree.fRoot);
+            _fScope = _AddAnnotationScope(_fScope, tree.fRoot, true);
     }
     _Visit(tree.fRoot);
 }
@@ -68,7 +68,7 @@ void COccurrenceFinder::TakeHint(const CTree& tree, const CTreeNode& node, uint3
     _fFlags = COccurrence::kInComment;
     _fShift = shift;
     _fScope = 0;
-    _fScope = _AddScope(EScopeKind::kAnnotation, _fNoName, 0, node);
+    _fScope = _AddAnnotationScope(0, node, true);
     const bool has_embedded = std::exchange(_fHasEmbedded, false);
     _Visit(node);
     _fHasEmbedded = has_embedded;

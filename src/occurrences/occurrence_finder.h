@@ -87,6 +87,7 @@ class COccurrenceFinder {
     void _VisitClauses(const CTreeNode& first, uint32_t outer_scope);
     EScopeKind _ComprehensionKind(const CTreeNode& owner) const;
     uint32_t _AddScope(EScopeKind kind, uint32_t name, uint32_t parent, const CTreeNode& node);
+    uint32_t _AddAnnotationScope(uint32_t parent, const CTreeNode& node, bool is_text);
     bool _DefersAnnotations() const;
     bool _IsInAnnotation(uint32_t scope) const;
 

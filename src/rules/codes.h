@@ -69,6 +69,13 @@ enum class ECode : uint16_t {
     kMisplacedPattern = 456,
     kPatternNotConstant = 457,
 
+    kDeclaredParameter = 501,
+    kDeclaredAfterUse = 502,
+    kDeclaredAnnotated = 503,
+    kNonlocalAndGlobal = 504,
+    kNonlocalWithoutBinding = 505,
+    kNonlocalTypeParameter = 506,
+
     kInvalidHint = 601,
 
     kNewerForm = 701,

@@ -89,6 +89,7 @@ void CScopeBuilder::_AddScopes() {
             CScope& scope = scopes[i + 1];
             scope.kind = inner[i].kind;
             scope.is_lost = inner[i].is_lost;
+            scope.is_text = inner[i].is_text;
             scope.name = inner[i].name;
             scope.parent = _fNames.ScopeOf(line, inner[i].parent);
             scope.start = inner[i].start;
@@ -275,12 +276,12 @@ void CScopeBuilder::_Bind(uint32_t symbol_i, EBinding binding, uint32_t home) {
     _fScopes.symbols[symbol_i].home = home;
 }
 
-// The scopes between one that uses a name and the one that binds it hand it on.
+// The scopes between one that uses a name and the one that binds it hand it on, but for what is text only.
 void CScopeBuilder::_PassOn(uint32_t symbol_i, uint32_t home) {
     const uint32_t name = _fScopes.symbols[symbol_i].name;
     const uint32_t last = _fScopes.symbols[home].scope;
-    uint32_t scope = _fScopes.scopes[_fScopes.symbols[symbol_i].scope].parent;
-    for (; scope != last; scope = _fScopes.scopes[scope].parent) {
+    uint32_t scope = _fScopes.symbols[symbol_i].scope;
+    while (!_fScopes.scopes[scope].is_text && (scope = _fScopes.scopes[scope].parent) != last) {
         const size_t count = _fScopes.symbols.size();
         const uint32_t passed_i = _fSymbols.FindOrAdd(scope, name);
         if (_fScopes.symbols.size() == count) continue;

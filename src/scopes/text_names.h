@@ -24,6 +24,7 @@ struct CLineNames {
     uint32_t first_scope = 0;  // among the scopes that begin on lines
     uint32_t scope = 0;        // around the line, among all
     uint32_t end = 0;          // of the line in bytes; zero for a comment
+    bool is_in_doubt = false;  // a fault may have moved what is around it
 };
 
 struct CTextNames {
