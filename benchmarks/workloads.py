@@ -124,8 +124,12 @@ def search_path() -> str:
 
 
 def read(paths: Iterable[str]) -> list[bytes]:
-    """The bytes of files."""
-    return [Path(path).read_bytes() for path in paths]
+    """The bytes of files, with as little else as can be."""
+    sources = []
+    for path in paths:
+        with open(path, "rb") as file:
+            sources.append(file.read())
+    return sources
 
 
 if __name__ == "__main__":

@@ -24,6 +24,7 @@ _FOREIGN_MARKS = {
     codecs.BOM_UTF16_LE: "UTF-16",
     codecs.BOM_UTF16_BE: "UTF-16",
 }
+_FIRST_OF_FOREIGN_MARKS = tuple({mark[:1] for mark in _FOREIGN_MARKS})
 _DEFAULT_REMEDY = "save the file as UTF-8, or name its encoding in the first row, as in `# coding: latin-1`"
 
 
@@ -80,7 +81,7 @@ class _Encoding:
 
 
 def _encoding_of(data: bytes) -> _Encoding:
-    for mark, name in _FOREIGN_MARKS.items():
+    for mark, name in _FOREIGN_MARKS.items() if data.startswith(_FIRST_OF_FOREIGN_MARKS) else ():
         if data.startswith(mark):
             message = f"the file is {name}, which Python doesn't read as source: save it as UTF-8"
             return _Encoding(name, fault=(0, 0, message))
@@ -104,6 +105,9 @@ def _encoding_of(data: bytes) -> _Encoding:
 
 def _cookie(data: bytes) -> tuple[int, int, str] | None:
     """The name of the encoding in the coding comment, after its row, from 1, and its offset."""
+    second_row_end = data.find(b"\n", data.find(b"\n") + 1)
+    if data.find(b"coding", 0, second_row_end) < 0:  # nearly all files
+        return None
     start = 0
     for row in (1, 2):
         row_end = _ROW_END.search(data, start)

@@ -25,7 +25,7 @@ void MakeRoom(Items& items, size_t for_line, size_t read, size_t text_size) {
     if (items.capacity() - items.size() >= for_line) return;
     const double share = static_cast<double>(text_size) / static_cast<double>(std::max<size_t>(read, 1));
     const size_t expected =
-        static_cast<size_t>(static_cast<double>(items.size()) * std::min(share, 2.0) * 1.05);
+        static_cast<size_t>(static_cast<double>(items.size()) * std::min(share, 4.0) * 1.05);
     items.reserve(std::max(expected, items.size() + items.size() / 4) + 2 * for_line);
 }
 

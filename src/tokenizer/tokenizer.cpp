@@ -103,7 +103,7 @@ bool CTokenizer::_CollectTokens(CRawLogical& logical, size_t forced_end) {
         const char c = ByteAt(text, pos);
         switch (ByteKind(c)) {
             case EByteKind::kNameStart:
-                _AddName(logical);
+                _AddName(logical, text);
                 break;
             case EByteKind::kOpener:
                 _Add(logical, pos + 1, BracketType(c), EWord::kNone);
@@ -120,7 +120,7 @@ bool CTokenizer::_CollectTokens(CRawLogical& logical, size_t forced_end) {
                     _EndAtSeparator(logical);
                     return true;
                 }
-                _AddOperator(logical);
+                _AddOperator(logical, text);
                 break;
             case EByteKind::kBlank:
                 ++_fPlace.pos;
@@ -129,7 +129,7 @@ bool CTokenizer::_CollectTokens(CRawLogical& logical, size_t forced_end) {
                 if (IsDigit(ByteAt(text, pos + 1))) {
                     _AddToken(logical);
                 } else {
-                    _AddOperator(logical);
+                    _AddOperator(logical, text);
                 }
                 break;
             default:
@@ -166,8 +166,7 @@ inline void CTokenizer::_Add(CRawLogical& logical, size_t end, int16_t type, EWo
     _fPlace.pos = end;
 }
 
-inline void CTokenizer::_AddName(CRawLogical& logical) {
-    const std::string_view text = _fLexer.Text();
+inline void CTokenizer::_AddName(CRawLogical& logical, std::string_view text) {
     const size_t pos = _fPlace.pos;
     const size_t end = SkipNameBytes(text, pos);
     if (HasTrait(ByteAt(text, end), kMayContinueName)) [[unlikely]]
@@ -179,8 +178,8 @@ inline void CTokenizer::_AddName(CRawLogical& logical) {
         _NoteLambda();
 }
 
-inline void CTokenizer::_AddOperator(CRawLogical& logical) {
-    const COperator op = OperatorAt(_fLexer.Text(), _fPlace.pos);
+inline void CTokenizer::_AddOperator(CRawLogical& logical, std::string_view text) {
+    const COperator op = OperatorAt(text, _fPlace.pos);
     if (op.length == 0) [[unlikely]]
         return _AddToken(logical);
     _Add(logical, _fPlace.pos + op.length, op.type, op.word);

@@ -53,8 +53,8 @@ class CTokenizer {
     bool _CollectTokens(CRawLogical& logical, size_t forced_end);
     EStep _SkipRows(const CRawLogical& logical, size_t forced_end);
     void _Add(CRawLogical& logical, size_t end, int16_t type, EWord word);
-    void _AddName(CRawLogical& logical);
-    void _AddOperator(CRawLogical& logical);
+    void _AddName(CRawLogical& logical, std::string_view text);
+    void _AddOperator(CRawLogical& logical, std::string_view text);
     void _AddToken(CRawLogical& logical);
     void _Note(size_t pos, CLexedToken token);
     void _NoteSign(COperator op);
