@@ -41,14 +41,14 @@ def test_output(write_files, run_cli):
     write_files({"a b.py": "if x:\n\ty = '日本' )\r\n", "c.py": b"'\xe9'\n" + b"z = 1 ) " + b"+ 1 " * 60})
     done = run_cli("check", "a b.py", "c.py")
     assert done.stdout.splitlines() == [
-        "a b.py:2:11: CL201 invalid syntax",
+        "a b.py:2:11: CL203 unmatched ')'",
         "    2 |     y = '日本' )",
         "      |                ^",
         "c.py:1:2: CL101 byte 0xE9 can't be read as utf-8: save the file as UTF-8, or name its encoding "
         "in the first row, as in `# coding: latin-1`",
         "    1 | '\ufffd'",
         "      |  ^",
-        "c.py:2:7: CL201 invalid syntax",
+        "c.py:2:7: CL203 unmatched ')'",
         "    2 | " + ("z = 1 ) " + "+ 1 " * 60)[:86] + "...",
         "      |       ^",
         "3 problems in 2 of 2 files, 4 logical lines",
@@ -62,11 +62,11 @@ def test_the_examples(run_cli):
     done = run_cli("check", EXAMPLES / "broken")
     places = re.findall(r"^.*/broken/(.*):(\d+:\d+): ", done.stdout, re.MULTILINE)
     assert {name: [place for other, place in places if other == name] for name, _ in places} == {
-        "fstring_field.py": ["4:34", "5:54", "8:16", "14:38"],
-        "half_written.py": ["4:20", "6:8", "10:28", "16:44", "20:80", "23:66"],
+        "fstring_field.py": ["4:31", "5:40", "8:12", "14:38"],
+        "half_written.py": ["4:14", "6:7", "10:17", "16:43", "20:65", "23:66"],
         "missing_quote.py": ["3:12"],
         "tabs_and_wide_text.py": ["6:34", "7:22", "8:45"],
-        "unclosed_bracket.py": ["10:42"],
+        "unclosed_bracket.py": ["10:24"],
     }
 
 
@@ -184,12 +184,12 @@ class TestFiles:
             (tmp_path / os.fsdecode(b"\xff\x1b.py")).write_text(")")
         except OSError:
             pytest.skip("this file system takes only text")
-        assert run_cli("check", ".").stdout.startswith("./\\xff\ufffd.py:1:1: CL201 invalid syntax")
+        assert run_cli("check", ".").stdout.startswith("./\\xff\ufffd.py:1:1: CL203 unmatched ')'")
 
     def test_standard_input(self, checked, run_cli):
         assert checked("-", "-", stdin=b")") == ["<stdin>"]
         done = run_cli("check", "-", stdin=b"# coding: latin-1\r'\xe9' )\r")
-        assert done.stdout.splitlines()[:2] == ["<stdin>:2:5: CL201 invalid syntax", "    2 | 'é' )"]
+        assert done.stdout.splitlines()[:2] == ["<stdin>:2:5: CL203 unmatched ')'", "    2 | 'é' )"]
 
 
 class TestEndings:

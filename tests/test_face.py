@@ -63,7 +63,7 @@ class TestItems:
     def test_problems(self):
         analysis = analyze(TEXT)
         (problem,) = analysis.problems
-        assert str(problem) == "<string>:5:19: CL201 invalid syntax"
+        assert str(problem) == "<string>:5:19: CL203 unmatched ')'"
         assert (problem.range, problem.related, problem.hint) == (Range(5, 19, 5, 20), (), None)
         assert analysis.lines[-1].problems == analysis.problems and not analysis.lines[-1].records
 

@@ -88,7 +88,7 @@ def test_false_hints_are_no_problems(comment):
         ("def f(a):  # type: (int] -> str\n  pass", (1, 24)),
         # The line's own fault beside a false hint.
         ("def f(a, b)):  # type: ignore[override]", (1, 12)),
-        ("x = f'{a b}'  # type: ignore[a]", (1, 10)),
+        ("x = f'{a b}'  # type: ignore[a]", (1, 8)),
     ],
 )
 def test_faults_that_remain(text, place):

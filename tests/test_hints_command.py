@@ -111,11 +111,15 @@ def test_what_a_signature_is_written_as():
     ("arguments", "status", "rows"),
     [
         (["a.py"], 0, ["a.py:1:1: def f(a)", "    a      int", "    gives  int 1"]),
-        (["b.py", "a.py"], 1, ["b.py:1:9: CL201 invalid syntax", "    1 | def f(a b): pass"]),
-        (["absent.py", "b.py"], 2, ["b.py:1:9: CL201 invalid syntax"]),
+        (
+            ["b.py", "a.py"],
+            1,
+            ["b.py:1:7: CL211 invalid syntax. Perhaps you forgot a comma?", "    1 | def f(a b): pass"],
+        ),
+        (["absent.py", "b.py"], 2, ["b.py:1:7: CL211 invalid syntax. Perhaps you forgot a comma?"]),
         (["--python", "2.7", "old.py"], 0, ["old.py:1:1: def f(a, b, c)", "    a  = 1, int"]),
         (["c.py"], 0, ["c.py:1:1: def f(a)"]),
-        (["--false-hints", "c.py"], 1, ["c.py:1:20: CL601 invalid syntax"]),
+        (["--false-hints", "c.py"], 1, ["c.py:1:20: CL601 invalid syntax in commented type hint"]),
     ],
 )
 def test_the_command(run_cli, write_files, arguments, status, rows):
@@ -142,4 +146,4 @@ def test_rows_of_json(run_cli, write_files):
         {"name": "a", "prefix": "", "hint": "int", "default": {"row": 1, "type": "int", "text": "1"}},
         {"name": "b", "prefix": "*", "hint": None, "default": None},
     ]
-    assert (g["type"], g["row"], g["column"], g["message"]) == ("problem", 4, 9, "invalid syntax")
+    assert (g["type"], g["row"], g["column"], g["code"]) == ("problem", 4, 7, "CL211")

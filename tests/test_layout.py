@@ -17,6 +17,7 @@ STEPS = [
     ["rules"],
     ["occurrences"],
     ["scopes"],
+    ["causes"],
     ["file"],
     ["host"],
     ["neighbours", "strutils", "_fastaccess", "symbolinfo"],

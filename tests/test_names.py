@@ -86,7 +86,7 @@ def test_rows_of_json(run_cli, write_files):
         ["f.py", 1, 7, 1, 8, "a", "set", None, "é"],
         ["f.py", 1, 7, 1, 8, "a", "literal", "int: 1", "é"],
     ]
-    assert (problem["type"], problem["row"], problem["code"], done.returncode) == ("problem", 2, "CL201", 1)
+    assert (problem["type"], problem["row"], problem["code"], done.returncode) == ("problem", 2, "CL203", 1)
 
 
 LIMIT = "the line is nested too deep for a full walk: names further in have no records"

@@ -4,13 +4,12 @@
 #include <cassert>
 #include <optional>
 
+#include "causes/causes.h"
 #include "file/method_hints.h"
-#include "line/fault_words.h"
 #include "line/line_length.h"
 #include "rules/text_checker.h"
 #include "scopes/declarations.h"
 #include "scopes/name_collector.h"
-#include "syntax/forms.h"
 #include "tokenizer/tokenizer.h"
 #include "typing/false_hints.h"
 
@@ -41,15 +40,6 @@ bool ImportsPrintFunction(const CRawLogical& logical) {
     return false;
 }
 
-ECode CodeOf(const CFault& fault, const CRawLogical& logical) {
-    const ELogicalType part = PartAtFault(fault, logical).type;
-    if (fault.kind == EFault::kNewerForm)
-        return fault.form->version == CForm::kNone ? ECode::kEndedForm : ECode::kNewerForm;
-    const bool is_hint = fault.kind == EFault::kInvalidHint || part == ELogicalType::kStringifiedTypeHint ||
-                         part == ELogicalType::kCommentedTypeHint;
-    return is_hint ? ECode::kInvalidHint : ECode::kInvalidSyntax;
-}
-
 // One analysis of one text.
 class CFileAnalyzer final : CTreeObserver {
   public:
@@ -60,9 +50,9 @@ class CFileAnalyzer final : CTreeObserver {
           _fLength(text.size()),
           _fFalseHints(text),
           _fChecker(LanguageOf(settings.version), _fResult.problems) {
-        _fAnalyzer.emplace(LanguageOf(settings.version));
         if (settings.wants_names || MayDeclareNames(text))
             _fNames.emplace(LanguageOf(settings.version), _fResult.names);
+        _SetLanguage(LanguageOf(settings.version));
     }
 
     CFileAnalysis Run();
@@ -70,6 +60,7 @@ class CFileAnalyzer final : CTreeObserver {
   private:
     void Take(const CRawLogical& part, const CTree& tree) override;
     void TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) override;
+    void _SetLanguage(const CLanguage& language);
     void _AnalyzeLine(const CRawLogical& logical);
     void _Enter(const CRawLogical& logical);
     void _Leave(const CRawLogical& logical, bool has_fault);
@@ -85,7 +76,9 @@ class CFileAnalyzer final : CTreeObserver {
     const CUnreadable& _fUnreadable;
     CLengthLimits _fLength;
     CFalseHints _fFalseHints;
+    const CLanguage* _fLanguage = nullptr;
     std::optional<CLineAnalyzer> _fAnalyzer;
+    std::optional<CCauses> _fCauses;  // made for the first fault
     CFileAnalysis _fResult;
     CTextChecker _fChecker;
     std::optional<CNameCollector> _fNames;
@@ -124,6 +117,12 @@ void CFileAnalyzer::_Leave(const CRawLogical& logical, bool has_fault) {
     if (_fNames) _fNames->EndLine(logical, has_fault, _fChecker.Blocks());
 }
 
+void CFileAnalyzer::_SetLanguage(const CLanguage& language) {
+    _fLanguage = &language;
+    _fAnalyzer.emplace(language);
+    _fCauses.reset();
+}
+
 void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
     assert(!logical.tokens.empty());
     const auto first_record = static_cast<uint32_t>(_fResult.records.records.size());
@@ -132,7 +131,7 @@ void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
     MakeRoom(_fResult.lines, 1, line.start, _fText.size());
     _fResult.lines.push_back(line);
     if (_fSettings.version < 300 && ImportsPrintFunction(logical))
-        _fAnalyzer.emplace(LanguageOf(_fSettings.version, true));
+        _SetLanguage(LanguageOf(_fSettings.version, true));
 
     _Enter(logical);
     if (const ETooLong too_long = _fLength.Take(logical); too_long != ETooLong::kNot) [[unlikely]] {
@@ -168,8 +167,8 @@ CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical, const CLine& lin
 void CFileAnalyzer::_AddFault(const CRawLogical& logical, const CFault& fault) {
     // `except A, a.b:` binds what isn't a name; in Python 2 that is sound.
     if (fault.kind == EFault::kExceptTarget && _fSettings.version < 300) return;
-    const CSpan place = PlaceOf(fault, logical);
-    _AddProblem(CodeOf(fault, logical), place.start, place.end, MessageOf(fault, logical));
+    if (!_fCauses) _fCauses.emplace(*_fLanguage);
+    _fResult.problems.push_back(_fCauses->Of(fault, logical));
 }
 
 void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::string message) {

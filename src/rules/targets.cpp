@@ -100,8 +100,12 @@ class CTargetCheck {
         if (_IsDelete()) {
             _fContext.Report(ECode::kCannotDelete, target, Joined("cannot delete ", what));
         } else {
-            _fContext.Report(ECode::kCannotAssign, target, Joined("cannot assign to ", what),
-                             may_be_comparison && MayBeComparison(kind) ? "use '==' to compare" : "");
+            const bool is_slip =
+                may_be_comparison && _fUse == ETargetUse::kStatement && MayBeComparison(kind);
+            _fContext.Report(ECode::kCannotAssign, target,
+                             Joined("cannot assign to ", what,
+                                    is_slip ? " here. Maybe you meant '==' instead of '='?" : ""),
+                             is_slip ? "write '==' to compare" : "");
         }
         return false;
     }
@@ -152,7 +156,7 @@ void CheckAssignment(const CRuleContext& context, const CTreeNode& statement) {
         if (IsYield(target))
             return context.Report(ECode::kCannotAssign, target,
                                   "assignment to yield expression not possible");
-        if (!CTargetCheck(context, ETargetUse::kAssign).Check(target)) return;
+        if (!CTargetCheck(context, ETargetUse::kStatement).Check(target)) return;
     }
 }
 

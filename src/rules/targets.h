@@ -5,7 +5,8 @@
 
 namespace codeloom {
 
-enum class ETargetUse : uint8_t { kAssign, kDelete };
+// What an assignment statement binds, and what any other statement does.
+enum class ETargetUse : uint8_t { kStatement, kAssign, kDelete };
 
 // One mark for one target.
 void CheckTarget(const CRuleContext& context, const CTreeNode& target, ETargetUse use);

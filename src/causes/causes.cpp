@@ -1,0 +1,146 @@
+#include "causes/causes.h"
+
+#include <array>
+#include <cassert>
+
+#include "causes/recognisers.h"
+#include "line/fault_words.h"
+#include "syntax/forms.h"
+
+namespace codeloom {
+
+namespace {
+
+using CRecogniser = CCause (*)(const CFaultyLine& line);
+using CTokenRecogniser = CCause (*)(const CFaultyLine& line, int token_i);
+
+// What may be wrong with a token by itself.
+constexpr auto kTokenCauses = std::to_array<CTokenRecogniser>(
+    {UnterminatedString, UnknownPrefix, AfterBackslash, ForeignSign, InvalidNumber, InvalidCharacter});
+
+// What may be wrong where the parser stopped, in the order in which it is asked: what is certain comes before
+// what is likely, and what fits one statement before what fits all.
+constexpr auto kGrammarCauses = std::to_array<CRecogniser>({
+    UnfinishedField,
+    EmptyField,
+    Conversion,
+    Backquotes,
+    UnmatchedCloser,
+    CallWithoutParentheses,
+    RaiseWithComma,
+    ParameterFault,
+    NeverClosed,
+    ImportFault,
+    ExceptFault,
+    ElseIf,
+    DefinitionHead,
+    NestedHeader,
+    MissingColon,
+    PatternFault,
+    NotAfterOperator,
+    Increment,
+    SplitOperator,
+    ArgumentFault,
+    AssignmentForComparison,
+    WalrusStatement,
+
+    DictionaryFault,
+    ComprehensionFault,
+    MissingIn,
+    MissingElse,
+    FieldExpression,
+    StarHere,
+    YieldHere,
+    Misspelled,
+    KeywordAsName,
+    StatementInExpression,
+    MissingComma,
+    StillOpen,
+    SideBySide,
+    MissingExpression,
+    MissingToken,
+    EndOfField,
+});
+
+CCause TokenCause(const CFaultyLine& line, int token_i) {
+    for (const CTokenRecogniser recogniser : kTokenCauses)
+        if (CCause cause = recogniser(line, token_i)) return cause;
+    return {};
+}
+
+// A sign that belongs to no token of the language ends what the parser can judge.
+CCause LaterTokenCause(const CFaultyLine& line) {
+    for (int i = line.At() + 1; i < line.Count(); ++i)
+        if (line.Is(i, kTokenId_ERRORTOKEN))
+            if (CCause cause = TokenCause(line, i)) return cause;
+    return {};
+}
+
+CProblem CauseOfSyntax(const CFaultyLine& line) {
+    const bool is_conversion = line.IsField() && line.Text(line.At()) == "!";
+    if (!is_conversion)
+        if (CCause cause = TokenCause(line, line.At())) return *cause;
+    for (const CRecogniser recogniser : kGrammarCauses)
+        if (CCause cause = recogniser(line)) return *cause;
+    if (CCause cause = LaterTokenCause(line)) return *cause;
+    return line.Problem(ECode::kInvalidSyntax, line.At(), line.At(), "invalid syntax");
+}
+
+// `except A as a.b:`
+CProblem CauseOfTarget(const CFaultyLine& line) {
+    const int colon_i = line.FindBack(0, line.Count(), kTokenId_COLON);
+    const int last_i = (colon_i < 0 ? line.Count() : colon_i) - 1;
+    const int as_i = line.FindBack(0, last_i, EWord::kAs);
+    const std::string_view kind = line.Is(last_i, kTokenId_RSQB)   ? "subscript"
+                                  : line.Is(last_i, kTokenId_RPAR) ? "function call"
+                                  : line.Is(last_i, kTokenId_NAME) ? "attribute"
+                                                                   : "expression";
+    return line.Problem(ECode::kCannotAssign, as_i + 1, last_i,
+                        Joined("cannot use except statement with ", kind), "bind a plain name");
+}
+
+bool IsHint(const CFault& fault, ELogicalType part) {
+    return fault.kind == EFault::kInvalidHint || part == ELogicalType::kStringifiedTypeHint ||
+           part == ELogicalType::kCommentedTypeHint;
+}
+
+CProblem CauseOfHint(const CFault& fault, const CRawLogical& line, const CFaultyLine& faulty) {
+    const bool is_stringified = faulty.LineType() == ELogicalType::kStringifiedTypeHint;
+    CProblem problem = faulty.Problem(
+        ECode::kInvalidHint, faulty.At(), faulty.At(),
+        is_stringified ? "invalid syntax in stringified type hint" : "invalid syntax in commented type hint");
+    const CSpan place = PlaceOf(fault, line);
+    if (place.start == place.end) return problem;
+    problem.start = place.start;
+    problem.end = place.end;
+    return problem;
+}
+
+}  // namespace
+
+CCauses::CCauses(const CLanguage& language) : _fLanguage(language) {}
+
+CCauses::~CCauses() = default;
+
+CProblem CCauses::Of(const CFault& fault, const CRawLogical& line) {
+    assert(fault && fault.kind != EFault::kTooLong);
+    if (_fProbe == nullptr) _fProbe = std::make_unique<CLineProbe>(_fLanguage);
+    const CRawLogical& part = PartAtFault(fault, line);
+    const CFaultyLine faulty(line, part, fault.token_i, _fLanguage, *_fProbe);
+    const int at = faulty.At();
+    if (IsHint(fault, part.type)) return CauseOfHint(fault, line, faulty);
+    switch (fault.kind) {
+        case EFault::kNewerForm:
+            return faulty.Problem(fault.form->version == CForm::kNone ? ECode::kEndedForm : ECode::kNewerForm,
+                                  at, at, MessageOf(fault, line));
+        case EFault::kBareGenerator:
+            return faulty.Problem(ECode::kBareGenerator, at, at,
+                                  "Generator expression must be parenthesized");
+        case EFault::kExceptTarget:
+            return CauseOfTarget(faulty);
+        default:
+            return CauseOfSyntax(faulty);
+    }
+}
+
+}  // namespace codeloom

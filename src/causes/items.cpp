@@ -1,0 +1,83 @@
+// What is wrong between brackets: arguments, entries of dictionaries, comprehensions.
+
+#include "causes/recognisers.h"
+
+namespace codeloom {
+
+namespace {
+
+bool EndsItem(int type) {
+    return type == kTokenId_COMMA || IsCloserType(type);
+}
+
+}  // namespace
+
+CCause ArgumentFault(const CFaultyLine& line) {
+    const int i = line.At();
+    const int opener_i = line.OpenerBefore(i);
+    const bool is_starred = line.Is(opener_i - 1, kTokenId_STAR);
+    if (opener_i < 0 || (!line.FollowsOperand(opener_i) && !is_starred)) return {};
+    const int start = line.ItemStart(i);
+    if (EndsItem(line.Type(i)) && line.Is(i - 1, kTokenId_EQUAL))
+        return line.Problem(ECode::kMissingArgumentValue, start, i - 1, "expected argument value expression");
+    if (line.Is(i, kTokenId_EQUAL) && line.Is(start, kTokenId_STAR))
+        return line.Problem(ECode::kCannotAssign, start, i - 1,
+                            "cannot assign to iterable argument unpacking");
+    if (line.Is(i, kTokenId_EQUAL) && line.Is(start, kTokenId_DOUBLESTAR))
+        return line.Problem(ECode::kCannotAssign, start, i - 1,
+                            "cannot assign to keyword argument unpacking");
+    const bool has_star = line.Is(start, kTokenId_STAR);
+    const bool is_star_alone =
+        line.Is(i - 1, kTokenId_STAR) && (EndsItem(line.Type(i)) || line.Is(i, kTokenId_COLON));
+    if (has_star && (is_star_alone || (line.Is(i, kTokenId_COLON) && line.OpenerBefore(i) > opener_i)))
+        return line.Problem(ECode::kMisplacedStar, start, i - 1, "Invalid star expression");
+    const bool is_keyword_generator =
+        line.Is(i, EWord::kFor) && line.IsName(start) && line.Is(start + 1, kTokenId_EQUAL);
+    if (line.Is(i, kTokenId_COLON) && is_starred)
+        return line.Problem(ECode::kMisplacedStar, opener_i - 1, i - 1, "Invalid star expression");
+    if (is_keyword_generator)
+        return line.Problem(ECode::kAssignmentForComparison, start, start + 1,
+                            "invalid syntax. Maybe you meant '==' or ':=' instead of '='?",
+                            "put parentheses around a generator expression that is a keyword's value");
+    return {};
+}
+
+CCause DictionaryFault(const CFaultyLine& line) {
+    const int i = line.At();
+    const int opener_i = line.OpenerBefore(i);
+    if (opener_i < 0 || !line.Is(opener_i, kTokenId_LBRACE)) return {};
+    const int start = line.ItemStart(i);
+    const int colon_i = line.FindBack(start, i, kTokenId_COLON);
+    if (colon_i == i - 1 && EndsItem(line.Type(i)))
+        return line.Problem(ECode::kDictionaryEntry, start, colon_i,
+                            "expression expected after dictionary key and ':'");
+    if (colon_i == i - 1 && line.Is(i, kTokenId_STAR))
+        return line.Problem(ECode::kDictionaryEntry, i, i,
+                            "cannot use a starred expression in a dictionary value");
+    const bool is_dictionary = line.FindBack(opener_i + 1, start, kTokenId_COLON) >= 0;
+    if (is_dictionary && colon_i < 0 && EndsItem(line.Type(i)) && i > start && line.Takes(kTokenId_COLON))
+        return line.Problem(ECode::kDictionaryEntry, start, i - 1, "':' expected after dictionary key");
+    if (is_dictionary && line.Is(i, kTokenId_EQUAL) && colon_i < 0)
+        return line.Problem(ECode::kDictionaryEntry, i, i, "':' expected after dictionary key",
+                            "write ':' instead of '='");
+    return {};
+}
+
+CCause ComprehensionFault(const CFaultyLine& line) {
+    const int i = line.At();
+    const int opener_i = line.OpenerBefore(i);
+    const bool is_for = line.Is(i, EWord::kFor) || (line.Is(i, EWord::kAsync) && line.Is(i + 1, EWord::kFor));
+    if (opener_i < 0 || !is_for) return {};
+    const int start = opener_i + 1;
+    if (line.Is(start, kTokenId_STAR) && line.ItemStart(i) == start)
+        return line.Problem(ECode::kUnpackingInComprehension, start, i - 1,
+                            "iterable unpacking cannot be used in comprehension");
+    if (line.Is(start, kTokenId_DOUBLESTAR) && line.ItemStart(i) == start)
+        return line.Problem(ECode::kUnpackingInComprehension, start, i - 1,
+                            "dict unpacking cannot be used in dict comprehension");
+    if (line.FindBack(start, i, kTokenId_COMMA) < 0) return {};
+    return line.Problem(ECode::kComprehensionTarget, start, i - 1,
+                        "did you forget parentheses around the comprehension target?");
+}
+
+}  // namespace codeloom

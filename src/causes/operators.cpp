@@ -1,0 +1,56 @@
+// Operators: `a + not b`, `i++`, `a + = b`.
+
+#include "causes/recognisers.h"
+
+namespace codeloom {
+
+namespace {
+
+bool IsComparison(int type) {
+    return (type >= kTokenId_EQEQUAL && type <= kTokenId_GREATEREQUAL) || type == kTokenId_LESS ||
+           type == kTokenId_GREATER;
+}
+
+}  // namespace
+
+CCause NotAfterOperator(const CFaultyLine& line) {
+    const int i = line.At();
+    if (!line.Is(i, EWord::kNot) || (!IsArithmeticSign(line.Type(i - 1)) && !IsComparison(line.Type(i - 1))))
+        return {};
+    return line.Problem(ECode::kNotAfterOperator, i - 1, i, "'not' after an operator must be parenthesized");
+}
+
+// `i++`, `i--`
+CCause Increment(const CFaultyLine& line) {
+    const int i = line.At();
+    const bool is_sign = line.Is(i - 1, kTokenId_PLUS) || line.Is(i - 1, kTokenId_MINUS);
+    if (!is_sign || line.Type(i - 2) != line.Type(i - 1) || !line.IsAdjacent(i - 1) ||
+        !line.EndsOperand(i - 3))
+        return {};
+    const std::string sign = Joined(line.Text(i - 1), line.Text(i - 1));
+    return line.Problem(ECode::kForeignSign, i - 2, i - 1,
+                        Joined(Quoted(sign), " isn't an operator in Python"),
+                        Joined("write '", line.Text(i - 1), "= 1'"));
+}
+
+// `a + = b`, `a < = b`, `a =< b`, `a => b`
+CCause SplitOperator(const CFaultyLine& line) {
+    const int i = line.At();
+    if (i == 0) return {};
+    const std::string together = Joined(line.Text(i - 1), line.Text(i));
+    if (line.Is(i, kTokenId_EQUAL) && !line.IsAdjacent(i) && !IsOpenerType(line.Type(i - 1))) {
+        const int type = GetTokenType(together);
+        if (type != kTokenId_ERRORTOKEN && line.FaultWith({i - 1, 2, {static_cast<int16_t>(type)}}) > i)
+            return line.Problem(ECode::kSplitOperator, i - 1, i,
+                                Joined("there can't be a blank within ", Quoted(together)));
+    }
+    if (!line.Is(i - 1, kTokenId_EQUAL) || !line.IsAdjacent(i)) return {};
+    const bool is_swapped = line.Is(i, kTokenId_LESS) || line.Is(i, kTokenId_GREATER);
+    if (!is_swapped) return {};
+    const std::string meant = Joined(line.Text(i), line.Text(i - 1));
+    return line.Problem(ECode::kForeignSign, i - 1, i,
+                        Joined(Quoted(together), " isn't an operator in Python"),
+                        Joined("write ", Quoted(meant)));
+}
+
+}  // namespace codeloom

@@ -1,0 +1,68 @@
+// The causes. Each looks at a line with a fault and says what it recognises, or nothing.
+#pragma once
+
+#include "causes/faulty_line.h"
+
+namespace codeloom {
+
+// Tokens; the token may also come after the place where the parser stopped.
+CCause UnterminatedString(const CFaultyLine& line, int i);  // strings.cpp
+CCause UnknownPrefix(const CFaultyLine& line, int i);
+CCause InvalidNumber(const CFaultyLine& line, int i);   // numbers.cpp
+CCause AfterBackslash(const CFaultyLine& line, int i);  // characters.cpp
+CCause InvalidCharacter(const CFaultyLine& line, int i);
+CCause ForeignSign(const CFaultyLine& line, int i);  // signs.cpp
+
+// What is in braces in an f-string.
+CCause UnfinishedField(const CFaultyLine& line);  // fields.cpp
+CCause EmptyField(const CFaultyLine& line);
+CCause Conversion(const CFaultyLine& line);
+CCause FieldExpression(const CFaultyLine& line);
+CCause EndOfField(const CFaultyLine& line);  // after the causes of any expression
+
+CCause UnmatchedCloser(const CFaultyLine& line);  // brackets.cpp
+CCause NeverClosed(const CFaultyLine& line);      // closing it mends the line
+CCause StillOpen(const CFaultyLine& line);        // it is open at the line's end
+
+CCause CallWithoutParentheses(const CFaultyLine& line);  // python2.cpp
+CCause RaiseWithComma(const CFaultyLine& line);
+CCause Backquotes(const CFaultyLine& line);
+
+CCause ParameterFault(const CFaultyLine& line);  // parameters.cpp
+
+CCause ImportFault(const CFaultyLine& line);  // imports.cpp
+
+CCause ExceptFault(const CFaultyLine& line);  // headers.cpp
+CCause ElseIf(const CFaultyLine& line);
+CCause DefinitionHead(const CFaultyLine& line);
+CCause MissingIn(const CFaultyLine& line);
+CCause NestedHeader(const CFaultyLine& line);
+CCause MissingColon(const CFaultyLine& line);
+
+CCause ArgumentFault(const CFaultyLine& line);  // items.cpp
+CCause DictionaryFault(const CFaultyLine& line);
+CCause ComprehensionFault(const CFaultyLine& line);
+
+CCause StarHere(const CFaultyLine& line);  // stars_and_yield.cpp
+CCause YieldHere(const CFaultyLine& line);
+
+CCause PatternFault(const CFaultyLine& line);  // case_patterns.cpp
+
+CCause AssignmentForComparison(const CFaultyLine& line);  // assignments.cpp
+CCause WalrusStatement(const CFaultyLine& line);
+
+CCause NotAfterOperator(const CFaultyLine& line);  // operators.cpp
+CCause Increment(const CFaultyLine& line);
+CCause SplitOperator(const CFaultyLine& line);
+
+CCause Misspelled(const CFaultyLine& line);     // misspellings.cpp
+CCause KeywordAsName(const CFaultyLine& line);  // keywords.cpp
+CCause StatementInExpression(const CFaultyLine& line);
+
+CCause MissingElse(const CFaultyLine& line);  // expected.cpp
+CCause MissingComma(const CFaultyLine& line);
+CCause SideBySide(const CFaultyLine& line);
+CCause MissingExpression(const CFaultyLine& line);
+CCause MissingToken(const CFaultyLine& line);
+
+}  // namespace codeloom
