@@ -1,9 +1,9 @@
 """The occurrences and scopes of whole files against the interpreter's own `ast`, `tokenize` and `symtable`.
 
-    python tests/names_against_interpreter.py FOLDER ...
+    python tests/names_against_interpreter.py [--python2] FOLDER ...
 
 prints each kind of disagreement with its count and first examples. No kind is expected but those in
-`KNOWN`, each with its reason.
+`KNOWN`, each with its reason. Files of Python 2 are held against the leaves that `lib2to3` finds.
 """
 
 import ast
@@ -16,6 +16,13 @@ import unicodedata
 import warnings
 from collections import Counter, defaultdict
 from pathlib import Path
+
+with warnings.catch_warnings():
+    warnings.simplefilter("ignore")
+    from lib2to3 import pygram, pytree
+    from lib2to3.pgen2 import driver, token
+    from lib2to3.pgen2.parse import ParseError
+    from lib2to3.pgen2.tokenize import TokenError
 
 from codeloom import Role, ScopeKind, analyze
 
@@ -175,14 +182,11 @@ def token_disagreements(text, by_place):
 
     `tokenize` takes names with combining characters apart, so only rows of ASCII are looked at.
     """
-    for token in tokenize.generate_tokens(io.StringIO(text).readline):
-        is_name = token.type == tokenize.NAME and token.string not in {*keyword.kwlist, *keyword.softkwlist}
-        if (
-            is_name
-            and token.line.isascii()
-            and (place := (token.start[0], token.start[1] + 1)) not in by_place
-        ):
-            yield "name without an occurrence", f"{place} {token.string}"
+    for each in tokenize.generate_tokens(io.StringIO(text).readline):
+        is_name = each.type == tokenize.NAME and each.string not in {*keyword.kwlist, *keyword.softkwlist}
+        place = (each.start[0], each.start[1] + 1)
+        if is_name and each.line.isascii() and place not in by_place:
+            yield "name without an occurrence", f"{place} {each.string}"
 
 
 # Scopes
@@ -278,6 +282,46 @@ def differences(ours, theirs, where):
         yield from differences(mine, other, f"{where}.{mine[1] or mine[0].value}")
 
 
+# Python 2
+
+KEYWORDS2 = {*keyword.kwlist, "print", "exec"} - {"True", "False", "async", "await", "nonlocal"}
+
+
+def python2_disagreements(text):
+    """Each name among the leaves of `lib2to3` has one occurrence, and the other way round."""
+    has_print_function = "print_function" in text
+    grammar = pygram.python_grammar_no_print_statement if has_print_function else pygram.python_grammar
+    tree = driver.Driver(grammar, pytree.convert).parse_string(text.rstrip() + "\n")
+    keywords = KEYWORDS2 - {"print"} if has_print_function else KEYWORDS2
+    theirs = {
+        (leaf.lineno, leaf.column + 1, leaf.value)
+        for leaf in tree.leaves()
+        if leaf.type == token.NAME and leaf.value not in keywords
+    }
+    ours = Counter(
+        (occurrence.range.row, occurrence.range.column, occurrence.name)
+        for occurrence in analyze(text, python="2.7").occurrences
+        if not (occurrence.in_comment or occurrence.name == "*")
+    )
+    for place in theirs - ours.keys():
+        yield "name of Python 2 without an occurrence", str(place)
+    for place, count in ours.items():
+        if place not in theirs or count != 1:
+            yield "occurrence of Python 2 without a name", str(place)
+
+
+def python2_texts_of(folders):
+    for folder in folders:
+        for path in sorted(Path(folder).rglob("*.py")):
+            try:
+                text = path.read_text("ascii").replace("\f", " ")
+                if "\t" not in text and not analyze(text, python="2.7").problems:
+                    list(python2_disagreements(text))
+                    yield path, text
+            except (UnicodeDecodeError, ParseError, TokenError, IndentationError):
+                continue
+
+
 def texts_of(folders):
     for folder in folders:
         for path in sorted(Path(folder).rglob("*.py")):
@@ -304,14 +348,17 @@ def disagreements_of(text):
     yield from differences(our_scopes(analysis), their_scopes(table), "module")
 
 
-def main(folders):
+def main(arguments):
     warnings.simplefilter("ignore")
     sys.setrecursionlimit(20_000)
+    is_python2 = "--python2" in arguments
+    folders = [argument for argument in arguments if argument != "--python2"]
+    texts = python2_texts_of(folders) if is_python2 else texts_of(folders)
     found, counts = defaultdict(list), Counter()
-    for path, text in texts_of(folders):
-        for kind, what in disagreements_of(text):
+    for path, text in texts:
+        for kind, what in (python2_disagreements if is_python2 else disagreements_of)(text):
             found[kind].append((path, what))
-        analysis = analyze(text, python="3.11")
+        analysis = analyze(text, python="2.7" if is_python2 else "3.11")
         counts["files"] += 1
         counts["occurrences"] += len(analysis.occurrences)
         counts["scopes"] += len(analysis.scopes)

@@ -122,3 +122,52 @@ def test_other_encodings_versions_and_what_cannot_be_read(run_cli, write_files):
     done = run_cli("names", "bad.py", "missing.py")
     assert "byte 0xFF can't be read" in done.stdout and "bad.py:2:1: y" in done.stdout
     assert "can't read missing.py" in done.stderr and done.returncode == 2
+
+
+# Appearances of names: roles, unused and undefined ones
+
+
+TEXT = "import os, re\n\n\ndef f(a):\n    b = re.x\n    return a + c\n\n\nx = (1,]\n"
+
+
+def test_unused_and_undefined(run_cli, write_files):
+    write_files({"f.py": TEXT})
+    done = run_cli("names", "--unused", "--undefined", "--format", "concise", "f.py")
+    assert done.stdout.splitlines() == [
+        "f.py:1:8: unused import os in module",
+        "f.py:5:5: unused bind b in function f",
+        "f.py:6:16: undefined read c in function f",
+        "f.py:9:8: CL201 invalid syntax",
+    ]
+    assert done.returncode == 1
+
+
+def test_roles(run_cli, write_files):
+    write_files({"f.py": "import os\ndef f(a):\n    a.b(len(os), c=d)\n"})
+    done = run_cli("names", "--roles", "f.py")
+    assert [row.partition(": ")[2] for row in done.stdout.splitlines()] == [
+        "import os in module",
+        "bind f in module",
+        "parameter a in function f",
+        "read a in function f",
+        "attribute b in function f",
+        "read len (builtin) in function f",
+        "read os of module in function f",
+        "keyword c in function f",
+        "read d (unknown) in function f",
+    ]
+    items = json.loads(run_cli("names", "--roles", "--format", "json", "f.py").stdout)["items"]
+    assert items[6] == {
+        "type": "occurrence",
+        "path": "f.py",
+        "row": 3,
+        "column": 13,
+        "end_row": 3,
+        "end_column": 15,
+        "name": "os",
+        "role": "read",
+        "finding": None,
+        "scope": "function f",
+        "resolution": "scope",
+        "home": "module",
+    }

@@ -1,5 +1,6 @@
 """Every appearance of a name: its role, its place, its scope, and where it is bound."""
 
+import pickle
 import random
 import warnings
 from collections import Counter
@@ -149,4 +150,80 @@ def test_broken_lines_leave_the_others_alone(seed):
         assert sound.keys() == spoilt.keys(), path
         count += len(sound)
         same += sum(spoilt[key] == home for key, home in sound.items())
-    assert same > 0.97 * count
+    assert same > 0.99 * count
+
+
+# Questions
+
+
+def At(occurrences):
+    return [f"{each.range.row}:{each.range.column} {each.name}" for each in occurrences]
+
+
+def test_definitions_and_references():
+    analysis = analyze("x = 1\ndef f(x):\n    return x\nx += y\nä = x; x\n")
+    assert At(analysis.definitions("x")) == ["1:1 x", "2:7 x", "4:1 x"]
+    assert At(analysis.references(analysis.occurrence_at(5, 5))) == ["1:1 x", "4:1 x", "5:5 x", "5:8 x"]
+    assert At(analysis.references(analysis.occurrence_at(3, 12))) == ["2:7 x", "3:12 x"]
+    assert At(analysis.references(analysis.occurrence_at(4, 6))) == ["4:6 y"]
+    assert At([analysis.occurrence_at(5, 6)]) == ["5:5 x"]  # it ends there
+    assert analysis.occurrence_at(5, 4) is None
+    assert analysis.occurrence_at(99, 1) is None
+    with pytest.raises(ValueError, match="row must be at least 1"):
+        analysis.occurrence_at(0, 1)
+    with pytest.raises(ValueError, match="another analysis"):
+        analysis.references(analyze("x").occurrences[0])
+
+
+@pytest.mark.parametrize(
+    ("text", "unused"),
+    [
+        ("import a, b.c, d as e\nb", ["1:8 a", "1:21 e"]),
+        ("from __future__ import division\nfrom m import a as a, _b, *", []),
+        ("import a, b, c\n__all__ = ['a']\n__all__ += ['b']", ["1:14 c"]),
+        ("def f(a, *b):\n    c = d = 1\n    def g(): pass\n    return d", ["2:5 c", "3:9 g"]),
+        ("def f():\n    a = 1\n    return locals()", []),
+        ("def f():\n    a = 1\n    def g():\n        nonlocal a\n        a = 2", ["2:5 a", "3:9 g"]),
+        ("def f():\n    a = 1\n    del a\n    for b in c: pass", ["4:9 b"]),
+        ("import a\nx: 'a.b' = 1\ny = z  # type: c", []),
+        ("import a\nx = (a,]", []),
+        ("class A:\n    a = 1\nb = 2", []),
+    ],
+)
+def test_unused(text, unused):
+    assert At(analyze(text).unused()) == unused
+
+
+def test_unused_parameters():
+    analysis = analyze("def f(a, b, _c): return a\nlambda d: 1")
+    assert At(analysis.unused(parameters=True)) == ["1:10 b", "2:8 d"]
+
+
+@pytest.mark.parametrize(
+    ("text", "undefined"),
+    [
+        ("a.b(len, c=__name__)", ["1:1 a"]),
+        ("from m import *\na", []),
+        ("def f():\n    global a, b\n    a = 1\nprint(a, b)", ["4:10 b"]),
+        ("class A:\n    x = 1\n    y = __qualname__\n    def f(self): return x, __class__", ["4:25 x"]),
+        ("x: 'a' = 1", ["1:5 a"]),
+        ("(a,]\na", []),
+        ("del a\nunicode", ["2:1 unicode"]),
+    ],
+)
+def test_undefined(text, undefined):
+    assert At(analyze(text).undefined()) == undefined
+
+
+def test_items_are_values():
+    analysis = analyze("class A:\n    __x = f(1).y\n")
+    again = analyze("class A:\n    __x = f(1).y\n")
+    x, f, y = analysis.occurrences[1:]
+    assert x == again.occurrences[1] and hash(x) == hash(again.occurrences[1]) and x != f
+    assert (x.mangled, x.symbol.name, x.home.name, x.scope.parent.parent) == ("_A__x", "_A__x", "A", None)
+    assert (y.object.column, y.object.end_column, y.symbol, y.home, f.object) == (11, 15, None, None, None)
+    assert x in x.line.occurrences and x.line == analysis.lines[1]
+    assert pickle.loads(pickle.dumps(x)) == x
+    assert pickle.loads(pickle.dumps(x.scope)) == x.scope
+    with pytest.raises(TypeError):
+        type(x.symbol)()

@@ -1,10 +1,13 @@
 """`codeloom names`: what each logical line reads and binds, and what it says of these names."""
 
+import argparse
 from collections.abc import Iterator
 
-from codeloom._analysis import Range
+from codeloom._analysis import Occurrence, Range
+from codeloom.cli.command import ExitStatus
 from codeloom.cli.items import Finding, Item
 from codeloom.cli.names_items import LimitItem, LineNames
+from codeloom.cli.options import Options
 from codeloom.cli.source import Source
 from codeloom.cli.source_command import SourceCommand
 
@@ -15,17 +18,66 @@ class NamesCommand(SourceCommand):
     NAME = "names"
     DESCRIPTION = (
         "Show what each logical line reads and binds, and what it says of these names. Lines that "
-        "say nothing of names are left out; a line that isn't sound is shown with its fault. The exit "
+        "say nothing of names are left out; a line that isn't sound is shown with its fault. "
+        "With --roles every appearance of a name is shown instead. The exit "
         "status is 0 when all are sound, 1 when some aren't, 2 on wrong use or when a file can't be read."
     )
     EXAMPLES = (
         "codeloom names src/a.py",
+        "codeloom names --unused --undefined src",
         "codeloom names --format jsonl src | jq -r 'select(.kind == \"from\").payload' | sort | uniq -c",
     )
     NEEDS_RECORDS = True
 
+    @classmethod
+    def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
+        """Add the command's own arguments."""
+        group = parser.add_argument_group("which names")
+        group.add_argument(
+            "--roles",
+            action="store_true",
+            help="every appearance of a name, what it does there and its scope",
+        )
+        group.add_argument(
+            "--unused", action="store_true", help="imports and local names that nothing in the file reads"
+        )
+        group.add_argument(
+            "--undefined",
+            action="store_true",
+            help="names that are read and that nothing in the file binds, but for builtins",
+        )
+        super().add_arguments(parser)
+
+    def run(self, options: Options) -> ExitStatus:
+        """Show the lines, or the appearances of names that are asked for."""
+        self._options = options
+        self._shows_occurrences = options.roles or options.unused or options.undefined
+        self.NEEDS_RECORDS = not self._shows_occurrences
+        return super().run(options)
+
     def items(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
-        """The lines that say something and the problems, in the order of the file."""
+        """What is to be shown and the problems, in the order of the file."""
+        return (
+            self._occurrences(source, findings) if self._shows_occurrences else self._lines(source, findings)
+        )
+
+    def _occurrences(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
+        from codeloom.cli.occurrence_items import OccurrenceItem
+
+        analysis, options = source.analysis, self._options
+        found: list[tuple[Range, Item]] = [(finding.range, finding) for finding in findings]
+        about: dict[str, tuple[Occurrence, ...]] = {
+            "unused": analysis.unused() if options.unused else (),
+            "undefined": analysis.undefined() if options.undefined else (),
+        }
+        for finding, occurrences in about.items():
+            found += [(each.range, OccurrenceItem(source, each, finding)) for each in occurrences]
+        if options.roles:
+            found += [(each.range, OccurrenceItem(source, each)) for each in analysis.occurrences]
+        found.sort(key=lambda placed: (placed[0].row, placed[0].column))
+        return (item for _, item in found)
+
+    def _lines(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
         limits = {limit.line: limit for limit in source.analysis.limits}
         waiting = iter(findings)
         finding = next(waiting, None)

@@ -28,6 +28,9 @@ class Options:
     place: str | None = None
     code: str | None = None
     shell: str = ""
+    roles: bool = False
+    unused: bool = False
+    undefined: bool = False
     python: str | None = None
     false_hints: bool = False
     stdin_filename: str | None = None

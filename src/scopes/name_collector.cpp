@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "scopes/lost_bindings.h"
 #include "scopes/scope_builder.h"
 
 namespace codeloom {
@@ -30,8 +31,8 @@ void CNameCollector::EndLine(const CRawLogical& line, bool has_fault, const CBlo
     _fNames.lines.back().is_in_doubt = blocks.IsInDoubt();
     const CStatementHead& head = blocks.Head();
     if (has_fault) {
-        _NoteLostLine(line);
         opened = OpensScope(head.clause) ? _AddLostScope(line, head) : 0;
+        _NoteLostLine(line, head.clause, opened);
     }
     if (opened == 0) return;
     const CLineNames& names = _fNames.lines.back();
@@ -39,11 +40,19 @@ void CNameCollector::EndLine(const CRawLogical& line, bool has_fault, const CBlo
     _fBlocks.Add(head.start, _fNames.ScopeOf(names, opened));
 }
 
-void CNameCollector::_NoteLostLine(const CRawLogical& line) {
+void CNameCollector::_NoteLostLine(const CRawLogical& line, EClause clause, uint32_t opened_scope) {
     _fLostLines.push_back(static_cast<uint32_t>(_fNames.lines.size() - 1));
     for (const CRawToken& token : line.tokens)
         if (token.type == kTokenId_NAME && token.word == EWord::kNone)
             _fNames.lost_names.push_back(_fNames.occurrences.names.Number(line.Text(token)));
+    const CLineNames& names = _fNames.lines.back();
+    const CLostBindings found = FindLostBindings(line, clause);
+    const auto note = [&](const CRawToken* token, uint32_t scope) {
+        _fNames.lost_bindings.push_back(
+            {_fNames.occurrences.names.Number(line.Text(*token)), _fNames.ScopeOf(names, scope)});
+    };
+    for (const CRawToken* const token : found.names) note(token, 0);
+    for (const CRawToken* const token : found.parameters) note(token, opened_scope);
 }
 
 // The header's block belongs to a scope all the same.

@@ -25,7 +25,7 @@ class CNameCollector {
     void Finish();
 
   private:
-    void _NoteLostLine(const CRawLogical& line);
+    void _NoteLostLine(const CRawLogical& line, EClause clause, uint32_t opened_scope);
     uint32_t _AddLostScope(const CRawLogical& line, const CStatementHead& head);
 
     CTextNames& _fNames;

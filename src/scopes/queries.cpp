@@ -34,7 +34,7 @@ EResolution CNameQueries::Resolution(uint32_t occurrence_i) const {
     if (symbol_i == kNoIndex) return EResolution::kNone;
     const CSymbol& symbol = _fNames.scopes.symbols[symbol_i];
     const CSymbol& home = _fNames.scopes.symbols[symbol.home];
-    if ((home.flags & (CSymbol::kIsBound | CSymbol::kIsBoundByOthers)) != 0) return EResolution::kScope;
+    if (home.MayBeBound()) return EResolution::kScope;
     const std::string_view name = _fNames.occurrences.names.Text(home.name);
     if (IsBuiltinName(name, _fVersion)) return EResolution::kBuiltin;
     if (IsNameOfClassBody(name) && _fNames.scopes.scopes[symbol.scope].kind == EScopeKind::kClass)

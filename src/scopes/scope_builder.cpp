@@ -43,6 +43,7 @@ class CScopeBuilder {
     void _AddOccurrences();
     void _NotePrivateNames();
     uint32_t _Mangled(uint32_t name, uint32_t scope);
+    uint32_t _MangledByClass(uint32_t name, uint32_t scope);
     uint32_t _Add(const COccurrence& occurrence, uint32_t scope);
     uint32_t _AddWalrus(uint32_t scope, uint32_t name);
     uint32_t _AddFlags(uint32_t scope, uint32_t name, uint16_t flags);
@@ -70,6 +71,8 @@ void CScopeBuilder::Run(std::span<const uint32_t> lost_lines) {
         _fScopes.scopes[_fNames.lines[line_i].scope].has_lost_lines = true;
     _NotePrivateNames();
     _AddOccurrences();
+    for (const CLostBinding& binding : _fNames.lost_bindings)
+        _AddFlags(binding.scope, _Mangled(binding.name, binding.scope), CSymbol::kIsBoundElsewhere);
     _NoteNamespaces();
     _Resolve();
 }
@@ -111,7 +114,11 @@ void CScopeBuilder::_NotePrivateNames() {
 }
 
 // The name as the class around mangles it.
-uint32_t CScopeBuilder::_Mangled(uint32_t name, uint32_t scope) {
+inline uint32_t CScopeBuilder::_Mangled(uint32_t name, uint32_t scope) {
+    return name < _fPrivate.size() && _fPrivate[name] ? _MangledByClass(name, scope) : name;
+}
+
+uint32_t CScopeBuilder::_MangledByClass(uint32_t name, uint32_t scope) {
     while (scope != 0 && _fScopes.scopes[scope].kind != EScopeKind::kClass)
         scope = _fScopes.scopes[scope].parent;
     CNameTable& names = _fNames.occurrences.names;
@@ -136,9 +143,7 @@ void CScopeBuilder::_AddOccurrences() {
 }
 
 uint32_t CScopeBuilder::_Add(const COccurrence& occurrence, uint32_t scope) {
-    uint32_t name = occurrence.name;
-    if (name < _fPrivate.size() && _fPrivate[name]) [[unlikely]]
-        name = _Mangled(name, scope);
+    const uint32_t name = _Mangled(occurrence.name, scope);
     switch (occurrence.role) {
         case ERole::kRead:
             if (name == _fSuper && IsFunction(_fScopes.scopes[scope].kind))
@@ -196,9 +201,7 @@ void CScopeBuilder::_NoteNamespaces() {
         CScope& parent = _fScopes.scopes[scope.parent];
         parent.end = std::max(parent.end, scope.end);
         if (scope.name == no_name || scope.is_lost) continue;
-        uint32_t name = scope.name;
-        if (name < _fPrivate.size() && _fPrivate[name]) name = _Mangled(name, scope.parent);
-        const uint32_t symbol_i = _fSymbols.Find(scope.parent, name);
+        const uint32_t symbol_i = _fSymbols.Find(scope.parent, _Mangled(scope.name, scope.parent));
         if (symbol_i != kNoIndex) _fScopes.symbols[symbol_i].flags |= CSymbol::kIsNamespace;
     }
 }
@@ -215,11 +218,10 @@ void CScopeBuilder::_ResolveOne(uint32_t symbol_i) {
     if (symbol.Is(CSymbol::kIsDeclaredGlobal)) {
         const uint32_t home = _fSymbols.FindOrAdd(0, symbol.name);
         const bool is_bound_here = (symbol.flags & CSymbol::kIsBound) != 0 && home != symbol_i;
-        if (is_bound_here) _fScopes.symbols[home].flags |= CSymbol::kIsBoundByOthers;
+        if (is_bound_here) _fScopes.symbols[home].flags |= CSymbol::kIsBoundElsewhere;
         return _Bind(symbol_i, EBinding::kGlobalExplicit, home);
     }
-    const bool is_bound_here = (symbol.flags & CSymbol::kIsBound) != 0;
-    if (is_bound_here && !symbol.Is(CSymbol::kIsDeclaredNonlocal))
+    if (symbol.MayBeBound() && !symbol.Is(CSymbol::kIsDeclaredNonlocal))
         return _Bind(symbol_i, EBinding::kLocal, symbol_i);
     if (symbol.scope == 0) return _Bind(symbol_i, EBinding::kGlobalImplicit, symbol_i);
     _LookUp(symbol_i);
@@ -250,7 +252,7 @@ bool CScopeBuilder::_LookUpInClass(uint32_t symbol_i) {
         _Bind(symbol_i, EBinding::kGlobalExplicit, _fSymbols.FindOrAdd(0, symbol.name));
         return true;
     }
-    if ((of_class.flags & CSymbol::kIsBound) == 0 || of_class.Is(CSymbol::kIsDeclaredNonlocal)) return false;
+    if (!of_class.MayBeBound() || of_class.Is(CSymbol::kIsDeclaredNonlocal)) return false;
     _Bind(symbol_i, EBinding::kGlobalImplicit, of_class_i);
     return true;
 }
@@ -259,14 +261,14 @@ bool CScopeBuilder::_LookUpInClass(uint32_t symbol_i) {
 uint32_t CScopeBuilder::_FindAround(uint32_t scope, uint32_t name) {
     for (scope = _fScopes.scopes[scope].parent; scope != 0; scope = _fScopes.scopes[scope].parent) {
         if (_fScopes.scopes[scope].kind == EScopeKind::kClass) {
-            if (name == _fClassCell) return _AddFlags(scope, name, CSymbol::kIsBoundByOthers);
+            if (name == _fClassCell) return _AddFlags(scope, name, CSymbol::kIsBoundElsewhere);
             continue;
         }
         const uint32_t found_i = _fSymbols.Find(scope, name);
         if (found_i == kNoIndex) continue;
         const CSymbol& found = _fScopes.symbols[found_i];
         if (found.Is(CSymbol::kIsDeclaredGlobal)) return kNoIndex;
-        if (!found.Is(CSymbol::kIsDeclaredNonlocal) && (found.flags & CSymbol::kIsBound) != 0) return found_i;
+        if (!found.Is(CSymbol::kIsDeclaredNonlocal) && found.MayBeBound()) return found_i;
     }
     return kNoIndex;
 }

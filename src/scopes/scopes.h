@@ -21,9 +21,9 @@ struct CSymbol {
         kIsDeclaredGlobal = 32,
         kIsDeclaredNonlocal = 64,
         kIsTypeParameter = 128,
-        kIsNamespace = 256,       // of a scope right within this one
-        kIsPassedOn = 512,        // used by a scope within only, and bound by one around
-        kIsBoundByOthers = 1024,  // a global that functions bind
+        kIsNamespace = 256,        // of a scope right within this one
+        kIsPassedOn = 512,         // used by a scope within only, and bound by one around
+        kIsBoundElsewhere = 1024,  // by a function that declares it global, or on a line with a fault
         kIsBound = kIsAssigned | kIsParameter | kIsImported | kIsTypeParameter,
     };
 
@@ -39,8 +39,9 @@ struct CSymbol {
     EBinding binding = EBinding::kLocal;
 
     bool Is(EFlag flag) const { return (flags & flag) != 0; }
+    bool MayBeBound() const { return (flags & (kIsBound | kIsBoundElsewhere)) != 0; }
     // False for what only stands for a global name that the module itself doesn't mention.
-    bool IsMentioned() const { return flags != 0 && flags != kIsBoundByOthers; }
+    bool IsMentioned() const { return flags != 0 && flags != kIsBoundElsewhere; }
 };
 
 // In the order of the source, the module first; a scope comes after the one around it.

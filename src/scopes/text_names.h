@@ -6,10 +6,11 @@
 //
 // block_scopes.h     the scope around a line, by its blocks
 // scope_builder.cpp  symbols, then where each is bound
+// lost_bindings.cpp  what a line with a fault binds by all appearances
 // declarations.cpp   what is wrong with `global` and `nonlocal`
-// A line with a fault is a gap: nothing is known of its names but that they stand there.
-// The occurrences of a line and the scopes within it depend on that line alone, but for the import that
-// defers annotations; what is made of blocks is made anew when lines change.
+// A line with a fault is a gap: nothing is known of its names but that they stand there, and what it plainly
+// binds. The occurrences of a line and the scopes within it depend on that line alone, but for the import
+// that defers annotations; what is made of blocks is made anew when lines change.
 #pragma once
 
 #include <vector>
@@ -27,10 +28,17 @@ struct CLineNames {
     bool is_in_doubt = false;  // a fault may have moved what is around it
 };
 
+// What a line with a fault binds by all appearances.
+struct CLostBinding {
+    uint32_t name = 0;
+    uint32_t scope = 0;  // among all
+};
+
 struct CTextNames {
     COccurrences occurrences;
     std::vector<CLineNames> lines;     // as many as lines of the text
     std::vector<uint32_t> lost_names;  // those on lines with a fault, by number
+    std::vector<CLostBinding> lost_bindings;
     CScopeTable scopes;
 
     // The occurrences of a line are those from FirstOccurrence(line_i) up to FirstOccurrence(line_i + 1).
