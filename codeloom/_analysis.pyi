@@ -198,7 +198,7 @@ class Problem:
 
     @property
     def range(self) -> Range:
-        """What it is about; empty for a place between characters."""
+        """What it is about, at least one character unless the text is empty."""
 
     @property
     def related(self) -> tuple[tuple[Range, str], ...]:

@@ -27,6 +27,7 @@ COMMANDS = {
         "show each def with the types of its arguments and what it gives back",
     ),
     "tree": ("tree", "TreeCommand", "show the syntax tree of a line"),
+    "explain": ("explain", "ExplainCommand", "print what the code of a problem means, with examples"),
     "completion": ("completion", "CompletionCommand", "print what completes commands and options in a shell"),
 }
 

@@ -31,6 +31,7 @@ class Options:
     roles: bool = False
     unused: bool = False
     undefined: bool = False
+    codes: Sequence[str] = ()
     python: str | None = None
     false_hints: bool = False
     stdin_filename: str | None = None

@@ -115,7 +115,8 @@ CCause MissingIn(const CFaultyLine& line) {
     if (!line.Takes(EWord::kIn)) return {};
     const bool is_other_word =
         line.Is(i, EWord::kIf) || line.Is(i, kTokenId_EQUAL) || line.Is(i, kTokenId_COLON);
-    if (!is_other_word && !mends({i, 0, {EWord::kIn}}) && !mends({i, 1, {EWord::kIn}})) return {};
+    if (!line.IsAtEnd() && !is_other_word && !mends({i, 0, {EWord::kIn}}) && !mends({i, 1, {EWord::kIn}}))
+        return {};
     return line.Problem(ECode::kMissingIn, for_i, i - 1, "'in' expected after for-loop variables");
 }
 

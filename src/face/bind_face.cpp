@@ -89,7 +89,7 @@ void BindProblem(nb::module_& module) {
         nb::sig("def message(self) -> str"), "What is wrong, in words.");
     problem.def_prop_ro("code", &CProblemItem::Code, "What kind of fault it is, such as \"CL201\".");
     problem.def_prop_ro("range", &CProblemItem::Range,
-                        "What it is about; empty for a place between characters.");
+                        "What it is about, at least one character unless the text is empty.");
     problem.def_prop_ro("related", &CProblemItem::Related,
                         nb::sig("def related(self) -> tuple[tuple[Range, str], ...]"),
                         "Other places that it has to do with, each with what it is.");

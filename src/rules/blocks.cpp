@@ -363,11 +363,12 @@ void CBlockTracker::_CheckExcept(CBlock& block) {
     }
 }
 
-void CBlockTracker::Finish(uint32_t end) {
+void CBlockTracker::Finish(const CSpan& last_token) {
+    const auto [start, end] = last_token;
     _fHead = CStatementHead();
     _fHasPlaceProblem = false;
-    if (_fOpensBlock && !_fPreviousHasFault) _ReportMissingBlock(end, end);
-    for (size_t i = _fBlocks.size(); i-- > 0;) _CheckPending(_fBlocks[i], end, end);
+    if (_fOpensBlock && !_fPreviousHasFault) _ReportMissingBlock(start, end);
+    for (size_t i = _fBlocks.size(); i-- > 0;) _CheckPending(_fBlocks[i], start, end);
 }
 
 bool CBlockTracker::IsInDoubt() const {

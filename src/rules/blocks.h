@@ -68,8 +68,8 @@ class CBlockTracker {
     // Takes note of the line that was entered last: whether it has a fault of its own.
     void Leave(bool has_fault);
 
-    // Call once, after the last line. `end` is the byte after the last row that isn't blank.
-    void Finish(uint32_t end);
+    // Call once, after the last line. What is missing at the end is reported at its last token.
+    void Finish(const CSpan& last_token);
 
     // The blocks around the line, the module first.
     const std::vector<CBlock>& Blocks() const { return _fBlocks; }

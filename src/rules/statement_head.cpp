@@ -117,10 +117,11 @@ uint32_t CountWithItems(const CRawLogical& logical) {
 CStatementHead ReadStatementHead(const CRawLogical& logical) {
     CStatementHead head;
     size_t token_i = 0;
-    const CRawToken* const first = NextSignificant(logical.tokens, token_i);
-    if (first == nullptr) return head;
+    const CRawToken* const significant = NextSignificant(logical.tokens, token_i);
+    const CRawToken* const first = significant == nullptr ? &logical.tokens.front() : significant;
     head.start = logical.StartOf(*first);
     head.end = logical.EndOf(*first);
+    if (significant == nullptr) return head;
     if (first->type == kTokenId_AT) {
         head.clause = EClause::kDecorator;
     } else if (logical.type == ELogicalType::kMatch || logical.type == ELogicalType::kCase) {

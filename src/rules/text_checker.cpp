@@ -39,7 +39,7 @@ void DropNested(CProblems& problems, size_t first) {
 }  // namespace
 
 void CTextChecker::Enter(const CRawLogical& logical) {
-    _fEnd = logical.EndOf(logical.tokens.back());
+    _fLastToken = {logical.StartOf(logical.tokens.back()), logical.EndOf(logical.tokens.back())};
     if (logical.type == ELogicalType::kComment) return;
     _fBlocks.Enter(logical);
     _fPlacement.Enter(_fBlocks);
@@ -79,7 +79,7 @@ void CTextChecker::Leave(const CRawLogical& logical, bool has_fault) {
 }
 
 void CTextChecker::Finish() {
-    _fBlocks.Finish(_fEnd);
+    _fBlocks.Finish(_fLastToken);
     _fPlacement.Finish();
 }
 

@@ -39,7 +39,7 @@ class CTextChecker final : public CTreeObserver {
     CPlacementRules _fPlacement;
     const CRawLogical* _fLine = nullptr;  // under way
     size_t _fFirstProblem = 0;            // of what its trees show
-    uint32_t _fEnd = 0;                   // of the last line
+    CSpan _fLastToken;                    // of the last line
 };
 
 }  // namespace codeloom
