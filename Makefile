@@ -1,6 +1,6 @@
 # make run     set up what is missing, build, and check the examples and the interpreter's own library
 # make test    set up what is missing, build, and run all tests
-# The rest: lint, tidy, format, asan, leaks, fuzz, bench, bench-short, clean.
+# The rest: docs, lint, tidy, format, asan, leaks, fuzz, bench, bench-short, clean.
 
 PYTHON ?= python3.11
 VENV   := .venv
@@ -11,7 +11,7 @@ SOURCES   := $(shell find src resources codeloom -type f -not -name '*.pyc') CMa
 CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
 STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
 
-.PHONY: run test lint tidy format asan asan-short leaks fuzz bench bench-short build clean
+.PHONY: run test docs lint tidy format asan asan-short leaks fuzz bench bench-short build clean
 
 build: $(STAMP)
 
@@ -33,6 +33,11 @@ run: build
 
 test: build
 	$(BIN)/pytest
+
+# The site, in build/site; a warning is an error.
+docs: $(VENV)/.tools
+	$(BIN)/pip install --quiet --group docs
+	$(BIN)/mkdocs build --quiet --strict
 
 lint: build
 	$(BIN)/clang-format --dry-run --Werror $(CXX_FILES)

@@ -1,0 +1,99 @@
+"""The examples of the pages run, and give what the pages say.
+
+A block of Python runs with those before it on its page, in a folder that holds the examples; the block of text
+after it is what it prints. Blocks of a console hold commands after `$` with their output. `pytest --rewrite` writes
+what comes out into the pages.
+"""
+
+import ast
+import os
+import re
+import shutil
+import subprocess
+import sys
+from pathlib import Path
+
+import pytest
+
+import codeloom
+
+ROOT = Path(__file__).parent.parent
+PYTHON = re.compile(
+    r"^```python\n(?P<code>.*?)^```\n(?:```text\n(?P<output>.*?)^```\n)?", re.MULTILINE | re.DOTALL
+)
+CONSOLE = re.compile(r"^```console\n(?P<session>.*?)^```\n", re.MULTILINE | re.DOTALL)
+END = "<end of a block>"
+PAGES = sorted(
+    str(path.relative_to(ROOT))
+    for path in [ROOT / "README.md", *ROOT.glob("docs/*.md")]
+    if re.search("^```(python|console)$", path.read_text(), re.MULTILINE)
+)
+
+
+@pytest.fixture
+def place(tmp_path):
+    """A folder with the examples, where `codeloom` is a command."""
+    shutil.copytree(ROOT / "examples", tmp_path / "examples")
+    commands = tmp_path / ".bin"
+    commands.mkdir()
+    script = commands / "codeloom"
+    script.write_text(f'#!/bin/sh\nexec {sys.executable} -P -m codeloom "$@"\n')
+    script.chmod(0o755)
+    path = f"{commands}{os.pathsep}{os.environ['PATH']}"
+    environment = {**os.environ, "PATH": path, "COLUMNS": "100", "PYTHONIOENCODING": "utf-8"}
+    return tmp_path, {name: value for name, value in environment.items() if name != "FORCE_COLOR"}
+
+
+def OutputsOfPython(blocks, place):
+    """What each block prints."""
+    folder, environment = place
+    program = "".join(f"{code}\nprint({END!r})\n" for code in blocks)
+    done = subprocess.run(
+        [sys.executable, "-P", "-c", program], cwd=folder, env=environment, capture_output=True, text=True
+    )
+    assert done.returncode == 0, done.stderr
+    return done.stdout.split(f"{END}\n")[:-1]
+
+
+def SessionWithOutputs(session, place):
+    """The commands of a session, each with what it prints now."""
+    folder, environment = place
+    rows = []
+    for command in re.findall(r"^\$ (.*(?:\\\n.*)*)", session, re.MULTILINE):
+        done = subprocess.run(
+            ["bash", "-c", command], cwd=folder, env=environment, capture_output=True, text=True
+        )
+        rows.append(f"$ {command}\n{done.stdout}{done.stderr}")
+    return "\n".join(rows)
+
+
+@pytest.mark.parametrize("page", PAGES)
+def test_examples(page, place, rewrite):
+    path = ROOT / page
+    text = path.read_text()
+    outputs = iter(OutputsOfPython([match["code"] for match in PYTHON.finditer(text)], place))
+
+    def WithOutput(match):
+        output = next(outputs)
+        block = f"```python\n{match['code']}```\n"
+        return block + (f"```text\n{output}```\n" if output else "")
+
+    found = PYTHON.sub(WithOutput, text)
+    found = CONSOLE.sub(
+        lambda match: f"```console\n{SessionWithOutputs(match['session'], place)}```\n", found
+    )
+    if rewrite:
+        path.write_text(found)
+    assert found.split("\n") == text.split("\n") or rewrite
+
+
+def test_every_name_has_an_example():
+    blocks = "".join(match["code"] for match in PYTHON.finditer((ROOT / "docs/api.md").read_text()))
+    used = {node.id for node in ast.walk(ast.parse(blocks)) if isinstance(node, ast.Name)}
+    assert set(codeloom.__all__) <= used
+
+
+def test_links_lead_somewhere():
+    for path in [ROOT / "README.md", *ROOT.glob("docs/*.md")]:
+        for link in re.findall(r"\]\(([^)#:]+)(?:#[^)]*)?\)", path.read_text()):
+            assert (path.parent / link).exists(), (path.name, link)
