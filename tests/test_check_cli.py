@@ -240,7 +240,7 @@ class TestEndings:
     )
     def test_out_of_memory(self, write_files, tmp_path, cli_environment):
         write_files({"a.py": "x = 1\n" * 10_000_000})
-        command = f"ulimit -v 400000; exec {sys.executable} -m codeloom check a.py"
+        command = f"ulimit -v 250000; exec {sys.executable} -m codeloom check a.py"
         done = subprocess.run(
             ["sh", "-c", command], capture_output=True, text=True, cwd=tmp_path, env=cli_environment
         )

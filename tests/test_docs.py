@@ -1,8 +1,8 @@
 """The examples of the pages run, and give what the pages say.
 
-A block of Python runs with those before it on its page, in a folder that holds the examples; the block of text
-after it is what it prints. Blocks of a console hold commands after `$` with their output. `pytest --rewrite` writes
-what comes out into the pages.
+A block of Python runs with those before it on its page, in a folder that holds the examples; the block of
+text after it is what it prints. Blocks of a console hold commands after `$` with their output. `pytest
+--rewrite` writes what comes out into the pages.
 """
 
 import ast

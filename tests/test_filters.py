@@ -50,7 +50,7 @@ def test_a_baseline(write_files, places, run_cli, form):
     run_cli("check", ".", "--format", form, "-o", "known.json")
     assert places(".", "--baseline", "known.json") == []
     write_files({"a.py": "x\n\n  \nif x:\n    f() = 1\nf() = 1\nf() = 1\ng() = 1\n", "c.py": ")\n"})
-    new = ["./a.py:7:1: CL401", "./a.py:8:1: CL401", "./c.py:1:1: CL201"]
+    new = ["./a.py:7:1: CL401", "./a.py:8:1: CL401", "./c.py:1:1: CL203"]
     assert places(".", "--baseline", "known.json") == new
     # The same from another folder, and by the settings.
     (folder / "codeloom.toml").write_text("baseline = 'known.json'\n")
@@ -86,7 +86,7 @@ class TestDiff:
         write_files({"new.ipynb": json.dumps({"cells": [{"cell_type": "code", "source": ")"}]})})
         assert [one.rpartition(":")[0] for one in places(".", "--diff", "HEAD")] == [
             "./a.py:3:1",  # changed
-            "./a.py:6:5",  # of a line that has changed
+            "./a.py:6:3",  # of a line that has changed
             "./a.py:10:1",  # next to what was taken out
             "./a.py:10:1",
             "./new.ipynb:cell 1:1:1",

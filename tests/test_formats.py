@@ -19,6 +19,7 @@ FILES = {
     "sub/sound.py": "import os\n\n\ndef f(a: int = 1, *b) -> str:\n    return os\n",
     "n.ipynb": json.dumps(NOTEBOOK),
 }
+CALL = "cannot assign to function call here. Maybe you meant '==' instead of '='?"
 PLACES = [("a & b.py", 2, 1), ("a & b.py", 3, 1), ("a & b.py", 3, 10), ("n.ipynb", 2, 5)]
 
 
@@ -160,7 +161,7 @@ def test_github(written, write_files, run_cli):
     assert rows[0].startswith(
         "::error file=a & b.py,title=CL302,line=2,endLine=2,col=1,endColumn=1::expected"
     )
-    assert rows[3].startswith("::error file=n.ipynb,title=CL201::cell 2, row 2, column 5: ")
+    assert rows[3].startswith("::error file=n.ipynb,title=CL203::cell 2, row 2, column 5: ")
     assert rows[4] == "::error file=absent.py,title=codeloom::can't be read: No such file or directory"
     write_files({"many, 1.py": "x = )\n" * 13})
     rows = run_cli("check", "--format", "github", "many, 1.py").stdout.splitlines()
@@ -178,16 +179,14 @@ def test_the_text_shows_what_belongs_together(write_files, run_cli):
         "      | -- the header that lacks its block",
         "    2 | y = '<'",
         "      | ^",
-        "a & b.py:3:1: CL401 cannot assign to function call",
-        "a & b.py:3:10: CL401 cannot assign to function call",
+        "a & b.py:3:1: CL401 " + CALL,
+        "a & b.py:3:10: CL401 " + CALL,
         "    3 | f() = 1; g() = 2",
         "      | ^^^      ^^^",
-        "    hint: use '==' to compare",
-        "n.ipynb:cell 2:2:5: CL201 invalid syntax",
+        "    hint: write '==' to compare",
+        "n.ipynb:cell 2:2:5: CL203 unmatched ')'",
         "    2 | b = )",
         "      |     ^",
         "4 problems in 2 of 2 files, 6 logical lines",
     ]
-    assert (
-        run_cli("check", "-q", "--statistics", "-q", "n.ipynb").stdout == "      1  CL201  invalid syntax\n"
-    )
+    assert run_cli("check", "-q", "--statistics", "-q", "n.ipynb").stdout == "      1  CL203  unmatched ')'\n"

@@ -137,7 +137,7 @@ def test_unused_and_undefined(run_cli, write_files):
         "f.py:1:8: unused import os in module",
         "f.py:5:5: unused bind b in function f",
         "f.py:6:16: undefined read c in function f",
-        "f.py:9:8: CL201 invalid syntax",
+        "f.py:9:8: CL204 closing parenthesis ']' does not match opening parenthesis '('",
     ]
     assert done.returncode == 1
 

@@ -56,7 +56,7 @@ class TestSettings:
     def test_a_format_is_for_the_commands_that_have_it(self, write_files, run_cli):
         write_files({"codeloom.toml": "format = 'github'\n", "a.py": ")\n"})
         assert run_cli("check", "a.py").stdout.startswith("::error")
-        assert run_cli("names", "a.py").stdout.startswith("a.py:1:1: CL201")
+        assert run_cli("names", "a.py").stdout.startswith("a.py:1:1: CL203")
 
 
 class TestVersions:
@@ -183,9 +183,9 @@ def test_watching(write_files, tmp_path, cli_environment):
     command = [sys.executable, "-m", "codeloom", "check", "--watch", "--format", "concise", "a.py"]
     process = subprocess.Popen(command, cwd=folder, env=cli_environment, stdout=subprocess.PIPE, text=True)
     try:
-        assert process.stdout.readline() == "a.py:1:1: CL201 invalid syntax\n"
+        assert process.stdout.readline() == "a.py:1:1: CL203 unmatched ')'\n"
         (folder / "a.py").write_text("x = )\n")
-        assert process.stdout.readline() == "a.py:1:5: CL201 invalid syntax\n"
+        assert process.stdout.readline() == "a.py:1:5: CL203 unmatched ')'\n"
     finally:
         process.send_signal(signal.SIGINT)
         process.communicate(timeout=30)
