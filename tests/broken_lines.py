@@ -12,6 +12,7 @@ import io
 import random
 import re
 import sysconfig
+import tokenize
 import warnings
 from collections import Counter
 from collections.abc import Iterator
@@ -20,7 +21,7 @@ from dataclasses import dataclass
 from functools import cached_property
 from pathlib import Path
 
-from faults import KINDS, Edit, Line, Lines, OpensTriple, TypedAbove
+from faults import KINDS, QUOTES, Edit, Line, Lines, OpensTriple, TypedAbove
 
 from codeloom.logicalline import CLogicalLine
 from codeloom.treesift import CExtendedAnalyzer, CPGenAnalyzerImpl
@@ -86,6 +87,11 @@ class Case:
         return not all(any(row in rows for rows in self.damaged) for row, _ in self.errors)
 
     @property
+    def joined_count(self) -> int:
+        """Faults that a reader can't tell from that of the line before."""
+        return len(self.kinds) - len(self.damaged)
+
+    @property
     def is_exact(self) -> bool:
         return self.found_count == len(self.damaged) and not self.is_dirty and self.keeps_others
 
@@ -129,7 +135,7 @@ class SoundText:
             damaged.append(range(line.first_row + shift, end_row + shift + more))
             shift += more
         kept += [(logical, shift) for logical in self.logicals[logical_i:]]
-        return self._Judge(text, [kind for kind, _, _ in edits], damaged, kept)
+        return self._Judge(text, [kind for kind, _, _ in edits], _Told(text, damaged), kept)
 
     def _Judge(
         self, text: str, kinds: list[str], damaged: list[range], kept: list[tuple[CLogicalLine, int]]
@@ -138,6 +144,42 @@ class SoundText:
         changed = [logical for logical in GetLogicalsFromText(text) if not _Discarded(sound, _Facts(logical))]
         errors = Errors(changed, self.analyzer)
         return Case(self.path, kinds, damaged, errors, not sound, text)
+
+
+# What begins no line, so that it continues the row before if that is open.
+CONTINUES = re.compile(r"[)\]}.,:=/%|&^<>]|(and|or|in|is|as)\b")
+
+
+def _Told(text: str, damaged: list[range]) -> list[range]:
+    """The broken lines that a reader can tell from each other.
+
+    Two that touch may make up one sound line, `f(` and `x=0)`, or one broken line, when the first leaves a
+    bracket or a quote open and the second begins with what must continue it, `f(x` and `.y)`.
+    """
+    source_rows = text.split("\n")
+    told: list[range] = []
+    for rows in damaged:
+        line = "\n".join(source_rows[rows.start : rows.stop])
+        last = told[-1] if told else range(0)
+        between = source_rows[last.stop : rows.start]
+        if last and all(row.strip()[:1] in ("", "#") for row in between):
+            before = "\n".join(source_rows[last.start : last.stop])
+            if not IsBroken(f"{before}\n{line}"):
+                told.pop()
+                continue
+            if CONTINUES.match(line.strip()) and _LeavesOpen(before.strip()):
+                told[-1] = range(last.start, rows.stop)
+                continue
+        told.append(rows)
+    return told
+
+
+def _LeavesOpen(line: str) -> bool:
+    try:
+        tokens = list(tokenize.generate_tokens(io.StringIO(f"{line}\n").readline))
+    except (tokenize.TokenError, SyntaxError):
+        return True
+    return any(token.string in QUOTES for token in tokens if token.type == tokenize.ERRORTOKEN)
 
 
 def _Facts(logical: CLogicalLine, shift: int = 0) -> tuple:
@@ -162,8 +204,11 @@ def Errors(logicals: list[CLogicalLine], analyzer: CPGenAnalyzerImpl) -> list[tu
 
 
 def IsBroken(line: str) -> bool:
-    """True when the interpreter's grammar refuses a line, completed to a statement of its own."""
-    line = line.strip()
+    """True when the interpreter's grammar refuses a line, completed to a statement of its own.
+
+    A backslash at its end joins it to the rest of the row, where nothing is left.
+    """
+    line = line.strip().removesuffix("\\").rstrip()
     word = line.split(None, 1)[0] if line else ""
     before, behind = "", ""
     if re.match(r"elif\b", word):
@@ -179,7 +224,7 @@ def IsBroken(line: str) -> bool:
     elif word.startswith("@"):
         behind = "\ndef function(): pass"
     if line.endswith(":"):
-        line += " pass"
+        line += "\n case _: pass" if word == "match" else " pass"
     return IsRefused(before + line + behind + "\n")
 
 
@@ -313,6 +358,7 @@ def main() -> None:
         counts["texts"] += 1
         counts["faults"] += len(case.damaged)
         counts["found"] += case.found_count
+        counts["joined"] += case.joined_count
         counts["exact"] += is_right
         counts["dirty"] += case.is_dirty
         counts["changed"] += not case.keeps_others

@@ -17,6 +17,8 @@ constexpr char CloserOf(char opener) {
 class CBrackets {
   public:
     bool AreOpen() const { return !_fOpen.empty(); }
+    // The closer of the innermost bracket. Requires: AreOpen().
+    char Innermost() const { return _fOpen.back().closer; }
     void Clear() { _fOpen.clear(); }
 
     // Takes account of the opener at `pos`; false when it is known that it will never be closed.

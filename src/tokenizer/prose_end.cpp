@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "tokenizer/code_signs.h"
 #include "tokenizer/row_facts.h"
 
 namespace codeloom {
@@ -10,10 +11,10 @@ namespace {
 
 // The row ends with two quotes that begin no empty string: they are left of triple quotes. Such a string
 // stands after a blank, an operator, an opener or a prefix of at most two letters.
-bool EndsInLostQuotes(std::string_view row) {
+bool EndsInLostQuotes(std::string_view row, char quote) {
     const size_t last = row.find_last_not_of(" \t)]},;:");
     if (last == std::string_view::npos || last == 0) return false;
-    if (ByteKind(row[last]) != EByteKind::kQuote || row[last - 1] != row[last]) return false;
+    if (row[last] != quote || row[last - 1] != quote) return false;
     size_t before = last - 1;
     while (before > 0 && IsNameByte(row[before - 1])) --before;
     if (before == 0) return true;
@@ -56,21 +57,26 @@ size_t FindProseEnd(CLexer& lexer, size_t pos, size_t end, size_t& looked_at) {
     const std::string_view text = lexer.Text();
     const int32_t indent = RowIndent(text, pos);
     size_t last_end = FindRowEnd(text, pos);
-    const size_t content = pos + ReadStringStart(text, pos).ContentOffset();
-    if (EndsInLostQuotes(text.substr(content, last_end - content))) return last_end;
+    const CStringStart start = ReadStringStart(text, pos);
+    const size_t content = pos + start.ContentOffset();
+    if (EndsInLostQuotes(text.substr(content, last_end - content), start.quote)) return last_end;
     CProseEnd prose(last_end);
     CRowReader reader(lexer, PlaceWithinRow(last_end));
     CTokenRow row;
+    bool is_broken_code = false;
     bool is_in_session = false;  // of the interpreter, up to a blank row
     while (reader.Next(row) && row.end <= end) {
         looked_at = std::max(looked_at, row.end);
         if (row.indent < indent && BeginsStatement(row)) break;
-        is_in_session &= row.start == last_end && !BeginsStatement(row);
+        is_in_session &= row.start == last_end && !BeginsStatement(row) && !IsHeader(row);
         is_in_session |= row.text.starts_with(">>>");
         last_end = row.end;
         if (IsComment(row)) continue;
-        if (!row.is_in_brackets && EndsInLostQuotes(row.text)) return RowTextEnd(text, row);
-        if (IsBroken(row) || LooksLikeProse(row) || is_in_session) {
+        if (!row.is_in_brackets && EndsInLostQuotes(row.text, start.quote)) return RowTextEnd(text, row);
+        // One broken row may be one of code, two on end hardly are.
+        const bool is_broken = IsBroken(row) || LooksLikeProse(row);
+        is_broken_code = is_broken && !is_broken_code && HasSignsOfCode(row);
+        if (is_in_session || (is_broken && !is_broken_code)) {
             prose.AddProse(RowTextEnd(text, row));
             reader.ForgetBrackets();  // in prose they mean nothing
         } else {

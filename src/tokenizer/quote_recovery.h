@@ -14,8 +14,8 @@ namespace codeloom {
 // is sound. `looked_at` is how far the search went.
 //
 // A string is doubted when what stands around its closing quotes is odd for closing quotes. It is given up
-// when the rows after it can't be code, and those that would be code if its closing quotes opened a string
-// can. Both only happen in broken text.
+// when the rows after it can't be code, and fit much worse than those that are code if it isn't closed. Both
+// only happen in broken text.
 size_t FindUnclosedTripleEnd(CLexer& lexer, size_t pos, const CStringStart& start, const CStringEnd& found,
                              size_t& looked_at);
 

@@ -42,7 +42,7 @@ class CStatementRows {
     void _Note(const CTokenRow& row) { _fEndsOpen = EndsOpen(row); }
 
     bool _MayBeEntry(const CTokenRow& row) const {
-        return _fEndsOpen && !BeginsStatement(row) && !BeginsWithTwoOperands(row);
+        return _fEndsOpen && !BeginsStatement(row) && !BeginsWithTwoOperands(row) && !AssignsToPart(row);
     }
 
     int32_t _fIndent;
@@ -170,6 +170,17 @@ size_t FindRecoveredEnd(CLexer& lexer, const CPlace& place) {
     const bool is_header = IsCompoundWord(WordAt(row.text, 0)) ? !HasBody(row) || EndsAfterColon(row)
                                                                : IsSpoiltHeader(row, reader.OpenBrackets());
     return is_header ? FindHeaderEnd(lexer, place) : FindStatementEnd(lexer, place);
+}
+
+bool ClosesBrackets(CLexer& lexer, size_t pos) {
+    CRowReader reader(lexer, PlaceWithinRow(pos));
+    CTokenRow row;
+    int row_count = 0;
+    do {
+        if (row_count++ == kMostHeaderRows || !reader.Next(row)) return false;
+    } while (!reader.OpenBrackets().empty());
+    const bool begins_header = row_count > 1 && IsCompoundWord(WordAt(row.text, 0));
+    return !begins_header && HasOuterColon(row);
 }
 
 }  // namespace codeloom

@@ -14,4 +14,7 @@ namespace codeloom {
 // closing bracket. A compound header ends with its first row that ends in ":".
 size_t FindRecoveredEnd(CLexer& lexer, const CPlace& place);
 
+// The header at `pos` ends with the row that closes its brackets, whatever is wrong within them.
+bool ClosesBrackets(CLexer& lexer, size_t pos);
+
 }  // namespace codeloom

@@ -53,6 +53,10 @@ bool EndsInOpenerOrOperator(const CRowToken& last) {
            (kind == EByteKind::kOperator && last.text.back() != ':' && last.text.back() != ';');
 }
 
+bool IsWholeStatement(EWord word) {
+    return word == EWord::kPass || word == EWord::kBreak || word == EWord::kContinue;
+}
+
 }  // namespace
 
 bool IsComment(const CTokenRow& row) {
@@ -63,11 +67,16 @@ bool BeginsWithCloser(const CTokenRow& row) {
     return ByteKind(row.text.front()) == EByteKind::kCloser;
 }
 
+bool HasOuterColon(const CTokenRow& row) {
+    return AnyToken(row, [](const CRowToken& token, int depth) { return depth <= 0 && token.text == ":"; });
+}
+
 // Behind an opener no `for` and no `if` can continue an expression.
 bool BeginsStatement(const CTokenRow& row) {
     if (StartsStatement(row.text, 0)) return true;
     const bool is_behind_opener = LastKind(row.before) == EByteKind::kOpener;
-    return is_behind_opener && IsHeaderKeyword(WordAt(row.text, 0)) && !ClosesOuterBracket(row);
+    if (!is_behind_opener || !IsHeaderKeyword(WordAt(row.text, 0))) return false;
+    return !ClosesOuterBracket(row) || HasOuterColon(row);
 }
 
 bool BeginsHeader(const CTokenRow& row) {
@@ -80,6 +89,10 @@ bool BeginsHeader(const CTokenRow& row) {
         return is_header || depth < 0 || token.word == EWord::kElse || token.word == EWord::kLambda;
     });
     return is_header;
+}
+
+bool IsHeader(const CTokenRow& row) {
+    return EndsInColon(row) && IsCompoundWord(WordAt(row.text, 0));
 }
 
 bool BeginsDefinition(const CTokenRow& row) {
@@ -111,6 +124,14 @@ bool HasAssignment(const CTokenRow& row) {
     return AnyToken(row, [](const CRowToken& token, int depth) { return depth <= 0 && token.text == "="; });
 }
 
+bool AssignsToPart(const CTokenRow& row) {
+    bool is_part = false;
+    return AnyToken(row, [&is_part](const CRowToken& token, int depth) {
+        is_part |= depth <= 0 && token.text == ".";
+        return is_part && depth <= 0 && token.text == "=";
+    });
+}
+
 bool EndsInColon(const CTokenRow& row) {
     return !row.tokens.empty() && row.tokens.back().text.back() == ':';
 }
@@ -126,8 +147,7 @@ bool EndsAfterColon(const CTokenRow& row) {
 }
 
 bool HasBody(const CTokenRow& row) {
-    return !EndsInColon(row) &&
-           AnyToken(row, [](const CRowToken& token, int depth) { return depth <= 0 && token.text == ":"; });
+    return !EndsInColon(row) && HasOuterColon(row);
 }
 
 bool EndsOpen(const CTokenRow& row) {
@@ -162,23 +182,12 @@ bool IsBroken(const CTokenRow& row) {
         if (token_i == 0) continue;
         const CRowToken& last = row.tokens[token_i - 1];
         if (last.text == "." && !is_import && token.type != kTokenId_NAME) return true;
+        if (IsWholeStatement(last.word) && token.text != ";") return true;
         const bool is_after_soft_keyword = token_i == 1 && IsSoftKeyword(last.word);
         if (!is_after_soft_keyword && AreOperandsSideBySide(last, token.text, 0)) return true;
         if (IsTriple(token)) return false;
     }
     return false;
-}
-
-bool HasCodeShape(const CTokenRow& row) {
-    if (EndsInColon(row) && IsCompoundWord(WordAt(row.text, 0))) return true;
-    CRowToken last;
-    return AnyToken(row, [&last](const CRowToken& token, int) {
-        // In prose a blank stands before a bracket.
-        const bool is_call = token.text == "(" && last.type == kTokenId_NAME &&
-                             last.text.data() + last.text.size() == token.text.data();
-        last = token;
-        return is_call || token.text == "=" || token.text == "+=";
-    });
 }
 
 bool LooksLikeProse(const CTokenRow& row) {

@@ -18,6 +18,9 @@ bool BeginsStatement(const CTokenRow& row);
 // lambda of an expression explains its ":".
 bool BeginsHeader(const CTokenRow& row);
 
+// The row begins like a compound statement and ends in ":".
+bool IsHeader(const CTokenRow& row);
+
 // The row begins with `def`, `class` or `async def`.
 bool BeginsDefinition(const CTokenRow& row);
 
@@ -36,7 +39,13 @@ bool ClosesOuterBracket(const CTokenRow& row);
 // A "=" stands outside the row's own brackets.
 bool HasAssignment(const CTokenRow& row);
 
+// A "=" after an attribute stands outside the row's own brackets: no keyword argument.
+bool AssignsToPart(const CTokenRow& row);
+
 bool EndsInColon(const CTokenRow& row);
+
+// A ":" stands outside the row's own brackets.
+bool HasOuterColon(const CTokenRow& row);
 
 // The row ends in a ":" outside its own brackets.
 bool EndsInOuterColon(const CTokenRow& row);
@@ -64,9 +73,6 @@ bool HasTripleQuotes(const CTokenRow& row);
 
 // The row, as far as the first triple quotes, is surely no row of sound code.
 bool IsBroken(const CTokenRow& row);
-
-// The row, not a broken one, has what prose hardly has: an assignment, a call, a header.
-bool HasCodeShape(const CTokenRow& row);
 
 // The row is hardly one of code, but may be.
 bool LooksLikeProse(const CTokenRow& row);

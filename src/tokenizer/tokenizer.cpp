@@ -1,5 +1,6 @@
 #include "tokenizer/tokenizer.h"
 
+#include <algorithm>
 #include <array>
 #include <stdexcept>
 
@@ -24,6 +25,11 @@ constexpr auto kIsNoted = [] {
             type == kTokenId_RARROW || IsAssignmentOperator(static_cast<int16_t>(type), EWord::kNone);
     return is_noted;
 }();
+
+CRowToken LastRowToken(const CRawLogical& logical) {
+    const CRawToken last = FindLastSignificant(logical.tokens);
+    return {logical.Text(last), last.type, last.word};
+}
 
 }  // namespace
 
@@ -254,19 +260,35 @@ void CTokenizer::_EndAtSeparator(CRawLogical& logical) {
 }
 
 // The row that begins at the place can't lie inside the brackets that are open: it begins with a statement,
-// or, no deeper than the logical line, with an operand although the row before ends with one.
+// or with an operand although the row before ends with one. Deeper rows may lack a comma: they are believed
+// to lie within the brackets of a simple statement, and of a header that is closed as headers are.
 bool CTokenizer::_ProvesUnclosed(const CRawLogical& logical) {
     const std::string_view text = _fLexer.Text();
     if (StartsStatement(text, _fPlace.pos)) return true;
-    if (MayBeginHeader(text, _fPlace.pos)) {
-        CTokenRow row;
-        CRowReader(_fLexer, _fPlace).Next(row);
-        return BeginsHeader(row);
-    }
-    if (_fPlace.indent > _fIndent) return false;
-    if (!BeginsOperand(text, _fPlace.pos)) return false;
-    const CRawToken last = FindLastSignificant(logical.tokens);
-    return AreOperandsSideBySide({logical.Text(last), last.type, last.word}, text, _fPlace.pos);
+    if (MayBeginHeader(text, _fPlace.pos)) return _BeginsHeader(logical);
+    const CRawToken& first = logical.tokens.front();
+    const bool is_deeper = _fPlace.indent > _fIndent;
+    if (is_deeper && !IsCompoundWord(first.word)) return false;
+    const CRowToken before = LastRowToken(logical);
+    if (before.type == kTokenId_COLON && _EndsHeader(logical)) return true;
+    const bool is_print = WordAt(text, _fPlace.pos) == EWord::kPrint && IsOperandEnd(before);
+    if (!is_print && !AreOperandsSideBySide(before, text, _fPlace.pos)) return false;
+    return !is_deeper || !ClosesBrackets(_fLexer, first.start);
+}
+
+bool CTokenizer::_BeginsHeader(const CRawLogical& logical) {
+    CTokenRow row;
+    CRowReader(_fLexer, _fPlace).Next(row);
+    row.before = LastRowToken(logical);
+    return BeginsHeader(row) || BeginsStatement(row);
+}
+
+// The ":" that the rows end with can't stand in the parentheses that are open, so it is the header's.
+bool CTokenizer::_EndsHeader(const CRawLogical& logical) const {
+    if (_fBrackets.Innermost() != ')' || !IsCompoundWord(logical.tokens.front().word)) return false;
+    return std::none_of(logical.tokens.begin(), logical.tokens.end(), [](const CRawToken& token) {
+        return token.word == EWord::kLambda || token.word == EWord::kDef;
+    });
 }
 
 }  // namespace codeloom

@@ -63,6 +63,8 @@ class CTokenizer {
     bool _HasOpenQuote();
     void _EndAtSeparator(CRawLogical& logical);
     bool _ProvesUnclosed(const CRawLogical& logical);
+    bool _BeginsHeader(const CRawLogical& logical);
+    bool _EndsHeader(const CRawLogical& logical) const;
     bool _IsOpen(size_t forced_end) const { return _fBrackets.AreOpen() && forced_end == kUpToEnd; }
 
     CLexer _fLexer;
