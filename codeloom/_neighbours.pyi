@@ -369,7 +369,7 @@ def GetUtf8Ptr(u: bytes | str) -> bytes:
 
 def AdjustUtf8Pos(utf8_ptr: bytes | str, pos: int, diff: int, end_pos: int) -> int:
     """
-    The byte offset of the character that lies `diff` characters behind (before, if negative) the one
+    The byte offset of the character that lies `diff` characters after (before, if negative) the one
     that byte `pos` is part of; -1 or `end_pos` when it isn't in the buffer. A `pos` outside the
     buffer is no part of a character, and each byte between it and the buffer counts as one.
     ValueError when `end_pos` lies outside the buffer.
@@ -483,7 +483,7 @@ class CNonNestedSearch:
 
 def _FindStringEndNonNested(search: CNonNestedSearch, quote_i: int) -> int:
     """
-    The byte index behind the string literal whose opening quote stands at `quote_i` of the text
+    The byte index after the string literal whose opening quote stands at `quote_i` of the text
     searched. An unterminated one ends with its row, with triple quotes at the end of the search.
     IndexError when `quote_i` lies outside the text searched.
     """
@@ -546,7 +546,7 @@ class CStringTokenizer:
 
     @property
     def fAtEnd(self) -> bool:
-        """True behind the last token."""
+        """True after the last token."""
 
     @property
     def fPos(self) -> int:
@@ -613,7 +613,7 @@ def IsParentOfDefLineScope(maybe_parent: str, def_line_scope: str) -> bool:
 
 def NextNonNestedUtf8PtrIndex(utf8_ptr: bytes | str, pos: int, end_pos: int) -> int:
     """
-    The byte index behind `pos` that isn't nested: behind the bracket or string that begins at `pos`,
+    The byte index after `pos` that isn't nested: after the bracket or string that begins at `pos`,
     otherwise the next one. -1 when `pos` isn't in the buffer, ValueError when `end_pos` lies outside
     it. A prefix of a string is walked byte by byte.
     """
@@ -637,12 +637,12 @@ def JoinTokens(tokens: Iterable[bytes | str]) -> bytes:
 
 def _NonInlineNextNonNestedUtf8PtrIndex(utf8_ptr: bytes | str, pos: int, end_pos: int) -> int:
     """
-    The byte index behind the bracket or string that begins at `pos`; `end_pos` when it doesn't end.
+    The byte index after the bracket or string that begins at `pos`; `end_pos` when it doesn't end.
     IndexError or ValueError when `pos` or `end_pos` lies outside the buffer.
     """
 
 def EnsureScopeNameIndicies(scope: bytes | str) -> str:
-    """A scope with an index behind every name: "A#1.f" gives "A#1.f#0"."""
+    """A scope with an index after every name: "A#1.f" gives "A#1.f#0"."""
 
 def GetInstanceNameForClass(cls_name: bytes | str) -> str:
     """

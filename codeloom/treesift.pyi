@@ -149,7 +149,7 @@ def GetUtf8Ptr(u: bytes | str) -> bytes:
 
 def AdjustUtf8Pos(utf8_ptr: bytes | str, pos: int, diff: int, end_pos: int) -> int:
     """
-    The byte offset of the character that lies `diff` characters behind (before, if negative) the one
+    The byte offset of the character that lies `diff` characters after (before, if negative) the one
     that byte `pos` is part of; -1 or `end_pos` when it isn't in the buffer. A `pos` outside the
     buffer is no part of a character, and each byte between it and the buffer counts as one.
     ValueError when `end_pos` lies outside the buffer.
@@ -272,7 +272,7 @@ def IsParentOfDefLineScope(maybe_parent: str, def_line_scope: str) -> bool:
 
 def NextNonNestedUtf8PtrIndex(utf8_ptr: bytes | str, pos: int, end_pos: int) -> int:
     """
-    The byte index behind `pos` that isn't nested: behind the bracket or string that begins at `pos`,
+    The byte index after `pos` that isn't nested: after the bracket or string that begins at `pos`,
     otherwise the next one. -1 when `pos` isn't in the buffer, ValueError when `end_pos` lies outside
     it. A prefix of a string is walked byte by byte.
     """
@@ -432,7 +432,7 @@ class CStarExpression(CExpression):
         ...
 
     def GetStarredExpression(self) -> CExpression | None:
-        """The expression behind the star."""
+        """The expression after the star."""
     kSupportedRules: list[typing.Any] = ["star_expr: '*' expr"]
 
 class CDottedName(CExpression):
@@ -452,7 +452,7 @@ class CLambdaExpr(CExpression):
         """The one parameter, or the list of parameters; None without parameters."""
 
     def GetBodyExpr(self) -> CNode | None:
-        """The expression behind the colon."""
+        """The expression after the colon."""
 
 class CTestExpr(CExpression):
     """Declared, with no rule and no state."""
@@ -508,10 +508,10 @@ class CAtomExpr(CExpression):
         """
 
     def GetAtom(self) -> CNode | None:
-        """The atom in front of the trailers; None for a leaf."""
+        """The atom before the trailers; None for a leaf."""
 
     def GetTrailers(self) -> list[CNode]:
-        """The trailers behind the atom, as a new list."""
+        """The trailers after the atom, as a new list."""
     kSupportedRules: list[typing.Any] = ['atom_expr: [AWAIT] atom trailer*']
 
 class CPower(CExpression):
@@ -521,7 +521,7 @@ class CPower(CExpression):
         ...
 
     def GetAtom(self) -> CNode | None:
-        """The atom in front of the trailers, under either grammar."""
+        """The atom before the trailers, under either grammar."""
 
     def GetTrailers(self) -> list[CNode]:
         """The trailers between the atom and `**`, as a new list."""
@@ -546,10 +546,10 @@ class CNamedExpr(CExpression):
         ...
 
     def GetAssignedName(self) -> CNode | None:
-        """The name in front of `:=`."""
+        """The name before `:=`."""
 
     def GetRightHandExpression(self) -> CNode | None:
-        """The expression behind `:=`."""
+        """The expression after `:=`."""
     kSupportedRules: list[typing.Any] = ["namedexpr_test: test [':=' test]"]
 
 class CBinaryOp(CNode):
@@ -586,7 +586,7 @@ class CCompForNode(CNode):
         """The target between `for` and `in`."""
 
     def GetInNode(self) -> CNode | None:
-        """The iterable behind `in`."""
+        """The iterable after `in`."""
 
     def GetCompIterNode(self) -> CNode | None:
         """The `for` or `if` that follows; None for the last one."""
@@ -714,7 +714,7 @@ class CArgInfo:
     @property
     def name(self) -> CNode | None:
         """
-        The node of the name: of a parameter, or in front of `=` in a call; None without one.
+        The node of the name: of a parameter, or before `=` in a call; None without one.
         """
 
     @property
@@ -733,7 +733,7 @@ class CArgInfo:
 
 def GetTokenEndIndex(node: CNode) -> int:
     """
-    The index of the token behind the node's last one; TypeError when that isn't known by an index.
+    The index of the token after the node's last one; TypeError when that isn't known by an index.
     """
 
 def GetDefiningArgInfoList(node: CNode | None) -> list[CArgInfo]:
@@ -762,7 +762,7 @@ class CAsName:
 
     @property
     def as_name(self) -> typing.Any:
-        """The name behind `as`; None without one."""
+        """The name after `as`; None without one."""
 
     @as_name.setter
     def as_name(self, arg: object | None, /) -> None:
@@ -803,7 +803,7 @@ class CFromImportStmt(CNode):
 
     def GetFromString(self) -> str | None:
         """
-        The module behind `from`, with its dots; None when nothing stands between `from` and `import`.
+        The module after `from`, with its dots; None when nothing stands between `from` and `import`.
         """
 
     def GetImportStar(self) -> bool:
@@ -827,19 +827,19 @@ class CSingleUsedArgumentNode(CNode):
         """"*" or "**"; None without such."""
 
     def GetName(self) -> CNode | None:
-        """What stands in front of `=`; None when there is no `=`."""
+        """What stands before `=`; None when there is no `=`."""
 
     def GetValue(self) -> CNode | None:
-        """The value behind `=`; the node itself when there is no `=`."""
+        """The value after `=`; the node itself when there is no `=`."""
 
     def IsUnparenthesizedGenExpr(self) -> bool:
         """True for a comprehension without brackets of its own."""
 
     def GetNameAssigned(self) -> CNode | None:
-        """What stands in front of `:=`; None when there is no `:=`."""
+        """What stands before `:=`; None when there is no `:=`."""
 
     def GetNamedRightHandExpression(self) -> CNode | None:
-        """The value behind `:=`; None when there is no `:=`."""
+        """The value after `:=`; None when there is no `:=`."""
 
 class CFunctionParameterDef(CNode):
     """One parameter definition with a possible annotation."""
@@ -891,7 +891,7 @@ class CClassdefStmt(CStmt):
         ...
 
     def GetClassName(self) -> str | None:
-        """The name behind `class`."""
+        """The name after `class`."""
 
     def GetBaseClassList(self) -> list[CArgInfo]:
         """
@@ -905,13 +905,13 @@ class CFuncdefStmt(CStmt):
         ...
 
     def GetFunctionName(self) -> str | None:
-        """The name behind `def`."""
+        """The name after `def`."""
 
     def GetParameters(self) -> CParametersNode | None:
         """The parameters with their brackets."""
 
     def GetReturnType(self) -> CExpression | None:
-        """The expression behind `->`; None when the header has no arrow."""
+        """The expression after `->`; None when the header has no arrow."""
 
     def GetSuite(self) -> CNode | None:
         """The body; None for a node without children."""
@@ -998,7 +998,7 @@ class CForStmt(CStmt):
         """The body."""
 
     def GetElseBody(self) -> CNode | None:
-        """The body behind `else`; None when there is none."""
+        """The body after `else`; None when there is none."""
 
 class CWithItem(CNode):
     """One item of a with statement."""
@@ -1007,10 +1007,10 @@ class CWithItem(CNode):
         ...
 
     def GetExpression(self) -> CNode | None:
-        """The expression in front of `as`."""
+        """The expression before `as`."""
 
     def GetTarget(self) -> CNode | None:
-        """The target behind `as`."""
+        """The target after `as`."""
 
 class CWithStmt(CStmt):
     """With statement."""
@@ -1034,10 +1034,10 @@ class CAnnotatedAssignNode(CNode):
         ...
 
     def GetTypeHintNode(self) -> CNode | None:
-        """The annotation behind the colon."""
+        """The annotation after the colon."""
 
     def GetPostEqualsTestExpr(self) -> CNode | None:
-        """The value behind `=`; None for a bare annotation."""
+        """The value after `=`; None for a bare annotation."""
     kSupportedRules: list[typing.Any] = ["annassign: ':' test ['=' test]"]
 
 class CExprStmt(CStmt):
@@ -1055,11 +1055,11 @@ class CExprStmt(CStmt):
         """The annotation and its value; None when there is no annotation."""
 
     def GetInitialTestExpr(self) -> CNode | None:
-        """The first target, or the expression in front of an operator."""
+        """The first target, or the expression before an operator."""
 
     def GetPostEqualsTestExpr(self, equal_num: int) -> CNode | None:
         """
-        The target or value behind the `=` numbered `equal_num`, from zero; ValueError when there are fewer.
+        The target or value after the `=` numbered `equal_num`, from zero; ValueError when there are fewer.
         """
 
     def GetAugAssignOp(self) -> str | None:
@@ -1100,7 +1100,7 @@ class CSingleDecorator(CNode):
         ...
 
     def GetDottedName(self) -> CNode | None:
-        """The name behind `@`: a CDottedName, or a CNameLiteral."""
+        """The name after `@`: a CDottedName, or a CNameLiteral."""
 
     def GetUsedArgList(self) -> list[CArgInfo]:
         """A new list of CArgInfo, one for each argument; empty without any."""
@@ -1120,7 +1120,7 @@ class CExceptClause(CNode):
         ...
 
     def GetExceptionType(self) -> CNode | None:
-        """The expression behind `except`."""
+        """The expression after `except`."""
 
     def GetTarget(self) -> CNode | None:
         """What the exception is bound to; None when it isn't."""
@@ -1144,7 +1144,7 @@ class CTypeParameter(CNode):
         """"*" or "**"; None for a plain type parameter."""
 
     def GetSpecNode(self) -> CNode | None:
-        """The bound behind the colon; None when there is none."""
+        """The bound after the colon; None when there is none."""
 
 class CPatternNode(CNode):
     """Base class for the patterns of a case."""
@@ -1270,7 +1270,7 @@ class CNodeToTextConverterImpl(CNodeToTextConverter):
 
     def TextForAtomPlusTrailers(self, atom: CNode, trailers: list[CNode], dotted_name_only: bool=False, discard_simple_parens: bool=True, literal_only: bool=False) -> bytes | None:
         """
-        The text of an atom and the trailers behind it as UTF-8; None when the atom has none. ValueError for a trailer that begins with none of `.`, `(` and `[`.
+        The text of an atom and the trailers after it as UTF-8; None when the atom has none. ValueError for a trailer that begins with none of `.`, `(` and `[`.
         """
 
 def FinishedWithNode(node: object | None) -> None:
@@ -1537,7 +1537,7 @@ class CNodeWalker:
         """Visit a value, be it below a target."""
 
     def _VisitCompForNode(self, node: CCompForNode) -> None:
-        """A `for` clause of a comprehension and the clauses behind it."""
+        """A `for` clause of a comprehension and the clauses after it."""
 
     def _VisitNameLiteral(self, node: CNameLiteral, atom_node: CNode | None=None, all_trailers: list[CNode] | None=None, trailer_i: int=-1) -> None:
         """
@@ -1620,7 +1620,7 @@ class CNodeWalker:
         """An atom and its trailers, from left to right."""
 
     def _VisitCall(self, atom: CNode, prev_trailers: list[CNode], arglist: CNode) -> None:
-        """The call of what an atom and the trailers behind it give."""
+        """The call of what an atom and the trailers after it give."""
 
     def _ProcessFunctionCall(self, func_name: bytes | None, arg_list: list[CArgInfo]) -> None:
         """
@@ -1654,7 +1654,7 @@ class CNodeWalker:
 
     def _TypeEquivForNode(self, node: CNode, extra_trailer: bytes | None=None) -> bytes | None:
         """
-        What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, stands behind it where a part of the value is meant.
+        What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, follows it where a part of the value is meant.
         """
 
     def _TypeEquivForOperatorExpression(self, op_expr: COperatorExpression) -> bytes | None:
@@ -1804,7 +1804,7 @@ class CTypeHintWalker(CDispatchWalker):
         """
 
     def _GetRowRange(self, node: CNode) -> tuple[int, int]:
-        """The first row of `node` and the one behind its last."""
+        """The first row of `node` and the one after its last."""
 
     def _IsDottedName(self, s: bytes) -> bool:
         """

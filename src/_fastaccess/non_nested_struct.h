@@ -12,7 +12,7 @@ struct tNonNestedStruct {             // NOLINT(readability-identifier-naming)
     char first_char = '\0';  // of to_find; not set when that is empty
     Py_ssize_t pos = 0;      // where the next step starts
     Py_ssize_t end = 0;      // exclusive
-    int nest_count = 0;      // brackets open at pos; below zero behind a closer too many
+    int nest_count = 0;      // brackets open at pos; below zero after a closer too many
 };
 
 }  // namespace codeloom

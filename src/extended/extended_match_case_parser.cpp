@@ -13,7 +13,7 @@ namespace codeloom {
 
 namespace {
 
-constexpr Py_ssize_t kPatternIndex = 1;  // of the first token behind `case`
+constexpr Py_ssize_t kPatternIndex = 1;  // of the first token after `case`
 
 // What stands in the invented brackets needs none: no comprehension, no `yield`, no lone star.
 bool IsSubject(const CNode& node) {
@@ -24,7 +24,7 @@ bool IsSubject(const CNode& node) {
 
 }  // namespace
 
-// Removed tokens are none of the statement's: those in front of the bound in `def f[T: match.a]()`.
+// Removed tokens are none of the statement's: those before the bound in `def f[T: match.a]()`.
 nb::tuple CExtendedMatchCaseParser::_RemoveSkipToks(nb::tuple toks, nb::tuple positions) {
     nb::list kept_toks, kept_positions;
     for (Py_ssize_t i = 0; i < TupleSize(toks); ++i) {
@@ -111,7 +111,7 @@ void CExtendedMatchCaseParser::_RefuseKeyword(Py_ssize_t tok_i) {
     if (_fPGenParser->IsKeyword(tok) && !TextIsOneOf(tok, "None", "True", "False")) _FailAt(tok_i);
 }
 
-// Of the ranges that begin behind `case`, the whole pattern is the only one with a comma outside brackets.
+// Of the ranges that begin after `case`, the whole pattern is the only one with a comma outside brackets.
 bool CExtendedMatchCaseParser::_IsOpenSequence(const CPatternStep& step) {
     return step.start_i == kPatternIndex && step.allow_as && _Find(",", step.start_i, step.end_i) != -1;
 }

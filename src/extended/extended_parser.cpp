@@ -17,7 +17,7 @@ namespace codeloom {
 
 namespace {
 
-// What stands in the brackets behind a `with`.
+// What is in the parentheses after a `with`.
 struct CWithContents {
     bool has_target = false;  // `a as b`, which no expression has
     bool are_items = false;   // without a target, expressions with commas between them
@@ -153,10 +153,10 @@ CNodeRef CExtendedParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, boo
 //   with a, b,:
 //             ^    stands within brackets only, which are off when the grammar reads the items
 void CExtendedParser::_RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i) {
-    bool is_behind_comma = false;
+    bool is_after_comma = false;
     ForEachOutsideBrackets(toks, with_i + 1, TupleSize(toks), [&](Py_ssize_t i, std::string_view text) {
-        if (is_behind_comma && text == ":") _RaiseParseError(nb::int_(i));
-        is_behind_comma = text == ",";
+        if (is_after_comma && text == ":") _RaiseParseError(nb::int_(i));
+        is_after_comma = text == ",";
         return text != ":";
     });
 }
@@ -251,7 +251,7 @@ CNodeRef CExtendedParser::_CreateSingleTypeParameterNode(nb::tuple toks, bool in
     return parameter;
 }
 
-// The default behind the `=` at `equal_i`; none when it is refused and errors aren't raised.
+// The default after the `=` at `equal_i`; none when it is refused and errors aren't raised.
 CNodeRef CExtendedParser::_ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                                         Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors) {
     const bool is_missing = _FindNextNonSkipIndex(toks, equal_i) >= end;

@@ -8,7 +8,7 @@
 //   with (x := f()) as y:   with (yield):   async with (a as b, c as d):   brackets that are and aren't
 //   items'
 //   @a[0].b                                 any expression as a decorator
-//   type is x                               `type` as a name in front of a keyword: type_aliases.cpp
+//   type is x                               `type` as a name before a keyword: type_aliases.cpp
 //   if a: type X = int                      an alias in a body on the row of its header
 //   def f[T: int = str]():                  defaults of type parameters
 //   case a, b:                              in extended_match_case_parser.h

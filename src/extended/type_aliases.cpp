@@ -14,7 +14,7 @@ namespace codeloom {
 
 namespace {
 
-// Calls visit(start, end) for each statement on a row: for those of the body behind a header, or for all.
+// Calls visit(start, end) for each statement on a row: for those of the body after a header, or for all.
 // The first token of the row stands at `first_i`.
 template <class Visit>
 void ForEachStatement(const nb::tuple& toks, Py_ssize_t first_i, Visit visit) {
@@ -31,7 +31,7 @@ void ForEachStatement(const nb::tuple& toks, Py_ssize_t first_i, Visit visit) {
     if (start != -1) visit(start, count);
 }
 
-// True when the last token in front of `i`, but for comments, backslashes and removed ones, is `type`.
+// True when the last token before `i`, but for comments, backslashes and removed ones, is `type`.
 bool IsBehindType(const nb::tuple& toks, Py_ssize_t i) {
     while (--i >= 0 && i < TupleSize(toks)) {
         const nb::handle tok = TupleItem(toks, i);
@@ -52,8 +52,8 @@ CNodeRef CExtendedParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, boo
     CNodeRef node = CPGenParserImpl::_ParseSpecialCaseWithTypeParameter(toks, in_async_def, positions, i);
     if (!node) return node;
     if (is_type) _RequireAlias(*node);
-    const Py_ssize_t behind_name_i = _FindNextNonSkipIndex(toks, _FindNextNonSkipIndex(toks, i));
-    _fForms.Note(is_type ? forms::kTypeAlias : forms::kTypeParameters, nb::int_(is_type ? i : behind_name_i));
+    const Py_ssize_t after_name_i = _FindNextNonSkipIndex(toks, _FindNextNonSkipIndex(toks, i));
+    _fForms.Note(is_type ? forms::kTypeAlias : forms::kTypeParameters, nb::int_(is_type ? i : after_name_i));
     return node;
 }
 
@@ -71,14 +71,14 @@ bool CExtendedParser::_BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i)
     return IsToken(toks, i, "=");
 }
 
-// The assignment that an alias is parsed as has one `=`, and one expression behind it.
+// The assignment that an alias is parsed as has one `=`, and one expression after it.
 void CExtendedParser::_RequireAlias(const CNode& node) {
     const CNode& assignment = node.As<CWithTypeParameters>() ? node.ChildAt(-1) : node;
     if (ListedCount(assignment) > 3) _RaiseParseError(assignment.ChildAt(3).fContext);
     _RequireSingle(assignment.ChildAt(2));
 }
 
-// In a body behind its header the grammar doesn't know an alias, and stumbles over its name.
+// In a body after its header the grammar doesn't know an alias, and stumbles over its name.
 CNodeRef CExtendedParser::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, CPositions positions) {
     try {
         return CPGenParserImpl::_ParseToksToNodeImpl(toks, in_async_def, positions);

@@ -158,7 +158,7 @@ class CRulesReader {
         if (_Current().kind != EPiece::kName) _fPieces.RaiseExpected("the name of a rule");
         CRuleText rule{std::string(_Current().text), _Current().row, CNfa()};
         _fPieces.Advance();
-        _TakeMark(':', "':' behind the name of the rule");
+        _TakeMark(':', "':' after the name of the rule");
         _fAutomaton = &rule.automaton;
         rule.automaton.fWhole = _ReadAlternatives();
         if (_Current().kind != EPiece::kRowEnd && _Current().kind != EPiece::kTextEnd)

@@ -7,7 +7,7 @@
 // Where single children are promoted, chains make an atom cheap. When a rule is begun, the next token alone
 // decides which rule it begins with, which one that begins with, and so on down to the rule that takes the
 // token: in an expression some seventeen rules, each with one child so far. All these chains are known
-// beforehand, and kept as a tree: a chain is its last rule, in the state behind its first child, and the
+// beforehand, and kept as a tree: a chain is its last rule, in the state after its first child, and the
 // chain of the rules around that one. Rules that can take no second child are left out, since such a rule is
 // replaced by its child.
 #pragma once

@@ -26,7 +26,7 @@ struct CFoundText {
 // Rows counted from the logical's first one.
 struct CRowRange {
     Py_ssize_t first_row = 0;
-    Py_ssize_t end_row = 0;  // behind the last one
+    Py_ssize_t end_row = 0;  // after the last one
 };
 
 class CTypeHintWalker : public CDispatchWalker {
@@ -76,7 +76,7 @@ class CTypeHintWalker : public CDispatchWalker {
               "The hint following `type:`, with blanks for all before it, so that offsets stay; None when "
               "there is none.",
               "comment"_a);
-    OPERATION(CRowRange, _GetRowRange, (CNode& node), "The first row of `node` and the one behind its last.",
+    OPERATION(CRowRange, _GetRowRange, (CNode& node), "The first row of `node` and the one after its last.",
               "node"_a);
     OPERATION(bool, _IsDottedName, (nb::bytes s),
               "True for letters and digits alone that begin with a letter, and for nothing.", "s"_a);

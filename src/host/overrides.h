@@ -42,7 +42,7 @@ class CHostOperation {
     // True when the type of `self` has another function under this name than `native_type`.
     bool IsOverridden(nb::handle self, nb::handle native_type) const;
 
-    // Calls the operation of `self`; `count` arguments stand behind it in `stack`, whose first entry is
+    // Calls the operation of `self`; `count` arguments follow it in `stack`, whose first entry is
     // `self`.
     nb::object Call(PyObject* const* stack, size_t count) const;
 

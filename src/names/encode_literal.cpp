@@ -65,10 +65,10 @@ constexpr std::array<bool, 128> kIsHarmless = [] {
     return is_harmless;
 }();
 
-// Writes the backslash at `pos` and what it escapes; returns the position behind what was written.
+// Writes the backslash at `pos` and what it escapes; returns the position after what was written.
 size_t EncodeEscape(std::string_view text, size_t pos, std::string& out) {
-    const size_t behind_row_end = pos + 1 + RowEndLength(text, pos + 1);
-    if (behind_row_end > pos + 1) return behind_row_end;  // a continued row: nothing of it is in the value
+    const size_t after_row_end = pos + 1 + RowEndLength(text, pos + 1);
+    if (after_row_end > pos + 1) return after_row_end;  // a continued row: nothing of it is in the value
     out += '\\';
     if (pos + 1 == text.size()) return pos + 1;
     const bool is_plain = RowEnderAt(text, pos + 1).length == 0;

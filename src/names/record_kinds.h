@@ -11,7 +11,7 @@
 
 namespace codeloom {
 
-// What stands behind the prefix.
+// What follows the prefix.
 //   none      nothing
 //   text      a text as it stands
 //   index     the decimal number of a token

@@ -129,7 +129,7 @@ class CPGenParserImpl : public CPGenAnalyzer {
   protected:
     CNodeRef _ParseCopyOfPart(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                               Py_ssize_t start, Py_ssize_t end);
-    // The node of what stands behind `mark_i` in a type parameter that ends at `end`, its bound for one; none
+    // The node of what follows `mark_i` in a type parameter that ends at `end`, its bound for one; none
     // when it is refused and errors aren't raised.
     CNodeRef _ParseBound(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                          Py_ssize_t mark_i, Py_ssize_t end, bool raise_errors);

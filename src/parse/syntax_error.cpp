@@ -27,7 +27,7 @@ CPlace Unpack(nb::handle pair) {
     return {items[0], items[1]};
 }
 
-// Just behind the last token; a removed one has no length.
+// Just after the last token; a removed one has no length.
 CPlace PlaceAtEnd(nb::handle logical) {
     const nb::object last_token = logical.attr("fToks")[-1];
     CPlace place = Unpack(logical.attr("fPositions")[-1]);

@@ -34,7 +34,7 @@ void CTokenFeed::FeedAll() {
     for (Py_ssize_t i = _fStart; i < _fEnd; ++i) _FeedToken(i);
     _CompleteStatement();
     static const CHostText kNewline("\n");
-    const nb::int_ end(_fEnd);  // the context of the invented tail: behind the last real token
+    const nb::int_ end(_fEnd);  // the context of the invented tail: after the last real token
     _fParser.addtoken(kTokenId_NEWLINE, kNewline, end);
     _fParser.addtoken(kTokenId_ENDMARKER, nb::none(), end);
 }

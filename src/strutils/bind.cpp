@@ -74,7 +74,7 @@ void BindStringPrimitives(nb::module_& module) {
 void BindPositionPrimitives(nb::module_& module) {
     module.def(
         "AdjustUtf8Pos", &HostAdjustUtf8Pos, "utf8_ptr"_a, "pos"_a, "diff"_a, "end_pos"_a,
-        "The byte offset of the character that lies `diff` characters behind (before, if negative) the one\n"
+        "The byte offset of the character that lies `diff` characters after (before, if negative) the one\n"
         "that byte `pos` is part of; -1 or `end_pos` when it isn't in the buffer. A `pos` outside the\n"
         "buffer is no part of a character, and each byte between it and the buffer counts as one.\n"
         "ValueError when `end_pos` lies outside the buffer.");

@@ -37,7 +37,7 @@ inline Py_ssize_t MoveToBuffer(Py_ssize_t pos, Py_ssize_t& diff, Py_ssize_t end_
     return pos + moved;
 }
 
-// The offset of the character that lies `diff` characters behind (before, if negative) the one that `pos` is
+// The offset of the character that lies `diff` characters after (before, if negative) the one that `pos` is
 // part of; -1 or `end_pos` when the buffer ends before it. A `pos` outside the buffer is no part of a
 // character, and each byte between it and the buffer counts as one.
 inline Py_ssize_t AdjustUtf8Pos(const char* utf8_ptr, Py_ssize_t pos, Py_ssize_t diff, Py_ssize_t end_pos) {

@@ -47,7 +47,7 @@ void BindSymbolPrimitives(nb::module_& module) {
         "lengths alone are compared. TypeError unless both are text strings.");
     module.def(
         "NextNonNestedUtf8PtrIndex", &HostNextNonNested, "utf8_ptr"_a, "pos"_a, "end_pos"_a,
-        "The byte index behind `pos` that isn't nested: behind the bracket or string that begins at `pos`,\n"
+        "The byte index after `pos` that isn't nested: after the bracket or string that begins at `pos`,\n"
         "otherwise the next one. -1 when `pos` isn't in the buffer, ValueError when `end_pos` lies outside\n"
         "it. A prefix of a string is walked byte by byte.");
 }

@@ -82,7 +82,7 @@ inline constexpr char AsLower(char c) {
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c | 0x20) : c;
 }
 
-// The byte at `pos`, NUL behind the end of the text.
+// The byte at `pos`, NUL after the end of the text.
 inline constexpr char ByteAt(std::string_view text, size_t pos) {
     return pos < text.size() ? text[pos] : '\0';
 }

@@ -40,14 +40,14 @@ inline CDecodedChar DecodeChar(std::string_view text, size_t pos) {
 
 // The role of a character beyond ASCII in names: 0 none, 1 continues one, 2 begins one too.
 inline uint32_t NameRole(uint32_t code) {
-    const uint32_t* behind = std::upper_bound(std::begin(kNameRanges), std::end(kNameRanges), code << 2 | 3);
-    return behind == std::begin(kNameRanges) ? 0 : *(behind - 1) & 3;
+    const uint32_t* after = std::upper_bound(std::begin(kNameRanges), std::end(kNameRanges), code << 2 | 3);
+    return after == std::begin(kNameRanges) ? 0 : *(after - 1) & 3;
 }
 
 // True for letters and numbers of any script beyond ASCII.
 inline bool IsUnicodeAlnum(uint32_t code) {
-    const uint32_t* const behind = std::upper_bound(std::begin(kAlnumRanges), std::end(kAlnumRanges), code);
-    return (behind - std::begin(kAlnumRanges)) % 2 != 0;
+    const uint32_t* const after = std::upper_bound(std::begin(kAlnumRanges), std::end(kAlnumRanges), code);
+    return (after - std::begin(kAlnumRanges)) % 2 != 0;
 }
 
 // The end of the name whose first part text[..pos) is known; `pos` itself when no further character belongs

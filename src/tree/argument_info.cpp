@@ -77,7 +77,7 @@ class CParameterReader {
         }
     }
 
-    // A default, an annotation or the name, by what stands in front of it.
+    // A default, an annotation or the name, by what stands before it.
     void _ReadPart(const CNodeRef& child) {
         if (_fAfterEqual) {
             _fCurrent.value = child;
@@ -217,14 +217,14 @@ void BindArgumentInfo(nb::module_& module) {
         "tree that its nodes belong to.")
         .def(TInit<>())
         .def_ro("name", &CArgInfo::name,
-                "The node of the name: of a parameter, or in front of `=` in a call; None without one.")
+                "The node of the name: of a parameter, or before `=` in a call; None without one.")
         .def_ro("value", &CArgInfo::value,
                 "The node of a parameter's default or of what a call passes; None without one.")
         .def_ro("prefix", &CArgInfo::prefix, "\"*\" or \"**\"; None without such.")
         .def_ro("type_expr", &CArgInfo::type_expr, "The node of the annotation; None without one.");
     module.def(
         "GetTokenEndIndex", &GetTokenEndIndex, "node"_a,
-        "The index of the token behind the node's last one; TypeError when that isn't known by an index.");
+        "The index of the token after the node's last one; TypeError when that isn't known by an index.");
     module.def(
         "GetDefiningArgInfoList", &GetDefiningArgInfoList, "node"_a.none(),
         "A new list of CArgInfo, one for each parameter of a definition: `node` is its parameter list, with "

@@ -16,7 +16,7 @@ using CArgumentList = std::vector<CArgument>;
 // What is known of one argument of a definition or of a call. The nodes belong to the tree, so a record is
 // good only as long as that.
 struct CArgument {
-    CNodeRef name;       // of a parameter; in a call what stands in front of `=`
+    CNodeRef name;       // of a parameter; in a call what stands before `=`
     CNodeRef value;      // the default of a parameter; what a call passes
     CTextOrNone prefix;  // "*" or "**"
     CNodeRef type_expr;  // the annotation

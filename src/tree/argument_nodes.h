@@ -16,12 +16,11 @@ class CSingleUsedArgumentNode : public CNode {
   public:
     OPERATIONS_OF(CSingleUsedArgumentNode, CNode)
     OPERATION(CTextOrNone, GetPrefix, (), "\"*\" or \"**\"; None without such.");
-    OPERATION(CNodeRef, GetName, (), "What stands in front of `=`; None when there is no `=`.");
-    OPERATION(CNodeRef, GetValue, (), "The value behind `=`; the node itself when there is no `=`.");
+    OPERATION(CNodeRef, GetName, (), "What stands before `=`; None when there is no `=`.");
+    OPERATION(CNodeRef, GetValue, (), "The value after `=`; the node itself when there is no `=`.");
     OPERATION(bool, IsUnparenthesizedGenExpr, (), "True for a comprehension without brackets of its own.");
-    OPERATION(CNodeRef, GetNameAssigned, (), "What stands in front of `:=`; None when there is no `:=`.");
-    OPERATION(CNodeRef, GetNamedRightHandExpression, (),
-              "The value behind `:=`; None when there is no `:=`.");
+    OPERATION(CNodeRef, GetNameAssigned, (), "What stands before `:=`; None when there is no `:=`.");
+    OPERATION(CNodeRef, GetNamedRightHandExpression, (), "The value after `:=`; None when there is no `:=`.");
     END_OPERATIONS
 
   private:
@@ -53,10 +52,10 @@ class CDefiningArglistNode : public CNode {};
 
 // `a, b=1, *c` in a call
 //   child    argument  ','  argument ...
-// In the 2.7 grammar `*` and `**` are children too, in front of their argument.
+// In the 2.7 grammar `*` and `**` are children too, before their argument.
 class CUsedArglistNode : public CNode {};
 
-// `( ... )` behind the name of a function
+// `( ... )` after the name of a function
 //   child    '('  [parameters]  ')'
 //   index     0        1
 class CParametersNode : public CNode {};

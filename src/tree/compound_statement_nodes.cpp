@@ -52,7 +52,7 @@ CNodeRef CExceptClause::GetExceptionType() {
     return GetChild(kTypeIndex);
 }
 
-// The target is last, behind `as` or a comma: both forms of the rule are in force.
+// The target is last, after `as` or a comma: both forms of the rule are in force.
 CNodeRef CExceptClause::GetTarget() {
     const Py_ssize_t separator_i = fChildren.IsNone() ? -1 : ChildCount() - 2;
     const bool has_target = separator_i >= 1 && TextIsOneOf(ChildText(separator_i), ",", "as");

@@ -6,7 +6,7 @@
 
 namespace codeloom {
 
-// `if test: suite`; an `elif` is read as `if`, and an `else` stands behind an invented `if 0: pass`
+// `if test: suite`; an `elif` is read as `if`, and an `else` follows an invented `if 0: pass`
 //   child    'if'  test  ':'  suite  ['elif'  test  ':'  suite] ...  ['else'  ':'  suite]
 //   index      0     1    2     3
 class CIfStmt : public CStmt {
@@ -28,7 +28,7 @@ class CForStmt : public CStmt {
     OPERATION(CNodeRef, GetTarget, (), "What is bound in each round.");
     OPERATION(CNodeRef, GetInExpression, (), "What is iterated over.");
     OPERATION(CNodeRef, GetBody, (), "The body.");
-    OPERATION(CNodeRef, GetElseBody, (), "The body behind `else`; None when there is none.");
+    OPERATION(CNodeRef, GetElseBody, (), "The body after `else`; None when there is none.");
     END_OPERATIONS
 
   private:
@@ -42,8 +42,8 @@ class CForStmt : public CStmt {
 class CWithItem : public CNode {
   public:
     OPERATIONS_OF(CWithItem, CNode)
-    OPERATION(CNodeRef, GetExpression, (), "The expression in front of `as`.");
-    OPERATION(CNodeRef, GetTarget, (), "The target behind `as`.");
+    OPERATION(CNodeRef, GetExpression, (), "The expression before `as`.");
+    OPERATION(CNodeRef, GetTarget, (), "The target after `as`.");
     END_OPERATIONS
 
   private:
@@ -68,7 +68,7 @@ class CWithStmt : public CStmt {
 class CExceptClause : public CNode {
   public:
     OPERATIONS_OF(CExceptClause, CNode)
-    OPERATION(CNodeRef, GetExceptionType, (), "The expression behind `except`.");
+    OPERATION(CNodeRef, GetExceptionType, (), "The expression after `except`.");
     OPERATION(CNodeRef, GetTarget, (), "What the exception is bound to; None when it isn't.");
     END_OPERATIONS
 

@@ -56,7 +56,7 @@ CTextOrNone CTypeParameter::GetName() {
         case 2:
             return ChildText(1);
         default:
-            return ChildText(-3);  // in front of the colon and the bound
+            return ChildText(-3);  // before the colon and the bound
     }
 }
 

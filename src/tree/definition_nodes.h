@@ -14,7 +14,7 @@ namespace codeloom {
 class CClassdefStmt : public CStmt {
   public:
     OPERATIONS_OF(CClassdefStmt, CStmt)
-    OPERATION(CTextOrNone, GetClassName, (), "The name behind `class`.");
+    OPERATION(CTextOrNone, GetClassName, (), "The name after `class`.");
     OPERATION(CArgumentList, GetBaseClassList, (),
               "A new list of CArgInfo, one for each base and keyword argument; empty without any.");
     END_OPERATIONS
@@ -29,10 +29,10 @@ class CClassdefStmt : public CStmt {
 class CFuncdefStmt : public CStmt {
   public:
     OPERATIONS_OF(CFuncdefStmt, CStmt)
-    OPERATION(CTextOrNone, GetFunctionName, (), "The name behind `def`.");
+    OPERATION(CTextOrNone, GetFunctionName, (), "The name after `def`.");
     OPERATION(CRef<CParametersNode>, GetParameters, (), "The parameters with their brackets.");
     OPERATION(CExpressionRef, GetReturnType, (),
-              "The expression behind `->`; None when the header has no arrow.");
+              "The expression after `->`; None when the header has no arrow.");
     OPERATION(CNodeRef, GetSuite, (), "The body; None for a node without children.");
     END_OPERATIONS
 
@@ -46,7 +46,7 @@ class CFuncdefStmt : public CStmt {
 class CSingleDecorator : public CNode {
   public:
     OPERATIONS_OF(CSingleDecorator, CNode)
-    OPERATION(CNodeRef, GetDottedName, (), "The name behind `@`: a CDottedName, or a CNameLiteral.");
+    OPERATION(CNodeRef, GetDottedName, (), "The name after `@`: a CDottedName, or a CNameLiteral.");
     OPERATION(CArgumentList, GetUsedArgList, (),
               "A new list of CArgInfo, one for each argument; empty without any.");
     END_OPERATIONS
@@ -66,7 +66,7 @@ class CTypeParameter : public CNode {
     OPERATIONS_OF(CTypeParameter, CNode)
     OPERATION(CTextOrNone, GetName, (), "The name of the type parameter.");
     OPERATION(CTextOrNone, GetPrefix, (), "\"*\" or \"**\"; None for a plain type parameter.");
-    OPERATION(CNodeRef, GetSpecNode, (), "The bound behind the colon; None when there is none.");
+    OPERATION(CNodeRef, GetSpecNode, (), "The bound after the colon; None when there is none.");
     END_OPERATIONS
 };
 

@@ -54,7 +54,7 @@ class COperatorExpression : public CExpression {
 class CStarExpression : public CExpression {
   public:
     OPERATIONS_OF(CStarExpression, CExpression)
-    OPERATION(CExpressionRef, GetStarredExpression, (), "The expression behind the star.");
+    OPERATION(CExpressionRef, GetStarredExpression, (), "The expression after the star.");
     END_OPERATIONS
 
   private:
@@ -72,7 +72,7 @@ class CLambdaExpr : public CExpression {
     OPERATIONS_OF(CLambdaExpr, CExpression)
     OPERATION(CNodeRef, GetArgumentsNode, (),
               "The one parameter, or the list of parameters; None without parameters.");
-    OPERATION(CNodeRef, GetBodyExpr, (), "The expression behind the colon.");
+    OPERATION(CNodeRef, GetBodyExpr, (), "The expression after the colon.");
     END_OPERATIONS
 
   private:
@@ -116,8 +116,8 @@ class CAtomExpr : public CExpression {
     OPERATION(CNodeRef, GetPrefix, (),
               "The leaf of `await` before the atom; None without one, and where `await` is itself the name "
               "that the trailers belong to.");
-    OPERATION(CNodeRef, GetAtom, (), "The atom in front of the trailers; None for a leaf.");
-    OPERATION(CNodeRange, GetTrailers, (), "The trailers behind the atom, as a new list.");
+    OPERATION(CNodeRef, GetAtom, (), "The atom before the trailers; None for a leaf.");
+    OPERATION(CNodeRange, GetTrailers, (), "The trailers after the atom, as a new list.");
     END_OPERATIONS
 
   private:
@@ -130,7 +130,7 @@ class CAtomExpr : public CExpression {
 class CPower : public CExpression {
   public:
     OPERATIONS_OF(CPower, CExpression)
-    OPERATION(CNodeRef, GetAtom, (), "The atom in front of the trailers, under either grammar.");
+    OPERATION(CNodeRef, GetAtom, (), "The atom before the trailers, under either grammar.");
     OPERATION(CNodeRange, GetTrailers, (), "The trailers between the atom and `**`, as a new list.");
     OPERATION(CNodeRef, GetExponentNode, (), "The exponent; None without `**`.");
     END_OPERATIONS
@@ -162,8 +162,8 @@ class CFactorExpr : public CExpression {
 class CNamedExpr : public CExpression {
   public:
     OPERATIONS_OF(CNamedExpr, CExpression)
-    OPERATION(CNodeRef, GetAssignedName, (), "The name in front of `:=`.");
-    OPERATION(CNodeRef, GetRightHandExpression, (), "The expression behind `:=`.");
+    OPERATION(CNodeRef, GetAssignedName, (), "The name before `:=`.");
+    OPERATION(CNodeRef, GetRightHandExpression, (), "The expression after `:=`.");
     END_OPERATIONS
 
   private:
@@ -173,7 +173,7 @@ class CNamedExpr : public CExpression {
 // Declared for hosts; no rule makes one.
 class CBinaryOp : public CNode {};
 
-// `from a` behind `yield`
+// `from a` after `yield`
 //   child    ['from']  value
 class CYieldArg : public CNode {
   public:
@@ -185,14 +185,14 @@ class CYieldArg : public CNode {
 
 // `for x in y` within a comprehension, with the next `for` or `if`
 //   child    ['async']  'for'  target  'in'  iterable  [next]
-//   index                 0      1       2      3        4     one more behind `async`
+//   index                 0      1       2      3        4     one more after `async`
 //   child    'async'  the clause, a node of this class
 class CCompForNode : public CNode {
   public:
     OPERATIONS_OF(CCompForNode, CNode)
     OPERATION(bool, IsAsync, (), "True for `async for`.");
     OPERATION(CNodeRef, GetTargetNode, (), "The target between `for` and `in`.");
-    OPERATION(CNodeRef, GetInNode, (), "The iterable behind `in`.");
+    OPERATION(CNodeRef, GetInNode, (), "The iterable after `in`.");
     OPERATION(CNodeRef, GetCompIterNode, (), "The `for` or `if` that follows; None for the last one.");
     END_OPERATIONS
 
@@ -222,7 +222,7 @@ class CListmakerNode : public CNode {
     bool _IsComprehension();
 };
 
-// `(...)`, `[...]` or `.name` behind an atom
+// `(...)`, `[...]` or `.name` after an atom
 //   child    '.'  name
 //   child    '(' or '['  [contents]  ')' or ']'
 class CTrailer : public CNode {

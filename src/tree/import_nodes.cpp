@@ -98,7 +98,7 @@ void BindAsNames(nb::module_& module) {
         .def(TInit<>())
         .def_rw("module_name", &CAsName::module_name, "The name as written, with its dots.",
                 nb::for_setter(nb::arg().none()))
-        .def_rw("as_name", &CAsName::as_name, "The name behind `as`; None without one.",
+        .def_rw("as_name", &CAsName::as_name, "The name after `as`; None without one.",
                 nb::for_setter(nb::arg().none()));
     module.def("_GetMatchingChildToken", &_GetMatchingChildToken, "node"_a, "text"_a,
                "The index of the first child of `node` whose text is `text`; -1 when there is none.");

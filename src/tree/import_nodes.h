@@ -46,7 +46,7 @@ class CFromImportStmt : public CNode {
     OPERATIONS_OF(CFromImportStmt, CNode)
     OPERATION(
         CTextOrNone, GetFromString, (),
-        "The module behind `from`, with its dots; None when nothing stands between `from` and `import`.");
+        "The module after `from`, with its dots; None when nothing stands between `from` and `import`.");
     OPERATION(bool, GetImportStar, (), "True for `from a import *`.");
     OPERATION(CAsNameList, GetAsNameList, (),
               "A new list of CAsName, one for each imported name; a star is such a name.");

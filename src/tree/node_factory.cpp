@@ -28,7 +28,7 @@ bool IsNewline(const CNode& node) {
     return node.fClsInfo && node.fClsInfo->fNodeType == kTokenId_NEWLINE;
 }
 
-// A statement and the newline behind it.
+// A statement and the newline after it.
 bool IsStatementLine(nb::handle text, nb::handle children) {
     return text.is_none() && ListSize(children) == 2 && IsNewline(*Instance<CNode>(ListItem(children, 1)));
 }

@@ -69,7 +69,7 @@ bool IsDottedChain(const CChainParts& chain) {
     const auto& [atom, trailers] = chain;
     for (Py_ssize_t i = 0; i < trailers.Size(); ++i)
         if (trailers.At<CTrailer>(i)->GetDotName().is_none()) return false;
-    // Brackets in front of a trailer aren't simple.
+    // Brackets before a trailer aren't simple.
     return trailers.Size() == 0 ? IsDottedName(*atom) : atom->As<CNameLiteral>() != nullptr;
 }
 

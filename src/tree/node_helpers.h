@@ -19,7 +19,7 @@ std::optional<std::vector<CNodeRef>> ExpandSeqLiteral(CNode& node);
 // True for a name and for a chain of names, `a.b.c`; for the first of them in brackets too.
 bool IsDottedName(CNode& node);
 
-// The same for an atom and the trailers behind it.
+// The same for an atom and the trailers after it.
 bool IsDottedChain(const CChainParts& chain);
 
 // True for `{a, b}`.

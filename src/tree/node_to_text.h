@@ -54,7 +54,7 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
     OPERATION(CBytesOrNone, TextForAtomPlusTrailers,
               (CNode& atom, const CNodeRange& trailers, bool dotted_name_only = false,
                bool discard_simple_parens = true, bool literal_only = false),
-              "The text of an atom and the trailers behind it as UTF-8; None when the atom has none. "
+              "The text of an atom and the trailers after it as UTF-8; None when the atom has none. "
               "ValueError for a trailer that begins with none of `.`, `(` and `[`.",
               "atom"_a, "trailers"_a, "dotted_name_only"_a = false, "discard_simple_parens"_a = true,
               "literal_only"_a = false);
@@ -87,7 +87,7 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
     virtual bool AppendTextForAtomPlusTrailers(std::string& text, CNode& atom, const CNodeRange& trailers,
                                                const CNodeTextOptions& options = {});
 
-    // Appends what the trailers behind a text add to it.
+    // Appends what the trailers after a text add to it.
     void AppendTextForTrailers(std::string& text, const CNodeRange& trailers,
                                const CNodeTextOptions& options = {});
 

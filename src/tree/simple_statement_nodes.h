@@ -10,14 +10,14 @@ namespace codeloom {
 // Names as text strings.
 using CNameList = nb::typed<nb::list, nb::str>;
 
-// `: annotation = value` behind the target of an assignment
+// `: annotation = value` after the target of an assignment
 //   child    ':'  annotation  ['='  value]
 //   index     0       1         2     3
 class CAnnotatedAssignNode : public CNode {
   public:
     OPERATIONS_OF(CAnnotatedAssignNode, CNode)
-    OPERATION(CNodeRef, GetTypeHintNode, (), "The annotation behind the colon.");
-    OPERATION(CNodeRef, GetPostEqualsTestExpr, (), "The value behind `=`; None for a bare annotation.");
+    OPERATION(CNodeRef, GetTypeHintNode, (), "The annotation after the colon.");
+    OPERATION(CNodeRef, GetPostEqualsTestExpr, (), "The value after `=`; None for a bare annotation.");
     END_OPERATIONS
 
   private:
@@ -38,10 +38,9 @@ class CExprStmt : public CStmt {
         "don't count.");
     OPERATION(CRef<CAnnotatedAssignNode>, GetAnnotatedAssignNode, (),
               "The annotation and its value; None when there is no annotation.");
-    OPERATION(CNodeRef, GetInitialTestExpr, (),
-              "The first target, or the expression in front of an operator.");
+    OPERATION(CNodeRef, GetInitialTestExpr, (), "The first target, or the expression before an operator.");
     OPERATION(CNodeRef, GetPostEqualsTestExpr, (int equal_num),
-              "The target or value behind the `=` numbered `equal_num`, from zero; ValueError when there are "
+              "The target or value after the `=` numbered `equal_num`, from zero; ValueError when there are "
               "fewer.",
               "equal_num"_a);
     OPERATION(CTextOrNone, GetAugAssignOp, (),

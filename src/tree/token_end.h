@@ -5,7 +5,7 @@
 
 namespace codeloom {
 
-// The index of the token behind the node's last one. Any leaf counts, a closing bracket too. TypeError when
+// The index of the token after the node's last one. Any leaf counts, a closing bracket too. TypeError when
 // the last leaf's context isn't an integer, ValueError for a tree of the host that contains itself.
 Py_ssize_t GetTokenEndIndex(const CNode& node);
 

@@ -13,7 +13,7 @@ namespace {
 
 constexpr CNeighbourFunction kIsScopeStartLogical("logicalline", "IsScopeStartLogical");
 
-// What an import binds: the name behind `as`, or the module's own.
+// What an import binds: the name after `as`, or the module's own.
 nb::object BoundName(const CAsName& as_name) {
     return AsUtf8(as_name.as_name.is_none() ? as_name.module_name : as_name.as_name);
 }
@@ -145,7 +145,7 @@ void CNodeWalker::_AddToEach(const CNameList& names, nb::handle equiv) {
     for (Py_ssize_t i = 0; i < ListSize(names); ++i) _AddTypeEquiv(ListItem(names, i), equiv);
 }
 
-// A bound stands behind the stars: "*" of `*Ts`, "int" of `T: int`. On a line that opens no scope, such as
+// A bound follows the stars: "*" of `*Ts`, "int" of `T: int`. On a line that opens no scope, such as
 // `type X[T] = int`, the parameter leaves no record.
 void CNodeWalker::_VisitTypeParameter(CTypeParameter& type_param) {
     const CTextOrNone name = type_param.GetName();

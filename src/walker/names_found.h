@@ -14,7 +14,7 @@ namespace codeloom {
 // Names in the order first met, each once. Emptied, it keeps its memory for the next walk.
 class COrderedNames {
   public:
-    // The position of a name, a text string or none, which is added behind the others when it is new.
+    // The position of a name, a text string or none, which is added after the others when it is new.
     size_t Add(nb::handle text) {
         nb::object name = PlainText(text);
         const auto hash = static_cast<size_t>(nb::hash(name));

@@ -56,7 +56,7 @@ class CNodeWalker : public CHosted {
               "node"_a, "within_sub_expr"_a = false);
     OPERATION(void, _VisitLoadContextNode, (CNode& node), "Visit a value, be it below a target.", "node"_a);
     OPERATION(void, _VisitCompForNode, (CCompForNode& node),
-              "A `for` clause of a comprehension and the clauses behind it.", "node"_a);
+              "A `for` clause of a comprehension and the clauses after it.", "node"_a);
     OPERATION(void, _VisitNameLiteral,
               (CNameLiteral& node, CNodeRef atom_node = nullptr,
                std::optional<CNodeRange> all_trailers = std::nullopt, int trailer_i = -1),
@@ -107,7 +107,7 @@ class CNodeWalker : public CHosted {
     OPERATION(void, _VisitAtomPlusTrailers, (CNode& atom_node, const CNodeRange& all_trailers),
               "An atom and its trailers, from left to right.", "atom_node"_a, "all_trailers"_a);
     OPERATION(void, _VisitCall, (CNode& atom, const CNodeRange& prev_trailers, CNode& arglist),
-              "The call of what an atom and the trailers behind it give.", "atom"_a, "prev_trailers"_a,
+              "The call of what an atom and the trailers after it give.", "atom"_a, "prev_trailers"_a,
               "arglist"_a);
     OPERATION(void, _ProcessFunctionCall, (CBytesOrNone func_name, const CArgumentList& arg_list),
               "Visit the arguments of a call, a list of CArgInfo, and record the call of `func_name`, UTF-8 "
@@ -133,7 +133,7 @@ class CNodeWalker : public CHosted {
               "Record `istr` for the name that a node shows.", "name_node"_a, "istr"_a.none());
     OPERATION(CBytesOrNone, _TypeEquivForNode, (CNode& node, CBytesOrNone extra_trailer = CBytesOrNone()),
               "What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, "
-              "stands behind it where a part of the value is meant.",
+              "follows it where a part of the value is meant.",
               "node"_a, "extra_trailer"_a.none()= nb::none());
     OPERATION(
         CBytesOrNone, _TypeEquivForOperatorExpression, (COperatorExpression& op_expr),

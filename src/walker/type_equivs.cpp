@@ -22,7 +22,7 @@ bool StartsWith(const nb::object& equiv, nb::handle prefix) {
     return CUtf8(equiv)->starts_with(CUtf8(prefix));
 }
 
-// A number and the plus or minus in front of it.
+// A number and the plus or minus before it.
 struct CSignedNumber {
     CRef<CNumberLiteral> number;  // empty for any other node
     CTextOrNone sign;

@@ -52,7 +52,7 @@ void BindStringTokenizer(nb::module_& module) {
         .def(TInit<CUtf8Argument>(), "utf8"_a)
         .def_prop_ro(
             "fAtEnd", [](CStringTokenizer& tokenizer) { return tokenizer.Tokens().IsAtEnd(); },
-            "True behind the last token.")
+            "True after the last token.")
         .def_prop_ro(
             "fPos", [](CStringTokenizer& tokenizer) { return tokenizer.Tokens().Pos(); },
             "The byte offset of the current token; the length of the text at the end.")
@@ -89,7 +89,7 @@ void BindNonNestedSearch(nb::module_& module) {
         .def("Clear", &CNonNestedSearch::Clear, "Make the search idle and let go of the text.");
     module.def(
         "_FindStringEndNonNested", &HostFindStringEnd, "search"_a, "quote_i"_a,
-        "The byte index behind the string literal whose opening quote stands at `quote_i` of the text\n"
+        "The byte index after the string literal whose opening quote stands at `quote_i` of the text\n"
         "searched. An unterminated one ends with its row, with triple quotes at the end of the search.\n"
         "IndexError when `quote_i` lies outside the text searched.");
 }

@@ -89,7 +89,7 @@ void BindRecordFunctions(nb::module_& module) {
                "Tokens, or texts of expressions, joined with blanks as a formatter would.");
     module.def(
         "_NonInlineNextNonNestedUtf8PtrIndex", &HostNextIndex, "utf8_ptr"_a, "pos"_a, "end_pos"_a,
-        "The byte index behind the bracket or string that begins at `pos`; `end_pos` when it doesn't end.\n"
+        "The byte index after the bracket or string that begins at `pos`; `end_pos` when it doesn't end.\n"
         "IndexError or ValueError when `pos` or `end_pos` lies outside the buffer.");
 }
 
@@ -98,7 +98,7 @@ void BindScopeFunctions(nb::module_& module) {
         "EnsureScopeNameIndicies",
         [](const CUtf8Argument& scope) { return TextFromUtf8(EnsureScopeNameIndicies(scope.text)); },
         "scope"_a, nb::sig("def EnsureScopeNameIndicies(scope: bytes | str) -> str"),
-        "A scope with an index behind every name: \"A#1.f\" gives \"A#1.f#0\".");
+        "A scope with an index after every name: \"A#1.f\" gives \"A#1.f#0\".");
     module.def(
         "GetInstanceNameForClass",
         [](const CUtf8Argument& cls_name) { return TextFromUtf8(GetInstanceNameForClass(cls_name.text)); },

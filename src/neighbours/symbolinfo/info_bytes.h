@@ -16,7 +16,7 @@ namespace codeloom {
 // TypeError when `text` is neither a string nor none.
 nb::object BuildLiteralInfo(std::string_view type_name, nb::handle text);
 
-// A scope with an index behind every name: "A#1.f" gives "A#1.f#0". Wildcards and the names of def line
+// A scope with an index after every name: "A#1.f" gives "A#1.f#0". Wildcards and the names of def line
 // scopes have none, and neither has the module's scope.
 std::string EnsureScopeNameIndicies(std::string_view scope);
 
