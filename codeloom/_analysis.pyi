@@ -82,6 +82,21 @@ class LimitKind(enum.Enum):
     TOO_MANY_NODES = 'too many nodes'
     TOO_DEEP = 'too deep'
 
+class ParameterKind(enum.Enum):
+    """How arguments reach a parameter."""
+    POSITIONAL_ONLY = 'positional only'
+    POSITIONAL_OR_KEYWORD = 'positional or keyword'
+    VAR_POSITIONAL = 'var positional'
+    KEYWORD_ONLY = 'keyword only'
+    VAR_KEYWORD = 'var keyword'
+
+class HintKind(enum.Enum):
+    """What a type hint is about."""
+    VARIABLE = 'variable'
+    ATTRIBUTE = 'attribute'
+    PARAMETER = 'parameter'
+    RETURN = 'return'
+
 class Role(enum.Enum):
     """What a name does where it appears; docs/names.md tells of each."""
     READ = 'read'
@@ -806,6 +821,226 @@ class Scopes(Sequence[Scope]):
     def __reduce__(self) -> tuple[Any, ...]:
         ...
 
+class Hint:
+    """
+    A type hint: an annotation (PEP 3107, PEP 526), or one in a comment (PEP 484).
+    """
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
+    @property
+    def text(self) -> str:
+        """The hint as written, quotes included."""
+
+    @property
+    def range(self) -> Range:
+        """Where it stands."""
+
+    @property
+    def kind(self) -> HintKind:
+        """What it is about."""
+
+    @property
+    def name(self) -> str:
+        """
+        The name or chain that it is about; of what a function gives back, that of the function.
+        """
+
+    @property
+    def target(self) -> Range:
+        """Where that name stands."""
+
+    @property
+    def in_comment(self) -> bool:
+        """It stands in a comment."""
+
+    @property
+    def line(self) -> Line:
+        """The line that it stands on."""
+
+    def __repr__(self) -> str:
+        ...
+
+class Parameter:
+    """A parameter of a `def`."""
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    @property
+    def name(self) -> str:
+        """Its name."""
+
+    @property
+    def range(self) -> Range:
+        """Where the name stands."""
+
+    @property
+    def kind(self) -> ParameterKind:
+        """How arguments reach it, in the words of `inspect`."""
+
+    @property
+    def default(self) -> Range | None:
+        """Where its default stands; None without one."""
+
+    @property
+    def hint(self) -> Hint | None:
+        """Its annotation, else its hint in a comment; None without any."""
+
+    def __repr__(self) -> str:
+        ...
+
+class Signature:
+    """The header of a `def`."""
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
+    @property
+    def name(self) -> str:
+        """The function's name."""
+
+    @property
+    def range(self) -> Range:
+        """Where the name stands."""
+
+    @property
+    def line(self) -> Line:
+        """The line of the header."""
+
+    @property
+    def is_async(self) -> bool:
+        """It is an `async def`."""
+
+    @property
+    def is_method(self) -> bool:
+        """It stands right in the body of a class."""
+
+    @property
+    def parameters(self) -> tuple[Parameter, ...]:
+        """Its parameters; those within a tuple of Python 2 one by one."""
+
+    @property
+    def return_hint(self) -> Hint | None:
+        """The hint of what it gives back; None without one."""
+
+    def __repr__(self) -> str:
+        ...
+
+class Hints(Sequence[Hint]):
+
+    def __len__(self) -> int:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: typing.SupportsIndex, /) -> Hint:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: slice, /) -> typing.Self:
+        ...
+
+    def __iter__(self) -> collections.abc.Iterator[Hint]:
+        ...
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def index(self, value: object, start: int=0, stop: int | None=None) -> int:
+        ...
+
+    def count(self, value: object) -> int:
+        ...
+
+    def __repr__(self) -> str:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
+class Signatures(Sequence[Signature]):
+
+    def __len__(self) -> int:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: typing.SupportsIndex, /) -> Signature:
+        ...
+
+    @typing.overload
+    def __getitem__(self, i: slice, /) -> typing.Self:
+        ...
+
+    def __iter__(self) -> collections.abc.Iterator[Signature]:
+        ...
+
+    def __eq__(self, other: object, /) -> bool:
+        ...
+
+    def __hash__(self) -> int:
+        ...
+
+    def __copy__(self) -> Self:
+        ...
+
+    def __deepcopy__(self, memo: object) -> Self:
+        ...
+
+    def index(self, value: object, start: int=0, stop: int | None=None) -> int:
+        ...
+
+    def count(self, value: object) -> int:
+        ...
+
+    def __repr__(self) -> str:
+        ...
+
+    def __reduce__(self) -> tuple[Any, ...]:
+        ...
+
 class Analysis:
     """What a text says. Each part is worked out when it is first asked for."""
 
@@ -887,6 +1122,16 @@ class Analysis:
     def undefined(self) -> tuple[Occurrence, ...]:
         """
         What is read although nothing in the text binds it and no builtin has the name; nothing is told that `import *` or a line with a fault may bind. Whether a binding runs before isn't known.
+        """
+
+    @property
+    def signatures(self) -> Signatures:
+        """The header of each `def` that is sound, in the order of the text."""
+
+    @property
+    def hints(self) -> Hints:
+        """
+        Every type hint of the text, line by line: those of variables, attributes, parameters and of what functions give back, in annotations and in comments.
         """
 
 def DumpNames(text: str, version: int, has_print_function: bool=False, with_records: bool=True) -> list[tuple[int, int, int, list[tuple[bytes, bytes, bool, int, int]]]]:

@@ -17,6 +17,7 @@ STEPS = [
     ["rules"],
     ["occurrences"],
     ["scopes"],
+    ["signatures"],
     ["causes"],
     ["file"],
     ["host"],

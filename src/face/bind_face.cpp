@@ -243,10 +243,12 @@ void BindFace(nb::module_& module) {
     BindItems<CRecordItems>(module, "Records", "class Records(collections.abc.Sequence[Record])");
     BindItems<CLimitItems>(module, "Limits", "class Limits(collections.abc.Sequence[Limit])");
     BindNameItems(module);
+    BindSignatureItems(module);
     nb::class_<CAnalysis> analysis(module, "Analysis",
                                    "What a text says. Each part is worked out when it is first asked for.");
     BindAnalysis(analysis);
     BindNamesOfAnalysis(analysis);
+    BindSignaturesOfAnalysis(analysis);
 }
 
 }  // namespace codeloom

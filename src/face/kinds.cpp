@@ -11,7 +11,8 @@ namespace {
 
 // For each byte, the member that stands for it. They live as long as the process.
 using CMembers = std::array<nb::handle, 256>;
-CMembers gRecordKinds, gLineKinds, gLimitKinds, gRoles, gScopeKinds, gResolutions;
+CMembers gRecordKinds, gLineKinds, gLimitKinds, gRoles, gScopeKinds, gResolutions, gParameterKinds,
+    gHintKinds;
 
 constexpr auto kRoleWords = std::to_array<std::string_view>({
 #define CODELOOM_ROLE_WORD(name, word, meaning) word,
@@ -92,6 +93,16 @@ void BindKinds(nb::module_& module) {
              {{ByteOf(ELimit::kTooManyVisits), "too many nodes"}, {ByteOf(ELimit::kTooDeep), "too deep"}},
              gLimitKinds);
 
+    std::vector<CMember> parameter_kinds, hint_kinds;
+#define CODELOOM_PARAMETER_KIND(name, word) parameter_kinds.push_back({ByteOf(EParameterKind::name), word});
+    CODELOOM_PARAMETER_KINDS(CODELOOM_PARAMETER_KIND)
+#undef CODELOOM_PARAMETER_KIND
+#define CODELOOM_HINT_KIND(name, word) hint_kinds.push_back({ByteOf(EHintKind::name), word});
+    CODELOOM_HINT_KINDS(CODELOOM_HINT_KIND)
+#undef CODELOOM_HINT_KIND
+    MakeEnum(module, "ParameterKind", "How arguments reach a parameter.", parameter_kinds, gParameterKinds);
+    MakeEnum(module, "HintKind", "What a type hint is about.", hint_kinds, gHintKinds);
+
     std::vector<CMember> roles, scope_kinds;
     for (size_t i = 0; i < kRoleWords.size(); ++i) roles.push_back({ByteOf(i), kRoleWords[i]});
     for (size_t i = 0; i < kScopeKindWords.size(); ++i)
@@ -116,6 +127,14 @@ nb::object RoleOf(ERole role) {
 
 nb::object ScopeKindOf(EScopeKind kind) {
     return Member(gScopeKinds, ByteOf(kind));
+}
+
+nb::object ParameterKindOf(EParameterKind kind) {
+    return Member(gParameterKinds, ByteOf(kind));
+}
+
+nb::object HintKindOf(EHintKind kind) {
+    return Member(gHintKinds, ByteOf(kind));
 }
 
 nb::object ResolutionOf(EResolution resolution) {

@@ -19,6 +19,8 @@ nb::object LineKindOf(ELogicalType type);
 nb::object LimitKindOf(ELimit limit);
 nb::object RoleOf(ERole role);
 nb::object ScopeKindOf(EScopeKind kind);
+nb::object ParameterKindOf(EParameterKind kind);
+nb::object HintKindOf(EHintKind kind);
 nb::object ResolutionOf(EResolution resolution);
 
 // The word for a role and for a kind of scope.

@@ -43,6 +43,7 @@ class CSourceFile {
     }
     const CFileAnalysis& WithRecords() const { return _Analyzed(_fWithRecords, true); }
     const CTextNames& Names() const { return _Analyzed(_fWithNames, false, true).names; }
+    const CSignatures& Signatures() const { return _Analyzed(_fWithNames, false, true).signatures; }
 
     const CRowIndex& Rows() const;
     nb::str HostText() const;

@@ -14,6 +14,7 @@
 #include "names/records.h"
 #include "rules/problem.h"
 #include "scopes/text_names.h"
+#include "signatures/signatures.h"
 #include "syntax/language.h"
 #include "tokenizer/logical_types.h"
 
@@ -23,7 +24,7 @@ struct CFileSettings {
     int version = CLanguage::kNewest;
     bool false_hints = false;  // take all that looks like a type hint for one
     bool wants_records = true;
-    bool wants_names = false;  // occurrences and scopes
+    bool wants_names = false;  // occurrences, scopes, signatures and hints
 };
 
 // A logical line: from its first token to the end of its last one, a comment at its end included.
@@ -45,7 +46,8 @@ struct CFileAnalysis {
     std::vector<CLine> lines;
     CRecords records;  // empty unless the settings ask for them
     std::vector<CLineLimit> limits;
-    CTextNames names;  // empty unless the settings ask for them
+    CTextNames names;  // empty unless the settings ask for them, as are the next ones
+    CSignatures signatures;
 
     // The records of a line are those from FirstRecord(line_i) up to FirstRecord(line_i + 1).
     uint32_t FirstRecord(size_t line_i) const {

@@ -10,6 +10,7 @@
 #include "rules/text_checker.h"
 #include "scopes/declarations.h"
 #include "scopes/name_collector.h"
+#include "signatures/signature_finder.h"
 #include "tokenizer/tokenizer.h"
 #include "typing/false_hints.h"
 
@@ -49,7 +50,8 @@ class CFileAnalyzer final : CTreeObserver {
           _fUnreadable(unreadable),
           _fLength(text.size()),
           _fFalseHints(text),
-          _fChecker(LanguageOf(settings.version), _fResult.problems) {
+          _fChecker(LanguageOf(settings.version), _fResult.problems),
+          _fSignatures(_fResult.signatures) {
         if (settings.wants_names || MayDeclareNames(text))
             _fNames.emplace(LanguageOf(settings.version), _fResult.names);
         _SetLanguage(LanguageOf(settings.version));
@@ -60,6 +62,8 @@ class CFileAnalyzer final : CTreeObserver {
   private:
     void Take(const CRawLogical& part, const CTree& tree) override;
     void TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) override;
+    bool WantsHints() const override { return _fSettings.wants_names; }
+    void TakeHintOf(const CHintNote& note) override { _fSignatures.TakeHintOf(note); }
     void _SetLanguage(const CLanguage& language);
     void _AnalyzeLine(const CRawLogical& logical);
     void _Enter(const CRawLogical& logical);
@@ -82,6 +86,8 @@ class CFileAnalyzer final : CTreeObserver {
     CFileAnalysis _fResult;
     CTextChecker _fChecker;
     std::optional<CNameCollector> _fNames;
+    const CRawLogical* _fLine = nullptr;  // under way, where names are wanted
+    CSignatureFinder _fSignatures;
 };
 
 CFileAnalysis CFileAnalyzer::Run() {
@@ -101,6 +107,7 @@ CFileAnalysis CFileAnalyzer::Run() {
 void CFileAnalyzer::Take(const CRawLogical& part, const CTree& tree) {
     _fChecker.Take(part, tree);
     if (_fNames) _fNames->Take(part, tree);
+    if (_fSettings.wants_names && &part == _fLine) _fSignatures.Take(tree);
 }
 
 void CFileAnalyzer::TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) {
@@ -110,11 +117,15 @@ void CFileAnalyzer::TakeHint(const CTree& tree, const CTreeNode& node, uint32_t 
 void CFileAnalyzer::_Enter(const CRawLogical& logical) {
     _fChecker.Enter(logical);
     if (_fNames) _fNames->BeginLine(logical, _fChecker.Blocks());
+    if (!_fSettings.wants_names) return;
+    _fLine = &logical;
+    _fSignatures.BeginLine(logical, static_cast<uint32_t>(_fResult.lines.size() - 1));
 }
 
 void CFileAnalyzer::_Leave(const CRawLogical& logical, bool has_fault) {
     _fChecker.Leave(logical, has_fault);
     if (_fNames) _fNames->EndLine(logical, has_fault, _fChecker.Blocks());
+    if (_fSettings.wants_names) _fSignatures.EndLine(has_fault);
 }
 
 void CFileAnalyzer::_SetLanguage(const CLanguage& language) {

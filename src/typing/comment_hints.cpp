@@ -138,6 +138,7 @@ void CHintWalker::_RecordFunction(const CTreeNode* funcdef) {
     ForEachParameter(*tree.tree, ParametersOfFuncdef(*tree.tree, header), [&](const CParameter& parameter) {
         if (parameter.nested != nullptr) return;
         const uint32_t i = argument_i++;
+        _fArgument_i = static_cast<int>(i);
         if (parameter.type_expr == nullptr) return;
         const CHint hint{tree, parameter.type_expr, of_arg};
         _WalkNames(hint);
@@ -145,6 +146,7 @@ void CHintWalker::_RecordFunction(const CTreeNode* funcdef) {
         if (of_arg && i < _fArguments.size()) return _Record(_fArguments[i].name, _fArguments[i].place, hint);
         _Record(std::string(kArgPrefix) + std::to_string(i), _PlaceOf(hint), hint);
     });
+    _fArgument_i = -1;
     if (const CTreeNode* const result = ReturnTypeOfFuncdef(*tree.tree, header)) {
         const CHint hint{tree, result, of_arg};
         _WalkNames(hint);

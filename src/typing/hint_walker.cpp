@@ -52,6 +52,7 @@ CHintResult CHintWalker::_Run(const CRawLogical& line, const CHintContext& conte
     _fResult = {};
     _fHasMarks.reset();
     _fVisitCount = _fDepth = _fNesting = 0;
+    _fArgument_i = -1;
     try {
         visit();
     } catch (const CLimitHit& hit) {
@@ -142,7 +143,7 @@ void CHintWalker::_VisitFuncdef(const CTreeNode& node) {
 
 // Tuples are paired item by item; what has no partner is passed over.
 void CHintWalker::_Pair(const CTreeNode& name, const CHint& hint) {
-    if (_fContext.records == nullptr) return;
+    if (!_IsWanted()) return;
     const CItems names = ItemsOf(*_fTree, name);
     if (names.count == 0) return _RecordTarget(name, hint);
     const CNesting nesting(_fNesting);
@@ -161,6 +162,7 @@ void CHintWalker::_RecordTarget(const CTreeNode& target, const CHint& hint) {
 }
 
 void CHintWalker::_Record(std::string_view name, CSpan place, const CHint& hint) {
+    if (_fContext.observer != nullptr && _fContext.observer->WantsHints()) _Tell(name, place, hint);
     if (_fContext.records == nullptr) return;
     CRecords& records = *_fContext.records;
     const size_t value = records.values.size();
@@ -173,6 +175,17 @@ void CHintWalker::_Record(std::string_view name, CSpan place, const CHint& hint)
     records.records.push_back({records.names.Number(name), static_cast<uint32_t>(value),
                                static_cast<uint32_t>(records.values.size() - value), place.start, place.end,
                                kTypeHintKind, hint.of_arg});
+}
+
+bool CHintWalker::_IsWanted() const {
+    return _fContext.records != nullptr ||
+           (_fContext.observer != nullptr && _fContext.observer->WantsHints());
+}
+
+void CHintWalker::_Tell(std::string_view name, CSpan place, const CHint& hint) {
+    const bool is_return = name == kReturnName, has_index = _fArgument_i >= 0;
+    _fContext.observer->TakeHintOf({place, _PlaceOf(hint), hint.of_arg || is_return || has_index, is_return,
+                                    hint.tree.tree != _fTree, is_return ? -1 : _fArgument_i});
 }
 
 }  // namespace codeloom

@@ -86,6 +86,8 @@ class CHintWalker {
     void _Pair(const CTreeNode& name, const CHint& hint);
     void _RecordTarget(const CTreeNode& target, const CHint& hint);
     void _Record(std::string_view name, CSpan place, const CHint& hint);
+    bool _IsWanted() const;
+    void _Tell(std::string_view name, CSpan place, const CHint& hint);
 
     // Comments
     bool _CommentsMayHoldHints();
@@ -112,6 +114,7 @@ class CHintWalker {
     std::optional<bool> _fHasMarks;  // comments of the line may hold hints; none until it matters
     CCommentHint _fHint;             // the last one that was read
     std::vector<CArgumentName> _fArguments;
+    int _fArgument_i = -1;  // that a hint in a function's form is for, while it is recorded
     CTextBuffer _fName;
     uint32_t _fVisitCount = 0;
     uint32_t _fDepth = 0;
