@@ -1,5 +1,6 @@
 #include "causes/causes.h"
 
+#include <algorithm>
 #include <array>
 #include <cassert>
 
@@ -24,6 +25,7 @@ constexpr auto kGrammarCauses = std::to_array<CRecogniser>({
     UnfinishedField,
     EmptyField,
     Conversion,
+    QuoteInString,
     Backquotes,
     UnmatchedCloser,
     CallWithoutParentheses,
@@ -99,6 +101,17 @@ CProblem CauseOfTarget(const CFaultyLine& line) {
                         Joined("cannot use except statement with ", kind), "bind a plain name");
 }
 
+// How another version writes it.
+std::string HintFor(const CForm& form, const CFaultyLine& line) {
+    const std::string_view text = line.Text(line.At());
+    if (&form == &forms::kBareExcept)
+        return "write 'except (A, B)'; 'except A, name' of Python 2 is 'except A as name'";
+    if (&form == &forms::kOldOctal)
+        return Joined("write 0o", text.substr(std::min(text.find_first_not_of("0_"), text.size() - 1)));
+    if (&form == &forms::kLongNumber) return Joined("write ", text.substr(0, text.size() - 1));
+    return {};
+}
+
 bool IsHint(const CFault& fault, ELogicalType part) {
     return fault.kind == EFault::kInvalidHint || part == ELogicalType::kStringifiedTypeHint ||
            part == ELogicalType::kCommentedTypeHint;
@@ -132,7 +145,7 @@ CProblem CCauses::Of(const CFault& fault, const CRawLogical& line) {
     switch (fault.kind) {
         case EFault::kNewerForm:
             return faulty.Problem(fault.form->version == CForm::kNone ? ECode::kEndedForm : ECode::kNewerForm,
-                                  at, at, MessageOf(fault, line));
+                                  at, at, MessageOf(fault, line), HintFor(*fault.form, faulty));
         case EFault::kBareGenerator:
             return faulty.Problem(ECode::kBareGenerator, at, at,
                                   "Generator expression must be parenthesized");

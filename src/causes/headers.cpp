@@ -140,14 +140,17 @@ CCause MissingColon(const CFaultyLine& line) {
     if (line.OpenerBefore(i) >= 0 && !line.Is(i, kTokenId_LBRACE)) return {};
     if (line.FindBack(0, i, kTokenId_COLON) >= 0 && line.FindBack(0, i, EWord::kLambda) < 0) return {};
     const bool is_sign = MayStandForColon(line.Type(i));
-    const bool is_instead = is_sign && (line.IsSoundWith({i, 1, {kTokenId_COLON}}) || i + 1 == line.Count());
+    const bool is_brace = line.Is(i, kTokenId_LBRACE);
+    const bool is_instead =
+        is_sign && (is_brace || i + 1 == line.Count() || line.IsSoundWith({i, 1, {kTokenId_COLON}}));
     const bool is_left_out = !is_sign && (line.IsAtEnd() ? line.Takes(kTokenId_COLON)
                                                          : line.IsSoundWith({i, 0, {kTokenId_COLON}}));
     if (!is_instead && !is_left_out) return {};
     if (is_instead && !line.Takes(kTokenId_COLON)) return {};
     if (!is_instead) return ColonMissingAfter(line, i - 1);
     return line.Problem(ECode::kMissingColon, i, i, "expected ':'",
-                        Joined("write ':' instead of ", Quoted(line.Text(i))));
+                        is_brace ? "write ':' instead of '{', and indent the block"
+                                 : Joined("write ':' instead of ", Quoted(line.Text(i))));
 }
 
 }  // namespace codeloom

@@ -57,6 +57,10 @@ CCause DictionaryFault(const CFaultyLine& line) {
     const bool is_dictionary = line.FindBack(opener_i + 1, start, kTokenId_COLON) >= 0;
     if (is_dictionary && colon_i < 0 && EndsItem(line.Type(i)) && i > start && line.Takes(kTokenId_COLON))
         return line.Problem(ECode::kDictionaryEntry, start, i - 1, "':' expected after dictionary key");
+    if (is_dictionary && colon_i < 0 && line.EndsOperand(i - 1) && line.BeginsOperand(i) &&
+        line.Takes(kTokenId_COLON))
+        return line.Problem(ECode::kDictionaryEntry, start, i, "':' expected after dictionary key",
+                            Joined("write ':' before ", Quoted(line.Text(i))));
     if (is_dictionary && line.Is(i, kTokenId_EQUAL) && colon_i < 0)
         return line.Problem(ECode::kDictionaryEntry, i, i, "':' expected after dictionary key",
                             "write ':' instead of '='");

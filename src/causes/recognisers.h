@@ -7,6 +7,7 @@ namespace codeloom {
 
 // Tokens; the token may also come after the place where the parser stopped.
 CCause UnterminatedString(const CFaultyLine& line, int i);  // strings.cpp
+CCause QuoteInString(const CFaultyLine& line);
 CCause UnknownPrefix(const CFaultyLine& line, int i);
 CCause InvalidNumber(const CFaultyLine& line, int i);   // numbers.cpp
 CCause AfterBackslash(const CFaultyLine& line, int i);  // characters.cpp

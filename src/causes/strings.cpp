@@ -45,6 +45,22 @@ CCause UnterminatedString(const CFaultyLine& line, int i) {
                    : Joined("close it with ", std::string(1, quote)));
 }
 
+// `'it's here'`
+CCause QuoteInString(const CFaultyLine& line) {
+    const int i = line.At();
+    if (!line.Is(i - 1, kTokenId_STRING) || !line.Is(i, kTokenId_NAME) || !line.IsAdjacent(i)) return {};
+    for (int later_i = i + 1; later_i < line.Count(); ++later_i) {
+        const CCause later = UnterminatedString(line, later_i);
+        if (!later || line.Text(later_i).back() == '\\') continue;
+        const std::string quote(1, line.Text(i - 1).back());
+        return line.Problem(
+            ECode::kUnterminatedString, i - 1, i,
+            "unterminated string literal; perhaps a quote within the string ended it?",
+            Joined("write \\", quote, " for a quote that is text, or use other quotes around it"));
+    }
+    return {};
+}
+
 // `fu'text'`
 CCause UnknownPrefix(const CFaultyLine& line, int i) {
     constexpr size_t kLongest = 3;
