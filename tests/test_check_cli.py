@@ -80,6 +80,7 @@ def test_the_examples(run_cli):
         (["check", "--statistic", "a.py"], "no option --statistic: did you mean '--statistics'?"),
         (["check", "--format", "jsn", "a.py"], "did you mean 'json'?"),
         (["check", "--select", "E9", "a.py"], "'E9' is no code"),
+        (["check", "--ignore", "CL399", "a.py"], "there is no code CL399: did you mean 'CL"),
         (["check", "--jobs", "0", "a.py"], "a number from 1"),
         (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.14"),
         (["check", "--fast", "a.py"], "--fast"),

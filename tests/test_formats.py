@@ -127,6 +127,7 @@ def test_sarif(written):
         place[1:] for place in PLACES
     ]
     rules = run["tool"]["driver"]["rules"]
+    assert all(rule["shortDescription"]["text"] for rule in rules)
     assert all(rules[result["ruleIndex"]]["id"] == result["ruleId"] for result in run["results"])
     assert all(len(result["partialFingerprints"]["codeloom/v1"]) == 32 for result in run["results"])
     assert run["results"][0]["relatedLocations"][0]["physicalLocation"]["region"]["startLine"] == 1

@@ -7,7 +7,9 @@ import re
 from collections.abc import Sequence
 
 from codeloom.cli.items import Finding
+from codeloom.cli.project import nearest
 from codeloom.cli.source import Source
+from codeloom.explanations import explanations
 
 _SELECTOR = re.compile(r"CL[0-9]{0,3}|ALL")
 _COMMENT = re.compile(r"#\s*codeloom:\s*ignore\b(?:\s*\[(?P<codes>[^\]#]*)\])?", re.IGNORECASE)
@@ -15,11 +17,14 @@ _COMMENT_MARK = "codeloom:"
 
 
 def selectors_of(text: str) -> list[str]:
-    """The selectors in a text, parted by commas or blanks; ValueError for what is none."""
+    """The selectors in a text, parted by commas or blanks; ValueError for what fits no code."""
+    known = explanations()
     selectors = re.split(r"[,\s]+", text.strip().upper())
     for selector in selectors:
         if not _SELECTOR.fullmatch(selector):
             raise ValueError(f"{selector!r} is no code: give one such as CL301, its beginning, or ALL")
+        if selector != "ALL" and not any(code.startswith(selector) for code in known):
+            raise ValueError(f"there is no code {selector}{nearest(selector, known)}")
     return selectors
 
 

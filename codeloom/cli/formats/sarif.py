@@ -15,6 +15,7 @@ from codeloom.cli.formats.base import Format, failed_path, portable_path
 from codeloom.cli.items import Finding, Item
 from codeloom.cli.source import Source
 from codeloom.cli.tally import Tally
+from codeloom.explanations import explanations
 
 MOST_RESULTS = 25_000
 _SCHEMA = "https://json.schemastore.org/sarif-2.1.0.json"
@@ -61,7 +62,7 @@ class SarifFormat(Format):
                     "name": "codeloom",
                     "version": __version__,
                     "semanticVersion": __version__,
-                    "rules": [{"id": code} for code in self._rules],
+                    "rules": [_rule(code) for code in self._rules],
                 }
             },
             "columnKind": "unicodeCodePoints",
@@ -96,6 +97,14 @@ class SarifFormat(Format):
             artifact = {"artifactLocation": {"uri": _uri(path)}}
             notification["locations"] = [{"physicalLocation": artifact}]
         self._notifications.append(notification)
+
+
+def _rule(code: str) -> dict[str, Any]:
+    known = explanations().get(code)
+    if known is None:
+        return {"id": code}
+    short, full = {"text": known.title}, {"text": known.meaning}
+    return {"id": code, "shortDescription": short, "fullDescription": full, "help": full}
 
 
 def _location(path: str, place: dict[str, int], more: dict[str, Any] | None = None) -> dict[str, Any]:
