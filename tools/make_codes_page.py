@@ -50,7 +50,7 @@ def _rows_of(explanation: Explanation) -> Iterator[str]:
 
 def _rows_of_example(label: str, example: Example) -> Iterator[str]:
     yield f"{label}, made by this expression:\n" if example.is_made else f"{label}:\n"
-    yield f"```python\n{example.text}```\n"
+    yield f"```py\n{example.text}```\n"
 
 
 if __name__ == "__main__":

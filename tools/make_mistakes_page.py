@@ -75,7 +75,7 @@ def page(python: str, ruff: str) -> str:
     linter = _output([ruff, "--version"], "").strip()
     rows = [_HEAD.format(interpreter=interpreter, linter=linter)]
     for number, (title, source, version) in enumerate(mistakes(), 1):
-        rows.append(f"## {number}. {title}\n\n```python\n{source}```\n")
+        rows.append(f"## {number}. {title}\n\n```py\n{source}```\n")
         said = {
             interpreter: of_interpreter(python, source),
             linter: of_ruff(ruff, source),
