@@ -82,7 +82,7 @@ def test_the_examples(run_cli):
         (["check", "--select", "E9", "a.py"], "'E9' is no code"),
         (["check", "--ignore", "CL399", "a.py"], "there is no code CL399: did you mean 'CL"),
         (["check", "--jobs", "0", "a.py"], "a number from 1"),
-        (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.14"),
+        (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.15"),
         (["check", "--fast", "a.py"], "--fast"),
         (["tree"], "FILE:ROW -c is required"),
         (["tree", "f.py:1", "-c", "x"], "not allowed with"),

@@ -56,7 +56,7 @@ def test_all_versions_are_known():
         ("try: pass\nexcept E, a[0]: pass", {"2.7"}),
         ("x = `y` <> 0777", {"2.7"}),
         ("async = await", {"2.7", "3.6"}),
-        ("def f(): nonlocal x", {"3.6", "3.7", "3.12"}),
+        ("def f():\n  x = 1\n  def g(): nonlocal x", {"3.6", "3.7", "3.12"}),
         ("if (x := 1): pass", {"3.12"}),
         ("try: pass\nexcept E, (a, b): pass\nexcept E, a.b: pass\nexcept E, a[0]: pass", {"2.7"}),
         ("x = 1 if y else 2", {"2.7", "3.6", "3.7", "3.12"}),

@@ -4,7 +4,7 @@ import re
 from collections.abc import Iterable
 from functools import cache
 
-_NEWEST_MINOR = 14
+_NEWEST_MINOR = 15
 
 # The names of the versions, oldest first.
 VERSIONS = ("2.7", *(f"3.{minor}" for minor in range(_NEWEST_MINOR + 1)))

@@ -11,6 +11,7 @@
 //   type is x                               `type` as a name before a keyword: type_aliases.cpp
 //   if a: type X = int                      an alias in a body on the row of its header
 //   def f[T: int = str]():                  defaults of type parameters
+//   lazy import a    [*a for a in b]        newest_forms.cpp
 //   case a, b:                              in extended_match_case_parser.h
 // What a line has that is newer than the version asked for is refused by its name: extended_forms.h.
 #pragma once
@@ -73,6 +74,8 @@ class CExtendedParser : public CPGenParserImpl {
     bool _BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i);
     void _RequireAlias(const CNode& node);
     nb::tuple _WithoutAliases(const nb::tuple& toks, bool in_async_def, const CPositions& positions);
+    bool _BeginsLazyImport(const nb::tuple& toks, Py_ssize_t lazy_i);
+    nb::tuple _WithoutNewestForms(const nb::tuple& toks);
     bool _IsPlainName(const nb::tuple& toks, Py_ssize_t i) const;
     CNodeRef _ParseDefault(const nb::tuple& toks, bool in_async_def, const CPositions& positions,
                            Py_ssize_t equal_i, Py_ssize_t end, bool raise_errors);

@@ -31,13 +31,13 @@ void ForEachStatement(const nb::tuple& toks, Py_ssize_t first_i, Visit visit) {
     if (start != -1) visit(start, count);
 }
 
-// True when the last token before `i`, but for comments, backslashes and removed ones, is `type`.
-bool IsBehindType(const nb::tuple& toks, Py_ssize_t i) {
+// True when the last token before `i`, but for comments, backslashes and removed ones, is `word`.
+bool IsBehind(std::string_view word, const nb::tuple& toks, Py_ssize_t i) {
     while (--i >= 0 && i < TupleSize(toks)) {
         const nb::handle tok = TupleItem(toks, i);
         if (tok.is_none()) continue;
         const CUtf8 text(tok);
-        if (!IsPassedOver(text)) return text == "type";
+        if (!IsPassedOver(text)) return text == word;
     }
     return false;
 }
@@ -78,17 +78,23 @@ void CExtendedParser::_RequireAlias(const CNode& node) {
     _RequireSingle(assignment.ChildAt(2));
 }
 
-// In a body after its header the grammar doesn't know an alias, and stumbles over its name.
+// In a body after its header the grammar doesn't know an alias, and stumbles over its name. What is newer
+// than the grammar it stumbles over anywhere.
 CNodeRef CExtendedParser::_ParseToksToNodeImpl(nb::tuple toks, bool in_async_def, CPositions positions) {
+    nb::tuple rest = toks;
     try {
         return CPGenParserImpl::_ParseToksToNodeImpl(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
         if (!IsParseError(error)) throw;
         const nb::object context = error.value().attr("context");
-        Py_ssize_t name_i = -1;
-        if (!nb::try_cast(context, name_i) || !IsBehindType(toks, name_i)) throw;
+        Py_ssize_t i = -1;
+        if (!nb::try_cast(context, i)) throw;
+        const bool may_be_newest =
+            IsToken(toks, i, "for") || IsToken(toks, i, "async") || IsBehind("lazy", toks, i);
+        if (may_be_newest) rest = _WithoutNewestForms(toks);
+        if (rest.is(toks) && !IsBehind("type", toks, i)) throw;
     }
-    const nb::tuple rest = _WithoutAliases(toks, in_async_def, positions);
+    if (rest.is(toks)) rest = _WithoutAliases(toks, in_async_def, positions);
     return CPGenParserImpl::_ParseToksToNodeImpl(rest, in_async_def, std::move(positions));
 }
 

@@ -306,6 +306,7 @@ void CBlockTracker::_CheckClause(CBlock& block) {
         return;
     }
     if (clause == EClause::kCase && block.clause != EClause::kMatch && !block.is_unknown) {
+        if (_fHead.may_be_annotation) return;
         _Report(ECode::kCaseOutsideMatch, _fHead.start, _fHead.end, "'case' outside a 'match' statement");
         return;
     }

@@ -85,6 +85,7 @@ enum class ECode : uint16_t {
     kFutureNotFirst = 329,
     kUnknownFeature = 330,
     kNonlocalInModule = 331,
+    kLazyImportPlaced = 332,
 
     kCannotAssign = 401,
     kCannotDelete = 402,
@@ -140,7 +141,7 @@ enum class ECode : uint16_t {
 
 // A statement or an expression that stands where it may not.
 constexpr bool IsPlacement(ECode code) {
-    return code >= ECode::kOutsideFunction && code <= ECode::kNonlocalInModule;
+    return code >= ECode::kOutsideFunction && code <= ECode::kLazyImportPlaced;
 }
 
 }  // namespace codeloom

@@ -24,7 +24,7 @@ constexpr int kMaxDepth = 400;
 // Words without which a line has nothing that depends on its place.
 constexpr uint64_t kWordsOfInterest =
     WordBits(EWord::kReturn, EWord::kYield, EWord::kAwait, EWord::kAsync, EWord::kBreak, EWord::kContinue,
-             EWord::kNonlocal, EWord::kFrom);
+             EWord::kNonlocal, EWord::kFrom, EWord::kLazy);
 // Words that may be anywhere in an expression.
 constexpr uint64_t kWordsWithin = WordBits(EWord::kYield, EWord::kAwait, EWord::kAsync);
 
@@ -96,6 +96,34 @@ CPlacement PlacementIn(const std::vector<CBlock>& blocks) {
     return place;
 }
 
+// Empty where nothing does.
+std::string_view WhatForbidsLazyImport(const std::vector<CBlock>& blocks) {
+    std::string_view found;
+    for (const CBlock& block : blocks) {
+        switch (block.clause) {
+            case EClause::kDef:
+            case EClause::kAsyncDef:
+                return "functions";
+            case EClause::kClass:
+                return "classes";
+            case EClause::kTry:
+            case EClause::kExcept:
+            case EClause::kBareExcept:
+            case EClause::kExceptStar:
+            case EClause::kFinally:
+                found = "try/except blocks";
+                break;
+            case EClause::kWith:
+            case EClause::kAsyncWith:
+                found = "with blocks";
+                break;
+            default:
+                break;
+        }
+    }
+    return found;
+}
+
 bool IsAsyncScope(EScope scope) {
     return scope == EScope::kAsyncFunction;
 }
@@ -109,7 +137,8 @@ std::string Outside(std::string_view what, const CPlacement& place) {
 }  // namespace
 
 void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const CBlockTracker& blocks) {
-    const bool is_future = tree != nullptr && IsFutureImport(*tree, tree->fRoot);
+    const bool is_lazy = logical.tokens.front().word == EWord::kLazy;
+    const bool is_future = tree != nullptr && !is_lazy && IsFutureImport(*tree, tree->fRoot);
     _fTree = tree;
     if (is_future) {
         _CheckFuture(tree->fRoot, blocks);
@@ -120,6 +149,7 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
     _fHasStatement = true;
     if (tree == nullptr || tree->fIsEmpty || !logical.MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt())
         return;
+    if (is_lazy) _CheckLazyImport(tree->fRoot, blocks);
     CPlacement place = PlacementIn(blocks.Blocks());
     // A body on the row of its header.
     place.in_except_star |= blocks.Head().clause == EClause::kExceptStar;
@@ -359,6 +389,10 @@ void CPlacementRules::_CheckReturn(const CTreeNode& node, const CPlacement& plac
 
 void CPlacementRules::_CheckYield(const CTreeNode& node, const CPlacement& place) {
     const CSpan span = SpanOf(*_fTree, node);
+    constexpr int kRefusesInComprehension = 308;
+    const bool is_in_own_scope =
+        place.comprehension != EComprehension::kNone && _fLanguage.version < kRefusesInComprehension;
+    if (is_in_own_scope && _fLanguage.IsPython3()) return;
     if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'yield' outside function");
     if (!IsAsyncScope(place.scope)) return;
     if (!node.IsLeaf() && IsYieldFrom(*_fTree, node))
@@ -412,6 +446,25 @@ void CPlacementRules::_CheckImportStar(const CTreeNode& node, const CPlacement& 
     if (star != nullptr && !is_allowed)
         _Report(ECode::kImportStarNotInModule, SpanOf(*_fTree, *star),
                 "import * only allowed at module level");
+}
+
+// Module level only, and nowhere where an exception of the import is expected (PEP 810).
+void CPlacementRules::_CheckLazyImport(const CTreeNode& node, const CBlockTracker& blocks) {
+    const bool is_from = node.Is(ENodeKind::kFromImport);
+    if (!is_from && !node.Is(ENodeKind::kImportNames)) return;
+    const std::string_view around = WhatForbidsLazyImport(blocks.Blocks());
+    std::string message;
+    if (!around.empty()) {
+        message.append("lazy import not allowed inside ").append(around);
+    } else if (is_from && StarOfFromImport(*_fTree, node) != nullptr) {
+        message = "lazy from ... import * is not allowed";
+    } else if (IsFutureImport(*_fTree, node)) {
+        message = "lazy from __future__ import is not allowed";
+    } else {
+        return;
+    }
+    const CRawToken& lazy = _fTree->Line().tokens.front();
+    _Report(ECode::kLazyImportPlaced, {lazy.start, lazy.start + lazy.length}, std::move(message));
 }
 
 void CPlacementRules::_CheckNonlocal(const CTreeNode& node, const CPlacement& place) {

@@ -54,8 +54,11 @@ class CPlacementRules {
     // An expression embedded in the line that was checked last.
     void CheckEmbedded(const CTree& tree, const CBlockTracker& blocks);
 
-    // Annotations aren't evaluated where they are: since 3.14 (PEP 649), or by `from __future__` (PEP 563).
-    bool DefersAnnotations() const { return _fHasFutureAnnotations || _fLanguage.version >= 314; }
+    // Annotations aren't evaluated where they are: since 3.14 (PEP 649), or by `from __future__` (PEP 563),
+    // where they are judged since 3.10.
+    bool DefersAnnotations() const {
+        return _fLanguage.version >= 314 || (_fHasFutureAnnotations && _fLanguage.version >= 310);
+    }
 
     // Call once, after the last line.
     void Finish() { _TrackFunctions({}); }
@@ -92,6 +95,7 @@ class CPlacementRules {
     void _CheckAwait(const CTreeNode& leaf, const CPlacement& place);
     void _CheckJump(const CTreeNode& leaf, const CPlacement& place);
     void _CheckImportStar(const CTreeNode& node, const CPlacement& place);
+    void _CheckLazyImport(const CTreeNode& node, const CBlockTracker& blocks);
     void _CheckNonlocal(const CTreeNode& node, const CPlacement& place);
     void _ReportInExceptStar(const CSpan& span);
     void _ReportAsyncDisplay(const CPlacement& place);

@@ -133,6 +133,10 @@ CStatementHead ReadStatementHead(const CRawLogical& logical) {
     } else {
         head.clause = ClauseOfWord(first->word);
     }
+    if (head.clause == EClause::kCase && !head.ends_in_colon) {
+        const CRawToken* const next = NextSignificant(logical.tokens, token_i);
+        head.may_be_annotation = next != nullptr && next->type == kTokenId_LSQB;
+    }
     if (head.clause == EClause::kWith || head.clause == EClause::kAsyncWith)
         head.with_item_count = CountWithItems(logical);
     for (size_t last_i = logical.tokens.size(); last_i-- > 0;) {

@@ -36,7 +36,8 @@ struct CStatementHead {
     EClause clause = EClause::kSimple;
     uint32_t start = 0;  // bytes of the first token
     uint32_t end = 0;
-    bool ends_in_colon = false;  // its last token, comments apart
+    bool ends_in_colon = false;      // its last token, comments apart
+    bool may_be_annotation = false;  // `case [x]: y`, of a name `case`
     uint32_t with_item_count = 0;
 
     bool IsHeader() const { return clause > EClause::kDecorator; }

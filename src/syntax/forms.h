@@ -36,6 +36,8 @@ inline constexpr CForm kTypeParameters{"a list of type parameters", 312};
 inline constexpr CForm kTypeDefault{"a default of a type parameter", 313};
 inline constexpr CForm kBareExcept{"an `except` of several types without brackets", 314};
 inline constexpr CForm kTString{"a t-string", 314};
+inline constexpr CForm kLazyImport{"a lazy import", 315};
+inline constexpr CForm kUnpackingComprehension{"unpacking in a comprehension", 315};
 
 inline constexpr CForm kOldOctal{"an octal number without `0o`", CForm::kNone};
 inline constexpr CForm kLongNumber{"the suffix `L` of a number", CForm::kNone};

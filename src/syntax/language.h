@@ -72,7 +72,7 @@ struct CChainClass {
 
 struct CLanguage {
     static constexpr int kOldest = 207;  // 2.7; 3.12 is 312
-    static constexpr int kNewest = 314;
+    static constexpr int kNewest = 315;
     static constexpr int kAllForms = INT32_MAX;
 
     int version = kNewest;
@@ -102,7 +102,7 @@ const CLanguage& LanguageOf(int version, bool has_print_function = false);
 // The language of hints in comments within a text of `version`: type checkers know the forms of all versions.
 const CLanguage& HintLanguageOf(int version);
 
-// True for 207 and from 300 to 314.
+// True for 207 and from 300 to 315.
 bool IsKnownVersion(int version);
 
 }  // namespace codeloom

@@ -11,8 +11,17 @@ CSpanParser::CSpanParser(const CLanguage& language)
 CParsed CSpanParser::_ParseAfterRefusal(const CTokenSpan& span, uint32_t token_i) {
     const bool may_be_alias =
         _fLanguage.has_newer_statements && span.IsWord(span.Previous(token_i), EWord::kType);
-    if (!may_be_alias) throw CRefusal{token_i};
+    if (!may_be_alias) return _ParseNewestForms(span, token_i);
     const std::vector<CTokenRange> ranges = _RangesOfAliases(span);
+    return _fStatementParser.Parse(span.Without(ranges), *_fTree);
+}
+
+CParsed CSpanParser::_ParseNewestForms(const CTokenSpan& span, uint32_t token_i) {
+    const bool is_met = span.IsWord(token_i, EWord::kFor) || span.IsWord(token_i, EWord::kAsync) ||
+                        span.IsWord(span.Previous(token_i), EWord::kLazy);
+    if (!is_met || !span.removed.empty() || !_fLanguage.has_newer_statements) throw CRefusal{token_i};
+    const std::vector<CTokenRange> ranges = _RangesOfNewestForms(span);
+    if (ranges.empty()) throw CRefusal{token_i};
     return _fStatementParser.Parse(span.Without(ranges), *_fTree);
 }
 

@@ -10,6 +10,7 @@
 //   @a[0].b                                 decorators.cpp
 //   def f[T: int = str]():    type X = int  type_parameters.cpp
 //   if a: type X = int                      type_aliases.cpp
+//   lazy import a    [*a for a in b]        newest_forms.cpp
 //   match a:    case [a, *b]:               match_case_parser.h
 // Mostly the tokens in the way are passed over, and the grammar takes the others.
 #pragma once
@@ -72,6 +73,7 @@ class CSpanParser {
     // In a body after its header the grammar doesn't know an alias, and stumbles over its name.
     CParsed _ParseAfterRefusal(const CTokenSpan& span, uint32_t token_i);
     CParsed _ParseBeyondGrammar(const CTokenSpan& span, uint32_t i);
+    CParsed _ParseNewestForms(const CTokenSpan& span, uint32_t token_i);
     CParsed _ParseAsync(const CTokenSpan& span, uint32_t async_i);
     CParsed _ParseExcept(const CTokenSpan& span, uint32_t except_i);
     void _RefuseTypesWithTarget(const CTokenSpan& span, uint32_t except_i) const;
@@ -90,6 +92,9 @@ class CSpanParser {
     void _ParseNameAndBound(const CTokenSpan& span, uint32_t start, uint32_t end, CFewNodes& children);
     CTreeNode _ParseDefault(const CTokenSpan& span, uint32_t equal_i, uint32_t end);
     CParsed _ParseBound(const CTokenSpan& span);
+
+    bool _BeginsLazyImport(const CTokenSpan& span, uint32_t lazy_i) const;
+    std::vector<CTokenRange> _RangesOfNewestForms(const CTokenSpan& span);
 
     bool _BeginsTypeAlias(const CTokenSpan& span, uint32_t type_i) const;
     void _RequireAlias(const CTreeNode& node) const;
