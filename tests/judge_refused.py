@@ -25,13 +25,25 @@ from codeloom import Problem, analyze
 # What the interpreter says, and what says as much. Both are patterns; {} is a group of the first one.
 SAME_CAUSE: list[tuple[str, str]] = [
     # It names no cause: whatever is found says more.
-    (r"invalid syntax", r".+"),
+    (r"(?:f-string: )?invalid syntax", r".+"),
     (r"(expected an indented block after .+) on line \d+", r"{}"),
     (r"(closing parenthesis '.' does not match opening parenthesis '.') on line \d+", r"{}"),
     (r"asynchronous comprehension outside of an asynchronous function", r"'await' outside async function"),
     (r"'yield from' outside function", r"'yield' outside function"),
     (r"multiple exception types must be parenthesized", r"an `except` of several types .+ needs Python 3.14"),
     (r"leading zeros in decimal .+", r"an octal number without `0o` ended with Python 2"),
+    (r"\(unicode error\) .+ position \d+-\d+: (.+)", r"{}"),
+    (r"\(value error\) (invalid \\x escape) at position \d+", r"{}"),
+    # As fields were read before 3.12.
+    (r"f-string: expecting '}'", r"f-string: (expecting .+|unmatched .+|invalid conversion .+)"),
+    (r"f-string: expression required before '(.)'", r"f-string: valid expression required before '{}'"),
+    (r"f-string: empty expression not allowed", r"f-string: valid expression required before '}}'"),
+    (r"f-string: invalid conversion character: .+", r"f-string: .*conversion.*"),
+    (r"f-string: (closing parenthesis .+|invalid syntax\. .+|cannot .+)", r"{}"),
+    (r"f-string: unterminated string", r"unterminated string literal"),
+    (r"f-string expression part cannot include '#'", r"'{{' was never closed"),
+    (r"f-string expression part cannot include a backslash", r".+ after line continuation character"),
+    (r"'(.+ expression)' can not be used within an annotation", r"{} cannot be used within an annotation"),
     (r"unexpected EOF while parsing", r"unexpected end of file after a backslash"),
     (r"assignment to yield expression not possible", r"'yield' is a keyword and can't be used as a name"),
     (r"f-string: expecting '=', .+", r"'.' has no meaning in Python"),

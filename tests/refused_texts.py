@@ -123,7 +123,7 @@ class _Watched:
             return
         if isinstance(source, bytes | bytearray):
             try:
-                source = bytes(source).decode()
+                source = bytes(source).decode("utf-8-sig")
             except UnicodeDecodeError:
                 return
         if isinstance(source, str) and self._IsMeant(source):
