@@ -51,8 +51,9 @@ class CFileAnalyzer final : CTreeObserver {
           _fLength(text.size()),
           _fFalseHints(text),
           _fChecker(LanguageOf(settings.version), _fResult.problems),
+          _fMayDeclareNames(MayDeclareNames(text)),
           _fSignatures(_fResult.signatures) {
-        if (settings.wants_names || MayDeclareNames(text))
+        if (settings.wants_names || _fMayDeclareNames)
             _fNames.emplace(LanguageOf(settings.version), _fResult.names);
         _SetLanguage(LanguageOf(settings.version));
     }
@@ -85,6 +86,7 @@ class CFileAnalyzer final : CTreeObserver {
     std::optional<CCauses> _fCauses;  // made for the first fault
     CFileAnalysis _fResult;
     CTextChecker _fChecker;
+    const bool _fMayDeclareNames;
     std::optional<CNameCollector> _fNames;
     const CRawLogical* _fLine = nullptr;  // under way, where names are wanted
     CSignatureFinder _fSignatures;
@@ -188,7 +190,7 @@ void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::s
 
 void CFileAnalyzer::_FinishNames() {
     _fNames->Finish();
-    CheckDeclarations(_fResult.names, _fSettings.version, _fResult.problems);
+    if (_fMayDeclareNames) CheckDeclarations(_fResult.names, _fSettings.version, _fResult.problems);
     if (!_fSettings.wants_names) _fResult.names = {};
 }
 

@@ -260,14 +260,9 @@ bool COccurrenceFinder::_IsValue(const CTreeNode& name) const {
 
 COccurrence& COccurrenceFinder::_Add(const CTreeNode& leaf, ERole role) {
     const CRawToken& token = _fTree->Token(leaf);
-    COccurrence& added = _fFound.items.emplace_back();
-    added.name = _fFound.names.Number(_fTree->Line().Text(token));
-    added.start = token.start + _fShift;
-    added.end = added.start + token.length;
-    added.scope = _fScope;
-    added.role = role;
-    added.flags = _fFlags;
-    return added;
+    const uint32_t name = _fFound.names.Number(_fTree->Line().Text(token)), start = token.start + _fShift;
+    _fFound.items.push_back({name, start, start + token.length, 0, 0, _fScope, role, _fFlags});
+    return _fFound.items.back();
 }
 
 COccurrence& COccurrenceFinder::_AddAttribute(const CTreeNode& leaf, ERole role, uint32_t object_start,
