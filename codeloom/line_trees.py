@@ -56,7 +56,7 @@ def new_parser(language: Language) -> CPGenParserImpl:
 
 
 def line_trees(analysis: Analysis, row: int | None = None) -> Iterator[LineTree]:
-    """The trees of all logical lines of a text, or of those that stand on one row, counted from 1."""
+    """The trees of all logical lines of a text, or of those on one row, counted from 1."""
     reader = _TreeReader(analysis)
     for logical in GetLogicalsFromText(analysis.text):
         origin = logical.fFirstLine, 0
@@ -76,7 +76,7 @@ def count_rows(text: str) -> int:
 
 
 def _rows_of(logical: CLogicalLine, first_row: int) -> range:
-    """The rows of the file that a logical stands on, from zero."""
+    """The rows of the file that a logical is on, from zero."""
     if not logical.fPositions:
         return range(first_row, first_row)
     last_row = logical.fPositions[-1][0] + len(RowTexts(logical.fToks[-1]))
@@ -109,7 +109,7 @@ class _TreeReader:
         return LineTree(self._path, row, column, TextFromTokens(logical).lstrip(), tree, fault)
 
     def _hindrance(self, rows: range) -> Fault | None:
-        """Why what stands on these rows, from zero, can't be parsed."""
+        """Why what is on these rows, from zero, can't be parsed."""
         for problem in self._hindrances:
             if problem.range.row - 1 in rows:
                 place = problem.range

@@ -7,7 +7,7 @@ from codeloom.rows import RowTexts
 def TextFromTokens(logical: CLogicalLine) -> str:
     """The source text of a logical, rebuilt from its tokens.
 
-    Tokens stand at their rows and columns, and blanks fill the gaps, so that a column of the
+    Tokens are at their rows and columns, and blanks fill the gaps, so that a column of the
     logical, in UTF-8 bytes, is a column of this text. Removed tokens leave blanks.
     """
     pieces: list[str] = []
@@ -24,7 +24,7 @@ def TextFromTokens(logical: CLogicalLine) -> str:
 
 
 def _Behind(token: str, row: int, col: int) -> tuple[int, int]:
-    """The place just behind a token that starts at (row, col)."""
+    """The place just after a token that starts at (row, col)."""
     *rows_above, last_row = RowTexts(token)
     if rows_above:
         col = 0

@@ -1,7 +1,7 @@
 """Records to read: what the engine says about the names of a line, as values and as lines of text.
 
 A line of text is a word for the kind, the name, and two blanks before the payload where there is
-one. In front stands `arg` when the record is about an argument of a definition:
+one. In front is `arg` when the record is about an argument of a definition:
 
     set  f
     arg set  a
@@ -9,7 +9,7 @@ one. In front stands `arg` when the record is about an argument of a definition:
     hint x  int
 
 `FormatRecord` writes such a line and `ParseRecord` reads it back, without loss. A name or a payload
-that would be mistaken stands as a bytes literal: `get  b'a  b'`.
+that would be mistaken is a bytes literal: `get  b'a  b'`.
 """
 
 import re

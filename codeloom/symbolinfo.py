@@ -1,6 +1,6 @@
 """The vocabulary of symbol records: what is said about a name, and how it is written.
 
-A record is a UTF-8 byte string: a prefix, which is `:`, a kind byte and `:`, and behind it a
+A record is a UTF-8 byte string: a prefix, which is `:`, a kind byte and `:`, and after it a
 payload whose form the kind decides. Anything else is a plain equiv, the text of what the name
 stands for. Kinds are integers from 0 to 255, as a byte string gives them by index.
 
@@ -99,7 +99,7 @@ class CFullyScopedName(CPlainRecord):
 
 
 class CDefInfo(CPlainRecord):
-    """A definition: its name, its kind, and the row from zero on which it stands."""
+    """A definition: its name, its kind, and the row from zero that it is on."""
 
     name: CFullyScopedName
     kind: int

@@ -23,6 +23,7 @@ EXAMPLES = Path(__file__).parent.parent / "examples"
         (["--python", "2.7", "old.py"], 0, "0 problems in 1 file, 1 logical line"),
         (["--python=3.5", "old.py"], 1, "1 problem in 1 of 1 file, 1 logical line"),
         (["empty"], 0, "0 problems in 0 files, 0 logical lines"),
+        ([], 1, "3 problems in 2 of 4 files, 12,350 logical lines"),
         (["many.py"], 0, "0 problems in 1 file, 12,345 logical lines"),
     ],
 )
@@ -76,7 +77,6 @@ def test_the_examples(run_cli):
         ([], "COMMAND"),
         (["mend", "a.py"], "no command 'mend'"),
         (["chek", "a.py"], "did you mean 'check'?"),
-        (["check"], "FILE-OR-FOLDER"),
         (["check", "--statistic", "a.py"], "no option --statistic: did you mean '--statistics'?"),
         (["check", "--format", "jsn", "a.py"], "did you mean 'json'?"),
         (["check", "--select", "E9", "a.py"], "'E9' is no code"),
@@ -269,3 +269,24 @@ class TestEndings:
         os.close(terminal)
         process.stderr.close()
         assert (b"\033[" in output) == coloured
+
+    def test_progress_on_a_terminal(self, write_files, start_cli):
+        """A row on the standard error, which is taken away; the results aren't touched by it."""
+        pty = pytest.importorskip("pty")
+        write_files({f"{i}.py": "x = )\n" if i == 99 else "x = 1\n" for i in range(100, 0, -1)})
+        terminal, terminal_of_process = pty.openpty()
+        code = (
+            "import codeloom.cli.progress as p, codeloom.cli as c; p._PATIENCE = p._INTERVAL = 0;"
+            "c.main(['check', '.'])"
+        )
+        command = [sys.executable, "-P", "-c", code]
+        process = subprocess.Popen(
+            command, cwd=write_files({}), stdout=subprocess.PIPE, stderr=terminal_of_process, text=True
+        )
+        os.close(terminal_of_process)
+        stdout, _ = process.communicate(timeout=60)
+        shown = os.read(terminal, 1 << 20).decode()
+        os.close(terminal)
+        assert "files, " in shown and shown.endswith("\r\033[K")
+        assert stdout.splitlines()[-1] == "1 problem in 1 of 100 files, 100 logical lines"
+        assert "\033" not in stdout

@@ -4,7 +4,7 @@ import os
 
 import pytest
 
-from codeloom.reading.languages import oldest_admitted, version_named
+from codeloom.reading.languages import NEWEST, oldest_admitted, version_named
 
 
 class TestSettings:
@@ -65,7 +65,7 @@ class TestVersions:
         [
             ("3.12", "3.12"),
             ("py312", "3.12"),
-            ("3", "3.14"),
+            ("3", NEWEST),
             ("2", "2.7"),
             ("python3.8", "3.8"),
             ("3.9.1", "3.9"),

@@ -29,7 +29,7 @@ class Colour(StrEnum):
 
 
 class Console:
-    """The output, as the terminal, the pipe or the file behind it wants it.
+    """The output, as the terminal, the pipe or the file that takes it wants it.
 
     `width` is the room for a row after the indentation, in columns of the terminal. `colour` is "auto",
     "always" or "never".

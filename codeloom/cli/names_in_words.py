@@ -6,7 +6,7 @@ from itertools import groupby
 
 from codeloom._analysis import Record, RecordKind
 
-# In the order in which a line's statements stand.
+# In the order of a line's statements.
 _LABELS = (
     "binds", "global", "nonlocal", "types", "takes", "inside", "knows", "calls", "reads", "returns", "yields"
 )  # fmt: skip
@@ -26,7 +26,7 @@ _LITERAL_PREFIX = ":l:"
 
 
 def statements(records: list[Record]) -> Iterator[tuple[str, list[list[str]]]]:
-    """What records say: a label, and rows of items behind it.
+    """What records say: a label, and rows of items after it.
 
     Names of which no more is said share a row; each of the others has its own.
     """
@@ -111,7 +111,7 @@ def _rows(said: Iterable[_Said]) -> list[list[str]]:
 
 
 def _value(record: Record) -> str:
-    """What a name stands for, in words."""
+    """What a name's value is, in words."""
     match record.kind, record.value:
         case RecordKind.LITERAL, (str(type_name), value):
             return value or _some_instance(type_name)

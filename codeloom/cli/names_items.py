@@ -41,7 +41,7 @@ class LineNames(Item):
             yield f"{place} {record.kind.value} {printable(on_one_row(record.name + payload))}"
 
     def fields(self) -> Iterator[dict[str, Any]]:
-        """An object for each record; one that stands nowhere has the place of its line."""
+        """An object for each record; one without a place has the place of its line."""
         scope = next((record.name for record in self._records if record.kind is RecordKind.SET), None)
         for record in self._records:
             place = record.range

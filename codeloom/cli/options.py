@@ -98,9 +98,11 @@ def add_source_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
     """Add what every command has that goes through files."""
     parser.add_argument(
         "paths",
-        nargs="+",
+        nargs="*",
+        default=["."],
         metavar="FILE-OR-FOLDER",
-        help="a file; a folder, with all Python files and notebooks below it; or - for the standard input",
+        help="a file; a folder, with all Python files and notebooks below it; or - for the standard input "
+        "(default: the current folder)",
     )
     _add_reading(parser)
     _add_finding(parser)

@@ -16,7 +16,7 @@ _OPEN_FILES = ("/dev/fd/", "/dev/stdin", "/proc/self/fd/")
 
 
 class StandardInput(str):
-    """The standard input where it stands among paths."""
+    """The standard input among paths."""
 
     NAME = "-"
     __slots__ = ()
