@@ -234,6 +234,7 @@ void CBlockTracker::_ReportMissingBlock(uint32_t start, uint32_t end) {
 
 // False where tabs and blanks disagree about how deep the line lies. Reported once a block.
 bool CBlockTracker::_CheckTabs(const CIndent& indent) {
+    if (!_fLanguage.IsPython3()) return true;
     CBlock& block = _Top();
     const CIndent& other = block.indent;
     const bool agrees = indent.column == other.column ? indent.alt_column == other.alt_column

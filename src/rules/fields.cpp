@@ -24,7 +24,9 @@ class CFieldReader final : public CFieldListener {
         _fOpen.push_back({_fFields.expressions.size(), level, false});
         _fFields.expressions.push_back({start, start});
     }
-    void AddFieldToken(size_t /*pos*/, const CLexedToken& /*token*/) override {}
+    void AddFieldToken(size_t /*pos*/, const CLexedToken& token) override {
+        _fFields.has_comment |= token.type == kTokenId_COMMENT;
+    }
     void EndExpression(size_t pos, bool /*is_sound*/) override {
         _fFields.expressions[_fOpen.back().expression_i].end = static_cast<uint32_t>(pos);
         _fOpen.back().in_spec = true;

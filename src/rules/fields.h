@@ -18,6 +18,7 @@ inline bool HasFields(std::string_view literal) {
 
 struct CStringFields {
     std::vector<CSpan> expressions;  // bytes of the file after each "{", by place; nested ones too
+    bool has_comment = false;        // within an expression
     int levels = 0;                  // of fields within format specs within fields
     int string_levels = 1;           // of strings within expressions within strings
 

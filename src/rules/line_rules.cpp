@@ -7,6 +7,7 @@
 #include "rules/patterns.h"
 #include "rules/stars.h"
 #include "rules/targets.h"
+#include "rules/versions.h"
 #include "syntax/definitions.h"
 #include "syntax/imports.h"
 #include "syntax/statements.h"
@@ -100,9 +101,10 @@ uint64_t KindsBelowRoot(const CTree& tree) {
 
 void CheckLine(const CTree& tree, const CLanguage& language, const CLineSetting& setting,
                CProblems& problems) {
+    const CRuleContext context{tree, language, problems};
+    if (language.version < kNeedsNoVersionCheck) CheckVersion(context);
     CheckLiterals(tree.Line(), language, problems);
     if (tree.fIsEmpty || tree.fRoot.IsLeaf() || (tree.Kinds() & kKindsWithRules) == 0) return;
-    const CRuleContext context{tree, language, problems};
     if (setting.defers_annotations) CheckAnnotations(context);
     CheckNode(context, tree.fRoot);
     if ((KindsBelowRoot(tree) & kKindsWithRules) != 0) {

@@ -13,6 +13,11 @@ constexpr std::string_view kDebug = "__debug__";
 constexpr int kRefusesDeletedDebug = 310;
 constexpr uint32_t kMaxBeforeStar = 255;
 
+// `None` in Python 2, where it is a name that can't be bound.
+bool IsNoneName(const CTreeNode& leaf) {
+    return leaf.Is(ENodeKind::kNameLiteral) && IsWord(leaf, EWord::kNoneValue);
+}
+
 // Of a node that is an attribute or a name, the leaf that is bound.
 const CTreeNode* BoundLeaf(const CTree& tree, const CTreeNode& node, EExpression kind) {
     const CTreeNode& shown = DropParentheses(tree, node);
@@ -54,6 +59,10 @@ class CTargetCheck {
     bool _IsDelete() const { return _fUse == ETargetUse::kDelete; }
 
     bool _CheckLeaf(const CTreeNode& name) const {
+        if (IsNoneName(name)) {
+            CheckBoundName(_fContext, name);
+            return false;
+        }
         if (_fContext.tree.Text(name) != kDebug) return true;
         if (_IsDelete() && _fContext.language.version < kRefusesDeletedDebug) return true;
         _fContext.Report(ECode::kCannotBindName, name,
@@ -143,6 +152,7 @@ void CheckTarget(const CRuleContext& context, const CTreeNode& target, ETargetUs
 void CheckBoundName(const CRuleContext& context, const CTreeNode& name) {
     if (context.tree.Text(name) == kDebug)
         context.Report(ECode::kCannotBindName, name, "cannot assign to __debug__");
+    if (IsNoneName(name)) context.Report(ECode::kCannotBindName, name, "cannot assign to None");
 }
 
 void CheckAssignment(const CRuleContext& context, const CTreeNode& statement) {

@@ -16,10 +16,24 @@ struct CForm {
 
 namespace forms {
 
+inline constexpr CForm kUnicodeName{"a name with other than ASCII letters", 300};
+inline constexpr CForm kUnicodePrefix{"the prefix `u` of a string", 303};
+inline constexpr CForm kRawBytes{"the prefix `rb` of bytes", 303};
+inline constexpr CForm kYieldFrom{"`yield from`", 303};
+inline constexpr CForm kAsync{"`async`", 305};
+inline constexpr CForm kMatrixProduct{"`@` as an operator", 305};
+inline constexpr CForm kUnpackingInCall{"unpacking in a call anywhere but once at the end", 305};
+inline constexpr CForm kUnpackingInDisplay{"unpacking in a display or a value", 305};
 inline constexpr CForm kFString{"an f-string", 306};
+inline constexpr CForm kUnderscore{"`_` within a number", 306};
+inline constexpr CForm kAsyncComprehension{"an asynchronous comprehension", 306};
+inline constexpr CForm kCommaAfterStars{"a comma after starred parameters", 306};
+inline constexpr CForm kEmptyTarget{"`()` as a target", 306};
 inline constexpr CForm kVariableAnnotation{"an annotation of a variable", 306};
 inline constexpr CForm kWalrus{"`:=`", 308};
 inline constexpr CForm kStarInResult{"a starred expression without brackets behind `return` or `yield`", 308};
+inline constexpr CForm kAnnotatedTuple{"an annotated assignment of a bare tuple or `yield`", 308};
+inline constexpr CForm kSignOfField{"`=` at the end of a field of an f-string", 308};
 inline constexpr CForm kPositionalOnly{"`/` among parameters", 308};
 inline constexpr CForm kDecorator{"a decorator that is no name or call of one", 309};
 inline constexpr CForm kWithBrackets{"a `with` whose items stand in brackets", 309};
@@ -33,6 +47,10 @@ inline constexpr CForm kStarInSubscript{"a starred expression in a subscript", 3
 inline constexpr CForm kStarredAnnotation{"a starred annotation", 311};
 inline constexpr CForm kTypeAlias{"`type`", 312};
 inline constexpr CForm kTypeParameters{"a list of type parameters", 312};
+inline constexpr CForm kQuotesInField{"an f-string's own quotes or row ends in its field",
+                                      312};
+inline constexpr CForm kBackslashInField{"a backslash in a field of an f-string", 312};
+inline constexpr CForm kCommentInField{"`#` in a field of an f-string", 312};
 inline constexpr CForm kTypeDefault{"a default of a type parameter", 313};
 inline constexpr CForm kBareExcept{"an `except` of several types without brackets", 314};
 inline constexpr CForm kTString{"a t-string", 314};
