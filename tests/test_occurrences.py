@@ -8,7 +8,7 @@ from pathlib import Path
 
 import pytest
 from golden import Cases, Check
-from names_against_interpreter import KNOWN, disagreements_of
+from names_against_interpreter import KNOWN, disagreements_of, python2_disagreements, pytree
 from test_library import LibraryTexts
 
 from codeloom import Role, analyze
@@ -227,3 +227,17 @@ def test_items_are_values():
     assert pickle.loads(pickle.dumps(x.scope)) == x.scope
     with pytest.raises(TypeError):
         type(x.symbol)()
+
+
+def test_python2_against_lib2to3():
+    text = (Path(pytree.__file__).parent / "tests/data/py2_test_grammar.py").read_text()
+    assert list(python2_disagreements(text)) == []
+
+
+def test_what_python2_unpacks_of_an_exception():
+    analysis = analyze("try: pass\nexcept a.b, (c, d): c\n", python="2.7")
+    assert [(each.name, each.role.value) for each in analysis.occurrences[2:]] == [
+        ("c", "bind"),
+        ("d", "bind"),
+        ("c", "read"),
+    ]

@@ -54,7 +54,7 @@ class CFileAnalyzer final : CTreeObserver {
           _fMayDeclareNames(MayDeclareNames(text)),
           _fSignatures(_fResult.signatures) {
         if (settings.wants_names || _fMayDeclareNames)
-            _fNames.emplace(LanguageOf(settings.version), _fResult.names);
+            _fNames.emplace(LanguageOf(settings.version), _fMayDeclareNames, _fResult.names);
         _SetLanguage(LanguageOf(settings.version));
     }
 
@@ -153,7 +153,9 @@ void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
         return _AddProblem(ECode::kLineTooLong, logical.StartOf(first), logical.EndOf(first),
                            CLengthLimits::Message(too_long, logical));
     }
-    const CLineResult result = _Analyze(logical, line);
+    CLineResult result = _Analyze(logical, line);
+    // `except A, a.b:` binds what isn't a name; in Python 2 that is sound.
+    if (result.fault.kind == EFault::kExceptTarget && _fSettings.version < 300) result.fault = {};
     _Leave(logical, static_cast<bool>(result.fault));
     if (result.fault) {
         if (!_IsUnreadable(line)) _AddFault(logical, result.fault);
@@ -178,8 +180,6 @@ CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical, const CLine& lin
 }
 
 void CFileAnalyzer::_AddFault(const CRawLogical& logical, const CFault& fault) {
-    // `except A, a.b:` binds what isn't a name; in Python 2 that is sound.
-    if (fault.kind == EFault::kExceptTarget && _fSettings.version < 300) return;
     if (!_fCauses) _fCauses.emplace(*_fLanguage);
     _fResult.problems.push_back(_fCauses->Of(fault, logical));
 }

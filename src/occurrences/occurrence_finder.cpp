@@ -37,7 +37,7 @@ void COccurrenceFinder::BeginLine(const CRawLogical& line) {
     _fFirstScope = _fFound.scopes.size();
     _fOpenedScope = 0;
     _fLine = &line;
-    _fHasEmbedded = !line.embedded.empty();
+    _fHasEmbedded = _fHasParts = !line.embedded.empty();
     _fStrings.clear();
 }
 
@@ -65,6 +65,7 @@ void COccurrenceFinder::Take(const CRawLogical& part, const CTree& tree) {
 
 void COccurrenceFinder::TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) {
     _fTree = &tree;
+    _fHasParts = true;
     _fFlags = COccurrence::kInComment;
     _fShift = shift;
     _fScope = 0;
@@ -82,6 +83,7 @@ void COccurrenceFinder::EndLine(bool has_fault) {
         _fOpenedScope = 0;
         return;
     }
+    if (!_fHasParts) return;
     const auto is_before = [](const COccurrence& one, const COccurrence& other) {
         return one.start < other.start;
     };

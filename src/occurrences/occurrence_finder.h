@@ -118,6 +118,7 @@ class COccurrenceFinder {
     uint32_t _fOpenedScope = 0;
     const CRawLogical* _fLine = nullptr;
     bool _fHasEmbedded = false;
+    bool _fHasParts = false;  // embedded ones or hints in comments, whose names come after those of the line
     std::vector<CString> _fStrings;
 
     // Of the tree under way

@@ -28,7 +28,7 @@ void CNameCollector::EndLine(const CRawLogical& line, bool has_fault, const CBlo
     _fFinder.EndLine(has_fault);
     if (line.type == ELogicalType::kComment) return;
     _fNames.lines.back().end = line.EndOf(line.tokens.back());
-    _fNames.lines.back().is_in_doubt = blocks.IsInDoubt();
+    _fNames.lines.back().is_in_doubt = _fMayDeclareNames && blocks.IsInDoubt();
     const CStatementHead& head = blocks.Head();
     if (has_fault) {
         opened = OpensScope(head.clause) ? _AddLostScope(line, head) : 0;

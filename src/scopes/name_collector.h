@@ -10,8 +10,9 @@ namespace codeloom {
 
 class CNameCollector {
   public:
-    CNameCollector(const CLanguage& language, CTextNames& names)
-        : _fNames(names), _fFinder(language, names.occurrences) {}
+    // Whether a line is in doubt matters only where names may be declared.
+    CNameCollector(const CLanguage& language, bool may_declare_names, CTextNames& names)
+        : _fNames(names), _fFinder(language, names.occurrences), _fMayDeclareNames(may_declare_names) {}
 
     // Call for every line, in order. The blocks around a comment are those of the line before.
     void BeginLine(const CRawLogical& line, const CBlockTracker& blocks);
@@ -31,6 +32,7 @@ class CNameCollector {
     CTextNames& _fNames;
     COccurrenceFinder _fFinder;
     CBlockScopes _fBlocks;
+    const bool _fMayDeclareNames;
     std::vector<uint32_t> _fLostLines;  // by number
 };
 
