@@ -41,10 +41,12 @@ class TestSettings:
             ("jobs = true", "codeloom.toml: jobs: it must be a number"),
             ("python = 3.12", "codeloom.toml: python: it must be a text"),
             ("python = '4'", "codeloom.toml: python: python: unknown version '4'"),
+            ("exclude = ['!']", "codeloom.toml: exclude: '!' is no pattern"),
             ("exclude = [1]", "codeloom.toml: exclude: it must be a list of texts"),
             ("exit-zero = 'no'", "codeloom.toml: exit-zero: it must be true or false"),
             ("format = 'xml'", "codeloom.toml: format: there is no 'xml' here"),
             ("a = ", "codeloom.toml: Invalid value"),
+            ("a = " + "[" * 10_000, "codeloom.toml: maximum recursion depth"),
         ],
     )
     def test_wrong_ones(self, write_files, run_cli, text, words):
@@ -52,6 +54,12 @@ class TestSettings:
         done = run_cli("check", "a.py")
         assert (done.returncode, done.stdout) == (2, "")
         assert words in done.stderr and done.stderr.count("\n") == 1
+
+    def test_a_broken_project_file_matters_when_it_holds_settings(self, write_files, run_cli):
+        write_files({"pyproject.toml": "[project\nrequires-python = '>=3.8'\n", "a.py": "x\n"})
+        assert run_cli("check", "a.py").returncode == 0
+        write_files({"pyproject.toml": "[tool.codeloom\n"})
+        assert run_cli("check", "a.py").returncode == 2
 
     def test_a_format_is_for_the_commands_that_have_it(self, write_files, run_cli):
         write_files({"codeloom.toml": "format = 'github'\n", "a.py": ")\n"})

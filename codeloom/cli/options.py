@@ -10,7 +10,7 @@ from typing import TYPE_CHECKING, Any
 
 from codeloom.cli.formats import FORMATS
 from codeloom.cli.project import Project, WrongUseError, checked_settings, nearest
-from codeloom.reading.exclusion import DEFAULT_PATTERNS, Exclusion
+from codeloom.reading.exclusion import DEFAULT_PATTERNS, Exclusion, is_pattern
 from codeloom.reading.files import StandardInput
 from codeloom.reading.languages import NEWEST, VERSIONS, oldest_admitted, version_named
 
@@ -225,7 +225,11 @@ def _selectors(value: str | list[str]) -> list[str]:
 
 
 def _patterns(value: str | list[str]) -> list[str]:
-    return _texts(value)
+    patterns = _texts(value)
+    for pattern in patterns:
+        if not is_pattern(pattern):
+            raise ValueError(f"{pattern!r} is no pattern")
+    return patterns
 
 
 def _texts(value: object) -> list[str]:

@@ -45,7 +45,12 @@ class Project:
         # Most have nothing for us, and a parser of TOML takes a while to load.
         if b"codeloom" not in text and b"requires-python" not in text:
             return
-        table = _parsed(text, project)
+        try:
+            table = _parsed(text, project)
+        except WrongUseError:
+            if b"tool.codeloom" in text:
+                raise
+            return  # others have something to say about it
         if self.settings_file is None and "codeloom" in _table(table, "tool"):
             self._take(project)
         if self.requires_python is None:
@@ -93,7 +98,7 @@ def _parsed(text: bytes, path: str) -> dict[str, Any]:
 
     try:
         return tomllib.loads(text.decode())
-    except (tomllib.TOMLDecodeError, UnicodeDecodeError) as error:
+    except (tomllib.TOMLDecodeError, UnicodeDecodeError, RecursionError) as error:
         raise WrongUseError(f"{path}: {error}") from None
 
 

@@ -132,10 +132,11 @@ def _read_spec(path: str) -> "GitIgnoreSpec | None":
     try:
         return _spec_of(patterns) if patterns else None
     except ValueError:  # a pattern that isn't one: the others hold
-        return _spec_of(filter(_is_pattern, patterns))
+        return _spec_of(filter(is_pattern, patterns))
 
 
-def _is_pattern(pattern: str) -> bool:
+def is_pattern(pattern: str) -> bool:
+    """True for what a .gitignore file may hold on a row."""
     try:
         _spec_of([pattern])
     except ValueError:
