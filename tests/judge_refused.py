@@ -34,6 +34,7 @@ SAME_CAUSE: list[tuple[str, str]] = [
     (r"leading zeros in decimal .+", r"an octal number without `0o` ended with Python 2"),
     (r"\(unicode error\) .+ position \d+-\d+: (.+)", r"{}"),
     (r"\(value error\) (invalid \\x escape) at position \d+", r"{}"),
+    (r".+ unpacking cannot be used in .*comprehension", r"unpacking in a comprehension needs Python 3.15"),
     # As fields were read before 3.12.
     (r"f-string: expecting '}'", r"f-string: (expecting .+|unmatched .+|invalid conversion .+)"),
     (r"f-string: expression required before '(.)'", r"f-string: valid expression required before '{}'"),

@@ -52,4 +52,14 @@ CCause StillOpen(const CFaultyLine& line) {
     return NeverClosedAt(line, opener_i);
 }
 
+CCause LaterUnmatchedCloser(const CFaultyLine& line) {
+    int open = 0;
+    for (int i = 0; i < line.Count() && !line.IsField(); ++i) {
+        open += IsOpenerType(line.Type(i)) - IsCloserType(line.Type(i));
+        if (open < 0)
+            return line.Problem(ECode::kUnmatchedCloser, i, i, Joined("unmatched ", Quoted(line.Text(i))));
+    }
+    return {};
+}
+
 }  // namespace codeloom

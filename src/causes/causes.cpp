@@ -30,6 +30,7 @@ constexpr auto kGrammarCauses = std::to_array<CRecogniser>({
     UnmatchedCloser,
     CallWithoutParentheses,
     RaiseWithComma,
+    Doubled,
     ParameterFault,
     NeverClosed,
     ImportFault,
@@ -58,6 +59,7 @@ constexpr auto kGrammarCauses = std::to_array<CRecogniser>({
     StatementInExpression,
     MissingComma,
     StillOpen,
+    LaterUnmatchedCloser,
     SideBySide,
     MissingExpression,
     MissingToken,
@@ -85,7 +87,7 @@ CProblem CauseOfSyntax(const CFaultyLine& line) {
     for (const CRecogniser recogniser : kGrammarCauses)
         if (CCause cause = recogniser(line)) return *cause;
     if (CCause cause = LaterTokenCause(line)) return *cause;
-    return line.Problem(ECode::kInvalidSyntax, line.At(), line.At(), "invalid syntax");
+    return Unexpected(line);
 }
 
 // `except A as a.b:`

@@ -42,15 +42,17 @@ CCause SideBySide(const CFaultyLine& line) {
     const int i = line.At();
     if (!line.EndsOperand(i - 1) || !(line.BeginsOperand(i) || line.IsKeyword(i)) || line.IsInBrackets(i))
         return {};
-    return line.Problem(
-        ECode::kSideBySide, i, i,
-        Joined("expected an operator or the end of the statement before ", Quoted(line.Text(i))));
+    const bool is_header =
+        line.IsKeyword(0) && line.FindBack(0, i, kTokenId_COLON) < 0 && line.Takes(kTokenId_COLON);
+    return line.Problem(ECode::kSideBySide, i, i,
+                        Joined("expected an operator or ", is_header ? "':'" : "the end of the statement",
+                               " before ", Quoted(line.Text(i))));
 }
 
 CCause MissingExpression(const CFaultyLine& line) {
     const int i = line.At();
-    if (i == 0 || line.EndsOperand(i - 1) || !line.Takes(kAnyName)) return {};
-    const bool is_name = !line.Takes(kTokenId_NUMBER);
+    if (line.EndsOperand(i - 1) || !line.Takes(kAnyName)) return {};
+    const bool is_name = i > 0 && !line.Takes(kTokenId_NUMBER);
     return line.Problem(ECode::kMissingExpression, line.IsAtEnd() ? i - 1 : i, i,
                         Joined(is_name ? "expected a name " : "expected an expression ", PlaceOf(line)));
 }
@@ -66,6 +68,15 @@ CCause MissingToken(const CFaultyLine& line) {
             return line.Problem(ECode::kMissingToken, line.IsAtEnd() ? line.At() - 1 : line.At(), line.At(),
                                 Joined("expected ", Quoted(kTexts[token_i]), " ", PlaceOf(line)));
     return {};
+}
+
+CProblem Unexpected(const CFaultyLine& line) {
+    const int i = line.At();
+    if (line.IsAtEnd())
+        return line.Problem(ECode::kInvalidSyntax, i, i, "invalid syntax: the line ends too early");
+    std::string message = Joined("invalid syntax: unexpected ", Quoted(line.Text(i)));
+    if (i > 0) message += Joined(" after ", Quoted(line.Text(i - 1)));
+    return line.Problem(ECode::kInvalidSyntax, i, i, std::move(message));
 }
 
 }  // namespace codeloom

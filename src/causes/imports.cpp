@@ -8,6 +8,8 @@ namespace {
 
 CCause FromImportFault(const CFaultyLine& line, int start) {
     const int i = line.At();
+    if (i == start + 1 && line.Is(i, EWord::kImport))
+        return line.Problem(ECode::kMissingName, start, start, "expected the name of a module after 'from'");
     const int import_i = line.FindBack(start, i, EWord::kImport);
     if (import_i < 0) {
         const bool is_missing =

@@ -38,7 +38,8 @@ CCause SplitOperator(const CFaultyLine& line) {
     const int i = line.At();
     if (i == 0) return {};
     const std::string together = Joined(line.Text(i - 1), line.Text(i));
-    if (line.Is(i, kTokenId_EQUAL) && !line.IsAdjacent(i) && !IsOpenerType(line.Type(i - 1))) {
+    if (line.Is(i, kTokenId_EQUAL) && !line.IsAdjacent(i) && !IsOpenerType(line.Type(i - 1)) &&
+        !line.Is(i - 1, kTokenId_COLON)) {
         const int type = GetTokenType(together);
         if (type != kTokenId_ERRORTOKEN && line.FaultWith({i - 1, 2, {static_cast<int16_t>(type)}}) > i)
             return line.Problem(ECode::kSplitOperator, i - 1, i,

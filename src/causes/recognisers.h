@@ -25,9 +25,13 @@ CCause UnmatchedCloser(const CFaultyLine& line);  // brackets.cpp
 CCause NeverClosed(const CFaultyLine& line);      // closing it mends the line
 CCause StillOpen(const CFaultyLine& line);        // it is open at the line's end
 
+CCause LaterUnmatchedCloser(const CFaultyLine& line);
+
 CCause CallWithoutParentheses(const CFaultyLine& line);  // python2.cpp
 CCause RaiseWithComma(const CFaultyLine& line);
 CCause Backquotes(const CFaultyLine& line);
+
+CCause Doubled(const CFaultyLine& line);  // doubled.cpp
 
 CCause ParameterFault(const CFaultyLine& line);  // parameters.cpp
 
@@ -65,5 +69,6 @@ CCause MissingComma(const CFaultyLine& line);
 CCause SideBySide(const CFaultyLine& line);
 CCause MissingExpression(const CFaultyLine& line);
 CCause MissingToken(const CFaultyLine& line);
+CProblem Unexpected(const CFaultyLine& line);  // the last resort
 
 }  // namespace codeloom

@@ -50,6 +50,7 @@ enum class ECode : uint16_t {
     kKeywordAsName = 232,
     kStatementInExpression = 233,
     kNestedHeader = 234,
+    kDoubled = 235,
     kCallWithoutParentheses = 241,
     kEndedStatement = 242,
     kMissingNames = 251,
