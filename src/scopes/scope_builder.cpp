@@ -238,14 +238,19 @@ void CScopeBuilder::_LookUp(uint32_t symbol_i) {
     _Bind(symbol_i, EBinding::kGlobalImplicit, _fSymbols.FindOrAdd(0, name));
 }
 
-// What is annotated in a class sees the names of the class. The interpreter has them as global ones, since
-// the class isn't a function.
+// What is annotated in a class, at any depth, sees the names of the class. The interpreter has them as global
+// ones, since the class isn't a function.
 bool CScopeBuilder::_LookUpInClass(uint32_t symbol_i) {
     const CSymbol symbol = _fScopes.symbols[symbol_i];
-    const CScope& scope = _fScopes.scopes[symbol.scope];
-    if (!IsAnnotationScope(scope.kind) || _fScopes.scopes[scope.parent].kind != EScopeKind::kClass)
-        return false;
-    const uint32_t of_class_i = _fSymbols.Find(scope.parent, symbol.name);
+    uint32_t scope = symbol.scope;
+    while (IsAnnotationScope(_fScopes.scopes[scope].kind)) {
+        scope = _fScopes.scopes[scope].parent;
+        const uint32_t found_i = _fSymbols.Find(scope, symbol.name);
+        const bool is_class = _fScopes.scopes[scope].kind == EScopeKind::kClass;
+        if (!is_class && found_i != kNoIndex && _fScopes.symbols[found_i].MayBeBound()) return false;
+    }
+    if (scope == symbol.scope || _fScopes.scopes[scope].kind != EScopeKind::kClass) return false;
+    const uint32_t of_class_i = _fSymbols.Find(scope, symbol.name);
     if (of_class_i == kNoIndex) return false;
     const CSymbol& of_class = _fScopes.symbols[of_class_i];
     if (of_class.Is(CSymbol::kIsDeclaredGlobal)) {
