@@ -2,6 +2,8 @@
 
 import json
 import os
+import subprocess
+import sys
 import xml.etree.ElementTree as ElementTree
 from importlib.resources import files
 
@@ -134,6 +136,22 @@ def test_sarif(written):
     (invocation,) = run["invocations"]
     assert not invocation["executionSuccessful"]
     assert "No such file" in invocation["toolExecutionNotifications"][0]["message"]["text"]
+
+
+def test_sarif_keeps_to_what_is_taken(write_files):
+    folder = write_files({"a.py": ")\n" * 5})
+    program = (
+        "import codeloom.cli as cli, codeloom.cli.formats.sarif as sarif; sarif.MOST_RESULTS = 2;"
+        "cli.main(['check', '--format', 'sarif', 'a.py'])"
+    )
+    done = subprocess.run(
+        [sys.executable, "-P", "-c", program], cwd=folder, capture_output=True, text=True, check=True
+    )
+    (run,) = json.loads(done.stdout)["runs"]
+    assert len(run["results"]) == 2
+    text = run["invocations"][0]["toolExecutionNotifications"][0]["message"]["text"]
+    assert text == "3 more problems are left out: GitHub takes 2"
+    assert done.stderr == f"codeloom: {text}\n"
 
 
 def test_gitlab(written):

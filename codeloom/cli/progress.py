@@ -12,14 +12,11 @@ _INTERVAL = 0.1
 
 
 class Progress:
-    """A row that is written over again and again, and gone when there is something else to show.
+    """A row that is written over again and again, and gone when there is something else to show."""
 
-    Nothing is shown in a run that prints its results on the terminal all the time.
-    """
-
-    def __init__(self, console: Console) -> None:
+    def __init__(self, console: Console, *, is_wanted: bool) -> None:
         self._console = console
-        self._is_wanted = sys.stderr is not None and sys.stderr.isatty()
+        self._is_wanted = is_wanted and sys.stderr is not None and sys.stderr.isatty()
         self._next = time.monotonic() + _PATIENCE
         self._is_shown = False
 

@@ -56,10 +56,15 @@ class Run:
             return source
 
         jobs = self.options.jobs or processor_count()
-        with Progress(self.console) as progress:
+        # What is printed on the terminal all the time shows well enough how far a run is.
+        with Progress(
+            self.console, is_wanted=not (self._with_records and self.console.is_terminal)
+        ) as progress:
             for source in read_all(self.files(), read, jobs, self._on_error):
-                progress.clear()
-                yield source, self._findings(source)
+                findings = self._findings(source)
+                if findings and self.console.is_terminal:
+                    progress.clear()
+                yield source, findings
                 progress.show(self.tally)
 
     def end(self) -> ExitStatus:
