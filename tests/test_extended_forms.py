@@ -41,25 +41,36 @@ NEW_IN = {
     class A: pass
     @a.b(c)\nclass A: pass
     """,
-    # 3102, 3104, 3107, 3109, 3115, 3132, 380, 414, 448, 465
+    # 3102, 3104, 3107, 3109, 3115, 3132
     "3.0": r"""
     def f(a, *, b: c = 1, **d) -> e: pass
     nonlocal a
     raise A from b
     class A(B, metaclass=C): pass
     a, *b = c
-    yield from a
-    x = u'a'
-    f(*a, *b, **c, **d); [*a, *b]; {**a, 'b': c}
-    a @ b; a @= b
-    with (yield from a) as b: c
     match = case = type; match.case(type)[case]; type is a; type in a; type not in a; type(a)
     """,
-    # 498, 526, 515, 492, 530
+    # 380, 414
+    "3.3": r"""
+    yield from a  #! `yield from` needs Python 3.3
+    x = u'a'  #! the prefix `u` of a string needs Python 3.3
+    x = rB'a'  #! the prefix `rb` of bytes needs Python 3.3
+    with (yield from a) as b: c  #! `yield from` needs Python 3.3
+    """,
+    # 448, 465, 492
+    "3.5": r"""
+    f(*a, *b, **c, **d)  #! unpacking in a call anywhere but once at the end needs Python 3.5
+    [*a, *b]  #! unpacking in a display or a value needs Python 3.5
+    {**a, 'b': c}  #! unpacking in a display or a value needs Python 3.5
+    a @ b; a @= b  #! `@` as an operator needs Python 3.5
+    async def f(): pass  #! `async` needs Python 3.5
+    """,
+    # 498, 526, 515, 530
     "3.6": r"""
     x = f'{a!r:>{b}}'  #! an f-string needs Python 3.6
     x: int  #! an annotation of a variable needs Python 3.6
-    x = 1_000
+    x = 1_000  #! `_` within a number needs Python 3.6
+    def f(*a,): pass  #! a comma after starred parameters needs Python 3.6
     case[a + 1]: int = 3; match[a]: int; type[a]: b = c  #! an annotation of a variable needs Python 3.6
     async def f():\n  async with a as b: await c\n  async for d in e: pass
     async def f(): return [a async for b in c]
@@ -71,7 +82,7 @@ NEW_IN = {
     def f(a, /, b): pass  #! `/` among parameters needs Python 3.8
     lambda a, /: 0  #! `/` among parameters needs Python 3.8
     return *a, b  #! a starred expression without brackets behind `return` or `yield` needs Python 3.8
-    x = f'{a = }'
+    x = f'{a = }'  #! `=` at the end of a field of an f-string needs Python 3.8
     with (a := b) as c, (d): e
     """,
     # 614, 617
