@@ -65,7 +65,7 @@ void CBlockTracker::Enter(const CRawLogical& logical) {
     _fHead = ReadStatementHead(logical);
     _fText = logical.file_text;
     _fTakesAll = {};
-    _fHasPlaceProblem = _fHaveChanged = false;
+    _fHasPlaceProblem = _fHasMixedTabs = _fHaveChanged = false;
     _FindPlace(logical);
     if (_fHead.IsHeader()) _CheckFrames();
 }
@@ -242,7 +242,7 @@ bool CBlockTracker::_CheckTabs(const CIndent& indent) {
     if (agrees || block.has_mixed_tabs || _fHasPlaceProblem || _fPreviousHasFault) return agrees;
     _Report(ECode::kMixedTabs, _fHead.start, _fHead.end,
             "inconsistent use of tabs and spaces in indentation");
-    block.has_mixed_tabs = true;
+    block.has_mixed_tabs = _fHasMixedTabs = true;
     return false;
 }
 
@@ -291,7 +291,7 @@ void CBlockTracker::Leave(bool has_fault) {
     block.previous = _fHead;
     block.may_follow_anything = has_fault || (_fHasPlaceProblem && !_fHead.IsHeader());
     if (_fHead.IsHeader() && !_fHasPlaceProblem) block.lacks_block = false;
-    _fPreviousHasFault = has_fault;
+    _fPreviousHasFault = has_fault || _fHasMixedTabs;  // then its depth isn't known
     _fOpensBlock = _fHead.ends_in_colon || (has_fault && _fHead.IsHeader());
     if (!_fHead.IsHeader() && !has_fault) _fOpensBlock = false;
 }

@@ -116,7 +116,8 @@ class CBlockTracker {
     bool _fHaveChanged = false;
     bool _fIsMidRow = false;
     bool _fHasPlaceProblem = false;
-    bool _fOpensBlock = false;  // the line before is a header without a body on its row
+    bool _fHasMixedTabs = false;  // reported for the line
+    bool _fOpensBlock = false;    // the line before is a header without a body on its row
     bool _fPreviousHasFault = false;
     bool _fHasTooMany = false;
     bool _fHasTooManyFrames = false;
