@@ -164,7 +164,7 @@ def _Told(text: str, damaged: list[range]) -> list[range]:
         between = source_rows[last.stop : rows.start]
         if last and all(row.strip()[:1] in ("", "#") for row in between):
             before = "\n".join(source_rows[last.start : last.stop])
-            if not IsBroken(f"{before}\n{line}"):
+            if not IsBroken(f"{before}\n{line}", ()):
                 told.pop()
                 continue
             if CONTINUES.match(line.strip()) and _LeavesOpen(before.strip()):
@@ -203,7 +203,7 @@ def Errors(logicals: list[CLogicalLine], analyzer: CPGenAnalyzerImpl) -> list[tu
     return errors
 
 
-def IsBroken(line: str) -> bool:
+def IsBroken(line: str, after: tuple[str, ...] = AFTER_THE_GRAMMAR) -> bool:
     """True when the interpreter's grammar refuses a line, completed to a statement of its own.
 
     A backslash at its end joins it to the rest of the row, where nothing is left.
@@ -225,18 +225,18 @@ def IsBroken(line: str) -> bool:
         behind = "\ndef function(): pass"
     if line.endswith(":"):
         line += "\n case _: pass" if word == "match" else " pass"
-    return IsRefused(before + line + behind + "\n")
+    return IsRefused(before + line + behind + "\n", after)
 
 
-def IsRefused(text: str) -> bool:
-    """True when the interpreter's grammar refuses a text."""
+def IsRefused(text: str, after: tuple[str, ...] = AFTER_THE_GRAMMAR) -> bool:
+    """True when the interpreter refuses a text, but not with a message that begins like one of `after`."""
     try:
         with warnings.catch_warnings():
             warnings.simplefilter("ignore")
             ast.parse(text)
     except SyntaxError as error:
         message = str(error.msg)
-        return not message.startswith(AFTER_THE_GRAMMAR) and "illegal expression" not in message
+        return not message.startswith(after) and "illegal expression" not in message
     except ValueError:
         return True
     return False

@@ -64,7 +64,8 @@ size_t FindProseEnd(CLexer& lexer, size_t pos, size_t end, size_t& looked_at) {
     CRowReader reader(lexer, PlaceWithinRow(last_end));
     CTokenRow row;
     bool is_broken_code = false;
-    bool is_in_session = false;  // of the interpreter, up to a blank row
+    bool is_after_prose = false;  // deeper rows of code are an example
+    bool is_in_session = false;   // of the interpreter, up to a blank row
     while (reader.Next(row) && row.end <= end) {
         looked_at = std::max(looked_at, row.end);
         if (row.indent < indent && BeginsStatement(row)) break;
@@ -78,9 +79,11 @@ size_t FindProseEnd(CLexer& lexer, size_t pos, size_t end, size_t& looked_at) {
         is_broken_code = is_broken && !is_broken_code && HasSignsOfCode(row);
         if (is_in_session || (is_broken && !is_broken_code)) {
             prose.AddProse(RowTextEnd(text, row));
+            is_after_prose = true;
             reader.ForgetBrackets();  // in prose they mean nothing
-        } else {
+        } else if (!is_after_prose || row.indent <= indent) {
             prose.AddCode(HasCodeShape(row));
+            is_after_prose = false;
         }
     }
     return prose.End();

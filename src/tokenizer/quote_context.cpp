@@ -53,11 +53,11 @@ bool EndsBeforeString(std::string_view text) {
     const size_t last = SkipBack(text, end);
     if (last == 0) return false;
     const char c = text[last - 1];
-    if (c == ':') return EndsLikeHeader(text, last);
+    const bool is_on_row = RowStart(text, last) == RowStart(text, end);
+    if (c == ':') return is_on_row || EndsLikeHeader(text, last);
     if (std::string_view("([{,+%|&\\").find(c) != std::string_view::npos) return true;
     size_t word = last;
     while (word > 0 && IsNameByte(text[word - 1])) --word;
-    const bool is_on_row = RowStart(text, last) == RowStart(text, end);
     return is_on_row && (c == '=' || IsBeforeString(WordOf(text.substr(word, last - word))));
 }
 
@@ -80,6 +80,7 @@ bool HardlyFollowsString(std::string_view text, size_t pos, size_t end) {
         case '\\':
             return !IsRowEnd(next);
         default:
+            if (IsNameByte(ByteAt(text, pos))) return pos == end;
             return std::string_view("*-/<>&|^~@$?`([{").find(ByteAt(text, pos)) != std::string_view::npos;
     }
 }
@@ -97,8 +98,11 @@ bool HardlyBeginsCode(std::string_view text, size_t pos) {
 
 size_t SkipToNextRow(std::string_view text, size_t pos) {
     CPlace place = PlaceWithinRow(pos);
-    if (!SkipRowEnd(text, place)) return text.size();
-    SkipBlankRows(text, place);
+    do {
+        if (ByteAt(text, place.pos) == '#') place.pos = FindRowEnd(text, place.pos);
+        if (!SkipRowEnd(text, place)) return text.size();
+        SkipBlankRows(text, place);
+    } while (ByteAt(text, place.pos) == '#');
     return place.pos;
 }
 

@@ -20,7 +20,8 @@ bool HardlyFollowsString(std::string_view text, size_t pos, size_t end);
 // operand before it.
 bool HardlyBeginsCode(std::string_view text, size_t pos);
 
-// The code of the row after the one that ends at `pos`; the end of the text when that isn't its end.
+// The next row of code after the one that ends, but for a comment, at `pos`; the end of the text when more
+// follows on the row.
 size_t SkipToNextRow(std::string_view text, size_t pos);
 
 // The string at `pos` is the first thing in brackets.

@@ -83,10 +83,12 @@ bool FitsBetterUnclosed(CLexer& lexer, size_t pos, size_t prose_end, size_t end,
                         size_t& looked_at) {
     constexpr int kEnoughRows = 60;
     constexpr int kMuch = 4;
+    constexpr int kOperandWeight = 6;
     CReading closed(lexer, pos, end);
     CReading unclosed(lexer, pos, prose_end);
     unclosed.ForgetBrackets();
     CBalance balance;
+    if (is_before_operand) balance.Add(end, kOperandWeight);
     balance.AddRows(closed, kEnoughRows, -1);
     balance.Add(unclosed, closed.Pos(), 1);
     looked_at = std::max({looked_at, closed.Pos(), unclosed.Pos()});

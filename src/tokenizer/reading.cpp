@@ -17,9 +17,9 @@ CReading::CReading(CLexer& lexer, size_t pos, size_t begin)
 int CReading::ReadRow() {
     _fIsAtEnd = !_fReader.Next(_fRow);
     if (_fIsAtEnd) return 0;
-    ++_fRowCount;
     _fPos = _fRow.end;
     if (IsComment(_fRow)) return 0;
+    ++_fRowCount;
     const bool is_out_of_place = _IsOutOfPlace();
     const bool is_broken = is_out_of_place || codeloom::IsBroken(_fRow);
     if (is_out_of_place) _Reset();
@@ -65,7 +65,7 @@ bool CReading::_IsOutOfPlace() const {
 // What was open before the row counts no more, so that each fault counts once.
 void CReading::_Reset() {
     _fInBrackets = false;
-    if (_fRow.is_in_brackets) _fReader.ForgetBrackets();
+    if (_fRow.is_in_brackets) _fReader.ForgetOuterBrackets();
     _fRow.is_in_brackets = false;
 }
 

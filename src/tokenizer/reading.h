@@ -16,7 +16,7 @@ class CReading {
     // Reads from `begin` on, the rows after the string at `pos`.
     CReading(CLexer& lexer, size_t pos, size_t begin);
 
-    int RowCount() const { return _fRowCount; }
+    int RowCount() const { return _fRowCount; }  // comments don't count
     bool IsAtEnd() const { return _fIsAtEnd; }
     bool HasReadTriple() const { return _fHasReadTriple; }
     // One of the rows can't be code.

@@ -1,5 +1,8 @@
 #include "tokenizer/rows.h"
 
+#include <algorithm>
+#include <iterator>
+
 #include "text/token_type.h"
 #include "tokenizer/brackets.h"
 
@@ -17,6 +20,7 @@ bool CRowReader::Next(CTokenRow& row) {
     row.tokens.clear();
     row.before = _fLast;
     row.is_in_brackets = !_fBrackets.empty();
+    _fOuterCount = std::ssize(_fBrackets);
     row.stray_closer_end = 0;
     while (_fPlace.pos < text.size() && !IsRowEnd(text[_fPlace.pos])) _ReadToken(row);
     row.text = text.substr(pos, _fPlace.pos - pos);
@@ -43,7 +47,9 @@ void CRowReader::_TrackBracket(CTokenRow& row, char c) {
     if (ByteKind(c) == EByteKind::kOpener) _fBrackets.push_back(CloserOf(c));
     if (ByteKind(c) != EByteKind::kCloser) return;
     if (_fBrackets.empty() && row.stray_closer_end == 0) row.stray_closer_end = _fPlace.pos + 1;
-    if (!_fBrackets.empty() && _fBrackets.back() == c) _fBrackets.pop_back();
+    if (_fBrackets.empty() || _fBrackets.back() != c) return;
+    _fBrackets.pop_back();
+    _fOuterCount = std::min(_fOuterCount, std::ssize(_fBrackets));
 }
 
 }  // namespace codeloom

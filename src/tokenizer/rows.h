@@ -54,6 +54,8 @@ class CRowReader {
 
     // Takes the brackets that are open for none.
     void ForgetBrackets() { _fBrackets.clear(); }
+    // Likewise, but for those that the last row has opened.
+    void ForgetOuterBrackets() { _fBrackets.erase(_fBrackets.begin(), _fBrackets.begin() + _fOuterCount); }
 
     // The brackets open behind the row, a closer for each; a closer that matches none is passed over.
     const std::vector<char>& OpenBrackets() const { return _fBrackets; }
@@ -66,6 +68,7 @@ class CRowReader {
     CPlace _fPlace;
     CRowToken _fLast;
     std::vector<char> _fBrackets;
+    ptrdiff_t _fOuterCount = 0;  // of them, those that rows before the last one have opened
 };
 
 }  // namespace codeloom
