@@ -53,7 +53,7 @@ bool AreKeywordsOf(const CLanguage& language, nb::object keyword_seq) {
 }
 
 // What a fault of the line or of one embedded in it is to the host.
-nb::object ErrorFor(CLogicalLine& logical, const CFault& fault) {
+nb::object ErrorFor(CLogicalLine& logical, const CFault& fault, const std::string& message) {
     const nb::int_ context(fault.token_i);
     nb::object part_owner = nb::borrow(logical.Self());
     if (fault.embedded_i >= 0) part_owner = nb::borrow(TupleItem(logical.GetExpLogicals(), fault.embedded_i));
@@ -64,7 +64,6 @@ nb::object ErrorFor(CLogicalLine& logical, const CFault& fault) {
         fault.kind == EFault::kInvalidHint
             ? nb::object(HomeModule().attr("TextPosInfo")(0, -1, int64_t{fault.byte_in_token}))
             : nb::none();
-    const std::string message = MessageOf(fault, *logical.Raw());
     return CreateSyntaxError(nb::str(message.c_str()), part_owner, context, place_in_token);
 }
 
@@ -92,20 +91,23 @@ std::unique_ptr<CPlainAnalysis> CPlainAnalysis::TryMake(const CAnalyzerParameter
 }
 
 bool CPlainAnalysis::CanTake(const CLogicalLine& logical) {
-    return logical.Raw() != nullptr && !nb::inst_python_derived(logical.Self()) && gNeighbours.IsUntouched();
+    return logical.IsFromText() && !nb::inst_python_derived(logical.Self()) && gNeighbours.IsUntouched();
 }
 
 std::optional<nb::object> CPlainAnalysis::Analyze(CLogicalLine& logical, bool in_async_def,
                                                   bool first_in_def) {
     _MakeRoom();
-    const CLineResult result = _fAnalyzer.Analyze(*logical.Raw(), {.in_async_def = in_async_def,
-                                                                   .first_in_def = first_in_def,
-                                                                   .records = &_fRecords,
-                                                                   .asks_for_more = true});
+    logical.CopyTo(_fLine);
+    const CLineResult result = _fAnalyzer.Analyze(_fLine, {.in_async_def = in_async_def,
+                                                           .first_in_def = first_in_def,
+                                                           .records = &_fRecords,
+                                                           .asks_for_more = true});
     if (_fAnalyzer.HasMoreToTell()) return std::nullopt;
     logical.fParsed = true;
     _SetRecords(logical);
-    return result.fault ? ErrorFor(logical, result.fault) : nb::none();
+    if (!result.fault) return nb::none();
+    const std::string message = MessageOf(result.fault, _fLine);
+    return ErrorFor(logical, result.fault, message);
 }
 
 void CPlainAnalysis::_SetRecords(CLogicalLine& logical) {

@@ -46,6 +46,7 @@ class CPlainAnalysis {
     void _MakeRoom();
 
     CLineAnalyzer _fAnalyzer;
+    CRawLogical _fLine;  // the one under way
     CRecords _fRecords;
 };
 

@@ -175,10 +175,19 @@ class CNoCollection {
     const int _fWasOn;
 };
 
+// An object that can't be part of a cycle yet costs collections nothing while they don't see it.
+inline void HideFromCollector(nb::handle object) {
+    PyObject_GC_UnTrack(object.ptr());
+}
+inline void ShowToCollector(nb::handle object) {
+    if (PyObject_GC_IsTracked(object.ptr()) == 0) PyObject_GC_Track(object.ptr());
+}
+
 // Makes an object of class T in a new host object. Its constructor takes `arguments`.
 template <class T, class... Arguments>
 CRef<T> MakeInstance(Arguments&&... arguments) {
-    nb::object owner = nb::inst_alloc(nb::type<T>());
+    static const nb::handle type = nb::type<T>();
+    nb::object owner = nb::inst_alloc(type);
     T* const made = new (nb::inst_ptr<void>(owner)) T(std::forward<Arguments>(arguments)...);
     CHosted::Introduce<T>(*made, owner);
     nb::inst_mark_ready(owner);

@@ -8,6 +8,10 @@
 #include <cstring>
 #include <string_view>
 
+#ifdef __SSE2__
+#include <emmintrin.h>
+#endif
+
 #include "text/char_class.h"
 
 namespace codeloom {
@@ -31,6 +35,25 @@ inline size_t FirstByte(uint64_t bytes) {
     return static_cast<size_t>(std::countr_zero(bytes)) / 8;
 }
 
+#ifdef __SSE2__
+inline constexpr size_t kWideStep = 16;
+
+// A bit for each of sixteen bytes that may be in an ASCII name.
+inline unsigned NameBytes(const char* bytes) {
+    const auto is_within = [](__m128i values, char first, char last) {
+        const __m128i from_first = _mm_sub_epi8(values, _mm_set1_epi8(first));
+        return _mm_cmpeq_epi8(_mm_min_epu8(from_first, _mm_set1_epi8(static_cast<char>(last - first))),
+                              from_first);
+    };
+    const __m128i values = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes));
+    const __m128i are_letters = is_within(_mm_or_si128(values, _mm_set1_epi8(0x20)), 'a', 'z');
+    const __m128i are_digits = is_within(values, '0', '9');
+    const __m128i are_underscores = _mm_cmpeq_epi8(values, _mm_set1_epi8('_'));
+    const __m128i are_all = _mm_or_si128(_mm_or_si128(are_letters, are_digits), are_underscores);
+    return static_cast<unsigned>(_mm_movemask_epi8(are_all));
+}
+#endif
+
 }  // namespace scan
 
 // The first position from `pos` on whose byte has the trait, or hasn't.
@@ -47,6 +70,12 @@ inline size_t FindByte(std::string_view text, size_t pos) {
 
 // The end of the ASCII name at `pos`.
 inline size_t SkipNameBytes(std::string_view text, size_t pos) {
+#ifdef __SSE2__
+    for (; pos + scan::kWideStep <= text.size(); pos += scan::kWideStep) {
+        const unsigned others = ~scan::NameBytes(text.data() + pos) & 0xFFFFu;
+        if (others != 0) return pos + static_cast<size_t>(std::countr_zero(others));
+    }
+#endif
     return FindByte<kContinuesName, false>(text, pos);
 }
 

@@ -50,8 +50,8 @@ constexpr bool IsPassedOver(const CRawToken& token) {
     return token.type == kTokenId_COMMENT || token.type == kTokenId_BACKSLASH;
 }
 
-// One logical line, or one expression embedded in a logical line.
-struct CRawLogical {
+// What is known of a logical line or of an embedded expression beside its tokens.
+struct CLogicalFacts {
     std::string_view file_text;
     ELogicalType type = ELogicalType::kUnknown;
     int32_t first_row = 0;  // in the text of the file, for an embedded logical too
@@ -66,6 +66,10 @@ struct CRawLogical {
     bool may_have_strings = true;
     bool may_have_comments = true;
     uint64_t words = ~uint64_t{0};  // a bit for each
+};
+
+// One logical line, or one expression embedded in a logical line.
+struct CRawLogical : CLogicalFacts {
     std::vector<CRawToken> tokens;
     std::vector<CRawLogical> embedded;  // in source order
 

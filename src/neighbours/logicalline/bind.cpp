@@ -35,11 +35,10 @@ void BindLogicalLine(nb::module_& module) {
         .def_ro("fFirstLine", &CLogicalLine::fFirstLine, "Source row of the first token, from zero.")
         .def_ro("fTokenCount", &CLogicalLine::fTokenCount, "Number of tokens.")
         .def_prop_ro(
-            "fTypeEquivs", [](CLogicalLine& logical) { return logical.fTypeEquivs.AsHost(); },
+            "fTypeEquivs", &CLogicalLine::GetTypeEquivs,
             "List of (name, equiv) pairs of byte strings in order of arrival; None when there is none.")
-        .def_prop_ro(
-            "fArgTypeEquivs", [](CLogicalLine& logical) { return logical.fArgTypeEquivs.AsHost(); },
-            "The same for the arguments of a definition.")
+        .def_prop_ro("fArgTypeEquivs", &CLogicalLine::GetArgTypeEquivs,
+                     "The same for the arguments of a definition.")
         .def_prop_ro(
             "fOrigin",
             [](const CLogicalLine& logical) {

@@ -32,6 +32,7 @@ nb::object HostTextOf(const CRawToken& token, std::string_view text) {
 nb::object HostLogical(const CRawLogical& raw, const CSourceTextRef& source) {
     CRef<CLogicalLine> logical = MakeInstance<CLogicalLine>();
     logical->InitFromRaw(raw, HostText(raw.type), source);
+    HideFromCollector(logical->Self());  // nothing that the host could tie into a cycle is in it yet
     return logical.Release();
 }
 
@@ -61,22 +62,47 @@ void CLogicalLine::InitFromRaw(const CRawLogical& raw, nb::object type, CSourceT
     fInAsyncDef = raw.in_async_def;
     fFirstInDef = raw.first_in_def;
     _fSource = std::move(source);
-    _fRaw = raw;
+    _fFacts = raw;
+    _fTokens = TSmallArray<CRawToken>(raw.tokens);
+    if (!raw.embedded.empty()) _fEmbedded = std::make_unique<const std::vector<CRawLogical>>(raw.embedded);
+}
+
+void CLogicalLine::CopyTo(CRawLogical& raw) const {
+    const std::span<const CRawToken> tokens = _fTokens.View();
+    static_cast<CLogicalFacts&>(raw) = _fFacts;
+    raw.tokens.assign(tokens.begin(), tokens.end());
+    if (_fEmbedded) {
+        raw.embedded = *_fEmbedded;
+    } else {
+        raw.embedded.clear();
+    }
 }
 
 int CLogicalLine::GetTokenType(Py_ssize_t i) {
     if (!_fSource) return ResultFromHost<int>(nb::object(GetTokTypes()[i]));
     if (i < 0) i += fTokenCount;
     if (i < 0 || i >= fTokenCount) RaiseIndexError("token index out of range");
-    return _fRaw.tokens[static_cast<size_t>(i)].type;
+    return _fTokens.View()[static_cast<size_t>(i)].type;
 }
 
 void CLogicalLine::AppendTypeEquiv(nb::handle name, nb::handle equiv) {
+    _ShowToCollector();
     fTypeEquivs.Append(name, equiv);
 }
 
 void CLogicalLine::AppendArgTypeEquiv(nb::handle name, nb::handle equiv) {
+    _ShowToCollector();
     fArgTypeEquivs.Append(name, equiv);
+}
+
+nb::object CLogicalLine::GetTypeEquivs() {
+    _ShowToCollector();
+    return fTypeEquivs.AsHost();
+}
+
+nb::object CLogicalLine::GetArgTypeEquivs() {
+    _ShowToCollector();
+    return fArgTypeEquivs.AsHost();
 }
 
 void CLogicalLine::MarkParsed(bool parsed) {
@@ -99,13 +125,13 @@ nb::object CLogicalLine::_Made(nb::object& tuple, Make make_item) {
     if (!IsMade(tuple)) {
         if (!_fSource) return nb::none();
         tuple = MakeTuple(fTokenCount,
-                          [&](Py_ssize_t i) { return make_item(_fRaw.tokens[static_cast<size_t>(i)]); });
+                          [&](Py_ssize_t i) { return make_item(_fTokens.View()[static_cast<size_t>(i)]); });
     }
     return tuple;
 }
 
 nb::object CLogicalLine::GetToks() {
-    return _Made(_fToks, [&](const CRawToken& token) { return HostTextOf(token, _fRaw.file_text); });
+    return _Made(_fToks, [&](const CRawToken& token) { return HostTextOf(token, _fFacts.file_text); });
 }
 
 nb::object CLogicalLine::GetPositions() {
@@ -121,9 +147,10 @@ nb::object CLogicalLine::GetTokTypes() {
 nb::object CLogicalLine::GetExpLogicals() {
     if (!IsMade(_fExpLogicals)) {
         if (!_fSource) return nb::none();
-        const std::vector<CRawLogical>& embedded = _fRaw.embedded;
-        _fExpLogicals = MakeTuple(static_cast<Py_ssize_t>(embedded.size()), [&](Py_ssize_t i) {
-            return HostLogical(embedded[static_cast<size_t>(i)], _fSource);
+        _ShowToCollector();
+        const auto count = static_cast<Py_ssize_t>(_fEmbedded ? _fEmbedded->size() : 0);
+        _fExpLogicals = MakeTuple(count, [&](Py_ssize_t i) {
+            return HostLogical((*_fEmbedded)[static_cast<size_t>(i)], _fSource);
         });
         _HandOutRecords();
     }

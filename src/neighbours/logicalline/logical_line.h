@@ -13,6 +13,7 @@
 
 #include "host/binding.h"
 #include "host/collections.h"
+#include "host/small_array.h"
 #include "neighbours/logicalline/record_pairs.h"
 #include "neighbours/logicalline/source_text.h"
 #include "tokenizer/raw_logical.h"
@@ -28,11 +29,13 @@ class CLogicalLine : public CHosted {
     // A record made by the tokenizer. `raw` lies in `source`.
     void InitFromRaw(const CRawLogical& raw, nb::object type, CSourceTextRef source);
 
-    // What the tokenizer found; null for a record made by hand.
-    const CRawLogical* Raw() const { return _fSource ? &_fRaw : nullptr; }
+    bool IsFromText() const { return _fSource != nullptr; }
+
+    // What the tokenizer found. Requires: IsFromText().
+    void CopyTo(CRawLogical& raw) const;
 
     // The tokens as the tokenizer found them; null for a record made by hand.
-    const CRawToken* Tokens() const { return _fSource ? _fRaw.tokens.data() : nullptr; }
+    const CRawToken* Tokens() const { return _fSource ? _fTokens.View().data() : nullptr; }
 
     // The records of an analysis on plain data, in the place of all that were there before: of the line, of
     // its arguments, and those of each embedded logical. Requires: the tokenizer made the record.
@@ -57,6 +60,10 @@ class CLogicalLine : public CHosted {
     virtual nb::object GetToks();
     virtual nb::object GetPositions();
     virtual nb::object GetTokTypes();
+
+    // The lists of records as the host sees them.
+    nb::object GetTypeEquivs();
+    nb::object GetArgTypeEquivs();
 
     // `toks` is the tuple that the host sees.
     bool HasToks(const nb::tuple& toks) const { return _fToks.is(toks); }
@@ -88,12 +95,15 @@ class CLogicalLine : public CHosted {
     template <class Make>
     nb::object _Made(nb::object& tuple, Make make_item);
     void _HandOutRecords();
+    void _ShowToCollector() const { ShowToCollector(Self()); }
 
     // Of the embedded logicals, until somebody looks at these.
     std::vector<CPackedRecords> _fEmbeddedRecords;
 
     CSourceTextRef _fSource;  // null in a record made by hand
-    CRawLogical _fRaw;
+    CLogicalFacts _fFacts;
+    TSmallArray<CRawToken> _fTokens;
+    std::unique_ptr<const std::vector<CRawLogical>> _fEmbedded;  // null for most lines
     nb::object _fToks;  // these four are invalid, or none, until somebody looks
     nb::object _fPositions;
     nb::object _fTokTypes;
