@@ -6,6 +6,8 @@
 #include <cstring>
 #include <string>
 
+#include "text/char_class.h"
+
 namespace codeloom {
 
 namespace {
@@ -188,6 +190,20 @@ void CDeclarationCheck::_ReportEarlier(ECode code, uint32_t i, std::string_view 
         .related.push_back({_Item(earlier).start, _Item(earlier).end, std::string(earlier_is)});
 }
 
+// The word stands where a statement may begin, with a blank after it.
+bool HasStatement(std::string_view text, std::string_view word, size_t start, size_t end) {
+    const std::string_view part = text.substr(0, end);
+    for (size_t pos = part.find(word, start); pos != std::string_view::npos; pos = part.find(word, pos + 1)) {
+        const char next = ByteAt(text, pos + word.size());
+        size_t before = pos;
+        while (before > 0 && IsBlank(text[before - 1])) --before;
+        const char last = before == 0 ? '\n' : text[before - 1];
+        const bool may_begin = IsRowEnd(last) || last == ';' || last == ':';
+        if (may_begin && (IsBlank(next) || next == '\\')) return true;
+    }
+    return false;
+}
+
 }  // namespace
 
 // Both words hold "lo?al", which is searched sixteen bytes at a time and without a branch.
@@ -196,8 +212,8 @@ bool MayDeclareNames(std::string_view text) {
     for (size_t start = 0; start < text.size(); start += kBlock) {
         const std::string_view block = text.substr(start, kBlock + kOverlap);
         if (!MayHoldEither(block)) continue;
-        if (block.find("global") != std::string_view::npos ||
-            block.find("nonlocal") != std::string_view::npos)
+        const size_t end = std::min(start + kBlock + kOverlap, text.size());
+        if (HasStatement(text, "global", start, end) || HasStatement(text, "nonlocal", start, end))
             return true;
     }
     return false;

@@ -8,8 +8,8 @@
 
 namespace codeloom {
 
-// False when the text has neither of the words, so that most texts need no names for these rules. It may be
-// true where they stand in a string.
+// False when neither of the words begins a statement, so that most texts need no names for these rules. It
+// may be true where one stands in a string.
 bool MayDeclareNames(std::string_view text);
 
 // Nothing is said where a fault may have moved what is around a line. The version is 312 for 3.12.
