@@ -82,10 +82,10 @@ fuzz: build
 
 bench: build
 	$(BIN)/pip install --quiet --group benchmark
-	$(BIN)/python -P benchmarks/bench.py --write
+	$(BIN)/python benchmarks/bench.py --write
 
 bench-short: build
-	$(BIN)/python -P benchmarks/bench.py --short
+	$(BIN)/python benchmarks/bench.py --short
 
 clean:
 	rm -rf build $(VENV)

@@ -1,7 +1,11 @@
-"""Times, as ratios of things done in turn in one run: single times say nothing on a shared machine."""
+"""Times of the processor, as ratios of things done in turn in one run: on a shared machine single times say
+nothing, and what a clock shows says what others do."""
 
+import resource
 import statistics
 import subprocess
+import sys
+import sysconfig
 import tempfile
 import time
 from collections.abc import Callable
@@ -14,6 +18,7 @@ from workloads import COMMAND, OURS, PEERS, RUFF, read, search_path
 from codeloom import analyze, analyze_paths
 
 ROUNDS = 7
+IMPORTED = ("codeloom", "codeloom.treesift")
 GROWTH = (1_000, 10_000, 100_000, 1_000_000)
 
 
@@ -23,31 +28,31 @@ def times_faster(ours: str, peer: str) -> float:
     return _ratio(lambda: PEERS[peer](sources), lambda: OURS[ours](sources))
 
 
-def ruff_on_files() -> None:
-    """One run of ruff's command, on one thread."""
-    subprocess.run([*RUFF, *files()], env={"RAYON_NUM_THREADS": "1", "PATH": search_path()}, check=True)
+def command_against_ruff(count: str) -> float:
+    """How many times as long as our command ruff's takes, for so many files of the library at a time."""
+    library = sorted(Path(sysconfig.get_path("stdlib")).rglob("*.py"))
+    paths = [str(path) for path in library if "lib2to3/tests/data" not in str(path)][: int(count)]
+    environment = {"RAYON_NUM_THREADS": "1", "PATH": search_path()}
+    return _ratio(
+        lambda: subprocess.run([*RUFF, *paths], env=environment, check=True),
+        lambda: subprocess.run([*COMMAND, *paths], stdout=subprocess.DEVNULL, check=False),
+    )
 
 
-def command_on_files() -> None:
-    """One run of our command."""
-    subprocess.run([*COMMAND, *files()], stdout=subprocess.DEVNULL, check=True)
-
-
-def command_against_ruff() -> float:
-    """How many times as long as our command ruff's takes."""
-    return _ratio(ruff_on_files, command_on_files)
-
-
-def growth() -> dict[str, float]:
+class Growth:
     """What a row costs in longer and longer texts, as times of what it costs in the shortest."""
-    per_row = {}
-    for rows in GROWTH:
-        text = text_of(rows)
-        repeats = max(3, 200_000 // rows)
-        best = min(_time(partial(_records, text)) for _ in range(repeats))
-        per_row[f"{rows:,} rows"] = best / rows
-    shortest = next(iter(per_row.values()))
-    return {rows: cost / shortest for rows, cost in per_row.items()}
+
+    def __init__(self) -> None:
+        self._shortest = 0.0
+
+    def of(self, rows: str) -> float:
+        """For a text of so many rows; the shortest is asked for first."""
+        count = int(rows)
+        text = text_of(count)
+        repeats = max(3, 200_000 // count)
+        cost = min(_time(partial(_records, text)) for _ in range(repeats)) / text.count(b"\n")
+        self._shortest = self._shortest or cost
+        return cost / self._shortest
 
 
 def _records(text: bytes) -> object:
@@ -64,16 +69,32 @@ def one_thread_against_two() -> float:
             for _ in analyze_paths([folder], jobs=jobs):
                 pass
 
-        return _ratio(lambda: run(1), lambda: run(2))
+        return _ratio(lambda: run(1), lambda: run(2), time.perf_counter)
 
 
-def _ratio(one: Callable[[], object], other: Callable[[], object]) -> float:
+def import_time(module: str) -> float:
+    """Milliseconds of the import of a module in a new interpreter, the shortest of some."""
+    code = f"import time; start = time.process_time(); import {module}; print(time.process_time() - start)"
+    command = [sys.executable, "-P", "-c", code]
+    times = (float(subprocess.run(command, capture_output=True, check=True).stdout) for _ in range(ROUNDS))
+    return min(times) * 1000
+
+
+def _spent() -> float:
+    """Seconds of the processor, those of child processes included."""
+    own, children = (resource.getrusage(who) for who in (resource.RUSAGE_SELF, resource.RUSAGE_CHILDREN))
+    return own.ru_utime + own.ru_stime + children.ru_utime + children.ru_stime
+
+
+def _ratio(
+    one: Callable[[], object], other: Callable[[], object], clock: Callable[[], float] = _spent
+) -> float:
     one()
     other()
-    return statistics.median(_time(one) / _time(other) for _ in range(ROUNDS))
+    return statistics.median(_time(one, clock) / _time(other, clock) for _ in range(ROUNDS))
 
 
-def _time(action: Callable[[], object]) -> float:
-    start = time.perf_counter()
+def _time(action: Callable[[], object], clock: Callable[[], float] = _spent) -> float:
+    start = clock()
     action()
-    return time.perf_counter() - start
+    return clock() - start

@@ -113,7 +113,7 @@ PEERS: dict[str, Workload] = {
     "libcst": libcst,
 }
 
-# Whole programs, with the files behind their arguments.
+# Whole programs, with the files after their arguments.
 COMMAND = [sys.executable, "-P", "-m", "codeloom", "check"]
 RUFF = ["ruff", "check", "--select=E9", "--isolated", "--no-cache", "--quiet", "--exit-zero"]
 
