@@ -23,7 +23,7 @@ from pathlib import Path
 from odd_hosts import OddHost
 from sentences import COMMENTS, WORDS, Sentences
 
-from codeloom import analyze, cli, treesift
+from codeloom import Analysis, analyze, cli, treesift
 from codeloom.logicalline import CLogicalLine
 from codeloom.rows import RowTexts
 from codeloom.treesift import CPGenAnalyzerImpl
@@ -137,9 +137,25 @@ class Fuzzer:
         analysis = analyze(text, python=self.random.choice(LANGUAGES))
         assert len(analysis.lines) == len(GetLogicalsFromText(analysis.text))
         rows = len(RowTexts(analysis.text))
-        for item in (*analysis.problems, *analysis.records):
+        for item in (*analysis.problems, *analysis.records, *analysis.hints, *analysis.scopes):
             place = item.range
             assert place is None or 1 <= place.row <= place.end_row <= rows
+        self._LookAtNames(analysis)
+
+    @staticmethod
+    def _LookAtNames(analysis: Analysis) -> None:
+        """Names stand in order, where they say, and each question about them has an answer."""
+        text_rows = RowTexts(analysis.text)
+        last = (0, 0)
+        for occurrence in analysis.occurrences:
+            place = occurrence.range
+            assert last <= (place.row, place.column), occurrence
+            last = place.end_row, place.end_column
+            shown = text_rows[place.row - 1][place.column - 1 : place.end_column - 1]
+            assert shown == occurrence.name, occurrence
+        for occurrence in analysis.occurrences[:10]:
+            assert occurrence.home is None or occurrence in analysis.references(occurrence)
+        assert {*analysis.unused(parameters=True), *analysis.undefined()} <= {*analysis.occurrences}
 
     def OnSwallowed(self, suppress_gui: bool = False) -> None:
         """Raise what an analysis wants to log, but for what is known of the engine alone."""
