@@ -14,6 +14,9 @@ namespace codeloom {
 
 namespace {
 
+// From this version on, all that the parser doesn't know is in the fields of f-strings.
+constexpr int kNeedsFieldsAlone = 309;
+
 class CVersionCheck {
   public:
     explicit CVersionCheck(const CRuleContext& context)
@@ -22,7 +25,7 @@ class CVersionCheck {
     void Run() {
         const CRawLogical& line = _fTree.Line();
         for (size_t i = 0; i < line.tokens.size(); ++i) _CheckToken(line, i);
-        if (!_fTree.fIsEmpty) _CheckNodes();
+        if (!_fTree.fIsEmpty && _fVersion < kNeedsFieldsAlone) _CheckNodes();
         if (_fFound != nullptr)
             _fContext.problems.push_back(
                 {ECode::kNewerForm, _fPlace.start, _fPlace.end, MessageOf(*_fFound), {}, {}});
@@ -234,6 +237,8 @@ class CVersionCheck {
 }  // namespace
 
 void CheckVersion(const CRuleContext& context) {
+    const bool needs_strings = context.language.version >= kNeedsFieldsAlone;
+    if (needs_strings && !context.tree.Line().may_have_strings) return;
     CVersionCheck(context).Run();
 }
 
