@@ -46,7 +46,6 @@ constexpr auto kGrammarCauses = std::to_array<CRecogniser>({
     ArgumentFault,
     AssignmentForComparison,
     WalrusStatement,
-
     DictionaryFault,
     ComprehensionFault,
     MissingIn,
@@ -88,19 +87,6 @@ CProblem CauseOfSyntax(const CFaultyLine& line) {
         if (CCause cause = recogniser(line)) return *cause;
     if (CCause cause = LaterTokenCause(line)) return *cause;
     return Unexpected(line);
-}
-
-// `except A as a.b:`
-CProblem CauseOfTarget(const CFaultyLine& line) {
-    const int colon_i = line.FindBack(0, line.Count(), kTokenId_COLON);
-    const int last_i = (colon_i < 0 ? line.Count() : colon_i) - 1;
-    const int as_i = line.FindBack(0, last_i, EWord::kAs);
-    const std::string_view kind = line.Is(last_i, kTokenId_RSQB)   ? "subscript"
-                                  : line.Is(last_i, kTokenId_RPAR) ? "function call"
-                                  : line.Is(last_i, kTokenId_NAME) ? "attribute"
-                                                                   : "expression";
-    return line.Problem(ECode::kCannotAssign, as_i + 1, last_i,
-                        Joined("cannot use except statement with ", kind), "bind a plain name");
 }
 
 // How another version writes it.
@@ -151,8 +137,6 @@ CProblem CCauses::Of(const CFault& fault, const CRawLogical& line) {
         case EFault::kBareGenerator:
             return faulty.Problem(ECode::kBareGenerator, at, at,
                                   "Generator expression must be parenthesized");
-        case EFault::kExceptTarget:
-            return CauseOfTarget(faulty);
         default:
             return CauseOfSyntax(faulty);
     }

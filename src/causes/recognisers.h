@@ -24,7 +24,6 @@ CCause EndOfField(const CFaultyLine& line);  // after the causes of any expressi
 CCause UnmatchedCloser(const CFaultyLine& line);  // brackets.cpp
 CCause NeverClosed(const CFaultyLine& line);      // closing it mends the line
 CCause StillOpen(const CFaultyLine& line);        // it is open at the line's end
-
 CCause LaterUnmatchedCloser(const CFaultyLine& line);
 
 CCause CallWithoutParentheses(const CFaultyLine& line);  // python2.cpp
