@@ -106,6 +106,9 @@ void CheckDeferred(const CRuleContext& context, const CTreeNode& expression, std
 
 void CheckAnnotations(const CRuleContext& context) {
     const CTree& tree = context.tree;
+    const bool may_be_wrong = tree.Line().MayHaveWords(WordBits(EWord::kYield, EWord::kAwait)) ||
+                              tree.HasKind(ENodeKind::kNamedExpr) || tree.HasKind(ENodeKind::kUsedArgument);
+    if (!may_be_wrong) return;
     const auto check = [&](const CTreeNode& annotation) {
         CheckDeferred(context, annotation, "an annotation");
     };
