@@ -47,8 +47,7 @@ inline constexpr CForm kStarInSubscript{"a starred expression in a subscript", 3
 inline constexpr CForm kStarredAnnotation{"a starred annotation", 311};
 inline constexpr CForm kTypeAlias{"`type`", 312};
 inline constexpr CForm kTypeParameters{"a list of type parameters", 312};
-inline constexpr CForm kQuotesInField{"an f-string's own quotes or row ends in its field",
-                                      312};
+inline constexpr CForm kQuotesInField{"an f-string's own quotes or row ends in its field", 312};
 inline constexpr CForm kBackslashInField{"a backslash in a field of an f-string", 312};
 inline constexpr CForm kCommentInField{"`#` in a field of an f-string", 312};
 inline constexpr CForm kTypeDefault{"a default of a type parameter", 313};
