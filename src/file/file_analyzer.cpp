@@ -44,14 +44,19 @@ bool ImportsPrintFunction(const CRawLogical& logical) {
 // One analysis of one text.
 class CFileAnalyzer final : CTreeObserver {
   public:
-    CFileAnalyzer(std::string_view text, const CFileSettings& settings, const CUnreadable& unreadable)
+    // With `wants_all_names` the rules for declarations see the names of the whole text, else those of the
+    // blocks that hold a declaration.
+    CFileAnalyzer(std::string_view text, const CFileSettings& settings, const CUnreadable& unreadable,
+                  bool wants_all_names)
         : _fText(text),
           _fSettings(settings),
           _fUnreadable(unreadable),
           _fLength(text.size()),
           _fFalseHints(text),
           _fChecker(LanguageOf(settings.version), _fResult.problems),
-          _fMayDeclareNames(MayDeclareNames(text)),
+          _fDeclarations(text),
+          _fMayDeclareNames(!_fDeclarations.IsEmpty()),
+          _fWantsAllNames(settings.wants_names || wants_all_names),
           _fSignatures(_fResult.signatures) {
         if (settings.wants_names || _fMayDeclareNames)
             _fNames.emplace(LanguageOf(settings.version), _fMayDeclareNames, _fResult.names);
@@ -59,6 +64,9 @@ class CFileAnalyzer final : CTreeObserver {
     }
 
     CFileAnalysis Run();
+
+    // True after a run that saw too few names for the declarations that are there.
+    bool NeedsAllNames() const { return _fNeedsAllNames; }
 
   private:
     void Take(const CRawLogical& part, const CTree& tree) override;
@@ -70,6 +78,7 @@ class CFileAnalyzer final : CTreeObserver {
     void _Enter(const CRawLogical& logical);
     void _Leave(const CRawLogical& logical, bool has_fault);
     CLineResult _Analyze(const CRawLogical& logical, const CLine& line);
+    void _FindOutWhetherToCollect(const CRawLogical& logical);
     void _FinishNames();
     void _AddUnreadable();
     void _AddFault(const CRawLogical& logical, const CFault& fault);
@@ -86,7 +95,11 @@ class CFileAnalyzer final : CTreeObserver {
     std::optional<CCauses> _fCauses;  // made for the first fault
     CFileAnalysis _fResult;
     CTextChecker _fChecker;
+    CDeclarationPlaces _fDeclarations;
     const bool _fMayDeclareNames;
+    const bool _fWantsAllNames;
+    bool _fNeedsAllNames = false;
+    bool _fIsCollecting = false;  // names of the line under way
     std::optional<CNameCollector> _fNames;
     const CRawLogical* _fLine = nullptr;  // under way, where names are wanted
     CSignatureFinder _fSignatures;
@@ -108,25 +121,40 @@ CFileAnalysis CFileAnalyzer::Run() {
 
 void CFileAnalyzer::Take(const CRawLogical& part, const CTree& tree) {
     _fChecker.Take(part, tree);
-    if (_fNames) _fNames->Take(part, tree);
+    if (_fIsCollecting) _fNames->Take(part, tree);
     if (_fSettings.wants_names && &part == _fLine) _fSignatures.Take(tree);
 }
 
 void CFileAnalyzer::TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) {
-    if (_fNames) _fNames->TakeHint(tree, node, shift);
+    if (_fIsCollecting) _fNames->TakeHint(tree, node, shift);
 }
 
 void CFileAnalyzer::_Enter(const CRawLogical& logical) {
     _fChecker.Enter(logical);
-    if (_fNames) _fNames->BeginLine(logical, _fChecker.Blocks());
+    if (_fNames) _FindOutWhetherToCollect(logical);
+    if (_fIsCollecting) _fNames->BeginLine(logical, _fChecker.Blocks());
     if (!_fSettings.wants_names) return;
     _fLine = &logical;
     _fSignatures.BeginLine(logical, static_cast<uint32_t>(_fResult.lines.size() - 1));
 }
 
+// A declaration concerns the names of the definition around it. What a line imports may say how annotations
+// are read.
+void CFileAnalyzer::_FindOutWhetherToCollect(const CRawLogical& logical) {
+    if (_fWantsAllNames) {
+        _fIsCollecting = true;
+        return;
+    }
+    const uint32_t start = logical.StartOf(logical.tokens.front());
+    if (logical.type != ELogicalType::kComment && _fChecker.Blocks().Depth() == 0)
+        _fIsCollecting = logical.type == ELogicalType::kFromImport || _fDeclarations.MayLieInBlockOf(start);
+    _fNeedsAllNames |=
+        !_fIsCollecting && _fDeclarations.HasOneIn(start, logical.EndOf(logical.tokens.back()));
+}
+
 void CFileAnalyzer::_Leave(const CRawLogical& logical, bool has_fault) {
     _fChecker.Leave(logical, has_fault);
-    if (_fNames) _fNames->EndLine(logical, has_fault, _fChecker.Blocks());
+    if (_fIsCollecting) _fNames->EndLine(logical, has_fault, _fChecker.Blocks());
     if (_fSettings.wants_names) _fSignatures.EndLine(has_fault);
 }
 
@@ -190,6 +218,7 @@ void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::s
 
 void CFileAnalyzer::_FinishNames() {
     _fNames->Finish();
+    _fNeedsAllNames |= !_fWantsAllNames && DeclaresInModule(_fResult.names);
     if (_fMayDeclareNames) CheckDeclarations(_fResult.names, _fSettings.version, _fResult.problems);
     if (!_fSettings.wants_names) _fResult.names = {};
 }
@@ -225,7 +254,10 @@ uint32_t CFileAnalysis::FirstProblem(size_t line_i) const {
 CFileAnalysis AnalyzeFile(std::string_view text, const CFileSettings& settings,
                           const CUnreadable& unreadable) {
     assert(text.size() <= kMaxTextSize);
-    return CFileAnalyzer(text, settings, unreadable).Run();
+    CFileAnalyzer analyzer(text, settings, unreadable, false);
+    CFileAnalysis analysis = analyzer.Run();
+    if (!analyzer.NeedsAllNames()) return analysis;
+    return CFileAnalyzer(text, settings, unreadable, true).Run();
 }
 
 }  // namespace codeloom

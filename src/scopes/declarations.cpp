@@ -191,31 +191,78 @@ void CDeclarationCheck::_ReportEarlier(ECode code, uint32_t i, std::string_view 
 }
 
 // The word stands where a statement may begin, with a blank after it.
-bool HasStatement(std::string_view text, std::string_view word, size_t start, size_t end) {
-    const std::string_view part = text.substr(0, end);
-    for (size_t pos = part.find(word, start); pos != std::string_view::npos; pos = part.find(word, pos + 1)) {
-        const char next = ByteAt(text, pos + word.size());
-        size_t before = pos;
-        while (before > 0 && IsBlank(text[before - 1])) --before;
-        const char last = before == 0 ? '\n' : text[before - 1];
-        const bool may_begin = IsRowEnd(last) || last == ';' || last == ':';
-        if (may_begin && (IsBlank(next) || next == '\\')) return true;
+bool MayBeginStatement(std::string_view text, size_t pos, size_t length) {
+    const char next = ByteAt(text, pos + length);
+    if (!IsBlank(next) && next != '\\') return false;
+    while (pos > 0 && IsBlank(text[pos - 1])) --pos;
+    const char last = pos == 0 ? '\n' : text[pos - 1];
+    return IsRowEnd(last) || last == ';' || last == ':';
+}
+
+// The first place from `start` up to `end`; npos when there is none.
+size_t FindPlace(std::string_view text, size_t start, size_t end) {
+    size_t first = std::string_view::npos;
+    for (const std::string_view word : {std::string_view("global"), std::string_view("nonlocal")}) {
+        const std::string_view part = text.substr(0, std::min(first, end));
+        size_t pos = part.find(word, start);
+        while (pos != std::string_view::npos && !MayBeginStatement(text, pos, word.size()))
+            pos = part.find(word, pos + 1);
+        first = std::min(first, pos);
     }
-    return false;
+    return first;
+}
+
+// The last definition before `end` that begins a row at column 0, from `start` on; `start` when there is
+// none.
+size_t LastDefinition(std::string_view text, size_t start, size_t end) {
+    for (size_t pos = end; pos > start;) {
+        pos = text.find_last_of('\n', pos - 1);
+        if (pos == std::string_view::npos || pos < start) return start;
+        const std::string_view row = text.substr(pos + 1, 6);
+        if (row.starts_with("def ") || row.starts_with("class ") || row.starts_with("async ")) return pos + 1;
+    }
+    return start;
 }
 
 }  // namespace
 
 // Both words hold "lo?al", which is searched sixteen bytes at a time and without a branch.
-bool MayDeclareNames(std::string_view text) {
+CDeclarationPlaces::CDeclarationPlaces(std::string_view text) {
     constexpr size_t kBlock = 4096, kOverlap = kStep + 8;
+    size_t definition = 0, after_last = 0;
     for (size_t start = 0; start < text.size(); start += kBlock) {
-        const std::string_view block = text.substr(start, kBlock + kOverlap);
-        if (!MayHoldEither(block)) continue;
+        if (!MayHoldEither(text.substr(start, kBlock + kOverlap))) continue;
         const size_t end = std::min(start + kBlock + kOverlap, text.size());
-        if (HasStatement(text, "global", start, end) || HasStatement(text, "nonlocal", start, end))
-            return true;
+        for (size_t pos = std::max(start, after_last);
+             (pos = FindPlace(text, pos, end)) != std::string_view::npos; ++pos) {
+            definition = std::max(definition, LastDefinition(text, definition, pos));
+            _fPlaces.push_back({static_cast<uint32_t>(pos), static_cast<uint32_t>(definition)});
+            after_last = pos + 1;
+        }
     }
+}
+
+const CDeclarationPlaces::CPlace* CDeclarationPlaces::_From(uint32_t start) {
+    while (_fNext < _fPlaces.size() && _fPlaces[_fNext].start < start) ++_fNext;
+    return _fNext < _fPlaces.size() ? &_fPlaces[_fNext] : nullptr;
+}
+
+bool CDeclarationPlaces::MayLieInBlockOf(uint32_t line_start) {
+    const CPlace* const place = _From(line_start);
+    return place != nullptr && place->definition <= line_start;
+}
+
+bool CDeclarationPlaces::HasOneIn(uint32_t start, uint32_t end) {
+    const CPlace* const place = _From(start);
+    return place != nullptr && place->start < end;
+}
+
+bool DeclaresInModule(const CTextNames& names) {
+    const std::vector<COccurrence>& items = names.occurrences.items;
+    for (uint32_t i = 0; i < items.size(); ++i)
+        if ((items[i].role == ERole::kGlobal || items[i].role == ERole::kNonlocal) &&
+            names.ScopeOfOccurrence(i) == 0)
+            return true;
     return false;
 }
 
