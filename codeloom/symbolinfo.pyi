@@ -109,7 +109,7 @@ class CFullyScopedName(CPlainRecord):
     def __init__(self, module_name: str, scope: str, name: str) -> None:
         ...
 class CDefInfo(CPlainRecord):
-    """A definition: its name, its kind, and the row from zero on which it stands."""
+    """A definition: its name, its kind, and the row from zero that it is on."""
     name: CFullyScopedName
     kind: int
     first_line: int

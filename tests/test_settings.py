@@ -189,7 +189,18 @@ def test_watching(write_files, tmp_path, cli_environment):
 
     folder = write_files({"a.py": ")\n"})
     command = [sys.executable, "-m", "codeloom", "check", "--watch", "--format", "concise", "a.py"]
-    process = subprocess.Popen(command, cwd=folder, env=cli_environment, stdout=subprocess.PIPE, text=True)
+
+    def HeedInterrupts():  # which a shell lets its background jobs ignore
+        signal.signal(signal.SIGINT, signal.SIG_DFL)
+
+    process = subprocess.Popen(
+        command,
+        cwd=folder,
+        env=cli_environment,
+        stdout=subprocess.PIPE,
+        text=True,
+        preexec_fn=HeedInterrupts,
+    )
     try:
         assert process.stdout.readline() == "a.py:1:1: CL203 unmatched ')'\n"
         (folder / "a.py").write_text("x = )\n")
