@@ -3,7 +3,7 @@ import collections.abc
 import typing
 from collections.abc import Sequence
 import enum
-from typing import Any, Self
+from typing import Any, Literal, Self
 
 class RecordKind(enum.Enum):
     """What a record says of its name; docs/records.md lists all kinds."""
@@ -210,6 +210,12 @@ class Problem:
     @property
     def code(self) -> str:
         """What kind of fault it is, such as "CL201"."""
+
+    @property
+    def severity(self) -> Literal['error', 'warning']:
+        """
+        "error" for what the interpreter refuses; "warning" for a type hint that can't be read and for a line that is too long to analyse.
+        """
 
     @property
     def range(self) -> Range:

@@ -4,7 +4,7 @@ import json
 from abc import ABC, abstractmethod
 from collections.abc import Iterable, Iterator, Sequence
 from itertools import groupby
-from typing import Any
+from typing import Any, Literal
 
 from codeloom._analysis import Problem, Range
 from codeloom.cli.console import Colour, Console
@@ -43,6 +43,7 @@ class Finding(Item):
         place: Range,
         related: Sequence[tuple[Range, str]] = (),
         hint: str | None = None,
+        severity: Literal["error", "warning"] = "error",
     ) -> None:
         self.source = source
         self.code = code
@@ -50,12 +51,21 @@ class Finding(Item):
         self.range = place
         self.related = related
         self.hint = hint
+        self.severity = severity
         self.fingerprint = ""
 
     @classmethod
     def of(cls, source: Source, problem: Problem) -> "Finding":
         """A problem of the analysis."""
-        return cls(source, problem.code, problem.message, problem.range, problem.related, problem.hint)
+        return cls(
+            source,
+            problem.code,
+            problem.message,
+            problem.range,
+            problem.related,
+            problem.hint,
+            problem.severity,
+        )
 
     @property
     def source_row(self) -> str:
@@ -80,6 +90,7 @@ class Finding(Item):
             **self.source.fields(self.range),
             "code": self.code,
             "message": self.message,
+            "severity": self.severity,
             "hint": self.hint,
             "related": related,
             "source_row": self.source_row,

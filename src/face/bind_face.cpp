@@ -88,6 +88,13 @@ void BindProblem(nb::module_& module) {
         "message", [](const CProblemItem& self) { return TextFromUtf8(self.Message()); },
         nb::sig("def message(self) -> str"), "What is wrong, in words.");
     problem.def_prop_ro("code", &CProblemItem::Code, "What kind of fault it is, such as \"CL201\".");
+    problem.def_prop_ro(
+        "severity",
+        [](const CProblemItem& self) { return nb::str(IsWarning(self.Data().code) ? "warning" : "error"); },
+        nb::sig("def severity(self) -> typing.Literal[\"error\", \"warning\"]"),
+        "\"error\" for what the interpreter refuses; \"warning\" for a type hint that can't be read and for "
+        "a "
+        "line that is too long to analyse.");
     problem.def_prop_ro("range", &CProblemItem::Range,
                         "What it is about, at least one character unless the text is empty.");
     problem.def_prop_ro("related", &CProblemItem::Related,

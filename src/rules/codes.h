@@ -140,6 +140,11 @@ enum class ECode : uint16_t {
     kFieldsTooDeep = 905,
 };
 
+// What no interpreter refuses: a type hint in a comment or in quotes, and what is too long for us.
+constexpr bool IsWarning(ECode code) {
+    return code == ECode::kInvalidHint || code == ECode::kLineTooLong;
+}
+
 // A statement or an expression that stands where it may not.
 constexpr bool IsPlacement(ECode code) {
     return code >= ECode::kOutsideFunction && code <= ECode::kLazyImportPlaced;

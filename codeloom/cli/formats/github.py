@@ -21,7 +21,7 @@ _PROPERTY_ESCAPES = {**_ESCAPES, ":": "%3A", ",": "%2C"}
 
 
 class GithubFormat(Format):
-    """An `::error` row for each of the first problems."""
+    """An `::error` or `::warning` row for each of the first problems."""
 
     _count = 0
 
@@ -66,7 +66,8 @@ class GithubFormat(Format):
             return
         pairs = (f"{name}={_escaped(value, _PROPERTY_ESCAPES)}" for name, value in properties.items())
         text = _escaped(message[:_LONGEST_MESSAGE], _ESCAPES)
-        self._console.print_row(f"::error {','.join(pairs)}::{text}")
+        kind = "error" if finding is None else finding.severity
+        self._console.print_row(f"::{kind} {','.join(pairs)}::{text}")
 
 
 def _escaped(text: str, escapes: dict[str, str]) -> str:

@@ -28,24 +28,28 @@ class GitlabFormat(Format):
                 cell = f"cell {place['cell']}, row {place['row']}: " if "cell" in place else ""
                 hint = f" ({item.hint})" if item.hint else ""
                 rows = {"begin": 1} if cell else {"begin": place["row"], "end": place["end_row"]}
-                self._add(item.code, cell + item.message + hint, item.fingerprint, source.path, rows)
+                severity = "critical" if item.severity == "error" else "minor"
+                message = cell + item.message + hint
+                self._add(item.code, severity, message, item.fingerprint, source.path, rows)
 
     def add_failure(self, error: OSError) -> None:
         """Write an issue for a file that can't be read."""
         path = failed_path(error)
         message = f"can't be read: {error.strerror or error}"
-        self._add("failure", message, os.fsencode(path).hex(), path, {"begin": 1})
+        self._add("failure", "critical", message, os.fsencode(path).hex(), path, {"begin": 1})
 
     def end(self, tally: Tally) -> None:
         """Close the array."""
         self._console.print_row("\n]")
 
-    def _add(self, check: str, message: str, fingerprint: str, path: str, rows: dict[str, int]) -> None:
+    def _add(
+        self, check: str, severity: str, message: str, fingerprint: str, path: str, rows: dict[str, int]
+    ) -> None:
         issue = {
             "description": message,
             "check_name": check,
             "fingerprint": fingerprint,
-            "severity": "critical",
+            "severity": severity,
             "location": {
                 "path": os.fsencode(portable_path(path)).decode(errors="replace"),
                 "lines": rows,

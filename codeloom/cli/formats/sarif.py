@@ -79,7 +79,7 @@ class SarifFormat(Format):
         result: dict[str, Any] = {
             "ruleId": finding.code,
             "ruleIndex": rule_i,
-            "level": "error",
+            "level": finding.severity,
             "message": {"text": finding.message + hint},
             "locations": [_location(source.path, row, {"snippet": {"text": finding.source_row}})],
             "partialFingerprints": {_FINGERPRINT: finding.fingerprint},
