@@ -241,3 +241,15 @@ def test_what_python2_unpacks_of_an_exception():
         ("d", "bind"),
         ("c", "read"),
     ]
+
+
+@pytest.mark.parametrize(
+    ("text", "python"),
+    [("type return []", "2.7"), ("type a.b = c", "2.7"), ("@a[b] := c", "3.14"), ("(a.b := c)", "3.14")],
+)
+def test_what_the_grammar_alone_takes_has_names_of_some_kind(text, python):
+    """No name is where one should be, and the rules of a line may refuse that only afterwards."""
+    analysis = analyze(f"{text}\nglobal x\n", python=python)
+    assert analysis.problems is not None
+    for occurrence in analysis.occurrences:
+        assert occurrence.name.isidentifier()

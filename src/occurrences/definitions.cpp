@@ -33,7 +33,7 @@ uint32_t COccurrenceFinder::_AddAnnotationScope(uint32_t parent, const CTreeNode
 void COccurrenceFinder::_VisitFuncdef(const CTreeNode& node, uint32_t header_scope) {
     const CTree& tree = *_fTree;
     const CTreeNode& name = NameOfFuncdef(tree, node);
-    if (header_scope == _fScope) _Add(name, ERole::kBind).flags |= COccurrence::kIsDefinition;
+    if (header_scope == _fScope) _AddName(name, ERole::kBind, COccurrence::kIsDefinition);
     const uint32_t scope = _AddScope(EScopeKind::kFunction, _NumberOf(name), header_scope, node);
     _fOpenedScope = scope;
     _fAnnotationScope = 0;
@@ -87,7 +87,7 @@ bool COccurrenceFinder::_IsInAnnotation(uint32_t scope) const {
 void COccurrenceFinder::_VisitClassdef(const CTreeNode& node, uint32_t header_scope) {
     const CTree& tree = *_fTree;
     const CTreeNode& name = NameOfClassdef(tree, node);
-    if (header_scope == _fScope) _Add(name, ERole::kBind).flags |= COccurrence::kIsDefinition;
+    if (header_scope == _fScope) _AddName(name, ERole::kBind, COccurrence::kIsDefinition);
     if (const CTreeNode* const bases = BasesOfClassdef(tree, node)) _VisitIn(header_scope, *bases);
     const uint32_t scope = _AddScope(EScopeKind::kClass, _NumberOf(name), header_scope, node);
     _fOpenedScope = scope;
@@ -99,10 +99,13 @@ void COccurrenceFinder::_VisitGeneric(const CTreeNode& node) {
     const CTree& tree = *_fTree;
     const CTreeNode* statement = &TypeParameterScopedStatementOf(tree, node);
     // `async def`
-    if (!statement->Is(ENodeKind::kStmt)) statement = &LastChild(tree, *statement);
+    if (!statement->Is(ENodeKind::kStmt) && !statement->IsLeaf()) statement = &LastChild(tree, *statement);
     const bool is_alias = statement->Is(ENodeKind::kExprStmt);
+    // Python 2 has neither, so that any statement may come after `type name`.
+    if (!is_alias && !statement->Is(ENodeKind::kFuncdef) && !statement->Is(ENodeKind::kClassdef))
+        return _VisitChildren(node);
     const CTreeNode& name = tree.Child(*statement, is_alias ? 0 : 1);
-    _Add(name, ERole::kBind).flags |= is_alias ? 0 : COccurrence::kIsDefinition;
+    _AddName(name, ERole::kBind, is_alias ? 0 : COccurrence::kIsDefinition);
     const uint32_t scope = _AddScope(EScopeKind::kTypeParameters, _NumberOf(name), _fScope, node);
     for (const CTreeNode& parameter : TypeParametersOf(tree, node)) _VisitTypeParameter(parameter, scope);
     if (statement->Is(ENodeKind::kFuncdef)) return _VisitFuncdef(*statement, scope);
@@ -116,7 +119,7 @@ void COccurrenceFinder::_VisitTypeParameter(const CTreeNode& node, uint32_t scop
     const CTree& tree = *_fTree;
     const CTreeNode& name = NameOfTypeParameter(tree, node);
     const uint32_t outer = std::exchange(_fScope, scope);
-    _Add(name, ERole::kTypeParameter);
+    _AddName(name, ERole::kTypeParameter, 0);
     if (const CTreeNode* const spec = SpecOfTypeParameter(tree, node)) {
         const bool has_both = spec->kind == ENodeKind::kNode && HasTokenAt(tree, *spec, 1, kTokenId_EQUAL);
         _VisitTypeVariable(name, has_both ? tree.Child(*spec, 0) : *spec);

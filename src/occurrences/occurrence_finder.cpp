@@ -132,7 +132,7 @@ inline void COccurrenceFinder::_Dispatch(const CTreeNode& node) {
             _fBracket = static_cast<int16_t>(tree.Child(node, 0).symbol);
             return _VisitChildren(node);
         case ENodeKind::kNamedExpr:
-            _Add(AssignedNameOf(tree, node), ERole::kBind).flags |= COccurrence::kIsWalrus;
+            _AddName(AssignedNameOf(tree, node), ERole::kBind, COccurrence::kIsWalrus);
             return _Visit(ValueOfNamed(tree, node));
         case ENodeKind::kLambda:
             return _VisitLambda(node);
@@ -179,7 +179,7 @@ void COccurrenceFinder::_VisitArgument(const CTreeNode& node) {
         return _Visit(_fTree->Child(node, 2));
     }
     if (IsAssigningArgument(*_fTree, node)) {
-        _Add(AssignedNameOf(*_fTree, node), ERole::kBind).flags |= COccurrence::kIsWalrus;
+        _AddName(AssignedNameOf(*_fTree, node), ERole::kBind, COccurrence::kIsWalrus);
         return _Visit(ValueOfNamed(*_fTree, node));
     }
     _fBracket = kTokenId_LPAR;
@@ -265,6 +265,11 @@ COccurrence& COccurrenceFinder::_Add(const CTreeNode& leaf, ERole role) {
     const uint32_t name = _fFound.names.Number(_fTree->Line().Text(token)), start = token.start + _fShift;
     _fFound.items.push_back({name, start, start + token.length, 0, 0, _fScope, role, _fFlags});
     return _fFound.items.back();
+}
+
+void COccurrenceFinder::_AddName(const CTreeNode& node, ERole role, uint8_t flags) {
+    if (!node.Is(ENodeKind::kNameLiteral)) return _Visit(node);
+    _Add(node, role).flags |= flags;
 }
 
 COccurrence& COccurrenceFinder::_AddAttribute(const CTreeNode& leaf, ERole role, uint32_t object_start,

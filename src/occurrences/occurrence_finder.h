@@ -103,6 +103,8 @@ class COccurrenceFinder {
     void _VisitPattern(const CTreeNode& node);
 
     COccurrence& _Add(const CTreeNode& leaf, ERole role);
+    // The same where the grammar takes more than a name, which the rules refuse: that is visited.
+    void _AddName(const CTreeNode& node, ERole role, uint8_t flags);
     COccurrence& _AddAttribute(const CTreeNode& leaf, ERole role, uint32_t object_start, uint32_t object_end);
     uint32_t _NumberOf(const CTreeNode& leaf) { return _fFound.names.Number(_fTree->Text(leaf)); }
     bool _IsValue(const CTreeNode& name) const;

@@ -15,7 +15,8 @@ void COccurrenceFinder::_VisitExprStmt(const CTreeNode& node) {
     const CTreeNode& first = tree.Child(node, 0);
     if (const CTreeNode* const annotated = AnnotatedAssignOf(tree, node))
         return _VisitAnnotatedAssign(first, *annotated);
-    if (tree.Line().type == ELogicalType::kTypeStatement) {
+    // In Python 2 any assignment may come after `type`.
+    if (tree.Line().type == ELogicalType::kTypeStatement && first.Is(ENodeKind::kNameLiteral)) {
         _Add(first, ERole::kBind);
         return _VisitAlias(first, ValueOfAssignment(tree, node));
     }
@@ -115,7 +116,7 @@ void COccurrenceFinder::_VisitPattern(const CTreeNode& node) {
         _Visit(parts[0]);
         parts = parts.subspan(1);
     } else if (IsNamedPattern(*_fTree, node)) {
-        _Add(parts[0], ERole::kKeyword);
+        _AddName(parts[0], ERole::kKeyword, 0);
         parts = parts.subspan(2);
     }
     for (const CTreeNode& part : parts) _VisitPattern(part);
