@@ -1,32 +1,15 @@
 // Headers of compound statements.
 
 #include "causes/recognisers.h"
+#include "tokenizer/keywords.h"
 
 namespace codeloom {
 
 namespace {
 
 bool BeginsHeader(const CFaultyLine& line, int i) {
-    switch (line.Word(i)) {
-        case EWord::kIf:
-        case EWord::kElif:
-        case EWord::kElse:
-        case EWord::kFor:
-        case EWord::kWhile:
-        case EWord::kWith:
-        case EWord::kTry:
-        case EWord::kExcept:
-        case EWord::kFinally:
-        case EWord::kDef:
-        case EWord::kClass:
-        case EWord::kAsync:
-            return true;
-        case EWord::kMatch:
-        case EWord::kCase:
-            return i == 0;
-        default:
-            return false;
-    }
+    const EWord word = line.Word(i);
+    return IsCompoundWord(word) && (i == 0 || !IsSoftKeyword(word));
 }
 
 int HeadWord(const CFaultyLine& line) {

@@ -1,36 +1,12 @@
 // Keywords where they can't be.
 
+#include "tokenizer/keywords.h"
+
 #include "causes/recognisers.h"
 
 namespace codeloom {
 
 namespace {
-
-bool IsStatementWord(EWord word) {
-    switch (word) {
-        case EWord::kAssert:
-        case EWord::kBreak:
-        case EWord::kClass:
-        case EWord::kContinue:
-        case EWord::kDef:
-        case EWord::kDel:
-        case EWord::kElif:
-        case EWord::kExcept:
-        case EWord::kFinally:
-        case EWord::kGlobal:
-        case EWord::kImport:
-        case EWord::kNonlocal:
-        case EWord::kPass:
-        case EWord::kRaise:
-        case EWord::kReturn:
-        case EWord::kTry:
-        case EWord::kWhile:
-        case EWord::kWith:
-            return true;
-        default:
-            return false;
-    }
-}
 
 CCause KeywordAt(const CFaultyLine& line, int i) {
     if (!line.IsKeyword(i) || !line.IsSoundWith({i, 1, {kAnyName}})) return {};

@@ -1,37 +1,16 @@
 // What tells `type` the keyword from `type` the name.
 #include "syntax/span_parser.h"
+#include "tokenizer/keywords.h"
 
 namespace codeloom {
 
 namespace {
 
-bool IsCompound(EWord word) {
-    switch (word) {
-        case EWord::kDef:
-        case EWord::kClass:
-        case EWord::kIf:
-        case EWord::kElif:
-        case EWord::kElse:
-        case EWord::kFor:
-        case EWord::kWhile:
-        case EWord::kWith:
-        case EWord::kTry:
-        case EWord::kExcept:
-        case EWord::kFinally:
-        case EWord::kAsync:
-        case EWord::kMatch:
-        case EWord::kCase:
-            return true;
-        default:
-            return false;
-    }
-}
-
 // Calls visit(start, end) for each statement on a row: for those of the body after a header, or for all.
 template <class Visit>
 void ForEachStatement(const CTokenSpan& span, Visit visit) {
     const uint32_t first_i = span.First();
-    bool has_header = first_i < span.end && IsCompound(span.Token(first_i).word);
+    bool has_header = first_i < span.end && IsCompoundWord(span.Token(first_i).word);
     uint32_t start = has_header ? CTokenSpan::kNone : first_i;
     ForEachOutsideBrackets(span, first_i, [&](uint32_t i, const CRawToken& token) {
         const bool ends_statement = token.type == kTokenId_SEMI;

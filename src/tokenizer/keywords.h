@@ -18,7 +18,7 @@ namespace keywords {
 enum ETrait : uint8_t {
     kStatementOnly = 1,  // begins a statement and stands nowhere else: in no version inside brackets
     kBinary = 2,         // stands between two operands, or begins what may follow an operand
-    kBehindOperand = 4,  // of these, one that nothing can begin with
+    kAfterOperand = 4,   // of these, one that nothing can begin with
     kNoOperand = 8,      // a further word that is no operand, or not surely
     kHeader = 16,  // begins a compound statement, `if`, `else` and `for` if they don't continue an expression
 };
@@ -32,7 +32,7 @@ inline constexpr auto kTraits = [] {
     set(kStatementOnly, {kDef, kClass, kReturn, kImport, kRaise, kPass, kBreak, kContinue, kDel, kGlobal,
                          kAssert, kWhile, kWith, kTry, kExcept, kFinally, kElif});
     set(kBinary, {kAnd, kOr, kIn, kIs, kNot, kIf, kElse, kFor, kAsync, kAs});
-    set(kBehindOperand, {kAnd, kOr, kIn, kIs, kAs});
+    set(kAfterOperand, {kAnd, kOr, kIn, kIs, kAs});
     set(kNoOperand, {kLambda, kYield, kFrom, kAwait, kPrint, kExec, kNonlocal});
     set(kHeader, {kDef, kClass, kIf, kElif, kElse, kFor, kWhile, kWith, kTry, kExcept, kFinally});
     return traits;
@@ -69,6 +69,11 @@ constexpr bool IsOperandWord(EWord word) {
 // The word can begin a statement in front of an operand, and be a name.
 constexpr bool IsSoftKeyword(EWord word) {
     return word == EWord::kMatch || word == EWord::kCase || word == EWord::kType;
+}
+
+// The word begins a statement, and is never a part of an expression in Python 3.
+constexpr bool IsStatementWord(EWord word) {
+    return keywords::Has(word, keywords::kStatementOnly) || word == EWord::kNonlocal;
 }
 
 constexpr bool IsHeaderKeyword(EWord word) {
@@ -112,7 +117,7 @@ inline bool StartsStatement(std::string_view text, size_t pos) {
     const size_t end = pos + TextOfWord(word).size();
     if (word == EWord::kFrom) return IsImported(text, end);
     if (word != EWord::kAsync && word != EWord::kNonlocal) return false;
-    // Names in old versions, so the word behind them decides.
+    // Names in old versions, so the word after them decides.
     const std::string_view next = WordTextAt(text, SkipBlanks(text, end));
     if (word == EWord::kAsync) return next == "def" || next == "with";
     return !next.empty() && !IsDigit(next[0]) && !IsBinaryWord(WordOf(next));

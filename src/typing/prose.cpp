@@ -4,6 +4,7 @@
 
 #include "text/white_space.h"
 #include "text/words.h"
+#include "tokenizer/keywords.h"
 
 namespace codeloom {
 
@@ -28,45 +29,23 @@ bool IsOperatorWord(std::string_view word) {
     }
 }
 
-bool BeginsStatement(std::string_view word) {
-    switch (WordOf(word)) {
-        case EWord::kAssert:
-        case EWord::kBreak:
-        case EWord::kClass:
-        case EWord::kContinue:
-        case EWord::kDef:
-        case EWord::kDel:
-        case EWord::kExcept:
-        case EWord::kFinally:
-        case EWord::kFor:
-        case EWord::kFrom:
-        case EWord::kGlobal:
-        case EWord::kImport:
-        case EWord::kNonlocal:
-        case EWord::kPass:
-        case EWord::kRaise:
-        case EWord::kReturn:
-        case EWord::kTry:
-        case EWord::kWhile:
-        case EWord::kWith:
-        case EWord::kYield:
-            return true;
-        default:
-            return false;
-    }
+bool BeginsStatement(std::string_view text) {
+    const EWord word = WordOf(text);
+    return (IsStatementWord(word) && word != EWord::kElif) || word == EWord::kFor || word == EWord::kFrom ||
+           word == EWord::kYield;
 }
 
 bool IsAsciiLetter(char c) {
     return AsLower(c) >= 'a' && AsLower(c) <= 'z';
 }
 
-std::string_view WordAt(std::string_view text, size_t pos) {
+std::string_view WholeWordAt(std::string_view text, size_t pos) {
     return text.substr(pos, WordEnd(text, pos) - pos);
 }
 
 // A word that no operator joins to what is before it stands at `pos`.
 bool IsUnjoinedWord(std::string_view text, size_t pos) {
-    return WordCharLength(text, pos) != 0 && !IsOperatorWord(WordAt(text, pos));
+    return WordCharLength(text, pos) != 0 && !IsOperatorWord(WholeWordAt(text, pos));
 }
 
 // The word that ends at `end`, with another one after it: no expression has two side by side.
@@ -86,7 +65,7 @@ bool BeginsAssignment(std::string_view text) {
 
 bool BeginsLikeNoExpression(std::string_view text) {
     if (!text.empty() && kNeverFirst.find(text[0]) != std::string_view::npos) return true;
-    const std::string_view word = WordAt(text, 0);
+    const std::string_view word = WholeWordAt(text, 0);
     return BeginsStatement(word) || (IsOperatorWord(word) && word != "not") || BeginsAssignment(text);
 }
 
@@ -133,7 +112,7 @@ bool HoldsProse(std::string_view text) {
     if (BeginsLikeNoExpression(text)) return true;
     int open_conditions = 0;
     for (size_t pos = 0; pos < text.size();) {
-        if (const std::string_view word = WordAt(text, pos); !word.empty()) {
+        if (const std::string_view word = WholeWordAt(text, pos); !word.empty()) {
             pos += word.size();
             if (IsWordOfProse(text, word, pos)) return true;
             open_conditions += (word == "if") - (word == "else");
@@ -161,7 +140,7 @@ bool HasTupleAsResult(std::string_view hint) {
 
 bool HasWordsSideBySide(std::string_view text) {
     for (size_t pos = 0; pos < text.size();) {
-        const std::string_view word = WordAt(text, pos);
+        const std::string_view word = WholeWordAt(text, pos);
         pos += word.empty() ? CharLength(text, pos) : word.size();
         if (!word.empty() && IsBesideWord(text, word, pos)) return true;
     }
