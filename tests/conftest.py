@@ -1,13 +1,11 @@
 """What several test files share."""
 
-import gc
 import os
 import random
 import subprocess
 import sys
 import threading
 from collections.abc import Callable, Iterator
-from contextlib import AbstractContextManager, contextmanager
 from pathlib import Path
 from typing import Any
 
@@ -41,28 +39,6 @@ def seed(request: pytest.FixtureRequest) -> int:
 def rewrite(request: pytest.FixtureRequest) -> bool:
     """True when golden files are to be rewritten, not compared."""
     return request.config.getoption("--rewrite")
-
-
-@pytest.fixture
-def at_a_collection() -> Callable[[Callable[[], object]], AbstractContextManager[None]]:
-    """Lets the collector run as often as it can meanwhile, and calls what it is given whenever it does."""
-
-    @contextmanager
-    def AtACollection(call: Callable[[], object]) -> Iterator[None]:
-        def OnCollection(phase: str, _: dict[str, int]) -> None:
-            if phase == "start":
-                call()
-
-        thresholds = gc.get_threshold()
-        gc.callbacks.append(OnCollection)
-        gc.set_threshold(1)
-        try:
-            yield
-        finally:
-            gc.set_threshold(*thresholds)
-            gc.callbacks.remove(OnCollection)
-
-    return AtACollection
 
 
 @pytest.fixture

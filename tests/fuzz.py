@@ -8,7 +8,6 @@ while a line is analysed. A failure prints the seed and the text.
 """
 
 import argparse
-import gc
 import io
 import random
 import re
@@ -16,10 +15,10 @@ import sys
 import sysconfig
 import tempfile
 import time
-from collections.abc import Callable, Iterator
-from contextlib import contextmanager, redirect_stderr, redirect_stdout
+from contextlib import redirect_stderr, redirect_stdout
 from pathlib import Path
 
+from collecting import OnCollection
 from odd_hosts import OddHost
 from sentences import COMMENTS, WORDS, Sentences
 
@@ -117,7 +116,7 @@ class Fuzzer:
     def _AskWhileDropping(self, logicals: list[CLogicalLine]) -> None:
         """Ask for records while host code, run by a collection, drops them."""
         for logical in logicals:
-            with _OnCollection(logical.ClearDerivedInfo):
+            with OnCollection(logical.ClearDerivedInfo, ("start", "stop")):
                 for name in ("fTypeEquivs", "fArgTypeEquivs"):
                     records = getattr(logical, name)
                     assert records is None or all(len(record) == 2 for record in records)
@@ -162,23 +161,6 @@ class Fuzzer:
         error = sys.exc_info()[1]
         if not _SWALLOWED_BY_ENGINE.search(str(error)):
             raise AssertionError("an exception was swallowed") from error
-
-
-@contextmanager
-def _OnCollection(action: Callable[[], None]) -> Iterator[None]:
-    """Nearly every new object starts a collection, which calls `action`."""
-
-    def OnPhase(phase: str, info: dict[str, int]) -> None:
-        action()
-
-    thresholds = gc.get_threshold()
-    gc.callbacks.append(OnPhase)
-    gc.set_threshold(1)
-    try:
-        yield
-    finally:
-        gc.set_threshold(*thresholds)
-        gc.callbacks.remove(OnPhase)
 
 
 def _Solid(text: str) -> list[str]:

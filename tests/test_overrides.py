@@ -9,6 +9,7 @@ from contextlib import redirect_stdout, suppress
 from types import SimpleNamespace
 
 import pytest
+from collecting import OnCollection
 from hand_made import Leaf, Node
 from odd_hosts import OddHost
 
@@ -424,12 +425,12 @@ def test_a_logical_of_the_host():
 
 
 @pytest.mark.parametrize("change", ["ClearDerivedInfo", "AppendTypeEquiv"])
-def test_records_may_change_while_their_list_is_made(change, at_a_collection):
+def test_records_may_change_while_their_list_is_made(change):
     logical = Logical("x")
     for i in range(3000):
         logical.AppendTypeEquiv(b"%d" % i, b"y")
     arguments = (b"z", b"z") if change == "AppendTypeEquiv" else ()
-    with at_a_collection(lambda: getattr(logical, change)(*arguments)):
+    with OnCollection(lambda: getattr(logical, change)(*arguments)):
         records = logical.fTypeEquivs
     assert records[:3000] == [(b"%d" % i, b"y") for i in range(3000)]
 
