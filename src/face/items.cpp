@@ -21,8 +21,8 @@ Items AllOf(const CSourceFilePtr& file, size_t count) {
     return {file, 0, 1, count};
 }
 
-nb::object Split(std::string_view payload, size_t at, size_t behind, bool may_lack_second) {
-    const std::string_view second = payload.substr(behind);
+nb::object Split(std::string_view payload, size_t at, size_t after, bool may_lack_second) {
+    const std::string_view second = payload.substr(after);
     const nb::object shown = may_lack_second && second.empty() ? nb::none() : TextFromUtf8(second);
     return nb::make_tuple(TextFromUtf8(payload.substr(0, at)), shown);
 }
@@ -104,8 +104,8 @@ nb::object CRecordItem::Value() const {
     }
     if (form == "literal") {
         const size_t colon = std::min(payload.find(':'), payload.size());
-        const size_t behind = std::min(colon + 1, payload.size());
-        return Split(payload, colon, behind + payload.substr(behind).starts_with(' '), true);
+        const size_t after = std::min(colon + 1, payload.size());
+        return Split(payload, colon, after + payload.substr(after).starts_with(' '), true);
     }
     return TextFromUtf8(payload);
 }

@@ -12,7 +12,7 @@ namespace {
 enum class EFrameKind {
     kHeader,      // outside brackets, from the keyword to the ":" of the header
     kStatement,   // outside brackets, `target: hint = value`
-    kParameters,  // in the brackets behind a def's name: `name: hint = value, ...`
+    kParameters,  // in the brackets after a def's name: `name: hint = value, ...`
     kFirstIsHint,
     kAllAlike,  // hints all the same, or none at all
 };
@@ -39,7 +39,7 @@ class CAnnotationScanner {
     void _VisitComma();
     CFrame _FrameInBracket(const CRawToken& opener) const;
     bool _IsWholeHint(size_t token_i) const;
-    bool _IsBehindOperand() const;
+    bool _IsAfterOperand() const;
     std::string_view _PreviousText() const;
     int16_t _NextType(size_t token_i) const;
 
@@ -128,7 +128,7 @@ CFrame CAnnotationScanner::_FrameInBracket(const CRawToken& opener) const {
         return {in_header ? EFrameKind::kParameters : EFrameKind::kAllAlike};
     }
     if (opener.type == kTokenId_LBRACE) return {EFrameKind::kAllAlike};
-    if (!_IsBehindOperand()) return {EFrameKind::kAllAlike, true};
+    if (!_IsAfterOperand()) return {EFrameKind::kAllAlike, true};
     if (opener.type == kTokenId_LPAR || _PreviousText() == "Literal") return {EFrameKind::kAllAlike};
     return {_PreviousText() == "Annotated" ? EFrameKind::kFirstIsHint : EFrameKind::kAllAlike, true};
 }
@@ -165,7 +165,7 @@ bool CAnnotationScanner::_IsWholeHint(size_t token_i) const {
     }
 }
 
-bool CAnnotationScanner::_IsBehindOperand() const {
+bool CAnnotationScanner::_IsAfterOperand() const {
     if (!_fPrevious) return false;
     const int16_t type = _fPrevious->type;
     return type == kTokenId_NAME || type == kTokenId_RSQB || type == kTokenId_RPAR || type == kTokenId_STRING;

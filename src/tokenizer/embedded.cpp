@@ -125,9 +125,9 @@ void CEmbeddedFinder::_ReadRows(const CRawLogical& logical, const CRawToken& tok
 }
 
 CPosition CEmbeddedFinder::_PositionOf(size_t pos) const {
-    const auto behind = std::upper_bound(_fRows.starts.begin(), _fRows.starts.end(), pos);
-    const auto row_i = static_cast<int32_t>(behind - _fRows.starts.begin()) - 1;
-    return {_fRows.first_row + row_i, static_cast<int32_t>(pos - *(behind - 1))};
+    const auto after = std::upper_bound(_fRows.starts.begin(), _fRows.starts.end(), pos);
+    const auto row_i = static_cast<int32_t>(after - _fRows.starts.begin()) - 1;
+    return {_fRows.first_row + row_i, static_cast<int32_t>(pos - *(after - 1))};
 }
 
 // Sets the origin and, relative to it, the positions of the tokens.

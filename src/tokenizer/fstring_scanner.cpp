@@ -101,8 +101,8 @@ size_t CFstringScanner::_ScanExpression(size_t pos) {
         if (pos == kFailed) return kFailed;
         if (_fBrackets.size() == outer_brackets) {
             if (_IsExpressionEndAt(pos)) return _EndExpression(pos);
-            const size_t behind_debug_sign = _ScanDebugSign(pos);
-            if (behind_debug_sign != pos) return _EndExpression(behind_debug_sign);
+            const size_t after_debug_sign = _ScanDebugSign(pos);
+            if (after_debug_sign != pos) return _EndExpression(after_debug_sign);
         }
         const char c = _fLexer.Text()[pos];
         const EByteKind kind = ByteKind(c);
@@ -156,7 +156,7 @@ size_t CFstringScanner::_EndField(size_t brace_pos) {
     return brace_pos + 1;
 }
 
-// `!r` and the blanks behind it. The letter must follow directly.
+// `!r` and the blanks after it. The letter must follow directly.
 size_t CFstringScanner::_ScanConversion(size_t pos, bool& is_sound) {
     const std::string_view text = _fLexer.Text();
     const size_t name_start = SkipBlanks(text, pos + 1);
@@ -173,10 +173,10 @@ size_t CFstringScanner::_ScanConversion(size_t pos, bool& is_sound) {
 size_t CFstringScanner::_ScanDebugSign(size_t pos) {
     const std::string_view text = _fLexer.Text();
     if (text[pos] != '=' || ByteAt(text, pos + 1) == '=') return pos;
-    size_t behind = CommentEnd(text, SkipBlanks(text, pos + 1));
-    while (behind < text.size() && (IsBlank(text[behind]) || IsRowEnd(text[behind])))
-        behind = CommentEnd(text, behind + 1);
-    return behind < text.size() && _IsExpressionEndAt(behind) ? behind : pos;
+    size_t after = CommentEnd(text, SkipBlanks(text, pos + 1));
+    while (after < text.size() && (IsBlank(text[after]) || IsRowEnd(text[after])))
+        after = CommentEnd(text, after + 1);
+    return after < text.size() && _IsExpressionEndAt(after) ? after : pos;
 }
 
 // The next token in a field, over blanks and row ends.

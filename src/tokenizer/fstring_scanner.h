@@ -19,10 +19,10 @@ struct CLexedToken;
 class CFieldListener {
   public:
     virtual void BeginField(size_t brace_pos) = 0;
-    // A token of the innermost field that is open. A nested string comes behind its own fields.
+    // A token of the innermost field that is open. A nested string comes after its own fields.
     virtual void AddFieldToken(size_t pos, const CLexedToken& token) = 0;
     // The innermost field's expression ends at `pos`, on "!", ":" or "}". It is sound if that, and what
-    // stands behind it up to the format spec, is sound.
+    // follows it up to the format spec, is sound.
     virtual void EndExpression(size_t pos, bool is_sound) = 0;
     // The innermost field is closed.
     virtual void EndField() = 0;

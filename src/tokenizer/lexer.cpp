@@ -97,12 +97,12 @@ CStringEnd CLexer::_JudgeTriple(size_t pos, const CStringStart& start, const CSt
     return spoilt_end ? CStringEnd{spoilt_end, false, true} : found;
 }
 
-// A backslash continues a row only as its very last character. One with nothing but blanks behind it takes
+// A backslash continues a row only as its very last character. One with nothing but blanks after it takes
 // the first of them into its token, so that it isn't mistaken for a continuation.
 CLexedToken CLexer::_LexBackslash(size_t pos) const {
-    const size_t behind_blanks = SkipBlanks(_fText, pos + 1);
-    const bool ends_row = behind_blanks == _fText.size() || IsRowEnd(_fText[behind_blanks]);
-    if (ends_row && behind_blanks > pos + 1) return {pos + 2, kTokenId_ERRORTOKEN};
+    const size_t after_blanks = SkipBlanks(_fText, pos + 1);
+    const bool ends_row = after_blanks == _fText.size() || IsRowEnd(_fText[after_blanks]);
+    if (ends_row && after_blanks > pos + 1) return {pos + 2, kTokenId_ERRORTOKEN};
     return {pos + 1, kTokenId_BACKSLASH};
 }
 

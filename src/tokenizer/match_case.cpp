@@ -120,8 +120,8 @@ ELogicalType FindMatchOrCaseType(std::span<const CRawToken> tokens, std::string_
     if (!is_match && keyword != EWord::kCase) return ELogicalType::kUnknown;
 
     const CRawToken& subject = reader.Next();
-    CTokenReader behind_subject = reader;
-    if (!CanBeginSubject(reader, subject, behind_subject.Next())) return ELogicalType::kUnknown;
+    CTokenReader after_subject = reader;
+    if (!CanBeginSubject(reader, subject, after_subject.Next())) return ELogicalType::kUnknown;
     CTargetReader target;
     if (!SkipToHeaderEnd(reader, &subject, target)) return ELogicalType::kUnknown;
 

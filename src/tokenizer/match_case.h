@@ -12,7 +12,7 @@ namespace codeloom {
 // otherwise. Comments, backslashes and removed tokens, of length zero, may stand among them; a body on the
 // same row may follow the header.
 //
-// What decides is the token behind the word, and the ":" that ends the header: outside brackets and not that
+// What decides is the token after the word, and the ":" that ends the header: outside brackets and not that
 // of a lambda. Where more follows, the ":" may as well begin an annotation. A `match` has no body on its row,
 // so `match [x]: y` is an annotation, `match x: y` a broken statement. A `case` may have one: `case [x]: y`
 // is a case, and `case.x: y`, `case[x][0]: y`, which are no patterns, are annotations.

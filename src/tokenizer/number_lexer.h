@@ -33,7 +33,7 @@ constexpr size_t DigitsEnd(std::string_view text, size_t pos, bool underscore_ma
     }
 }
 
-// Takes the "L" that Python 2 allows behind a whole number.
+// Takes the "L" that Python 2 allows after a whole number.
 constexpr size_t LongEnd(std::string_view text, size_t end) {
     return AsLower(ByteAt(text, end)) == 'l' ? end + 1 : end;
 }
@@ -86,7 +86,7 @@ constexpr size_t WholeEnd(std::string_view text, size_t pos, size_t end) {
 }  // namespace number_lexer
 
 // The end of the longest number at `pos`, which stands on a digit, or on a "." before a digit. What runs on
-// behind it (`1abc`, `0xg`, `1__0`) is a token of its own, which no grammar takes there unless it is a
+// after it (`1abc`, `0xg`, `1__0`) is a token of its own, which no grammar takes there unless it is a
 // keyword as in `1if x else y`.
 constexpr size_t NumberEnd(std::string_view text, size_t pos) {
     using namespace number_lexer;

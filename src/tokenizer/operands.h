@@ -18,7 +18,7 @@ struct CRowToken {
     EWord word = EWord::kNone;
 };
 
-// The token ends an operand. A string without closing quotes counts, unless its text may go on behind a sign.
+// The token ends an operand. A string without closing quotes counts, unless its text may go on after a sign.
 inline bool IsOperandEnd(const CRowToken& token) {
     switch (token.type) {
         case kTokenId_NAME:
@@ -57,7 +57,7 @@ inline bool ContinuesExpression(std::string_view text, size_t pos) {
         case EByteKind::kCloser:
             return true;
         case EByteKind::kNameStart:
-            return keywords::Has(WordAt(text, pos), keywords::kBehindOperand);
+            return keywords::Has(WordAt(text, pos), keywords::kAfterOperand);
         case EByteKind::kDot:
             return !IsDigit(ByteAt(text, pos + 1)) && ByteAt(text, pos + 1) != '.';
         case EByteKind::kOperator:

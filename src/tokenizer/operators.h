@@ -18,7 +18,7 @@ struct COperator {
     EWord word = EWord::kNone;  // of operators that share their type
 };
 
-// The types of an operator byte alone, doubled, with "=" behind it, and doubled with "=" behind it; zero
+// The types of an operator byte alone, doubled, with "=" after it, and doubled with "=" after it; zero
 // where that isn't an operator.
 struct COperatorForms {
     uint8_t single = 0, doubled = 0, with_equal = 0, doubled_with_equal = 0;

@@ -1,5 +1,5 @@
 // Triple quotes that aren't closed, so that the next string's opening quotes seem to close them and
-// everything behind is turned inside out: text is taken for code and code for text.
+// everything after is turned inside out: text is taken for code and code for text.
 #pragma once
 
 #include <cstddef>

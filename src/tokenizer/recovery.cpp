@@ -46,7 +46,7 @@ class CStatementRows {
     }
 
     int32_t _fIndent;
-    bool _fIsBody;            // stands behind a header
+    bool _fIsBody;            // follows a header
     bool _fEndsOpen = false;  // the row before does
 };
 
@@ -73,7 +73,7 @@ size_t FindStatementEnd(CLexer& lexer, const CPlace& place) {
     return end;
 }
 
-// The row begins behind the last parameter: `) -> int: pass`, the bracket perhaps missing.
+// The row begins after the last parameter: `) -> int: pass`, the bracket perhaps missing.
 bool EndsParameters(const CTokenRow& row) {
     return BeginsWithCloser(row) || row.text.starts_with("->");
 }
@@ -154,7 +154,7 @@ size_t FindHeaderEnd(CLexer& lexer, const CPlace& place) {
 }
 
 // A row that ends as headers do, although it doesn't begin with a keyword: that may be lost. A dictionary may
-// end a row so too. `open_brackets` are those behind the row.
+// end a row so too. `open_brackets` are those after the row.
 bool IsSpoiltHeader(const CTokenRow& row, const std::vector<char>& open_brackets) {
     if (!EndsInColon(row)) return false;
     const bool begins_with_bracket = ByteKind(row.text.front()) == EByteKind::kOpener;

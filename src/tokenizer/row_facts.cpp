@@ -24,7 +24,7 @@ bool IsTriple(const CRowToken& token) {
 }
 
 // Calls `visit` with each token and the number of brackets open at it, an opener and a closer counted as
-// open, and less than zero behind a closer of an outer bracket. Ends when `visit` returns true, and tells
+// open, and less than zero after a closer of an outer bracket. Ends when `visit` returns true, and tells
 // that.
 template <class Visit>
 bool AnyToken(const CTokenRow& row, Visit visit) {
@@ -74,8 +74,8 @@ bool HasOuterColon(const CTokenRow& row) {
 // Behind an opener no `for` and no `if` can continue an expression.
 bool BeginsStatement(const CTokenRow& row) {
     if (StartsStatement(row.text, 0)) return true;
-    const bool is_behind_opener = LastKind(row.before) == EByteKind::kOpener;
-    if (!is_behind_opener || !IsHeaderKeyword(WordAt(row.text, 0))) return false;
+    const bool is_after_opener = LastKind(row.before) == EByteKind::kOpener;
+    if (!is_after_opener || !IsHeaderKeyword(WordAt(row.text, 0))) return false;
     return !ClosesOuterBracket(row) || HasOuterColon(row);
 }
 

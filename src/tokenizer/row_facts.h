@@ -30,7 +30,7 @@ bool ContinuesExpression(const CTokenRow& row);
 // The row begins with an operand although the row before ends with one.
 bool FollowsOperand(const CTokenRow& row);
 
-// A second operand stands directly behind the one that the row begins with.
+// A second operand stands directly after the one that the row begins with.
 bool BeginsWithTwoOperands(const CTokenRow& row);
 
 // The row holds a closer for which it has no opener.
@@ -50,7 +50,7 @@ bool HasOuterColon(const CTokenRow& row);
 // The row ends in a ":" outside its own brackets.
 bool EndsInOuterColon(const CTokenRow& row);
 
-// The row is a header and, behind its ":", a body.
+// The row is a header and, after its ":", a body.
 bool HasBody(const CTokenRow& row);
 
 // The row ends in an opener directly after a ":".

@@ -15,13 +15,13 @@ namespace codeloom {
 // A row that isn't blank. Rows that a string or a backslash joins are one.
 struct CTokenRow {
     size_t start = 0;
-    size_t end = 0;  // behind its row end
+    size_t end = 0;  // after its row end
     int32_t indent = 0;
     std::string_view text;  // from its first token up to its row end
     std::vector<CRowToken> tokens;
     CRowToken before;             // the last token of the rows before; an empty one before the first row
     bool is_in_brackets = false;  // begins within brackets that the rows before have opened
-    size_t stray_closer_end = 0;  // behind the first closer that stands where no bracket is open; or zero
+    size_t stray_closer_end = 0;  // after the first closer that stands where no bracket is open; or zero
 
     // The row was read from its beginning.
     bool IsWhole() const { return start != SIZE_MAX; }
@@ -57,7 +57,7 @@ class CRowReader {
     // Likewise, but for those that the last row has opened.
     void ForgetOuterBrackets() { _fBrackets.erase(_fBrackets.begin(), _fBrackets.begin() + _fOuterCount); }
 
-    // The brackets open behind the row, a closer for each; a closer that matches none is passed over.
+    // The brackets open after the row, a closer for each; a closer that matches none is passed over.
     const std::vector<char>& OpenBrackets() const { return _fBrackets; }
 
   private:

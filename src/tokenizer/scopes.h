@@ -11,7 +11,7 @@ namespace codeloom {
 class CScopes {
   public:
     // Sets what the scopes say about `logical`, whose type is known and whose row is indented by `indent`,
-    // and opens the scope that it begins. `is_mid_row`: it stands behind another logical of the same row.
+    // and opens the scope that it begins. `is_mid_row`: it stands after another logical of the same row.
     void Visit(CRawLogical& logical, int32_t indent, bool is_mid_row);
 
   private:

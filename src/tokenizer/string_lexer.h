@@ -30,7 +30,7 @@ constexpr bool CanBeginString(char c) {
 
 // Where a string literal ends.
 struct CStringEnd {
-    size_t end = 0;  // behind the closing quotes; without closing quotes the end of the row, or of the text
+    size_t end = 0;  // after the closing quotes; without closing quotes the end of the row, or of the text
     bool is_closed = false;
     bool may_span_rows = false;
 };
@@ -57,7 +57,7 @@ constexpr bool IsLegalPrefix(std::string_view prefix) {
 
 }  // namespace string_lexer
 
-// The beginning of the string at `pos`, its quotes directly there or behind a legal prefix of at most two
+// The beginning of the string at `pos`, its quotes directly there or after a legal prefix of at most two
 // letters.
 constexpr CStringStart ReadStringStart(std::string_view text, size_t pos) {
     using namespace string_lexer;
@@ -78,7 +78,7 @@ constexpr CStringStart ReadStringStart(std::string_view text, size_t pos) {
     return start;
 }
 
-// The position behind the backslash at `pos` and what it escapes.
+// The position after the backslash at `pos` and what it escapes.
 constexpr size_t SkipEscape(std::string_view text, size_t pos) {
     const size_t row_end_length = RowEndLength(text, pos + 1);
     const size_t end = pos + 1 + (row_end_length ? row_end_length : 1);

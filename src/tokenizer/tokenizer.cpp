@@ -97,7 +97,7 @@ void CTokenizer::_CollectStatement(CRawLogical& logical) {
         logical.type = ELogicalType::kAssignment;
 }
 
-// Adds tokens up to the end of the logical line, and moves behind it; false when its brackets prove to be
+// Adds tokens up to the end of the logical line, and moves after it; false when its brackets prove to be
 // unclosed. Most tokens are plain names, brackets and operators, which are read here and now.
 bool CTokenizer::_CollectTokens(CRawLogical& logical, size_t forced_end) {
     const std::string_view text = _fLexer.Text();
@@ -148,7 +148,7 @@ bool CTokenizer::_CollectTokens(CRawLogical& logical, size_t forced_end) {
     }
 }
 
-// Moves from the end of a row, or of the text, to the next token of the logical line, or behind the row that
+// Moves from the end of a row, or of the text, to the next token of the logical line, or after the row that
 // ends it.
 CTokenizer::EStep CTokenizer::_SkipRows(const CRawLogical& logical, size_t forced_end) {
     const std::string_view text = _fLexer.Text();

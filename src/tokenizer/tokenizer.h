@@ -72,7 +72,7 @@ class CTokenizer {
     CScopes _fScopes;
     CEmbeddedFinder _fEmbedded;
     CLineFacts _fFacts;
-    bool _fMidRow = false;  // behind a separator
+    bool _fMidRow = false;  // after a separator
     int32_t _fIndent = 0;   // of the first row of the logical line
     bool _fIsCompound = false;
     CBrackets _fBrackets;
