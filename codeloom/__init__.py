@@ -33,6 +33,7 @@ if TYPE_CHECKING:
         Signature,
         Symbol,
     )
+    from codeloom._document import Change, Document
     from codeloom._face import analyze, analyze_file, analyze_paths, read_notebook
     from codeloom.reading.languages import NEWEST, VERSIONS
     from codeloom.reading.notebooks import Notebook
@@ -43,6 +44,8 @@ __all__ = [
     "NEWEST",
     "VERSIONS",
     "Analysis",
+    "Change",
+    "Document",
     "Hint",
     "HintKind",
     "Limit",
@@ -72,6 +75,7 @@ __all__ = [
 # Where the names are, which are imported when they are first asked for, so that `import codeloom` is cheap.
 _MODULES = {
     **dict.fromkeys(("analyze", "analyze_file", "analyze_paths", "read_notebook"), "codeloom._face"),
+    **dict.fromkeys(("Change", "Document"), "codeloom._document"),
     **dict.fromkeys(("NEWEST", "VERSIONS"), "codeloom.reading.languages"),
     "Notebook": "codeloom.reading.notebooks",
 }

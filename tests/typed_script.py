@@ -6,6 +6,8 @@ from pathlib import Path
 from codeloom import (
     NEWEST,
     Analysis,
+    Change,
+    Document,
     Line,
     Notebook,
     Occurrence,
@@ -40,3 +42,6 @@ for one in analyze_paths([Path("."), "a"], jobs=2, on_error=report):
     print(related, [name.scope.name for name in unused], one.limits[0].kind.value)
 notebook: Notebook = read_notebook("a.ipynb")
 print(notebook.place(1)[0] + 1)
+document = Document("x = 1", encoding="utf-8")
+change: Change = document.edit((1, 1), document.end, "y")
+print([scope.name for scope in change.scopes_come], change.lines_gone[0].text, document.analysis.problems[0])

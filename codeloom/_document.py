@@ -1,0 +1,304 @@
+"""The text of an editor that changes, with what it says after each edit."""
+
+import os
+import re
+from bisect import bisect_right
+from collections import Counter
+from collections.abc import Callable, Hashable, Iterable
+from functools import cached_property
+from operator import attrgetter
+
+from codeloom._analysis import Analysis, Line, Occurrence, Problem, Range, Scope
+from codeloom._face import analyze
+from codeloom.reading.languages import NEWEST
+
+TYPE_CHECKING = False  # `typing` takes longer to import than this module
+if TYPE_CHECKING:
+    from typing import Literal, TypeVar
+
+    Encoding = Literal["utf-8", "utf-16", "utf-32"]
+    Item = TypeVar("Item")
+
+# From 1, and what columns count is said where a position is taken.
+Position = tuple[int, int]
+
+_ROW_END = re.compile(r"\r\n|\r|\n")
+_ENCODINGS = ("utf-8", "utf-16", "utf-32")
+_SAID_OF_SYMBOL = attrgetter(
+    "name",
+    *("is_local", "is_global", "is_free", "is_declared_global", "is_nonlocal", "is_referenced"),
+    *("is_assigned", "is_parameter", "is_imported", "is_annotated", "is_type_parameter", "is_namespace"),
+)
+
+
+class Document:
+    """A text that is edited piece by piece.
+
+    `encoding` is what the columns of positions count, here and nowhere else: "utf-32" characters,
+    "utf-16" the units of UTF-16, "utf-8" bytes. Rows and columns count from 1, and rows end as they do
+    in the analysis, at "\\n", "\\r\\n" and "\\r". The other arguments are those of `analyze`.
+
+    Use a document from one thread at a time. What it has given stays as it is.
+    """
+
+    def __init__(
+        self,
+        source: str,
+        *,
+        path: str | os.PathLike[str] = "<string>",
+        python: str = NEWEST,
+        false_hints: bool = False,
+        encoding: "Encoding" = "utf-32",
+    ) -> None:
+        if not isinstance(source, str):
+            raise TypeError(f"source must be a str, not {type(source).__name__}")
+        if not isinstance(encoding, str):
+            raise TypeError(f"encoding must be a str, not {type(encoding).__name__}")
+        if encoding not in _ENCODINGS:
+            raise ValueError(f"encoding must be one of {', '.join(_ENCODINGS)}, not {encoding!r}")
+        self._encoding: Encoding = encoding
+        self._false_hints = false_hints
+        self._text = source
+        self._row_starts = _row_starts(source)
+        self._analysis = analyze(source, path=path, python=python, false_hints=false_hints)
+
+    @property
+    def path(self) -> str:
+        """The name that problems bear."""
+        return self._analysis.path
+
+    @property
+    def python(self) -> str:
+        """The version of Python that the text is written in."""
+        return self._analysis.python
+
+    @property
+    def encoding(self) -> "Encoding":
+        """What columns count: "utf-8", "utf-16" or "utf-32"."""
+        return self._encoding
+
+    @property
+    def text(self) -> str:
+        """The text as it is now."""
+        return self._text
+
+    @property
+    def analysis(self) -> Analysis:
+        """What the text says now; the same as `analyze` says of it."""
+        return self._analysis
+
+    @property
+    def end(self) -> Position:
+        """The position after the last character."""
+        return len(self._row_starts), self._units(self._row_text(len(self._row_starts))) + 1
+
+    def position(self, row: int, column: int) -> Position:
+        """A place of the analysis, with the column in what this document counts.
+
+        ValueError for a place that the text doesn't have.
+        """
+        offset = self._offset_in_row((row, column), "column", characters=True)
+        return row, self._units(self._row_text(row)[: offset - self._row_starts[row - 1]]) + 1
+
+    def edit(self, start: Position, end: Position, new_text: str) -> "Change":
+        """Put `new_text` in the place of what is from `start` up to `end`, and say what that changes.
+
+        ValueError for a position that the text doesn't have, within a character too, and for an `end`
+        before `start`; the text then stays as it is.
+        """
+        if not isinstance(new_text, str):
+            raise TypeError(f"new_text must be a str, not {type(new_text).__name__}")
+        first = self._offset_in_row(_checked(start, "start"), "start")
+        last = self._offset_in_row(_checked(end, "end"), "end")
+        if last < first:
+            raise ValueError(f"end {end} is before start {start}")
+        before, gone = self._analysis, self._range(first, last)
+        text = self._text[:first] + new_text + self._text[last:]
+        self._analysis = analyze(text, path=before.path, python=before.python, false_hints=self._false_hints)
+        self._text = text
+        self._row_starts = _row_starts(text)
+        return Change(before, self._analysis, gone, self._range(first, first + len(new_text)))
+
+    def __repr__(self) -> str:
+        return f"<Document {self.path!r}>"
+
+    def _offset_in_row(self, position: Position, name: str, characters: bool = False) -> int:
+        """The index of the character at a position, which the argument `name` gives."""
+        row, column = position
+        if not 1 <= row <= len(self._row_starts):
+            raise ValueError(f"{name} {position}: there is no row {row}, but {len(self._row_starts)}")
+        text = self._row_text(row)
+        count = column - 1 if characters else self._characters(text, column - 1)
+        if column < 1 or count > len(text):
+            raise ValueError(f"{name} {position}: row {row} ends at column {self._units(text) + 1}")
+        if count < 0:
+            raise ValueError(f"{name} {position} is within a character")
+        return self._row_starts[row - 1] + count
+
+    def _row_text(self, row: int) -> str:
+        end = self._row_starts[row] if row < len(self._row_starts) else len(self._text)
+        return self._text[self._row_starts[row - 1] : end].rstrip("\r\n")
+
+    def _range(self, first: int, last: int) -> Range:
+        return Range(*self._place(first), *self._place(last))
+
+    def _place(self, offset: int) -> Position:
+        row = bisect_right(self._row_starts, offset)
+        return row, offset - self._row_starts[row - 1] + 1
+
+    def _units(self, text: str) -> int:
+        if self._encoding == "utf-32" or text.isascii():
+            return len(text)
+        if self._encoding == "utf-16":
+            return len(text) + sum(character > "\uffff" for character in text)
+        return len(text.encode("utf-8", "surrogatepass"))
+
+    def _characters(self, text: str, units: int) -> int:
+        """How many characters of `text` have so many units; more than it has for more, -1 within one."""
+        if self._encoding == "utf-32" or text.isascii():
+            return units
+        count = 0
+        while units > 0 and count < len(text):
+            units -= self._units(text[count])
+            count += 1
+        return count + units if units >= 0 else -1
+
+
+class Change:
+    """What an edit has changed.
+
+    `range` is what it replaced in the text before, and `new_range` what is there now, both in
+    characters. An item of the analysis before that the analysis after has too, at the place where the
+    edit has moved it, has neither gone nor come; all others have.
+    """
+
+    def __init__(self, before: Analysis, after: Analysis, range: Range, new_range: Range) -> None:
+        self.before = before
+        self.after = after
+        self.range = range
+        self.new_range = new_range
+
+    @property
+    def lines_gone(self) -> tuple[Line, ...]:
+        """The logical lines of the text before that are no more, or have another text or indentation."""
+        return self._lines[0]
+
+    @property
+    def lines_come(self) -> tuple[Line, ...]:
+        """The logical lines of the text after that are in their place."""
+        return self._lines[1]
+
+    @property
+    def problems_gone(self) -> tuple[Problem, ...]:
+        """The problems that are no more."""
+        return self._problems[0]
+
+    @property
+    def problems_come(self) -> tuple[Problem, ...]:
+        """The problems that weren't there before."""
+        return self._problems[1]
+
+    @property
+    def occurrences_gone(self) -> tuple[Occurrence, ...]:
+        """The appearances of names that are no more, or have another resolution now."""
+        return self._occurrences[0]
+
+    @property
+    def occurrences_come(self) -> tuple[Occurrence, ...]:
+        """The appearances of names that weren't there before, or had another resolution."""
+        return self._occurrences[1]
+
+    @property
+    def scopes_gone(self) -> tuple[Scope, ...]:
+        """The scopes that are no more, or whose symbols are others now."""
+        return self._scopes[0]
+
+    @property
+    def scopes_come(self) -> tuple[Scope, ...]:
+        """The scopes that weren't there before, or had other symbols."""
+        return self._scopes[1]
+
+    def moved(self, range: Range) -> Range | None:
+        """Where a range of the text before is now; None where the edit has cut into it."""
+        start, end = (range.row, range.column), (range.end_row, range.end_column)
+        cut, cut_end = (self.range.row, self.range.column), (self.range.end_row, self.range.end_column)
+        if cut < start < cut_end or cut < end < cut_end:
+            return None
+        new_start = self._shifted(start) if start >= cut_end and end > cut else start
+        return Range(*new_start, *(end if end <= cut else self._shifted(end)))
+
+    def __repr__(self) -> str:
+        gone, come = self.range, self.new_range
+        return f"<Change of {self.after.path!r}: {gone} to {come}>"
+
+    def _shifted(self, place: Position) -> Position:
+        row, column = place
+        if row == self.range.end_row:
+            column += self.new_range.end_column - self.range.end_column
+        return row + self.new_range.end_row - self.range.end_row, column
+
+    @cached_property
+    def _lines(self) -> tuple[tuple[Line, ...], tuple[Line, ...]]:
+        return self._differences(
+            self.before.lines, self.after.lines, lambda line: (line.kind, line.indent, line.text)
+        )
+
+    @cached_property
+    def _problems(self) -> tuple[tuple[Problem, ...], tuple[Problem, ...]]:
+        return self._differences(
+            self.before.problems,
+            self.after.problems,
+            lambda problem: (problem.code, problem.message, problem.hint, len(problem.related)),
+        )
+
+    @cached_property
+    def _occurrences(self) -> tuple[tuple[Occurrence, ...], tuple[Occurrence, ...]]:
+        return self._differences(
+            self.before.occurrences,
+            self.after.occurrences,
+            lambda occurrence: (occurrence.name, occurrence.role, occurrence.resolution),
+        )
+
+    @cached_property
+    def _scopes(self) -> tuple[tuple[Scope, ...], tuple[Scope, ...]]:
+        return self._differences(self.before.scopes, self.after.scopes, _said_of_scope)
+
+    def _differences(
+        self, before: "Iterable[Item]", after: "Iterable[Item]", said: "Callable[[Item], Hashable]"
+    ) -> "tuple[tuple[Item, ...], tuple[Item, ...]]":
+        """The items of both sides that the other one lacks, by their place and by what is said of them."""
+        old = [(self.moved(item.range), said(item), item) for item in before]  # type: ignore[attr-defined]
+        new = [(item.range, said(item), item) for item in after]  # type: ignore[attr-defined]
+        return _missing(old, new), _missing(new, old)
+
+
+def _missing(
+    items: "list[tuple[Range | None, Hashable, Item]]",
+    others: "list[tuple[Range | None, Hashable, Item]]",
+) -> "tuple[Item, ...]":
+    left: Counter[tuple[Range | None, Hashable]] = Counter()
+    left.update((place, said) for place, said, _ in others if place is not None)
+    found = []
+    for place, said, item in items:
+        if left[place, said] > 0:
+            left[place, said] -= 1
+        else:
+            found.append(item)
+    return tuple(found)
+
+
+def _said_of_scope(scope: Scope) -> Hashable:
+    parent = scope.parent
+    around = (parent.kind, parent.name) if parent else None
+    return scope.kind, scope.name, around, frozenset(map(_SAID_OF_SYMBOL, scope.symbols))
+
+
+def _row_starts(text: str) -> list[int]:
+    return [0, *(match.end() for match in _ROW_END.finditer(text))]
+
+
+def _checked(position: object, name: str) -> Position:
+    match position:
+        case (int(row), int(column)) if not isinstance(row, bool) and not isinstance(column, bool):
+            return row, column
+    raise TypeError(f"{name} must be a row and a column, both of type int, not {position!r}")

@@ -1,0 +1,124 @@
+"""A text that changes says at any time what `analyze` says of it."""
+
+import pytest
+from document_edits import Editor, compare
+
+import codeloom
+from codeloom import Document, Range, analyze
+
+TEXT = "def f(a):\n    return a + b\n\n\nclass C:\n    x = 1\n"
+
+
+def test_random_edits(seed):
+    for number in range(4):
+        editor = Editor(seed + number, rows=40)
+        for _ in range(40):
+            editor.step()
+
+
+class TestPositions:
+    @pytest.mark.parametrize(
+        "encoding, start, end, after", [("utf-32", 3, 4, 5), ("utf-16", 3, 5, 7), ("utf-8", 4, 8, 12)]
+    )
+    def test_what_columns_count(self, encoding, start, end, after):
+        document = Document("\n'é\U0001f600\U0001f600'\r\n", encoding=encoding)
+        assert document.position(2, 5) == (2, after)
+        change = document.edit((2, start), (2, end), "x")
+        assert document.text == "\n'éx\U0001f600'\r\n"
+        assert (change.range, change.new_range) == (Range(2, 3, 2, 4), Range(2, 3, 2, 4))
+
+    def test_end(self):
+        assert Document("").end == (1, 1)
+        assert Document("a\r\né\r\U0001f600", encoding="utf-16").end == (3, 3)
+        document = Document(TEXT)
+        document.edit((1, 1), document.end, "")
+        assert document.text == "" and not document.analysis.lines
+
+    @pytest.mark.parametrize(
+        "start, end, message",
+        [
+            ((0, 1), (1, 1), "start (0, 1): there is no row 0, but 7"),
+            ((1, 1), (8, 1), "end (8, 1): there is no row 8, but 7"),
+            ((1, 0), (1, 1), "start (1, 0): row 1 ends at column 10"),
+            ((1, 1), (1, 11), "end (1, 11): row 1 ends at column 10"),
+            ((2, 3), (2, 2), "end (2, 2) is before start (2, 3)"),
+        ],
+    )
+    def test_out_of_range(self, start, end, message):
+        document = Document(TEXT)
+        analysis = document.analysis
+        with pytest.raises(ValueError) as raised:
+            document.edit(start, end, "x")
+        assert str(raised.value) == message
+        assert document.text == TEXT and document.analysis is analysis
+
+    def test_within_a_character(self):
+        for encoding in ("utf-8", "utf-16"):
+            document = Document("\U0001f600", encoding=encoding)
+            with pytest.raises(ValueError, match=r"start \(1, 2\) is within a character"):
+                document.edit((1, 2), document.end, "")
+
+
+class TestArguments:
+    @pytest.mark.parametrize(
+        "arguments, name",
+        [
+            ((None, (1, 1), ""), "start"),
+            (((1, 1, 1), (1, 1), ""), "start"),
+            (((1, 1.0), (1, 1), ""), "start"),
+            (((1, 1), (1, True), ""), "end"),
+            (((1, 1), (1, 1), b""), "new_text"),
+        ],
+    )
+    def test_of_an_edit(self, arguments, name):
+        with pytest.raises(TypeError, match=f"^{name} must be"):
+            Document(TEXT).edit(*arguments)
+
+    def test_of_a_document(self):
+        with pytest.raises(TypeError, match="source must be a str, not bytes"):
+            Document(b"")
+        with pytest.raises(TypeError, match="encoding must be a str"):
+            Document("", encoding=8)
+        with pytest.raises(ValueError, match="encoding must be one of utf-8, utf-16, utf-32, not 'latin-1'"):
+            Document("", encoding="latin-1")
+        with pytest.raises(ValueError, match="python: unknown version"):
+            Document("", python="4.0")
+
+
+class TestChange:
+    def test_of_a_broken_line(self):
+        document = Document(TEXT, path="d.py", python="3.12")
+        change = document.edit((2, 14), (2, 15), "(")
+        assert [line.text for line in change.lines_gone] == ["return a + b"]
+        assert [line.text for line in change.lines_come] == ["return a ( b"]
+        assert [str(problem) for problem in change.problems_come] == [str(document.analysis.problems[0])]
+        assert [scope.name for scope in change.scopes_gone] == ["f"]
+        assert [name.name for name in change.occurrences_gone] == ["a", "b"]
+        undone = document.edit((2, 14), (2, 15), "+")
+        assert undone.problems_gone == change.problems_come and not undone.problems_come
+        assert undone.before is change.after
+        compare(document.analysis, change.before)
+
+    def test_what_only_moves(self):
+        change = Document(TEXT + "x = )\n").edit((4, 1), (4, 1), "\n\n")
+        for name in ("lines", "problems", "occurrences", "scopes"):
+            assert getattr(change, f"{name}_gone") == getattr(change, f"{name}_come") == ()
+        assert change.moved(Range(5, 1, 5, 9)) == Range(7, 1, 7, 9)
+        assert change.moved(Range(2, 5, 2, 11)) == Range(2, 5, 2, 11)
+
+    def test_edits_of_a_name(self):
+        document = Document(TEXT)
+        change = document.edit((1, 7), (1, 8), "b")
+        assert [(name.name, name.range.row) for name in change.occurrences_gone] == [
+            ("a", 1),
+            ("a", 2),
+            ("b", 2),
+        ]
+        assert document.text.startswith("def f(b):")
+        assert repr(document) == "<Document '<string>'>"
+        assert repr(change).startswith("<Change of '<string>': Range(1, 7, 1, 8) to Range(1, 7, 1, 8)")
+
+
+def test_it_is_lazy_to_import():
+    assert codeloom.Document is Document
+    assert Document(TEXT).analysis.problems == analyze(TEXT).problems
