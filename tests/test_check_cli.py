@@ -33,9 +33,11 @@ def test_statuses_and_summaries(write_files, run_cli, arguments, status, summary
     (folder / "empty").mkdir()
     done = run_cli("check", *arguments)
     assert (done.returncode, done.stdout.splitlines()[-1]) == (status, summary)
-    assert done.stderr == (
-        "codeloom: can't read absent.py: No such file or directory\n" if status == 2 else ""
-    )
+    said = {
+        2: "codeloom: can't read absent.py: No such file or directory\n",
+        "empty": "codeloom: nothing to read in empty: it holds no Python file and no notebook\n",
+    }
+    assert done.stderr == said.get(status, said.get(" ".join(arguments), ""))
 
 
 def test_output(write_files, run_cli):

@@ -143,6 +143,42 @@ class TestExclusion:
         assert found("gen") == ["gen/x.py"]
         assert found("b/c/local.py", "--force-exclude") == []
 
+    def test_a_named_folder_is_read_though_folders_above_ignore_it(self, write_files, found):
+        ignored = {"home/.gitignore": "/versions\n*.tmp.py\n", "home/versions/3/.gitignore": "lib/\n"}
+        files = ["a.py", "b.tmp.py", "lib/c.py"]
+        write_files(
+            {**ignored, **{f"home/versions/3/{name}": "" for name in files}, "own/pyproject.toml": ""}
+        )
+        assert found("home") == []
+        assert found("home/versions/3") == ["home/versions/3/a.py", "home/versions/3/b.tmp.py"]
+        assert found("home/versions", "--force-exclude") == []
+
+    def test_what_stands_for_no_file_says_why(self, write_files, run_cli):
+        files = ["a/build/x.py", "a/empty.txt", "b/.hidden/y.py", "c/env/pyvenv.cfg", "c/env/z.py", "d/k.py"]
+        folder = write_files({**dict.fromkeys(files, ""), "a/.gitignore": "\n# made\nbuild/\n"})
+        (folder / "e/.git").mkdir(parents=True)
+
+        def Said(*arguments):
+            done = run_cli("check", *arguments)
+            assert (done.returncode, done.stdout) == (0, "0 problems in 0 files, 0 logical lines\n")
+            return done.stderr
+
+        said = "codeloom: nothing to read in "
+        assert Said("a", "a") == 2 * (
+            f"{said}a: a/build/ is left out by 'build/' in row 3 of a/.gitignore; --no-gitignore reads it\n"
+        )
+        by_default = "b/.hidden/ is left out by the default pattern '.*/'; --exclude replaces the defaults"
+        assert Said("b") == f"{said}b: {by_default}\n"
+        assert Said("c").startswith(f"{said}c: c/env/ is left out by its pyvenv.cfg")
+        assert Said("d", "--exclude", "k.py").startswith(f"{said}d: d/k.py is left out by the pattern 'k.py'")
+        assert Said("e") == f"{said}e: it holds no Python file and no notebook\n"
+        forced = ["--force-exclude", "--exclude", "k.py"]
+        by_force = "--force-exclude leaves it out by the pattern 'k.py' to exclude\n"
+        assert Said("d/k.py", *forced) == f"{said}d/k.py: {by_force}"
+        assert Said("-", "--stdin-filename", "d/k.py", *forced) == f"{said}-: {by_force}"
+        done = run_cli("check", "d", "./d", "d/k.py")
+        assert (done.stdout, done.stderr) == ("0 problems in 1 file, 0 logical lines\n", "")
+
     def test_the_standard_input(self, write_files, run_cli):
         write_files({"codeloom.toml": "exclude = ['gen/']\nforce-exclude = true\n"})
         done = run_cli("check", "--stdin-filename", "gen/a.py", "-", stdin=b")")

@@ -1,13 +1,14 @@
 """One run over files: which are read, which of their problems count, and where it is written."""
 
 import sys
-from collections.abc import Iterator, Sequence
+from collections.abc import Callable, Iterator, Sequence
 from contextlib import contextmanager
 from typing import TYPE_CHECKING
 
 from codeloom._face import analyze, processor_count, read_all
 from codeloom.cli.command import ExitStatus
 from codeloom.cli.console import Console
+from codeloom.cli.excerpt import printable
 from codeloom.cli.filters import Filter
 from codeloom.cli.filters.codes import CodeFilter, not_ignored_by_comments
 from codeloom.cli.formats import format_named
@@ -15,9 +16,15 @@ from codeloom.cli.items import Finding
 from codeloom.cli.options import Options
 from codeloom.cli.progress import Progress
 from codeloom.cli.project import WrongUseError
-from codeloom.cli.source import Source
+from codeloom.cli.source import Source, printable_path
 from codeloom.cli.tally import Tally
-from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput, find_files, read_file
+from codeloom.reading.files import (
+    NOTEBOOK_SUFFIX,
+    StandardInput,
+    find_files,
+    left_out_by_force,
+    read_file,
+)
 from codeloom.reading.notebooks import read_notebook
 
 if TYPE_CHECKING:
@@ -38,10 +45,12 @@ class Run:
         self._needs_fingerprints = self.format.NEEDS_FINGERPRINTS or options.baseline is not None
         self._filters, self._changes = _filters_of(options)
         self._version = options.version
+        # What is printed on the terminal all the time shows well enough how far a run is.
+        self._progress = Progress(console, is_wanted=not (with_records and console.is_terminal))
 
     def files(self) -> Iterator[str | OSError]:
         """The paths of the files to read, and what keeps a folder from being listed."""
-        for path in files_of(self.options):
+        for path in files_of(self.options, self._on_nothing):
             is_named = isinstance(path, OSError | StandardInput)
             if is_named or self._changes is None or self._changes.concern(str(path)):
                 yield path
@@ -56,10 +65,7 @@ class Run:
             return source
 
         jobs = self.options.jobs or processor_count()
-        # What is printed on the terminal all the time shows well enough how far a run is.
-        with Progress(
-            self.console, is_wanted=not (self._with_records and self.console.is_terminal)
-        ) as progress:
+        with self._progress as progress:
             for source in read_all(self.files(), read, jobs, self._on_error):
                 findings = self._findings(source)
                 if findings and self.console.is_terminal:
@@ -93,20 +99,35 @@ class Run:
             findings = passes(source, findings)
         return list(findings)
 
+    def _on_nothing(self, path: str, reason: str) -> None:
+        if self.options.quiet < 2:
+            self._progress.clear()
+            self.console.print_error(
+                f"codeloom: nothing to read in {printable_path(path)}: {printable(reason)}"
+            )
+
     def _on_error(self, error: OSError) -> None:
         self.tally.unread += 1
+        self._progress.clear()
         self.console.print_failure(error)
         self.format.add_failure(error)
 
 
-def files_of(options: Options) -> Iterator[str | OSError]:
-    """The paths of the files that the options name, and what keeps a folder from being listed."""
+def files_of(
+    options: Options, on_nothing: Callable[[str, str], None] | None = None
+) -> Iterator[str | OSError]:
+    """The paths of the files that the options name, and what keeps a folder from being listed.
+
+    `on_nothing` gets each path that stands for no file, and the reason.
+    """
     exclusion = options.exclusion
-    for path in find_files([as_named(path) for path in options.paths], exclusion):
+    for path in find_files([as_named(path) for path in options.paths], exclusion, on_nothing):
         name = options.stdin_filename
-        is_excluded = isinstance(path, StandardInput) and name and exclusion.leaves_out_named(name)
-        if not is_excluded:
+        cause = exclusion.cause_for_named(name) if isinstance(path, StandardInput) and name else None
+        if cause is None:
             yield path
+        elif on_nothing is not None:
+            on_nothing(StandardInput.NAME, left_out_by_force(cause))
 
 
 def read_source(path: str, options: Options, version: str) -> Source:

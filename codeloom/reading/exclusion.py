@@ -18,6 +18,26 @@ _REPOSITORY = ".git"
 DEFAULT_PATTERNS = (".*/", "__pycache__/")
 
 
+class Cause:
+    """Why something is left out, and what brings it back."""
+
+    __slots__ = ("reason", "remedy")
+
+    def __init__(self, reason: str, remedy: str) -> None:
+        self.reason = reason
+        self.remedy = remedy
+
+    def __str__(self) -> str:
+        return f"{self.reason}; {self.remedy}"
+
+
+_HIDDEN, _CACHE = (
+    Cause(f"the default pattern {pattern!r}", "--exclude replaces the defaults")
+    for pattern in DEFAULT_PATTERNS
+)
+ENVIRONMENT = Cause("its pyvenv.cfg, as a virtual environment", "name it to read it")
+
+
 class Exclusion:
     """What is left out: `patterns` relative to `root`, and what .gitignore files name."""
 
@@ -37,56 +57,69 @@ class Exclusion:
         self._gitignore = gitignore
         self._force = force
         self._is_default = tuple(patterns) == DEFAULT_PATTERNS
-        self._spec = None if self._is_default else _spec_of(patterns)
-        self._specs: dict[str, GitIgnoreSpec | None] = {}
-        self._is_top = {self._root: True} if is_top else {}
+        self._rules = None if self._is_default else _Rules(enumerate(patterns, 1))
+        self._ignore_files: dict[str, _Rules | None] = {}
+        self._tops = {self._root: True} if is_top else {}
 
     def in_folder(self, folder: str) -> "FolderExclusion":
         """The same for what lies in one folder."""
         folder = os.path.abspath(folder)
-        rules = [(self._spec, _relative(folder, self._root))] if self._spec is not None else []
-        ignores = list(self._ignores(folder)) if self._gitignore else []
-        return FolderExclusion(rules, ignores, self._is_default)
+        rules = [] if self._rules is None else [(self._rules, _relative(folder, self._root))]
+        return FolderExclusion(rules, list(self._ignores(folder)), self._is_default)
 
-    def leaves_out_named(self, path: str) -> bool:
-        """True when a file or a folder is left out although it is named itself."""
-        return self._force and self._leaves_out_path(path)
+    def cause_for_named(self, path: str) -> Cause | None:
+        """Why a file or a folder is left out although it is named itself; None when it isn't."""
+        return self._cause_for_path(path) if self._force else None
 
     def below_named(self, folder: str) -> "Exclusion":
         """What holds below a folder that is named itself: within one that would be left out its own rules."""
-        if not self._leaves_out_path(folder):
+        if self._cause_for_path(folder) is None:
             return self
         return Exclusion(folder, self._patterns, gitignore=self._gitignore, force=self._force, is_top=True)
 
-    def _leaves_out_path(self, path: str) -> bool:
-        """True for what is left out, or lies in a folder that is."""
+    def _cause_for_path(self, path: str) -> Cause | None:
+        """Why a path is left out, or a folder that it lies in.
+
+        Patterns count for what is below the root, .gitignore files for all of their repository.
+        """
         path = os.path.abspath(path)
         is_folder = os.path.isdir(path)
-        while len(path) > len(self._root) and path.startswith(self._root):
-            folder, name = os.path.split(path)
-            if self.in_folder(folder).leaves_out(name, is_folder):
-                return True
-            path, is_folder = folder, True
-        return False
+        inside = os.path.join(self._root, "")
+        while (above := os.path.dirname(path)) != path:
+            if path.startswith(inside):
+                here = self.in_folder(above)
+            elif not self._is_top(path):
+                here = FolderExclusion([], list(self._ignores(above)), False)
+            else:
+                return None
+            cause = here.cause(os.path.basename(path), is_folder)
+            if cause is not None:
+                return cause
+            path, is_folder = above, True
+        return None
 
-    def _ignores(self, folder: str) -> Iterator[tuple["GitIgnoreSpec", str]]:
+    def _ignores(self, folder: str) -> "Iterator[tuple[_Rules, str]]":
         """The .gitignore files that hold for a folder, the nearest first, and its path from each."""
         here = folder
-        while True:
-            spec = self._spec_in(here)
-            if spec is not None:
-                yield spec, _relative(folder, here)
+        while self._gitignore:
+            rules = self._ignore_file_in(here)
+            if rules is not None:
+                yield rules, _relative(folder, here)
             above = os.path.dirname(here)
-            if self._is_top[here] or above == here:
+            if self._is_top(here) or above == here:
                 return
             here = above
 
-    def _spec_in(self, folder: str) -> "GitIgnoreSpec | None":
-        if folder not in self._specs:
-            if folder not in self._is_top:
-                self._is_top[folder] = os.path.exists(os.path.join(folder, _REPOSITORY))
-            self._specs[folder] = _read_spec(os.path.join(folder, _GITIGNORE))
-        return self._specs[folder]
+    def _ignore_file_in(self, folder: str) -> "_Rules | None":
+        if folder not in self._ignore_files:
+            self._ignore_files[folder] = _read_ignore_file(os.path.join(folder, _GITIGNORE))
+        return self._ignore_files[folder]
+
+    def _is_top(self, folder: str) -> bool:
+        """True for the folder of a repository, above which no .gitignore file counts."""
+        if folder not in self._tops:
+            self._tops[folder] = os.path.exists(os.path.join(folder, _REPOSITORY))
+        return self._tops[folder]
 
 
 class FolderExclusion:
@@ -94,45 +127,54 @@ class FolderExclusion:
 
     def __init__(
         self,
-        rules: "Sequence[tuple[GitIgnoreSpec, str]]",
-        ignores: "Sequence[tuple[GitIgnoreSpec, str]]",
+        rules: "Sequence[tuple[_Rules, str]]",
+        ignores: "Sequence[tuple[_Rules, str]]",
         leaves_out_hidden: bool,
     ) -> None:
-        """Each spec comes with the path from its folder to this one, empty or with a slash at the end."""
+        """Rules come with the path from their folder to this one, empty or with a slash at the end."""
         self._rules = rules
         self._ignores = ignores
         self._leaves_out_hidden = leaves_out_hidden
 
-    def leaves_out(self, name: str, is_folder: bool) -> bool:
-        """True for a file or a folder of this name that isn't looked at."""
-        if self._leaves_out_hidden and is_folder and (name.startswith(".") or name == "__pycache__"):
-            return True
+    def cause(self, name: str, is_folder: bool) -> Cause | None:
+        """Why a file or a folder of this name isn't looked at; None when it is."""
+        if self._leaves_out_hidden and is_folder:
+            if name.startswith("."):
+                return _HIDDEN
+            if name == "__pycache__":
+                return _CACHE
         name = f"{name}/" if is_folder else name
-        if any(spec.check_file(prefix + name).include for spec, prefix in self._rules):
-            return True
-        for spec, prefix in self._ignores:  # the nearest file that says anything decides
-            include = spec.check_file(prefix + name).include
-            if include is not None:
-                return include
-        return False
-
-
-def _spec_of(patterns: Iterable[str]) -> "GitIgnoreSpec":
-    from pathspec import GitIgnoreSpec
-
-    return GitIgnoreSpec.from_lines(patterns)
-
-
-def _read_spec(path: str) -> "GitIgnoreSpec | None":
-    try:
-        with open(path, encoding="utf-8", errors="surrogateescape") as file:
-            patterns = file.read().splitlines()
-    except OSError:  # none, or none that can be read
+        for rules, prefix in self._rules:
+            if rules.decide(prefix + name):
+                return rules.cause(prefix + name)
+        for rules, prefix in self._ignores:  # the nearest file that says anything decides
+            is_left_out = rules.decide(prefix + name)
+            if is_left_out is not None:
+                return rules.cause(prefix + name) if is_left_out else None
         return None
-    try:
-        return _spec_of(patterns) if patterns else None
-    except ValueError:  # a pattern that isn't one: the others hold
-        return _spec_of(filter(is_pattern, patterns))
+
+
+class _Rules:
+    """The patterns of a .gitignore file, or those of an option."""
+
+    def __init__(self, rows: Iterable[tuple[int, str]], path: str = "") -> None:
+        """From numbered rows; ValueError when one of them is no pattern."""
+        self._rows = [(number, row) for number, row in rows if row]
+        self._path = path
+        self._spec = _spec_of([row for _, row in self._rows])
+
+    def decide(self, path: str) -> bool | None:
+        """True for what is left out, False for what is taken back, None for anything else."""
+        return self._spec.check_file(path).include
+
+    def cause(self, path: str) -> Cause:
+        """Why a path is left out that these rules leave out."""
+        row_i = self._spec.check_file(path).index
+        number, pattern = self._rows[row_i or 0]
+        if not self._path:
+            return Cause(f"the pattern {pattern!r} to exclude", "name it to read it")
+        where = _shown_path(self._path)
+        return Cause(f"{pattern!r} in row {number} of {where}", "--no-gitignore reads it")
 
 
 def is_pattern(pattern: str) -> bool:
@@ -142,6 +184,29 @@ def is_pattern(pattern: str) -> bool:
     except ValueError:
         return False
     return True
+
+
+def _spec_of(patterns: Sequence[str]) -> "GitIgnoreSpec":
+    from pathspec import GitIgnoreSpec
+
+    return GitIgnoreSpec.from_lines(patterns)
+
+
+def _read_ignore_file(path: str) -> _Rules | None:
+    try:
+        with open(path, encoding="utf-8", errors="surrogateescape") as file:
+            rows = list(enumerate(file.read().splitlines(), 1))
+    except OSError:  # none, or none that can be read
+        return None
+    try:
+        return _Rules(rows, path) if rows else None
+    except ValueError:  # a row that is no pattern: the others hold
+        return _Rules([row for row in rows if is_pattern(row[1])], path)
+
+
+def _shown_path(path: str) -> str:
+    below = os.path.relpath(path)
+    return path if below.startswith(os.pardir) else below
 
 
 def _relative(folder: str, root: str) -> str:

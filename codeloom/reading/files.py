@@ -3,9 +3,9 @@
 import errno
 import os
 import stat
-from collections.abc import Iterator, Sequence
+from collections.abc import Callable, Iterator, Sequence
 
-from codeloom.reading.exclusion import Exclusion, FolderExclusion
+from codeloom.reading.exclusion import ENVIRONMENT, Cause, Exclusion, FolderExclusion
 
 NOTEBOOK_SUFFIX = ".ipynb"
 _SUFFIXES = (".py", ".pyi", ".pyw", NOTEBOOK_SUFFIX)
@@ -37,15 +37,25 @@ def read_file(path: str) -> bytes:
         return file.read()
 
 
-def find_files(paths: Sequence[str], exclusion: Exclusion | None = None) -> Iterator[str | OSError]:
+def find_files(
+    paths: Sequence[str],
+    exclusion: Exclusion | None = None,
+    on_nothing: Callable[[str, str], None] | None = None,
+) -> Iterator[str | OSError]:
     """The paths of the files that `paths` name, and an error for each folder that can't be listed.
 
     A folder stands for the Python files and notebooks below it, in the order of their names. What
     `exclusion` names is left out, hidden folders and caches unless told otherwise, and virtual
     environments; unless they are named themselves. Links to folders aren't followed. No file is found
-    twice, whatever its names.
+    twice, whatever its names. `on_nothing` is called with each of the paths that stands for no file, and
+    with the reason.
     """
-    return _FileFinder(paths, exclusion or Exclusion()).files()
+    return _FileFinder(paths, exclusion or Exclusion(), on_nothing).files()
+
+
+def left_out_by_force(cause: Cause) -> str:
+    """The reason why something isn't read that is named itself."""
+    return f"--force-exclude leaves it out by {cause.reason}"
 
 
 # What is the same for all names of a file or a folder: device and number, or else the path.
@@ -65,22 +75,56 @@ def _identity_of(path: str) -> _Identity:
 class _FileFinder:
     """Goes through files and folders, and remembers what it has seen."""
 
-    def __init__(self, paths: Sequence[str], exclusion: Exclusion) -> None:
+    def __init__(
+        self,
+        paths: Sequence[str],
+        exclusion: Exclusion,
+        on_nothing: Callable[[str, str], None] | None = None,
+    ) -> None:
         self._paths = paths
         self._exclusion = exclusion
+        self._on_nothing = on_nothing
         self._seen: set[_Identity] = set()
+        # What was left out, when somebody asks: where nothing was found.
+        self._left_out: list[tuple[str, Cause]] | None = None
 
     def files(self) -> Iterator[str | OSError]:
         for path in self._paths:
-            if isinstance(path, StandardInput):
-                if self._is_new(path):
-                    yield path
-            elif self._exclusion.leaves_out_named(path):
-                continue
-            elif os.path.isdir(path):
-                yield from self._files_below(path)
-            elif self._is_new(path):
+            has_found = False
+            for found in self._files_of(path):
+                has_found = True
+                yield found
+            if not has_found and self._on_nothing is not None:
+                reason = self._why_nothing(path)
+                if reason:
+                    self._on_nothing(path, reason)
+
+    def _files_of(self, path: str) -> Iterator[str | OSError]:
+        if isinstance(path, StandardInput):
+            if self._is_new(path):
                 yield path
+        elif self._exclusion.cause_for_named(path) is not None:
+            return
+        elif os.path.isdir(path):
+            yield from self._files_below(path)
+        elif self._is_new(path):
+            yield path
+
+    def _why_nothing(self, path: str) -> str | None:
+        """Why a path stands for no file; None when all of its files were found before."""
+        cause = None if isinstance(path, StandardInput) else self._exclusion.cause_for_named(path)
+        if cause is not None:
+            return left_out_by_force(cause)
+        if not os.path.isdir(path):
+            return None
+        again = _FileFinder([path], self._exclusion)
+        again._left_out = []
+        if next(again.files(), None) is not None:
+            return None
+        for left_out, cause in again._left_out:
+            if not left_out.endswith(os.sep) or next(find_files([left_out]), None) is not None:
+                return f"{left_out} is left out by {cause}"
+        return "it holds no Python file and no notebook"
 
     def _files_below(self, folder: str) -> Iterator[str | OSError]:
         # What is still to be looked at, the next one last; folders end in a separator.
@@ -106,9 +150,25 @@ class _FileFinder:
         with os.scandir(folder) as scan:
             entries = sorted(scan, key=lambda entry: entry.name, reverse=True)
         if not is_named and any(entry.name == _ENVIRONMENT_MARK for entry in entries):
+            self._note(folder, ENVIRONMENT)
             return []
         here = exclusion.in_folder(folder)
-        return [path for entry in entries if (path := _path_of_interest(entry, here)) is not None]
+        return [path for entry in entries if (path := self._path_of_interest(entry, here)) is not None]
+
+    def _path_of_interest(self, entry: os.DirEntry[str], exclusion: FolderExclusion) -> str | None:
+        """The path of a folder, with a separator, or of a Python file; None for anything else."""
+        is_folder = entry.is_dir(follow_symlinks=False)
+        if not is_folder and not entry.name.lower().endswith(_SUFFIXES):
+            return None
+        cause = exclusion.cause(entry.name, is_folder)
+        if cause is not None:
+            self._note(entry.path + os.sep if is_folder else entry.path, cause)
+            return None
+        return entry.path + os.sep if is_folder else _path_of_file(entry)
+
+    def _note(self, path: str, cause: Cause) -> None:
+        if self._left_out is not None:
+            self._left_out.append((path, cause))
 
     def _is_new(self, path: str) -> bool:
         """False for what was found before, by this name or another."""
@@ -119,15 +179,8 @@ class _FileFinder:
         return True
 
 
-def _path_of_interest(entry: os.DirEntry[str], exclusion: FolderExclusion) -> str | None:
-    """The path of a folder, with a separator, or of a Python file; None for anything else."""
-    is_folder = entry.is_dir(follow_symlinks=False)
-    if not is_folder and not entry.name.lower().endswith(_SUFFIXES):
-        return None
-    if exclusion.leaves_out(entry.name, is_folder):
-        return None
-    if is_folder:
-        return entry.path + os.sep
+def _path_of_file(entry: os.DirEntry[str]) -> str | None:
+    """The path of a file that is to be read, or that can't be; None for what is no file."""
     is_hidden = entry.name.startswith(".")
     try:
         is_broken = entry.is_symlink() and not os.path.exists(entry.path)
