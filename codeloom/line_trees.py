@@ -2,16 +2,17 @@
 
 import re
 from bisect import bisect_right
-from collections.abc import Iterator
-from dataclasses import dataclass
+from collections.abc import Iterator, Sequence
+from contextlib import suppress
+from dataclasses import dataclass, replace
 
-from codeloom._analysis import Analysis
+from codeloom._analysis import Analysis, Line, Problem
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine, kCommentedTypeHint
 from codeloom.optpgen import ParseError
 from codeloom.reading.languages import Language, language_of
 from codeloom.rows import ROW_END, RowTexts
-from codeloom.treesift import CExtendedParser, CNode, CPGenParserImpl, CreateSyntaxError
+from codeloom.treesift import CExtendedParser, CNode, CPGenParserImpl
 from codeloom.utils import GetLogicalsFromText
 
 # Problems that keep a line from being parsed: it can't be read, or is too long.
@@ -19,34 +20,18 @@ _HINDRANCES = ("CL101", "CL902")
 
 
 @dataclass(frozen=True, slots=True)
-class Fault:
-    """What is wrong with a line; row and column count from 1."""
-
-    path: str
-    row: int
-    column: int
-    message: str
-    source_row: str
-    code: str = "CL201"
-
-    def __str__(self) -> str:
-        return f"{self.path}:{self.row}:{self.column}: {self.message}"
-
-
-@dataclass(frozen=True, slots=True)
 class LineTree:
-    """A logical line with its tree, or with what is wrong with it; with neither when it is empty.
+    """A logical line with what is wrong with it, and its tree unless the grammar refuses it or it is empty.
 
     `row` and `column` count from 1, the column in characters. An expression within a line, such as
     the field of an f-string, is a line of its own here.
     """
 
-    path: str
     row: int
     column: int
     text: str
     tree: CNode | None
-    fault: Fault | None
+    problems: Sequence[Problem]
 
 
 def new_parser(language: Language) -> CPGenParserImpl:
@@ -58,15 +43,9 @@ def new_parser(language: Language) -> CPGenParserImpl:
 def line_trees(analysis: Analysis, row: int | None = None) -> Iterator[LineTree]:
     """The trees of all logical lines of a text, or of those on one row, counted from 1."""
     reader = _TreeReader(analysis)
-    for logical in GetLogicalsFromText(analysis.text):
-        origin = logical.fFirstLine, 0
-        if row is not None and row - 1 not in _rows_of(logical, origin[0]):
-            continue
-        yield reader.read(logical, origin, logical.fInAsyncDef)
-        for embedded in logical.GetExpLogicals():
-            # A hint in a comment is rewritten before it is parsed.
-            if embedded.fType != kCommentedTypeHint:
-                yield reader.read(embedded, embedded.fOrigin, logical.fInAsyncDef)
+    for line, logical in zip(analysis.lines, GetLogicalsFromText(analysis.text), strict=True):
+        if row is None or row - 1 in _rows_of(logical, logical.fFirstLine):
+            yield from reader.read(line, logical)
 
 
 def count_rows(text: str) -> int:
@@ -87,41 +66,59 @@ class _TreeReader:
     """Parses the logical lines of one text."""
 
     def __init__(self, analysis: Analysis) -> None:
-        self._path = analysis.path
         self._parser = new_parser(language_of(analysis.text, analysis.python))
         self._utf8 = analysis.text.encode()
         self._starts = [0, *(match.end() for match in _UTF8_ROW_END.finditer(self._utf8))]
-        self._hindrances = [problem for problem in analysis.problems if problem.code in _HINDRANCES]
+        self._hindrances = {
+            problem.range.row - 1 for problem in analysis.problems if problem.code in _HINDRANCES
+        }
 
-    def read(self, logical: CLogicalLine, origin: tuple[int, int], in_async_def: bool) -> LineTree:
+    def read(self, line: Line, logical: CLogicalLine) -> Iterator[LineTree]:
+        """The tree of a line, then those of the expressions within it."""
+        rest = list(line.problems)
+        within = [each for each in self._expressions(logical, rest) if each.tree is not None or each.problems]
+        yield self._read(logical, (logical.fFirstLine, 0), logical.fInAsyncDef, rest)
+        yield from within
+
+    def _expressions(self, logical: CLogicalLine, problems: list[Problem]) -> Iterator[LineTree]:
+        """What lies within a line; each takes the problems that keep it from being parsed out of `problems`.
+
+        What is refused without a problem only looks like a type hint.
+        """
+        for embedded in logical.GetExpLogicals():
+            # A hint in a comment is rewritten before it is parsed.
+            if embedded.fType == kCommentedTypeHint:
+                continue
+            found = self._read(embedded, embedded.fOrigin, logical.fInAsyncDef, ())
+            if found.tree is None:
+                own = [each for each in problems if self._is_within(each, embedded, found)]
+                problems[:] = [each for each in problems if each not in own]
+                found = replace(found, problems=own)
+            yield found
+
+    def _read(
+        self,
+        logical: CLogicalLine,
+        origin: tuple[int, int],
+        in_async_def: bool,
+        problems: Sequence[Problem],
+    ) -> LineTree:
         """The tree of a logical whose text begins at `origin`: row and UTF-8 column, from zero."""
-        tree, fault = None, self._hindrance(_rows_of(logical, origin[0]))
-        if fault is None:
-            try:
+        tree = None
+        if self._hindrances.isdisjoint(_rows_of(logical, origin[0])):
+            with suppress(ParseError, SyntaxError):  # what is wrong is among the problems
                 tree = self._parser.ParseToNode(logical, in_async_def)
-            except ParseError as error:
-                *_, context = error.args
-                fault = self._refusal(CreateSyntaxError("invalid syntax", logical, context), origin)
-            except SyntaxError as error:
-                fault = self._refusal(error, origin)
         row, col = logical.fPositions[0] if logical.fPositions else (0, 0)
         row, column = self._place(origin, row, col)
-        return LineTree(self._path, row, column, TextFromTokens(logical).lstrip(), tree, fault)
+        return LineTree(row, column, TextFromTokens(logical).lstrip(), tree, problems)
 
-    def _hindrance(self, rows: range) -> Fault | None:
-        """Why what is on these rows, from zero, can't be parsed."""
-        for problem in self._hindrances:
-            if problem.range.row - 1 in rows:
-                place = problem.range
-                return Fault(
-                    self._path, place.row, place.column, problem.message, problem.source_row, problem.code
-                )
-        return None
-
-    def _refusal(self, error: SyntaxError, origin: tuple[int, int]) -> Fault:
-        assert error.lineno is not None and error.offset is not None
-        row, column = self._place(origin, error.lineno - 1, error.offset - 1)
-        return Fault(self._path, row, column, error.msg, self._row_text(row - 1))
+    def _is_within(self, problem: Problem, embedded: CLogicalLine, tree: LineTree) -> bool:
+        """True for a problem of an expression within a line, whose tree it is."""
+        if not embedded.fPositions:
+            return False
+        row, col = embedded.fPositions[-1]
+        end = self._place(embedded.fOrigin, row, col + len(embedded.fToks[-1].encode()))
+        return (tree.row, tree.column) <= (problem.range.row, problem.range.column) <= end
 
     def _place(self, origin: tuple[int, int], row: int, utf8_col: int) -> tuple[int, int]:
         """Row and column, from 1, of a place in a logical whose text begins at `origin`.
@@ -133,10 +130,6 @@ class _TreeReader:
         offset = min(start + utf8_col, len(self._utf8))
         row = bisect_right(self._starts, offset) - 1
         return row + 1, len(self._utf8[self._starts[row] : offset].decode(errors="ignore")) + 1
-
-    def _row_text(self, row: int) -> str:
-        end = self._starts[row + 1] if row + 1 < len(self._starts) else None
-        return self._utf8[self._starts[row] : end].decode().rstrip("\r\n")
 
 
 _UTF8_ROW_END = re.compile(ROW_END.pattern.encode())

@@ -28,7 +28,7 @@ def test_which_lines_are_too_long(text, reason):
     assert len(problems) == (reason is not None)
     if problems:
         assert reason in problems[0].message and "split it" in problems[0].message
-        assert next(line.fault is not None for line in line_trees(analyze(text)))
+        assert next(bool(line.problems) for line in line_trees(analyze(text)))
 
 
 def test_records_of_a_file_stay_in_proportion_to_it():

@@ -53,7 +53,7 @@ def test_several_lines(run_cli):
         ("f.py:5", ["f.py:5:5: # nothing"]),
         ("f.py:6", ["f.py:6:5: d = 1", 'f.py:6:12: return f"{b + c!r}"', "f.py:6:22: b + c"]),
         ("f.py:9:3:", ["f.py:9:1: y = 2"]),
-        ("f.py:8", ["f.py:8:7: CL201 invalid syntax"]),
+        ("f.py:8", ["f.py:8:5: CL202 '(' was never closed"]),
     ],
 )
 def test_the_row_of_a_file(write_files, run_cli, place, headings):
@@ -72,17 +72,32 @@ def test_whole_files(write_files, run_cli):
 
 
 def test_a_broken_line(run_cli):
-    done = run_cli("tree", "-c", "x = [é, 1")
+    done = run_cli("tree", "-c", "x = [é, 1 2]")
     assert (done.returncode, done.stderr) == (1, "")
     assert done.stdout.splitlines() == [
-        "<string>:1:10: CL201 invalid syntax",
-        "    1 | x = [é, 1",
-        "      |          ^",
+        "<string>:1:9: CL211 invalid syntax. Perhaps you forgot a comma?",
+        "    1 | x = [é, 1 2]",
+        "      |         ^^^",
+        "    hint: write ',' or an operator before '2'",
     ]
     # The place of a fault in an expression is a place of the file.
-    done = run_cli("tree", "-c", "\nx = f'é{a b}'")
-    assert Headings(done.stdout)[-1] == "<string>:2:11: CL201 invalid syntax"
-    assert run_cli("tree", "-c", "case [a b]: pass").stdout.startswith("<string>:1:9: CL201 invalid")
+    done = run_cli("tree", "-c", "\nx = f'é{a b} {c}'")
+    assert Headings(done.stdout) == [
+        "<string>:2:1: x = f'é{a b} {c}'",
+        "<string>:2:9: CL211 invalid syntax. Perhaps you forgot a comma?",
+        "<string>:2:15: c",
+    ]
+    assert run_cli("tree", "-c", "case [a b]: pass").stdout.startswith("<string>:1:7: CL211 invalid")
+
+
+def test_a_line_that_parses_and_is_refused(run_cli):
+    """It has its problems above its tree; what only looks like a hint isn't a line."""
+    done = run_cli("tree", "-c", "f() = 1")
+    assert done.returncode == 1
+    assert Headings(done.stdout)[0].startswith("<string>:1:1: CL401 cannot assign to function call")
+    assert "\nCExprStmt expr_stmt @0\n" in done.stdout
+    done = run_cli("tree", "-c", 'def f(a: "the first of them"): pass')
+    assert (done.returncode, Headings(done.stdout)) == (0, [])
 
 
 def test_what_cannot_be_read(write_files, run_cli):
@@ -124,7 +139,7 @@ def test_json(write_files, run_cli):
     (line,) = Items("-c", CODE)
     tree = line.pop("tree")
     place = {"row": 1, "column": 1, "end_row": 1, "end_column": 1}
-    assert line == {"type": "tree", "path": "<string>", **place, "text": CODE, "problem": None}
+    assert line == {"type": "tree", "path": "<string>", **place, "text": CODE, "problems": []}
     assert Texts(tree) == ["x", "=", "foo", "(", '"é\\n"', ")"]
     assert tree["children"][2]["children"][1] == {
         "class": "CTrailer",
@@ -140,7 +155,8 @@ def test_json(write_files, run_cli):
     lines = Items("f.py")
     assert len(lines) == 8
     (line,) = (line for line in lines if line["tree"] is None)
-    assert (line["problem"]["row"], line["problem"]["column"], line["problem"]["code"]) == (8, 7, "CL201")
+    (problem,) = line["problems"]
+    assert (problem["row"], problem["column"], problem["code"]) == (8, 5, "CL202")
     (line,) = Items("-c", "case a: b")
     assert line["tree"]["children"][1]["position"] == [0, 5]
 
@@ -148,7 +164,7 @@ def test_json(write_files, run_cli):
 def test_dot(run_cli):
     done = run_cli("tree", "-c", 'x = "\\\\\\""; y = (', "--format=dot")
     assert done.returncode == 1
-    assert done.stderr.startswith("<string>:1:18: CL201 invalid syntax\n")
+    assert done.stderr.startswith("<string>:1:17: CL202 '(' was never closed\n")
     assert done.stdout.splitlines() == [
         "digraph tree {",
         '  node [fontname="monospace"]; edge [arrowhead=none];',
@@ -170,5 +186,6 @@ def test_deep_trees(run_cli, tree_format):
     depth = 3_000
     source = b"(" * depth + b"a" + b")" * depth
     done = run_cli("tree", "-", "--format", tree_format, stdin=source)
-    assert (done.returncode, done.stderr) == (0, "")
+    assert done.returncode == 1  # the interpreter takes fewer parentheses; the tree is there nevertheless
+    assert "Traceback" not in done.stderr
     assert done.stdout.count("CAtom") == depth

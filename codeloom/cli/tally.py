@@ -24,8 +24,12 @@ class Tally:
         """Count one file and its problems."""
         self.files += 1
         self.faulty_files += bool(findings)
-        self.problems += len(findings)
         self.lines += len(source.analysis.lines)
+        self.count(findings)
+
+    def count(self, findings: Sequence[Finding]) -> None:
+        """Count problems."""
+        self.problems += len(findings)
         for finding in findings:
             self.by_code[finding.code] += 1
             self._messages.setdefault(finding.code, finding.message)

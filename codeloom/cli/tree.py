@@ -86,9 +86,7 @@ def _print(source: Source, options: Options, row: int | None, console: Console) 
         for i, line in enumerate(chain([first], [] if second is None else [second], lines)):
             item = TreeItem(source, line, has_headings, is_first=i == 0)
             tally.lines += 1
-            if item.finding is not None:
-                tally.problems += 1
-                tally.by_code[item.finding.code] += 1
+            tally.count(item.findings)
             yield item
 
     tree_format = format_named(options.format)(console, TreeCommand.NAME)

@@ -8,7 +8,7 @@ from typing import TYPE_CHECKING, Any
 from codeloom._analysis import Range
 from codeloom.cli.console import Colour, Console
 from codeloom.cli.excerpt import printable
-from codeloom.cli.items import Finding, Item
+from codeloom.cli.items import Finding, Item, show_items
 from codeloom.cli.source import Source
 
 if TYPE_CHECKING:  # they load the engine
@@ -19,7 +19,7 @@ _INDENT = "  "
 
 
 class TreeItem(Item):
-    """A line with its tree, or with what is wrong with it.
+    """A line with what is wrong with it, and with its tree.
 
     Without a heading when the reader knows already which line it is.
     """
@@ -29,15 +29,7 @@ class TreeItem(Item):
         self._source = source
         self._has_heading = has_heading
         self._is_first = is_first
-
-    @property
-    def finding(self) -> Finding | None:
-        """What is wrong with the line."""
-        fault = self.line.fault
-        if fault is None:
-            return None
-        place = Range(fault.row, fault.column, fault.row, fault.column)
-        return Finding(self._source, fault.code, fault.message, place)
+        self.findings = [Finding.of(source, problem) for problem in line.problems]
 
     @property
     def heading(self) -> str:
@@ -46,11 +38,11 @@ class TreeItem(Item):
         return printable(first_row.rstrip()) + (" ..." if more else "")
 
     def show(self, console: Console) -> None:
-        """The line's place and text, and below it a row for each node, indented; or what is wrong."""
+        """What is wrong; the line's place and text, and below it a row for each node, indented."""
         if not self._is_first:
             console.print_row("")
-        if self.finding is not None:
-            self.finding.show(console)
+        show_items(self.findings, console)
+        if self.findings and self.line.tree is None:
             return
         if self._has_heading:
             console.print_row(
@@ -63,20 +55,19 @@ class TreeItem(Item):
             console.print_row(_INDENT * depth + _node_row(node, console))
 
     def rows(self) -> Iterator[str]:
-        """The line's place and text, or what is wrong with it."""
-        if self.finding is not None:
-            yield from self.finding.rows()
-        else:
+        """What is wrong with the line, and its place and text when it has a tree."""
+        for finding in self.findings:
+            yield from finding.rows()
+        if self.line.tree is not None or not self.findings:
             yield f"{self._source.label(self._place)} {self.heading}"
 
     def fields(self) -> Iterator[dict[str, Any]]:
         """All but the tree."""
-        finding = self.finding
         yield {
             "type": "tree",
             **self._source.fields(self._place),
             "text": self.line.text,
-            "problem": finding and next(finding.fields()),
+            "problems": [fields for finding in self.findings for fields in finding.fields()],
         }
 
     def json(self) -> Iterator[str]:

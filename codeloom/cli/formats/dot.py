@@ -30,8 +30,8 @@ class DotFormat(Format):
         self._console.print_row("}")
 
     def _add_tree(self, item: TreeItem) -> None:
-        if item.finding is not None:
-            for row in item.finding.rows():
+        for finding in item.findings:
+            for row in finding.rows():
                 self._console.print_error(row)
         if item.line.tree is None:
             return
