@@ -76,7 +76,8 @@ def test_the_examples(run_cli):
 @pytest.mark.parametrize(
     ("arguments", "words"),
     [
-        ([], "COMMAND"),
+        ([], "usage: codeloom COMMAND"),
+        (["help", "chek"], "did you mean 'check'?"),
         (["mend", "a.py"], "no command 'mend'"),
         (["chek", "a.py"], "did you mean 'check'?"),
         (["check", "--statistic", "a.py"], "no option --statistic: did you mean '--statistics'?"),
@@ -86,9 +87,12 @@ def test_the_examples(run_cli):
         (["check", "--jobs", "0", "a.py"], "a number from 1"),
         (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.15"),
         (["check", "--fast", "a.py"], "--fast"),
-        (["tree"], "FILE:ROW -c is required"),
+        (["tree"], "name a line as FILE:ROW, or give one with -c CODE"),
+        (["check", "--config", "absent.toml"], "can't read absent.toml: No such file or directory"),
+        (["check", "--baseline", "absent.json"], "can't read absent.json: No such file or directory"),
+        (["check", "-o", "absent/a.txt", "."], "can't write absent/a.txt: No such file or directory"),
         (["tree", "f.py:1", "-c", "x"], "not allowed with"),
-        (["tree", "-c", "x", "--format", "xml"], "there is no 'xml' here"),
+        (["tree", "-c", "x", "--format", "xml"], "unknown value 'xml'"),
     ],
 )
 def test_wrong_use(run_cli, arguments, words):
@@ -99,8 +103,11 @@ def test_wrong_use(run_cli, arguments, words):
 
 def test_version_and_help(run_cli):
     assert run_cli("--version").stdout.startswith("codeloom ")
-    assert "check" in run_cli("--help").stdout
-    assert "--python" in run_cli("check", "--help").stdout
+    for arguments in (["--help"], ["help"], ["check", "--help"], ["help", "check"], ["help", "tree"]):
+        done = run_cli(*arguments)
+        assert done.returncode == 0 and "examples:" in done.stdout
+        assert ("--python" in done.stdout) == (len(arguments) == 2)
+        assert max(map(len, done.stdout.splitlines())) < 80
 
 
 class TestFiles:
@@ -161,7 +168,7 @@ class TestFiles:
         assert done.stderr.splitlines() == [
             "codeloom: can't read pipe: it is no regular file",
             "codeloom: can't read /dev/zero: it is no regular file",
-            "codeloom: can't read a.ipynb: it is no notebook: it has no cells",
+            "codeloom: can't read a.ipynb: it isn't a notebook: it has no cells",
         ]
 
     def test_a_pipe_of_the_shell(self, run_cli, tmp_path):
@@ -236,7 +243,15 @@ class TestEndings:
         with open("/dev/full", "wb") as full:
             process = start_cli("a.py", stdout=full)
             _, stderr = process.communicate(timeout=30)
-        assert (process.returncode, stderr) == (2, b"codeloom: [Errno 28] No space left on device\n")
+        assert (process.returncode, stderr) == (2, b"codeloom: can't write: No space left on device\n")
+
+    @pytest.mark.parametrize("redirection", ["2>&-", "2>/dev/full"])
+    def test_a_standard_error_that_takes_nothing(self, tmp_path, cli_environment, redirection):
+        command = f"{sys.executable} -m codeloom check absent.py {redirection}"
+        done = subprocess.run(
+            ["sh", "-c", command], stdout=subprocess.PIPE, text=True, cwd=tmp_path, env=cli_environment
+        )
+        assert (done.returncode, done.stdout) == (2, "0 problems in 0 files, 0 logical lines; 1 not read\n")
 
     @pytest.mark.skipif(
         "ASAN_OPTIONS" in os.environ, reason="the sanitizer ends a process that runs out of memory"
@@ -271,6 +286,24 @@ class TestEndings:
         os.close(terminal)
         process.stderr.close()
         assert (b"\033[" in output) == coloured
+
+    def test_a_narrow_terminal(self, write_files, start_cli, cli_environment):
+        """Long messages are broken between words; a row never wraps by itself."""
+        pty = pytest.importorskip("pty")
+        write_files({"a.py": "f() = 1\nx = [" + "'日本', " * 20 + "1 2]\n"})
+        cli_environment |= {"NO_COLOR": "1", "COLUMNS": "60"}
+        terminal, terminal_of_process = pty.openpty()
+        process = start_cli("a.py", stdout=terminal_of_process)
+        os.close(terminal_of_process)
+        process.stderr.close()
+        assert process.wait(30) == 1
+        rows = os.read(terminal, 65_536).decode().splitlines()
+        os.close(terminal)
+        assert rows[:2] == [
+            "a.py:1:1: CL401 cannot assign to function call here. Maybe",
+            "    you meant '==' instead of '='?",
+        ]
+        assert all(len(row) + row.count("日") + row.count("本") <= 60 for row in rows)
 
     def test_progress_on_a_terminal(self, write_files, start_cli):
         """A row on the standard error, which is taken away; the results aren't touched by it."""

@@ -2,7 +2,7 @@
 
 import pytest
 
-from codeloom.cli.excerpt import excerpt
+from codeloom.cli.excerpt import excerpt, wrapped
 
 
 def At(column):
@@ -78,3 +78,17 @@ def _AtColumn(shown, col):
             return char
         col -= width
     return None
+
+
+@pytest.mark.parametrize(
+    ("text", "rows"),
+    [
+        ("a bc", ["a bc"]),
+        ("a bcd efg hijkl m", ["a", "bcd", "efg", "hijkl", "m"]),
+        ("abcdef", ["", "abcdef"]),
+        ("日本 日", ["日本", "日"]),
+        ("", [""]),
+    ],
+)
+def test_text_is_broken_between_words(text, rows):
+    assert list(wrapped(text, 4, 5)) == rows

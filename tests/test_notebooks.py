@@ -55,9 +55,18 @@ def test_what_is_no_notebook(data, tmp_path):
     path = tmp_path / "a.ipynb"
     path.write_bytes(data)
     for call in (codeloom.analyze_file, codeloom.read_notebook):
-        with pytest.raises(OSError, match="it is no notebook") as raised:
+        with pytest.raises(OSError, match="it isn't a notebook") as raised:
             call(path)
         assert raised.value.filename == str(path)
+
+
+@pytest.mark.parametrize("end", ["f(1", "y = [1,\n  2\n", "def g(a", "z = {'a': (", "if f(:\n    pass"])
+def test_what_a_cell_leaves_open_ends_with_it(end):
+    notebook = Notebook(Made(f"x = 1\n{end}", "total = 1\nprint(total)\n"))
+    analysis = codeloom.analyze(notebook.text)
+    assert [notebook.place(problem.range.row)[0] for problem in analysis.problems] == [1]
+    assert [problem.code for problem in analysis.problems] in (["CL202"], ["CL203"], ["CL211"], ["CL217"])
+    assert [line.text for line in analysis.lines][-2:] == ["total = 1", "print(total)"]
 
 
 def test_odd_cells():

@@ -31,20 +31,20 @@ class TestSettings:
         assert Codes("y.py", "--config", "a/codeloom.toml") == ["CL401"]
         assert "must be" not in run_cli("check", "-v", "a/b/x.py").stderr
         assert "a/codeloom.toml" in run_cli("check", "-v", "a/b/x.py").stderr
-        assert "Python 3.8 is" in run_cli("check", "-v", "a/b/x.py").stderr
+        assert "read as Python 3.8" in run_cli("check", "-v", "a/b/x.py").stderr
 
     @pytest.mark.parametrize(
         ("text", "words"),
         [
-            ("selct = []", "codeloom.toml: selct is no setting: did you mean 'select'?"),
+            ("selct = []", "codeloom.toml: selct isn't a setting: did you mean 'select'?"),
             ("select = 'CL9x'", "codeloom.toml: select: 'CL9X' is no code"),
             ("jobs = true", "codeloom.toml: jobs: it must be a number"),
-            ("python = 3.12", "codeloom.toml: python: it must be a text"),
+            ("python = 3.12", "codeloom.toml: python: it must be a string"),
             ("python = '4'", "codeloom.toml: python: python: unknown version '4'"),
-            ("exclude = ['!']", "codeloom.toml: exclude: '!' is no pattern"),
-            ("exclude = [1]", "codeloom.toml: exclude: it must be a list of texts"),
+            ("exclude = ['!']", "codeloom.toml: exclude: '!' isn't a pattern"),
+            ("exclude = [1]", "codeloom.toml: exclude: it must be a list of strings"),
             ("exit-zero = 'no'", "codeloom.toml: exit-zero: it must be true or false"),
-            ("format = 'xml'", "codeloom.toml: format: there is no 'xml' here"),
+            ("format = 'xml'", "codeloom.toml: format: unknown value 'xml'"),
             ("a = ", "codeloom.toml: Invalid value"),
             ("a = " + "[" * 10_000, "codeloom.toml: maximum recursion depth"),
         ],

@@ -33,9 +33,10 @@ def main(argv: "Sequence[str] | None" = None) -> int:
         return _PIPE_CLOSED
     except OSError as error:
         _drop_output()
-        print(f"codeloom: {error}", file=sys.stderr)
+        where = f" {error.filename}" if error.filename else ""
+        _say(f"can't write{where}: {error.strerror or error}")
     except MemoryError:
-        print("codeloom: out of memory: name fewer or smaller files", file=sys.stderr)
+        _say("out of memory: name fewer or smaller files")
     return _FAILURE
 
 
@@ -52,14 +53,17 @@ def _run(arguments: list[str]) -> int:
         options = options_from(arguments)
         return options.command().run(options)
     except WrongUseError as error:
-        print(f"codeloom: {error}", file=sys.stderr)
+        _say(str(error))
         return _FAILURE
 
 
-def _drop_output() -> None:
-    """Send what is left in the buffers nowhere, so that the interpreter can end quietly."""
-    import os
+def _say(text: str) -> None:
+    from codeloom.cli.console import say
 
-    nowhere = os.open(os.devnull, os.O_WRONLY)
-    os.dup2(nowhere, sys.stdout.fileno())
-    os.close(nowhere)
+    say(text)
+
+
+def _drop_output() -> None:
+    from codeloom.cli.console import discard
+
+    discard(sys.stdout)

@@ -10,37 +10,30 @@ from importlib import import_module
 from typing import NoReturn
 
 from codeloom.cli.command import Command
+from codeloom.cli.console import print_error
 from codeloom.cli.options import Options
 from codeloom.cli.project import nearest
 
 # The module and the class of each command, and what it does.
 COMMANDS = {
-    "check": ("check", "CheckCommand", "show what isn't sound, with the place of each fault"),
-    "names": (
-        "names",
-        "NamesCommand",
-        "show what each line reads and binds, and what it says of these names",
-    ),
-    "hints": (
-        "hints",
-        "HintsCommand",
-        "show each def with the types of its arguments and what it gives back",
-    ),
-    "tree": ("tree", "TreeCommand", "show the syntax tree of a line"),
-    "explain": ("explain", "ExplainCommand", "print what the code of a problem means, with examples"),
-    "completion": ("completion", "CompletionCommand", "print what completes commands and options in a shell"),
+    "check": ("check", "CheckCommand", "report what is broken, with the place of each fault"),
+    "names": ("names", "NamesCommand", "list what each line reads and binds"),
+    "hints": ("hints", "HintsCommand", "list each def with the types of its arguments and results"),
+    "tree": ("tree", "TreeCommand", "print the syntax tree of a line"),
+    "explain": ("explain", "ExplainCommand", "explain the code of a problem, with examples"),
+    "completion": ("completion", "CompletionCommand", "print a script that completes commands in your shell"),
 }
 
 _HELP = """usage: codeloom COMMAND ...
 
-Analyses Python source one logical line at a time.
+Analyses Python source, from 2.7 to 3.15, one logical line at a time.
 
 commands:
 {commands}
 
 options:
-  --help            show this, or with a command what it takes
-  --version         show the version, the grammars and the Python that runs it
+  -h, --help     show this help
+  -V, --version  show the version, the grammars and the Python that runs it
 
 examples:
   codeloom check src tests
@@ -48,7 +41,9 @@ examples:
   codeloom names --format jsonl src
   codeloom tree -c 'x = foo(1)'
 
-Exit status: 0 when all is sound, 1 when there are problems, 2 on wrong use or when a file can't be read."""
+`codeloom help COMMAND` lists the options of a command.
+Exit status: 0 if all is well, 1 if there are problems, 2 for wrong use or
+a file that can't be read."""
 
 
 def options_from(argv: Sequence[str]) -> Options:
@@ -56,19 +51,27 @@ def options_from(argv: Sequence[str]) -> Options:
 
     SystemExit after help and wrong use, WrongUseError for wrong settings.
     """
-    name = argv[0] if argv else ""
-    if name in ("-h", "--help", "help"):
-        print(
-            _HELP.format(commands="\n".join(f"  {name:<16}  {help}" for name, (*_, help) in COMMANDS.items()))
-        )
+    name, rest = (argv[0], argv[1:]) if argv else ("", ())
+    if name in ("-h", "--help", "help") and not rest:
+        print(_help())
         sys.exit(0)
+    if name == "help":
+        name, rest = rest[0], ("--help",)
+    if not name:
+        print_error(_help())
+        sys.exit(2)
     if name not in COMMANDS:
-        _fail(
-            "codeloom", f"there is no command {name!r}{nearest(name, COMMANDS)}" if name else "name a COMMAND"
-        )
+        _fail("codeloom", f"there is no command {name!r}{nearest(name, COMMANDS)}")
     command = command_named(name)
-    given = vars(parser_of(command).parse_args(argv[1:]))
+    given = vars(parser_of(command).parse_args(rest))
     return Options({**given, "command": command})
+
+
+def _help() -> str:
+    width = max(map(len, COMMANDS))
+    return _HELP.format(
+        commands="\n".join(f"  {name:<{width}}  {help}" for name, (*_, help) in COMMANDS.items())
+    )
 
 
 def command_named(name: str) -> type[Command]:
@@ -120,5 +123,5 @@ class _HelpFormatter(argparse.RawDescriptionHelpFormatter):
 
 
 def _fail(program: str, message: str) -> NoReturn:
-    print(f"{program}: {message}\nTry `{program} --help`.", file=sys.stderr)
+    print_error(f"{program}: {message}\nTry `{program} --help`.")
     sys.exit(2)

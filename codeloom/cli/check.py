@@ -13,15 +13,15 @@ class CheckCommand(SourceCommand):
 
     NAME = "check"
     DESCRIPTION = (
-        "Show every logical line that isn't sound, with the place of its fault. The exit status is "
-        "0 when all are sound, 1 when some aren't, 2 on wrong use or when a file can't be read."
+        "Report every logical line that is broken, with the place of each fault. The exit status is "
+        "0 if there is no problem, 1 if there are some, 2 for wrong use or a file that can't be read."
     )
     EXAMPLES = (
         "codeloom check src tests",
         "codeloom check --python 2.7 old.py",
-        "codeloom check --diff main .                       only what this branch has changed",
-        "codeloom check --format json -o known.json .       what is there today ...",
-        "codeloom check --baseline known.json .             ... and then only what is new",
+        "codeloom check --diff main .                  # only what this branch changed",
+        "codeloom check --format json -o known.json .  # what is there today ...",
+        "codeloom check --baseline known.json .        # ... and then only what is new",
         "git show HEAD:a.py | codeloom check --stdin-filename a.py -",
     )
     FORMATS = FOR_PROBLEMS

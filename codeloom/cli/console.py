@@ -4,10 +4,11 @@ import io
 import os
 import shutil
 import sys
+from collections.abc import Sequence
 from enum import StrEnum
 from typing import TextIO
 
-from codeloom.cli.excerpt import Mark, excerpt, fits, printable
+from codeloom.cli.excerpt import Mark, excerpt, fits, printable, wrapped
 from codeloom.cli.source import printable_path
 
 _WIDTH_WITHOUT_TERMINAL = 100
@@ -16,6 +17,8 @@ _LEAST_WIDTH = 20
 _GUTTER = 8
 
 _PLAIN = "\033[0m"
+# Before what goes on of a message.
+_CONTINUATION = " " * 4
 
 
 class Colour(StrEnum):
@@ -41,6 +44,7 @@ class Console:
             self._stream.reconfigure(errors="backslashreplace")
         columns = shutil.get_terminal_size((_WIDTH_WITHOUT_TERMINAL, 0)).columns
         self.width = max(columns - 4, _LEAST_WIDTH)
+        self._columns = columns
         self._source_width = max(columns - _GUTTER, _LEAST_WIDTH)
         self._encoding = getattr(self._stream, "encoding", None) or "utf-8"
         self._has_colour = _is_colour_wanted(self._stream, colour)
@@ -79,7 +83,19 @@ class Console:
         """What can't be read, and why."""
         reason = error.strerror or str(error)
         path = "?" if error.filename is None else printable_path(os.fsdecode(error.filename))
-        self.print_error(f"codeloom: can't read {path}: {reason}")
+        self.say(f"can't read {path}: {reason}")
+
+    def print_message(self, words: Sequence[tuple[Colour, str]], text: str, indent: str = "") -> None:
+        """A row of words in colours and a text; on a terminal the text is broken between words."""
+        head = indent + " ".join(self.coloured(colour, word) for colour, word in words)
+        rows = [printable(text)]
+        if self.is_terminal:
+            first_room = self._columns - len(indent) - sum(len(word) + 1 for _, word in words)
+            room = self._columns - len(_CONTINUATION)
+            rows = list(wrapped(printable(text), first_room, room))
+        self.print_row(f"{head} {rows[0]}".rstrip())
+        for row in rows[1:]:
+            self.print_row(_CONTINUATION + row)
 
     def print_row(self, row: str) -> None:
         """A row of a command's result."""
@@ -90,10 +106,14 @@ class Console:
         if self._stream is not None:
             self._stream.write(text)
 
+    def say(self, text: str) -> None:
+        """A message of the program, on the standard error."""
+        self.print_error(f"codeloom: {text}")
+
     def print_error(self, text: str) -> None:
-        """What is no part of the result, after what was printed before."""
+        """What isn't part of the result, on the standard error and after what was printed before."""
         self.flush()
-        print(text, file=sys.stderr)
+        print_error(text)
 
     def flush(self) -> None:
         """Bring what was printed to its reader."""
@@ -106,6 +126,27 @@ class Console:
 
     def _gutter(self, number: int | None) -> str:
         return self.coloured(Colour.DIM, f"{'' if number is None else number:>5} |") + " "
+
+
+def say(text: str) -> None:
+    """Print a message of the program on the standard error."""
+    print_error(f"codeloom: {text}")
+
+
+def print_error(text: str) -> None:
+    """Print a row on the standard error, if it takes one."""
+    if sys.stderr is None:
+        return
+    try:
+        print(text, file=sys.stderr, flush=True)
+    except OSError:
+        discard(sys.stderr)
+
+
+def discard(stream: TextIO) -> None:
+    """Send what is left in a stream's buffers nowhere, so that the interpreter can end quietly."""
+    with open(os.devnull, "wb") as nowhere:
+        os.dup2(nowhere.fileno(), stream.fileno())
 
 
 def _is_colour_wanted(stream: TextIO | None, colour: str) -> bool:

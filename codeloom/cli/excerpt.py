@@ -47,6 +47,20 @@ def fits(source_row: str, width: int, encoding: str) -> bool:
     return sum(cell_width for _, cell_width in _cells(source_row, encoding)) <= width
 
 
+def wrapped(text: str, first_room: int, room: int) -> Iterator[str]:
+    """`text` on rows that end between words; the first one has `first_room` columns and may stay empty."""
+    row, free = "", first_room
+    for word in text.split(" "):
+        width = sum(map(_width_of, word)) + (1 if row else 0)
+        if width > free and (row or free < room):
+            yield row
+            row, free = "", room
+            width = sum(map(_width_of, word))
+        row += f" {word}" if row else word
+        free -= width
+    yield row
+
+
 def printable(text: str) -> str:
     """`text` with U+FFFD for each character that would do something to a terminal."""
     if text.isprintable():

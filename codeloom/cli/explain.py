@@ -17,7 +17,7 @@ class ExplainCommand(Command):
 
     NAME = "explain"
     DESCRIPTION = (
-        "Print what the code of a problem means, with a wrong and a right example; all codes without one."
+        "Explain the code of a problem, with a wrong and a right example. Without a code, list all codes."
     )
     EXAMPLES = ("codeloom explain CL301", "codeloom explain")
 

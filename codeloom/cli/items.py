@@ -11,6 +11,8 @@ from codeloom.cli.console import Colour, Console
 from codeloom.cli.excerpt import Mark, on_one_row, printable
 from codeloom.cli.source import Source
 
+_INDENT = "    "
+
 
 class Item(ABC):
     """Something that is said of a source."""
@@ -116,15 +118,14 @@ def show_findings(findings: list[Finding], console: Console) -> None:
             show_findings([finding], console)
         return
     for finding in findings:
-        place = console.coloured(Colour.BOLD, finding.source.label(finding.range))
-        code = console.coloured(Colour.RED, finding.code)
-        console.print_row(f"{place} {code} {printable(finding.message)}")
+        place = finding.source.label(finding.range)
+        console.print_message([(Colour.BOLD, place), (Colour.RED, finding.code)], finding.message)
     _show_rows(findings, console)
     hints = {finding.hint: finding.range.column for finding in reversed(findings)}
     for hint, column in reversed(hints.items()):
         if hint:
             label = "hint:" if len(hints) == 1 else f"hint for column {column}:"
-            console.print_row(f"    {console.coloured(Colour.GREEN, label)} {printable(hint)}")
+            console.print_message([(Colour.GREEN, label)], hint, _INDENT)
 
 
 def _row_of_finding(item: Item) -> int | None:

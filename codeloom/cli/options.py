@@ -101,7 +101,7 @@ def add_source_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
         nargs="*",
         default=["."],
         metavar="FILE-OR-FOLDER",
-        help="a file; a folder, with all Python files and notebooks below it; or - for the standard input "
+        help="a file; a folder, for all Python files and notebooks in it; or - for the standard input "
         "(default: the current folder)",
     )
     _add_reading(parser)
@@ -115,13 +115,16 @@ def _add_reading(parser: argparse.ArgumentParser) -> None:
     parser.add_argument(
         "--false-hints",
         action="store_true",
-        help="take all that looks like a type hint for one, as the engine itself does: prose after "
-        "`# type:`, error codes after `# type: ignore`, sentences in quoted annotations",
+        help="treat everything that looks like a type hint as one: also prose after `# type:`, "
+        "codes after `# type: ignore` and sentences in quoted annotations",
     )
     parser.add_argument(
-        "--jobs", type=_as_argument(_count), metavar="N", help="threads (default: one a processor)"
+        "--jobs",
+        type=_as_argument(_count),
+        metavar="N",
+        help="number of threads (default: one per processor)",
     )
-    parser.add_argument("--config", metavar="FILE", help="the settings, in place of those of the project")
+    parser.add_argument("--config", metavar="FILE", help="read the settings from this file")
 
 
 def _add_finding(parser: argparse.ArgumentParser) -> None:
@@ -130,39 +133,45 @@ def _add_finding(parser: argparse.ArgumentParser) -> None:
     group.add_argument(
         "--exclude",
         **patterns,
-        help="leave out what fits, as in a .gitignore file; in place of the defaults "
+        help="skip paths that match, written as in a .gitignore file; replaces the defaults "
         f"{' '.join(DEFAULT_PATTERNS)}",
     )
-    group.add_argument("--extend-exclude", **patterns, help="leave this out too")
+    group.add_argument("--extend-exclude", **patterns, help="skip these too")
     group.add_argument(
-        "--force-exclude", action="store_true", help="leave it out also where it is named itself"
+        "--force-exclude", action="store_true", help="skip paths that match even if you name them"
     )
     group.add_argument(
-        "--no-gitignore", dest="gitignore", action="store_false", help="read what .gitignore files name too"
+        "--no-gitignore", dest="gitignore", action="store_false", help="read what .gitignore files list"
     )
-    group.add_argument("--show-files", action="store_true", help="print which files would be read, and end")
+    group.add_argument(
+        "--show-files", action="store_true", help="list the files that would be read, and exit"
+    )
 
 
 def _add_selecting(parser: argparse.ArgumentParser) -> None:
     group = parser.add_argument_group("which problems")
     codes: dict[str, Any] = {"type": _as_argument(_selectors), "action": "extend", "metavar": "CODES"}
-    group.add_argument("--select", **codes, help="only these: codes such as CL301, or CL3 for all such")
-    group.add_argument("--ignore", **codes, help="not these; the longer of two that fit decides")
     group.add_argument(
-        "--baseline", metavar="FILE", help="only what isn't in this report, which --format json wrote"
+        "--select", **codes, help="report only these codes, such as CL301, or CL3 for all that begin so"
+    )
+    group.add_argument(
+        "--ignore", **codes, help="don't report these codes; of two that match, the longer one counts"
+    )
+    group.add_argument(
+        "--baseline",
+        metavar="FILE",
+        help="report only what isn't in this earlier report, written with --format json",
     )
     group.add_argument(
         "--diff",
         metavar="REVISION",
-        help="only on lines that differ from this git revision, such as HEAD or main",
+        help="report only problems on lines changed since this git revision, such as HEAD or main",
     )
-    group.add_argument("--exit-zero", action="store_true", help="end with 0 also when there are problems")
+    group.add_argument("--exit-zero", action="store_true", help="exit with 0 even if there are problems")
 
 
 def _add_running(group: "argparse._ArgumentGroup") -> None:
-    group.add_argument(
-        "--statistics", action="store_true", help="how often each code was reported, at the end"
-    )
+    group.add_argument("--statistics", action="store_true", help="count the problems by code at the end")
     group.add_argument("--watch", action="store_true", help="run again whenever a file changes")
 
 
@@ -178,16 +187,18 @@ def add_output_arguments(
         metavar="FORMAT",
         help=f"{', '.join(formats[:-1])} or {formats[-1]} (default: text)",
     )
-    group.add_argument("-o", "--output", metavar="FILE", help="write to this file")
+    group.add_argument("-o", "--output", metavar="FILE", help="write to this file, not the standard output")
     group.add_argument(
         "--color",
         choices=COLOURS,
         type=_as_argument(lambda name: _one_of(name, COLOURS)),
         metavar="WHEN",
-        help="auto, always or never; NO_COLOR and FORCE_COLOR in the environment count too",
+        help="auto, always or never (default: auto, which heeds NO_COLOR and FORCE_COLOR)",
     )
-    group.add_argument("-q", "--quiet", action="count", help="no summary; twice: no problems either")
-    group.add_argument("-v", "--verbose", action="store_true", help="say what settings and version hold")
+    group.add_argument("-q", "--quiet", action="count", help="no summary; -qq: no problems either")
+    group.add_argument(
+        "-v", "--verbose", action="store_true", help="say which settings and versions are used"
+    )
     return group
 
 
@@ -197,13 +208,11 @@ def add_python_argument(parser: argparse.ArgumentParser) -> None:
         "--python",
         type=_as_argument(version_named),
         metavar="VERSION",
-        help=f"the version of Python that the source is written in, {VERSIONS[0]} or {VERSIONS[1]} to "
-        f"{NEWEST}, as in 3.12, py312 or 3 (default: the oldest that the project's requires-python "
-        f"admits, or {NEWEST})",
+        help=f"the version of Python that the source is for: {VERSIONS[0]}, or {VERSIONS[1]} to {NEWEST}, "
+        f"written 3.12, py312 or 3 (default: the oldest that the project's requires-python allows, "
+        f"or {NEWEST})",
     )
-    parser.add_argument(
-        "--stdin-filename", metavar="FILE", help="the file that the standard input stands for"
-    )
+    parser.add_argument("--stdin-filename", metavar="FILE", help="report the standard input under this name")
 
 
 def _as_argument(read: Callable[[str], Any]) -> Callable[[str], Any]:
@@ -228,20 +237,20 @@ def _patterns(value: str | list[str]) -> list[str]:
     patterns = _texts(value)
     for pattern in patterns:
         if not is_pattern(pattern):
-            raise ValueError(f"{pattern!r} is no pattern")
+            raise ValueError(f"{pattern!r} isn't a pattern")
     return patterns
 
 
 def _texts(value: object) -> list[str]:
     texts = [value] if isinstance(value, str) else value
     if not isinstance(texts, list) or not all(isinstance(text, str) for text in texts):
-        raise TypeError("it must be a list of texts")
+        raise TypeError("it must be a list of strings")
     return texts
 
 
 def _text(value: object) -> str:
     if not isinstance(value, str):
-        raise TypeError("it must be a text")
+        raise TypeError("it must be a string")
     return value
 
 
@@ -266,7 +275,7 @@ def _count(value: object) -> int:
 def _one_of(value: object, names: Sequence[str]) -> str:
     if value not in names:
         suggestion = nearest(str(value), names) or f": choose {', '.join(names[:-1])} or {names[-1]}"
-        raise ValueError(f"there is no {value!r} here{suggestion}")
+        raise ValueError(f"unknown value {value!r}{suggestion}")
     return str(value)
 
 

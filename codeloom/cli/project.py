@@ -40,8 +40,7 @@ class Project:
             self._take(own)
         if not os.path.isfile(project):
             return
-        with open(project, "rb") as file:
-            text = file.read()
+        text = _bytes_of(project)
         # Most have nothing for us, and a parser of TOML takes a while to load.
         if b"codeloom" not in text and b"requires-python" not in text:
             return
@@ -58,8 +57,7 @@ class Project:
             self.requires_python = requirement if isinstance(requirement, str) else None
 
     def _take(self, path: str) -> None:
-        with open(path, "rb") as file:
-            settings: Any = _parsed(file.read(), path)
+        settings: Any = _parsed(_bytes_of(path), path)
         if os.path.basename(path) == _PROJECT_FILE:
             settings = _table(settings, "tool").get("codeloom", {})
         if not isinstance(settings, dict):
@@ -78,7 +76,7 @@ def checked_settings(
     for name, value in project.settings.items():
         where = f"{project.settings_file}: {name}"
         if name not in readers:
-            raise WrongUseError(f"{where} is no setting{nearest(name, readers)}")
+            raise WrongUseError(f"{where} isn't a setting{nearest(name, readers)}")
         try:
             yield name, readers[name](value)
         except (TypeError, ValueError) as error:
@@ -91,6 +89,14 @@ def nearest(name: str, known: Mapping[str, object] | Sequence[str]) -> str:
 
     found = get_close_matches(name, list(known), 1)
     return f": did you mean {found[0]!r}?" if found else ""
+
+
+def _bytes_of(path: str) -> bytes:
+    try:
+        with open(path, "rb") as file:
+            return file.read()
+    except OSError as error:
+        raise WrongUseError(f"can't read {path}: {error.strerror}") from None
 
 
 def _parsed(text: bytes, path: str) -> dict[str, Any]:

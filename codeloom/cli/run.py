@@ -7,7 +7,7 @@ from typing import TYPE_CHECKING
 
 from codeloom._face import analyze, processor_count, read_all
 from codeloom.cli.command import ExitStatus
-from codeloom.cli.console import Console
+from codeloom.cli.console import Console, say
 from codeloom.cli.excerpt import printable
 from codeloom.cli.filters import Filter
 from codeloom.cli.filters.codes import CodeFilter, not_ignored_by_comments
@@ -102,9 +102,7 @@ class Run:
     def _on_nothing(self, path: str, reason: str) -> None:
         if self.options.quiet < 2:
             self._progress.clear()
-            self.console.print_error(
-                f"codeloom: nothing to read in {printable_path(path)}: {printable(reason)}"
-            )
+            self.console.say(f"nothing to read in {printable_path(path)}: {printable(reason)}")
 
     def _on_error(self, error: OSError) -> None:
         self.tally.unread += 1
@@ -162,11 +160,11 @@ def opened_console(options: Options) -> Iterator[Console]:
 
 
 def print_facts(options: Options) -> None:
-    """Say what holds for a run, on the standard error."""
+    """Say what a run goes by."""
     settings = options.project.settings_file or "none"
-    print(f"codeloom: settings: {settings}", file=sys.stderr)
-    print(f"codeloom: Python {options.version} is what sources are written in", file=sys.stderr)
-    print(f"codeloom: {options.jobs or processor_count()} threads", file=sys.stderr)
+    say(f"settings: {settings}")
+    say(f"source is read as Python {options.version}")
+    say(f"threads: {options.jobs or processor_count()}")
 
 
 def _filters_of(options: Options) -> tuple[list[Filter], "Changes | None"]:
@@ -184,6 +182,8 @@ def _filters_of(options: Options) -> tuple[list[Filter], "Changes | None"]:
             from codeloom.cli.filters.baseline import Baseline
 
             filters.append(Baseline(options.baseline))
+    except OSError as error:
+        raise WrongUseError(f"can't read {error.filename}: {error.strerror}") from None
     except ValueError as error:
         raise WrongUseError(str(error)) from None
     return filters, changes

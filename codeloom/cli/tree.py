@@ -11,7 +11,8 @@ from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Console
 from codeloom.cli.formats import FOR_TREES, format_named
 from codeloom.cli.options import Options, add_output_arguments, add_python_argument
-from codeloom.cli.run import as_named, opened_console, read_source
+from codeloom.cli.project import WrongUseError
+from codeloom.cli.run import as_named, opened_console, print_facts, read_source
 from codeloom.cli.source import Source, printable_path
 from codeloom.cli.tally import Tally
 from codeloom.cli.tree_items import TreeItem
@@ -25,10 +26,10 @@ class TreeCommand(Command):
 
     NAME = "tree"
     DESCRIPTION = (
-        "Show the syntax tree of a line: of each node its class, the grammar rule or kind of token, "
-        "the text of a leaf, and after @ the index of its first token. Expressions within the "
-        "line, in f-strings and quoted hints, follow as lines of their own. The exit status is 0 "
-        "when all lines are sound, 1 when some aren't, 2 on wrong use or when the line can't be read."
+        "Print the syntax tree of a line: for each node its class, its grammar rule or kind of token, "
+        "the text of a leaf, and after @ the index of its first token. Expressions within the line, in "
+        "f-strings and quoted hints, follow as lines of their own. The exit status is 0 if there is no "
+        "problem, 1 if there are some, 2 for wrong use or a line that can't be read."
     )
 
     EXAMPLES = (
@@ -41,13 +42,13 @@ class TreeCommand(Command):
     @classmethod
     def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
         """Add the command's own arguments."""
-        what = parser.add_mutually_exclusive_group(required=True)
+        what = parser.add_mutually_exclusive_group()
         what.add_argument(
             "place",
             nargs="?",
             metavar="FILE:ROW",
-            help="the line on a row of a file, counted from 1, or all lines of a FILE; "
-            "- is the standard input",
+            help="the line on a row of a file, counted from 1; all lines of a FILE; or - for the standard "
+            "input",
         )
         what.add_argument("-c", dest="code", metavar="CODE", help="the line itself, or several")
         add_python_argument(parser)
@@ -55,6 +56,10 @@ class TreeCommand(Command):
 
     def run(self, options: Options) -> ExitStatus:
         """Print the trees of the code, of the row or of the file."""
+        if options.code is None and options.place is None:
+            raise WrongUseError("name a line as FILE:ROW, or give one with -c CODE")
+        if options.verbose:
+            print_facts(options)
         with opened_console(options) as console:
             if options.code is not None:
                 analysis = analyze(options.code, python=options.version)
@@ -98,7 +103,7 @@ def _print(source: Source, options: Options, row: int | None, console: Console) 
 
 
 def _fail(message: str, console: Console) -> ExitStatus:
-    console.print_error(f"codeloom: {message}")
+    console.say(message)
     return ExitStatus.FAILURE
 
 

@@ -14,7 +14,7 @@ _MAGIC = re.compile(
 )
 # Cell magic whose cell still holds Python.
 _PYTHON_CELL = re.compile(r"\s*%%(?:time|timeit|capture|prun|debug|python3?|pypy)\b")
-# What decides whether a row goes on: strings, comments, brackets, ends of rows.
+# What decides whether a row goes on: strings, comments, parentheses, ends of rows.
 _PIECE = re.compile(
     r"""(?P<quotes>\'{3}|"{3})(?:\\.|(?!(?P=quotes)).)*(?:(?P=quotes)|\Z)"""
     r"""|"(?:\\.|[^"\\\n])*"?|'(?:\\.|[^'\\\n])*'?"""
@@ -22,6 +22,8 @@ _PIECE = re.compile(
     re.DOTALL,
 )
 _ROW_END = re.compile(r"\r\n|\r")
+# A row that can't be within parentheses, so that what a cell leaves open ends with the cell.
+_END_OF_OPEN_CELL = "pass\n"
 
 
 class Notebook:
@@ -33,7 +35,7 @@ class Notebook:
     """
 
     def __init__(self, data: bytes) -> None:
-        """Read a notebook from its JSON; ValueError when it is none."""
+        """Read a notebook from its JSON; ValueError when it isn't one."""
         cells, self.is_python = _code_cells(data)
         self._cells: list[int] = []
         self._first_rows: list[int] = []
@@ -59,11 +61,11 @@ class Notebook:
 
 
 def read_notebook(data: bytes, path: str) -> Notebook:
-    """The notebook in a file's bytes; OSError, with the path, when it is none."""
+    """The notebook in a file's bytes; OSError, with the path, when it isn't one."""
     try:
         return Notebook(data)
     except (ValueError, RecursionError) as error:
-        raise OSError(errno.EINVAL, f"it is no notebook: {error}", path) from None
+        raise OSError(errno.EINVAL, f"it isn't a notebook: {error}", path) from None
 
 
 def _code_cells(data: bytes) -> tuple[list[tuple[int, str]], bool]:
@@ -103,7 +105,7 @@ def _source_of(cell: dict[str, Any]) -> str:
 
 
 def _without_magic(source: str) -> str:
-    """A cell's text with comments, or `pass` within a block, in place of what is no Python.
+    """A cell's text with comments, or `pass` within a block, in place of what isn't Python.
 
     It ends with the end of a row, and its rows end with a line feed.
     """
@@ -117,20 +119,23 @@ def _without_magic(source: str) -> str:
     while start < len(text):
         match = _MAGIC.match(text, start)
         end = match.end() if match else _end_of_statement(text, start)
+        if end is None:
+            pieces += [text[start:], _END_OF_OPEN_CELL]
+            break
         pieces.append(_passed_over(match) if match else text[start:end])
         start = end
     return "".join(pieces)
 
 
-def _end_of_statement(text: str, start: int) -> int:
-    """Where the rows end that belong together by brackets, quotes and backslashes."""
+def _end_of_statement(text: str, start: int) -> int | None:
+    """Where the rows end that parentheses, quotes and backslashes join; None when they don't end."""
     depth = 0
     for piece in _PIECE.finditer(text, start):
         if piece["bracket"]:
             depth = max(depth + (1 if piece["bracket"] in "([{" else -1), 0)
         elif piece["end"] and depth == 0:
             return piece.end()
-    return len(text)
+    return None
 
 
 def _passed_over(match: re.Match[str]) -> str:

@@ -55,7 +55,7 @@ class SarifFormat(Format):
         if self._count > MOST_RESULTS:
             text = f"{self._count - MOST_RESULTS:,} more problems are left out: GitHub takes {MOST_RESULTS:,}"
             self._notify(text)
-            self._console.print_error(f"codeloom: {text}")
+            self._console.say(text)
         rest = {
             "tool": {
                 "driver": {
