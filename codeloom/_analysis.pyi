@@ -1140,6 +1140,13 @@ class Analysis:
         Every type hint of the text, line by line: those of variables, attributes, parameters and of what functions give back, in annotations and in comments.
         """
 
+def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, with_records: bool) -> list[Analysis | None]:
+    """
+    For `codeloom.analyze_paths`: what each file says, with its problems worked out, and with `with_records` its records.
+
+    None for a file that can't be read or that has to be decoded: the Python layer reads these.
+    """
+
 def DumpNames(text: str, version: int, has_print_function: bool=False, with_records: bool=True) -> list[tuple[int, int, int, list[tuple[bytes, bytes, bool, int, int]]]]:
     """
     For developers: what the walk for names records of each logical line of a text, and of each expression embedded in it.

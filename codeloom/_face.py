@@ -1,26 +1,17 @@
 """What users call: texts, files and folders into what they say."""
 
 import os
-from collections import deque
 from collections.abc import Callable, Iterable, Iterator
-from functools import partial
-from itertools import chain, islice
 
-from codeloom._analysis import Analysis
+from codeloom._analysis import Analysis, analyze_files
+from codeloom.reading.ahead import read_ahead
 from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput, find_files, read_file
 from codeloom.reading.languages import NEWEST, version_number
 from codeloom.reading.source import source_from_bytes, source_from_text
 
 TYPE_CHECKING = False  # `typing` takes longer to import than this module
 if TYPE_CHECKING:
-    from typing import TypeVar
-
     from codeloom.reading.notebooks import Notebook
-
-    Result = TypeVar("Result")
-
-# How many files are read ahead for each thread.
-_AHEAD_PER_JOB = 4
 
 
 def analyze(
@@ -119,63 +110,43 @@ def analyze_paths(
     elif jobs < 1:
         raise ValueError(f"jobs must be at least 1, not {jobs}")
 
+    def read_plain(names: list[str]) -> Iterator[Analysis | None]:
+        return analyze_plain_files(names, python=python, false_hints=false_hints, records=records)
+
     def read(name: str) -> Analysis:
         analysis = analyze_file(name, python=python, false_hints=false_hints)
         _ = analysis.records if records else analysis.problems  # worked out now, in this thread
         return analysis
 
-    return read_all(find_files(names), read, jobs, on_error)
+    return _without_errors(read_ahead(find_files(names), read_plain, read, jobs), on_error)
 
 
-def read_all(
-    found: Iterator[str | OSError],
-    read: "Callable[[str], Result]",
-    jobs: int,
-    on_error: Callable[[OSError], None] | None,
-) -> "Iterator[Result]":
-    """What `read` makes of each path, in their order, ahead and in `jobs` threads."""
-    for result in _results(found, read, jobs):
-        try:
-            value = result()
-        except OSError as error:
-            if on_error is None:
-                raise
-            on_error(error)
+def _without_errors(
+    results: Iterator[Analysis | OSError], on_error: Callable[[OSError], None] | None
+) -> Iterator[Analysis]:
+    for result in results:
+        if not isinstance(result, OSError):
+            yield result
+        elif on_error is None:
+            raise result
         else:
-            yield value
+            on_error(result)
 
 
-def _results(
-    found: Iterator[str | OSError], read: "Callable[[str], Result]", jobs: int
-) -> "Iterator[Callable[[], Result]]":
-    """For each path a call that gives, or raises, what came of it."""
-    first = list(islice(found, 2))
-    if jobs == 1 or len(first) < 2:  # one file is nothing to share
-        for path in chain(first, found):
-            yield partial(_read_one, read, path)
-        return
-    from concurrent.futures import ThreadPoolExecutor
+def analyze_plain_files(
+    names: list[str], *, python: str, false_hints: bool, records: bool
+) -> Iterator[Analysis | None]:
+    """Each file analysed, all with one release of the interpreter's lock; None for what takes more to read.
 
-    pool = ThreadPoolExecutor(jobs, "codeloom")
-    ahead: deque[Callable[[], Result]] = deque()
-    try:
-        for path in chain(first, found):
-            if isinstance(path, StandardInput):  # can't be read ahead: it may be a terminal
-                ahead.append(partial(_read_one, read, path))
-            else:
-                ahead.append(pool.submit(_read_one, read, path).result)
-            if len(ahead) > _AHEAD_PER_JOB * jobs:
-                yield ahead.popleft()
-        while ahead:
-            yield ahead.popleft()
-    finally:
-        pool.shutdown(cancel_futures=True)
+    These are notebooks, the standard input, what isn't plain UTF-8, and what can't be read.
+    """
+    plain = [name for name in names if _is_plain(name)]
+    found = iter(analyze_files(plain, python, version_number(python), false_hints, records))
+    return (next(found) if _is_plain(name) else None for name in names)
 
 
-def _read_one(read: "Callable[[str], Result]", path: str | OSError) -> "Result":
-    if isinstance(path, OSError):
-        raise path
-    return read(path)
+def _is_plain(name: str) -> bool:
+    return not (isinstance(name, StandardInput) or name.lower().endswith(NOTEBOOK_SUFFIX))
 
 
 def processor_count() -> int:

@@ -5,7 +5,7 @@ from collections.abc import Callable, Iterator, Sequence
 from contextlib import contextmanager
 from typing import TYPE_CHECKING
 
-from codeloom._face import analyze, processor_count, read_all
+from codeloom._face import analyze, analyze_plain_files, processor_count
 from codeloom.cli.command import ExitStatus
 from codeloom.cli.console import Console, say
 from codeloom.cli.excerpt import printable
@@ -18,6 +18,7 @@ from codeloom.cli.progress import Progress
 from codeloom.cli.project import WrongUseError
 from codeloom.cli.source import Source, printable_path
 from codeloom.cli.tally import Tally
+from codeloom.reading.ahead import read_ahead
 from codeloom.reading.files import (
     NOTEBOOK_SUFFIX,
     StandardInput,
@@ -57,21 +58,33 @@ class Run:
 
     def sources(self) -> Iterator[tuple[Source, list[Finding]]]:
         """Each file with the problems that count; what can't be read is reported."""
-
-        def read(path: str) -> Source:
-            source = read_source(path, self.options, self._version)
-            analysis = source.analysis
-            _ = analysis.records if self._with_records else analysis.problems  # worked out in this thread
-            return source
-
         jobs = self.options.jobs or processor_count()
         with self._progress as progress:
-            for source in read_all(self.files(), read, jobs, self._on_error):
+            for source in read_ahead(self.files(), self._read_plain, self._read, jobs):
+                if isinstance(source, OSError):
+                    self._on_error(source)
+                    continue
                 findings = self._findings(source)
                 if findings and self.console.is_terminal:
                     progress.clear()
                 yield source, findings
                 progress.show(self.tally)
+
+    def _read_plain(self, paths: list[str]) -> Iterator[Source | None]:
+        analyses = analyze_plain_files(
+            paths,
+            python=self._version,
+            false_hints=self.options.false_hints,
+            records=self._with_records,
+        )
+        for path, analysis in zip(paths, analyses, strict=True):
+            yield None if analysis is None else Source(path, analysis)
+
+    def _read(self, path: str) -> Source:
+        source = read_source(path, self.options, self._version)
+        analysis = source.analysis
+        _ = analysis.records if self._with_records else analysis.problems  # worked out in this thread
+        return source
 
     def end(self) -> ExitStatus:
         """Write what goes after all files, and give the exit status."""

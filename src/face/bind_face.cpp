@@ -29,8 +29,7 @@ CAnalysis MakeAnalysis(nb::bytes utf8, nb::str path, nb::str python, int version
         places.faults.push_back({start, end, message});
     }
     for (nb::handle offset : unreadable) places.offsets.push_back(nb::cast<uint32_t>(offset));
-    const bool is_known = version == CLanguage::kOldest || (version >= 300 && version <= CLanguage::kNewest);
-    if (!is_known) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
     CFileSettings settings;
     settings.version = version;
     settings.false_hints = false_hints;

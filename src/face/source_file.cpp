@@ -12,7 +12,23 @@ CSourceFile::CSourceFile(nb::bytes utf8, nb::str path, nb::str python, const CFi
       _fPython(std::move(python)),
       _fSettings(settings),
       _fUnreadable(std::move(unreadable)) {
-    if (_fUtf8.size() > kMaxTextSize) RaiseHost(PyExc_ValueError, "source is longer than 2 GB");
+    const nb::bytes bytes = nb::borrow<nb::bytes>(_fUtf8);
+    if (bytes.size() > kMaxTextSize) RaiseHost(PyExc_ValueError, "source is longer than 2 GB");
+    _fText = {bytes.c_str(), bytes.size()};
+}
+
+CSourceFile::CSourceFile(CPlainFile file, nb::str path, nb::str python, const CFileSettings& settings,
+                         std::unique_ptr<const CFileAnalysis> analysis)
+    : _fFile(std::move(file)),
+      _fText(_fFile.Text()),
+      _fPath(std::move(path)),
+      _fPython(std::move(python)),
+      _fSettings(settings) {
+    (settings.wants_records ? _fWithRecords : _fQuick) = std::move(analysis);
+}
+
+nb::bytes CSourceFile::Utf8() const {
+    return _fUtf8.is_valid() ? nb::borrow<nb::bytes>(_fUtf8) : BytesFromUtf8(_fText);
 }
 
 const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
@@ -21,9 +37,7 @@ const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>
     CFileSettings settings = _fSettings;
     settings.wants_records = wants_records;
     settings.wants_names = wants_names;
-    // Made before the interpreter's lock is given up: a process forked meanwhile would wait for it forever.
-    LanguageOf(settings.version);
-    if (settings.version < 300) LanguageOf(settings.version, true);
+    MakeLanguages(settings.version);
     std::unique_ptr<const CFileAnalysis> made;
     {
         const nb::gil_scoped_release released;
@@ -33,13 +47,18 @@ const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>
     return *kept;
 }
 
+void CSourceFile::MakeLanguages(int version) {
+    LanguageOf(version);
+    if (version < 300) LanguageOf(version, true);
+}
+
 const CRowIndex& CSourceFile::Rows() const {
     if (!_fRows) _fRows = std::make_unique<const CRowIndex>(Text());
     return *_fRows;
 }
 
 nb::str CSourceFile::HostText() const {
-    if (!_fHostText.is_valid()) _fHostText = nb::str(_fUtf8.c_str(), _fUtf8.size());
+    if (!_fHostText.is_valid()) _fHostText = nb::str(_fText.data(), _fText.size());
     return nb::borrow<nb::str>(_fHostText);
 }
 

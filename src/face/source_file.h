@@ -13,6 +13,7 @@
 
 #include <nanobind/nanobind.h>
 
+#include "face/plain_file.h"
 #include "file/file_analyzer.h"
 #include "file/row_index.h"
 
@@ -27,9 +28,12 @@ class CSourceFile {
     // Raises ValueError for a text that is too long.
     CSourceFile(nb::bytes utf8, nb::str path, nb::str python, const CFileSettings& settings,
                 CUnreadable unreadable);
+    // For a file that was read natively, with the result of a pass that was made as the settings say.
+    CSourceFile(CPlainFile file, nb::str path, nb::str python, const CFileSettings& settings,
+                std::unique_ptr<const CFileAnalysis> analysis);
 
-    std::string_view Text() const { return {_fUtf8.c_str(), _fUtf8.size()}; }
-    const nb::bytes& Utf8() const { return _fUtf8; }
+    std::string_view Text() const { return _fText; }
+    nb::bytes Utf8() const;
     const nb::str& Path() const { return _fPath; }
     const nb::str& Python() const { return _fPython; }
     int Version() const { return _fSettings.version; }
@@ -44,6 +48,10 @@ class CSourceFile {
     const CFileAnalysis& WithRecords() const { return _Analyzed(_fWithRecords, true); }
     const CTextNames& Names() const { return _Analyzed(_fWithNames, false, true).names; }
     const CSignatures& Signatures() const { return _Analyzed(_fWithNames, false, true).signatures; }
+
+    // What a pass needs is made while the interpreter's lock is held: a process that is forked while another
+    // thread makes it would wait for it forever.
+    static void MakeLanguages(int version);
 
     const CRowIndex& Rows() const;
     nb::str HostText() const;
@@ -60,7 +68,9 @@ class CSourceFile {
     const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
                                    bool wants_names = false) const;
 
-    nb::bytes _fUtf8;
+    nb::object _fUtf8;  // the text is in the host's bytes, or, if there are none,
+    CPlainFile _fFile;  // in a file that was read natively
+    std::string_view _fText;
     nb::str _fPath;
     nb::str _fPython;
     CFileSettings _fSettings;
