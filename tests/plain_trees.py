@@ -49,7 +49,7 @@ def Differences(text: str, version: str) -> Iterator[Difference]:
             if _IsMisplaced(line, language):
                 continue
             hosted = _HostedOutcome(line, logical.fInAsyncDef, language)
-            if plain != hosted:
+            if plain != hosted and not _IsTakenByGrammar(line, language, hosted, plain):
                 yield Difference(line.fToks, hosted, plain)
     assert next(plain_trees, None) is None
 
@@ -57,6 +57,12 @@ def Differences(text: str, version: str) -> Iterator[Difference]:
 def _IsMisplaced(line: CLogicalLine, language: Language) -> bool:
     """True where the hosted parser of 2.7 counts tokens from elsewhere, or stumbles over removed ones."""
     return not language.is_py3 and not {"match", "case"}.isdisjoint(line.fToks)
+
+
+def _IsTakenByGrammar(line: CLogicalLine, language: Language, hosted: Outcome, plain: Outcome) -> bool:
+    """True where the hosted parser of 2.7 refuses `with ():` or `type is x`, which the grammar takes."""
+    is_unusual = not language.is_py3 and not {"with", "type"}.isdisjoint(line.fToks[:2])
+    return is_unusual and hosted.fault is not None and plain.fault is None
 
 
 @cache

@@ -32,6 +32,7 @@ class CExtendedForms {
 
     void Reset() { _fFound = nullptr; }
     void Note(const CForm& form, nb::handle context);
+    bool IsNewer(const CForm& form) const { return form.version > _fVersion; }
 
     // True for nodes that NoteNode is to look at.
     bool AreWatched(int type) const {

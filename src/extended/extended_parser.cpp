@@ -117,14 +117,22 @@ CNodeRef CExtendedParser::_ParseMatchOrCase(const nb::tuple& toks, bool in_async
     return node;
 }
 
-// `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
+// `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name, and before
+// 3.10 it is none else.
 CNodeRef CExtendedParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def,
                                                 const CPositions& positions, Py_ssize_t word_i) {
+    const bool may_be_name = IsToken(toks, _FindNextNonSkipIndex(toks, word_i), "[");
+    if (may_be_name && _fForms.IsNewer(forms::kCase)) {
+        try {
+            return _ParseToksToNodeImpl(toks, in_async_def, positions);
+        } catch (const nb::python_error& error) {
+            if (!IsParseError(error)) throw;
+        }
+    }
     try {
         return CPGenParserImpl::_ParseSpecialCases(toks, in_async_def, positions);
     } catch (const nb::python_error& error) {
-        if (!IsParseError(error)) throw;
-        if (!IsToken(toks, _FindNextNonSkipIndex(toks, word_i), "[")) throw;
+        if (!IsParseError(error) || !may_be_name) throw;
         try {
             return _ParseToksToNodeImpl(toks, in_async_def, positions);
         } catch (const nb::python_error& second_error) {

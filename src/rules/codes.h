@@ -87,6 +87,7 @@ enum class ECode : uint16_t {
     kUnknownFeature = 330,
     kNonlocalInModule = 331,
     kLazyImportPlaced = 332,
+    kJumpOutOfFinally = 333,
 
     kCannotAssign = 401,
     kCannotDelete = 402,
@@ -140,14 +141,15 @@ enum class ECode : uint16_t {
     kFieldsTooDeep = 905,
 };
 
-// What no interpreter refuses: a type hint in a comment or in quotes, and what is too long for us.
+// What no interpreter refuses: a type hint in a comment or in quotes, what it only warns of, and what is too
+// long for us.
 constexpr bool IsWarning(ECode code) {
-    return code == ECode::kInvalidHint || code == ECode::kLineTooLong;
+    return code == ECode::kInvalidHint || code == ECode::kJumpOutOfFinally || code == ECode::kLineTooLong;
 }
 
 // A statement or an expression that stands where it may not.
 constexpr bool IsPlacement(ECode code) {
-    return code >= ECode::kOutsideFunction && code <= ECode::kLazyImportPlaced;
+    return code >= ECode::kOutsideFunction && code <= ECode::kJumpOutOfFinally;
 }
 
 }  // namespace codeloom

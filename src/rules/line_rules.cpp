@@ -42,10 +42,33 @@ void CheckLambda(const CRuleContext& context, const CTreeNode& lambda) {
         CheckParameters(context, *parameters);
 }
 
+//   for a in b if lambda: c    no version of the language from 3.9 on reads it
+void CheckCondition(const CRuleContext& context, const CTreeNode& condition) {
+    constexpr int kRefusesLambda = 309;
+    const CTreeNode* const expression = TryChild(context.tree, condition, 1, ENodeKind::kLambda);
+    if (expression != nullptr && context.language.version >= kRefusesLambda)
+        context.Report(ECode::kMissingToken, *expression,
+                       "a lambda must be parenthesized as the condition of a comprehension");
+}
+
 // One with `async` has the clause itself within.
 void CheckClause(const CRuleContext& context, const CTreeNode& clause) {
-    if (!HasWordAt(context.tree, clause, 0, EWord::kAsync))
-        CheckTarget(context, *CompClauseOf(context.tree, clause).target, ETargetUse::kAssign);
+    if (HasWordAt(context.tree, clause, 0, EWord::kAsync)) return;
+    const CCompClause parts = CompClauseOf(context.tree, clause);
+    CheckTarget(context, *parts.target, ETargetUse::kAssign);
+    if (parts.next != nullptr && HasWordAt(context.tree, *parts.next, 0, EWord::kIf))
+        CheckCondition(context, *parts.next);
+}
+
+// `if a: type X = int`, a body on the row of its header
+void CheckAliases(const CRuleContext& context) {
+    const CTree& tree = context.tree;
+    for (const CTreeNode& node : tree.NodesBelowRoot()) {
+        const bool is_alias = node.Is(ENodeKind::kExprStmt) && !node.IsLeaf() && node.token > 0 &&
+                              tree.Line().tokens[node.token - 1].word == EWord::kType;
+        if (is_alias && !tree.IsRoot(node))
+            CheckDeferred(context, ValueOfAssignment(tree, node), "a type alias");
+    }
 }
 
 void CheckNode(const CRuleContext& context, const CTreeNode& node) {
@@ -117,6 +140,7 @@ void CheckLine(const CTree& tree, const CLanguage& language, const CLineSetting&
     const bool is_alias = tree.Line().type == ELogicalType::kTypeStatement;
     if (is_alias && tree.fRoot.Is(ENodeKind::kExprStmt))
         CheckDeferred(context, ValueOfAssignment(tree, tree.fRoot), "a type alias");
+    if (!is_alias && tree.Line().MayHaveWords(WordBits(EWord::kType))) CheckAliases(context);
 }
 
 }  // namespace codeloom

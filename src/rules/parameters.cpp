@@ -1,16 +1,20 @@
 #include "rules/parameters.h"
 
+#include <algorithm>
+
 #include "rules/expression_kinds.h"
 #include "rules/name_set.h"
 #include "rules/targets.h"
 #include "syntax/atoms.h"
 #include "syntax/definitions.h"
 #include "syntax/statements.h"
+#include "tokenizer/keywords.h"
 
 namespace codeloom {
 
 namespace {
 
+constexpr std::string_view kAnnotation = "an annotation";
 constexpr std::string_view kGeneric = "the definition of a generic";
 
 class CDeferredCheck {
@@ -67,7 +71,28 @@ CTypeParameterParts PartsOfTypeParameter(const CTree& tree, const CTreeNode& par
     return {spec, nullptr};
 }
 
+// What the parser leaves to the rules: it takes any word for a name, and any statement for a bound. False
+// after a fault.
+bool CheckPartsAreSound(const CRuleContext& context, const CTreeNode& name,
+                        const CTypeParameterParts& parts) {
+    if (context.language.IsKeyword(name.word)) {
+        const std::string_view word = context.tree.Text(name);
+        context.Report(ECode::kKeywordAsName, name,
+                       Joined("'", word, "' is a keyword and can't be used as a name"));
+        return false;
+    }
+    for (const CTreeNode* const part : {parts.bound, parts.value}) {
+        if (part == nullptr || (part->Is(ENodeKind::kExpression) && !IsStatementWord(part->word))) continue;
+        context.Report(ECode::kMissingExpression, *part,
+                       Joined("expected an expression after '", part == parts.bound ? ":" : "=", "'"));
+        return false;
+    }
+    return true;
+}
+
 void CheckBound(const CRuleContext& context, const CTreeNode& bound, EStars stars) {
+    if (bound.Is(ENodeKind::kStar))
+        return context.Report(ECode::kMisplacedStar, bound, "can't use starred expression here");
     const bool is_tuple = KindOfExpression(context.tree, bound) == EExpression::kTuple;
     if (stars != EStars::kNone)
         return context.Report(
@@ -82,6 +107,26 @@ void ForEachAnnotation(const CTree& tree, const CTreeNode& function, Visit visit
         if (parameter.type_expr != nullptr) visit(*parameter.type_expr);
     });
     if (const CTreeNode* const result = ReturnTypeOfFuncdef(tree, function)) visit(*result);
+}
+
+template <class Visit>
+void ForEachAnnotationBelow(const CTree& tree, Visit visit) {
+    const auto visit_statement = [&](const CTreeNode& node) {
+        if (node.IsLeaf()) return;
+        if (node.Is(ENodeKind::kFuncdef)) ForEachAnnotation(tree, node, visit);
+        if (node.Is(ENodeKind::kAnnotatedAssign)) visit(HintOfAnnotatedAssign(tree, node));
+    };
+    visit_statement(tree.fRoot);
+    if (tree.HasKind(ENodeKind::kFuncdef) || tree.HasKind(ENodeKind::kAnnotatedAssign))
+        for (const CTreeNode& node : tree.NodesBelowRoot())
+            if (!tree.IsRoot(node)) visit_statement(node);
+}
+
+bool MayBeWrongInAnnotation(const CRawLogical& embedded) {
+    if (embedded.type != ELogicalType::kFstringFieldExp) return false;
+    return embedded.MayHaveWords(WordBits(EWord::kYield, EWord::kAwait)) ||
+           std::any_of(embedded.tokens.begin(), embedded.tokens.end(),
+                       [](const CRawToken& token) { return token.type == kTokenId_COLONEQUAL; });
 }
 
 // Annotations, bases and an alias's value are evaluated where the type parameters are known.
@@ -109,23 +154,41 @@ void CheckAnnotations(const CRuleContext& context) {
     const bool may_be_wrong = tree.Line().MayHaveWords(WordBits(EWord::kYield, EWord::kAwait)) ||
                               tree.HasKind(ENodeKind::kNamedExpr) || tree.HasKind(ENodeKind::kUsedArgument);
     if (!may_be_wrong) return;
-    const auto check = [&](const CTreeNode& annotation) {
-        CheckDeferred(context, annotation, "an annotation");
-    };
-    const auto check_statement = [&](const CTreeNode& node) {
-        if (node.IsLeaf()) return;
-        if (node.Is(ENodeKind::kFuncdef)) ForEachAnnotation(tree, node, check);
-        if (node.Is(ENodeKind::kAnnotatedAssign)) check(HintOfAnnotatedAssign(tree, node));
-    };
-    check_statement(tree.fRoot);
-    if (tree.HasKind(ENodeKind::kFuncdef) || tree.HasKind(ENodeKind::kAnnotatedAssign))
-        for (const CTreeNode& node : tree.NodesBelowRoot())
-            if (!tree.IsRoot(node)) check_statement(node);
+    ForEachAnnotationBelow(
+        tree, [&](const CTreeNode& annotation) { CheckDeferred(context, annotation, kAnnotation); });
 }
 
-void CheckParameters(const CRuleContext& context, const CTreeNode& parameters) {
-    CNameSet names;
+std::vector<CSpan> AnnotationsWithFields(const CTree& tree) {
+    std::vector<CSpan> found;
+    if (std::any_of(tree.Line().embedded.begin(), tree.Line().embedded.end(), MayBeWrongInAnnotation))
+        ForEachAnnotationBelow(
+            tree, [&](const CTreeNode& annotation) { found.push_back(SpanOf(tree, annotation)); });
+    return found;
+}
+
+void CheckFieldInAnnotation(const CRuleContext& context) {
+    CheckDeferred(context, context.tree.fRoot, kAnnotation);
+}
+
+namespace {
+
+//   (a)=1    Python 2 has parameters in parentheses, but one name alone can't have a default
+void CheckDefaults(const CRuleContext& context, const CTreeNode& list) {
+    const CTree& tree = context.tree;
+    for (uint32_t i = 0; i + 1 < list.child_count; ++i) {
+        const CTreeNode& child = tree.Child(list, i);
+        if (!child.Is(ENodeKind::kParameterDef) || !HasTokenAt(tree, list, i + 1, kTokenId_EQUAL)) continue;
+        const CTreeNode* const nested = PartsOfParameter(tree, child).nested;
+        if (nested != nullptr && !nested->Is(ENodeKind::kDefiningArglist))
+            context.Report(ECode::kParenthesizedParameter, child, "parenthesized arg with default");
+    }
+}
+
+// Those in parentheses have names too.
+void CheckNames(const CRuleContext& context, const CTreeNode& parameters, CNameSet& names, int depth) {
+    if (depth > CRuleContext::kMaxDepth) return;
     ForEachParameter(context.tree, parameters, [&](const CParameter& parameter) {
+        if (parameter.nested != nullptr) return CheckNames(context, *parameter.nested, names, depth + 1);
         if (parameter.name == nullptr) return;
         CheckBoundName(context, *parameter.name);
         const std::string_view name = context.tree.Text(*parameter.name);
@@ -133,6 +196,17 @@ void CheckParameters(const CRuleContext& context, const CTreeNode& parameters) {
             context.Report(ECode::kRepeatedParameter, *parameter.name,
                            Joined("duplicate argument '", name, "' in function definition"));
     });
+}
+
+}  // namespace
+
+void CheckParameters(const CRuleContext& context, const CTreeNode& parameters) {
+    CNameSet names;
+    CheckNames(context, parameters, names, 0);
+    if (context.language.IsPython3()) return;
+    const bool is_list = !parameters.Is(ENodeKind::kParameters);
+    if (is_list || parameters.child_count > 2)
+        CheckDefaults(context, is_list ? parameters : context.tree.Child(parameters, 1));
 }
 
 void CheckTypeParameters(const CRuleContext& context, const CTreeNode& statement) {
@@ -143,6 +217,7 @@ void CheckTypeParameters(const CRuleContext& context, const CTreeNode& statement
         const CTreeNode& name = NameOfTypeParameter(tree, parameter);
         const EStars stars = StarsOfTypeParameter(tree, parameter);
         const CTypeParameterParts parts = PartsOfTypeParameter(tree, parameter);
+        if (!CheckPartsAreSound(context, name, parts)) continue;
         if (!names.Add(tree.Text(name)))
             context.Report(ECode::kRepeatedTypeParameter, name,
                            Joined("duplicate type parameter '", tree.Text(name), "'"));

@@ -6,8 +6,10 @@
 #include <string_view>
 
 #include "rules/fields.h"
+#include "rules/lazy_imports.h"
 #include "syntax/atoms.h"
 #include "syntax/expressions.h"
+#include "syntax/forms.h"
 #include "syntax/imports.h"
 #include "syntax/statements.h"
 
@@ -20,6 +22,9 @@ using EComprehension = CPlacement::EComprehension;
 
 // Deeper than any text that the interpreter takes.
 constexpr int kMaxDepth = 400;
+
+constexpr std::string_view kOutOfExceptStar =
+    "'break', 'continue' and 'return' cannot appear in an except* block";
 
 // Words without which a line has nothing that depends on its place.
 constexpr uint64_t kWordsOfInterest =
@@ -57,71 +62,11 @@ bool IsDocstring(const CRawLogical& logical, const CLanguage& language) {
     return !language.IsPython3() || !(HasFields(text) || IsBytesText(text));
 }
 
-bool IsFutureImport(const CTree& tree, const CTreeNode& statement) {
-    if (!statement.Is(ENodeKind::kFromImport)) return false;
-    const std::span<const CTreeNode> module = ModuleOfFromImport(tree, statement);
-    return module.size() == 1 && tree.Text(module[0]) == "__future__";
-}
-
 // What the blocks around a line allow in it.
 CPlacement PlacementIn(const std::vector<CBlock>& blocks) {
     CPlacement place;
-    for (const CBlock& block : blocks) {
-        switch (block.clause) {
-            case EClause::kDef:
-                place = {.scope = EScope::kFunction};
-                break;
-            case EClause::kAsyncDef:
-                place = {.scope = EScope::kAsyncFunction};
-                break;
-            case EClause::kClass:
-                place = {.scope = EScope::kClass};
-                break;
-            case EClause::kFor:
-            case EClause::kAsyncFor:
-            case EClause::kWhile:
-                place.in_loop = true;
-                place.in_except_star = place.in_finally = false;
-                break;
-            case EClause::kExceptStar:
-                place.in_except_star = true;
-                break;
-            case EClause::kFinally:
-                place.in_finally = true;
-                break;
-            default:
-                break;
-        }
-    }
+    for (const CBlock& block : blocks) place.Enter(block.clause);
     return place;
-}
-
-// Empty where nothing does.
-std::string_view WhatForbidsLazyImport(const std::vector<CBlock>& blocks) {
-    std::string_view found;
-    for (const CBlock& block : blocks) {
-        switch (block.clause) {
-            case EClause::kDef:
-            case EClause::kAsyncDef:
-                return "functions";
-            case EClause::kClass:
-                return "classes";
-            case EClause::kTry:
-            case EClause::kExcept:
-            case EClause::kBareExcept:
-            case EClause::kExceptStar:
-            case EClause::kFinally:
-                found = "try/except blocks";
-                break;
-            case EClause::kWith:
-            case EClause::kAsyncWith:
-                found = "with blocks";
-                break;
-            default:
-                break;
-        }
-    }
-    return found;
 }
 
 bool IsAsyncScope(EScope scope) {
@@ -136,6 +81,34 @@ std::string Outside(std::string_view what, const CPlacement& place) {
 
 }  // namespace
 
+void CPlacement::Enter(EClause clause) {
+    switch (clause) {
+        case EClause::kDef:
+            *this = {.scope = EScope::kFunction};
+            break;
+        case EClause::kAsyncDef:
+            *this = {.scope = EScope::kAsyncFunction};
+            break;
+        case EClause::kClass:
+            *this = {.scope = EScope::kClass};
+            break;
+        case EClause::kFor:
+        case EClause::kAsyncFor:
+        case EClause::kWhile:
+            in_loop = true;
+            left_by_jump = {};
+            break;
+        case EClause::kExceptStar:
+            left_by_return.except_star = left_by_jump.except_star = true;
+            break;
+        case EClause::kFinally:
+            left_by_return.finally = left_by_jump.finally = true;
+            break;
+        default:
+            break;
+    }
+}
+
 void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const CBlockTracker& blocks) {
     const bool is_lazy = logical.tokens.front().word == EWord::kLazy;
     const bool is_future = tree != nullptr && !is_lazy && IsFutureImport(*tree, tree->fRoot);
@@ -149,11 +122,11 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
     _fHasStatement = true;
     if (tree == nullptr || tree->fIsEmpty || !logical.MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt())
         return;
-    if (is_lazy) _CheckLazyImport(tree->fRoot, blocks);
+    if (logical.MayHaveWords(WordBits(EWord::kLazy))) CheckLazyImports(*tree, blocks, _fProblems);
     CPlacement place = PlacementIn(blocks.Blocks());
     // A body on the row of its header.
-    place.in_except_star |= blocks.Head().clause == EClause::kExceptStar;
-    place.in_finally |= blocks.Head().clause == EClause::kFinally;
+    const EClause header = blocks.Head().clause;
+    if (header == EClause::kExceptStar || header == EClause::kFinally) place.Enter(header);
     if (IsPlainReturn(*tree)) return _CheckReturn(tree->fRoot, place);
     _Visit(tree->fRoot, place);
 }
@@ -165,7 +138,7 @@ void CPlacementRules::CheckEmbedded(const CTree& tree, const CBlockTracker& bloc
 }
 
 void CPlacementRules::_TrackFunctions(const std::vector<CBlock>& blocks) {
-    const auto is_under_way = [&](const CAsyncFunction& function) {
+    const auto is_under_way = [&](const CStrictFunction& function) {
         return function.block_i < blocks.size() &&
                blocks[function.block_i].header.start == function.header_start;
     };
@@ -174,21 +147,32 @@ void CPlacementRules::_TrackFunctions(const std::vector<CBlock>& blocks) {
         _fFunctions.pop_back();
     }
     size_t block_i = _fFunctions.empty() ? 0 : _fFunctions.back().block_i + 1;
-    for (; block_i < blocks.size(); ++block_i)
-        if (blocks[block_i].clause == EClause::kAsyncDef)
-            _fFunctions.push_back({block_i, blocks[block_i].header.start, {}, {}});
+    for (; block_i < blocks.size(); ++block_i) {
+        const EClause clause = blocks[block_i].clause;
+        const bool is_strict = (clause == EClause::kAsyncDef && _IsStrict(EScope::kAsyncFunction)) ||
+                               (clause == EClause::kDef && _IsStrict(EScope::kFunction));
+        if (is_strict) _fFunctions.push_back({block_i, blocks[block_i].header.start, {}, {}});
+    }
 }
 
-void CPlacementRules::_EndFunction(const CAsyncFunction& function) {
+// Any generator before 3.3 (PEP 380).
+bool CPlacementRules::_IsStrict(EScope scope) const {
+    return IsAsyncScope(scope) ||
+           (scope == EScope::kFunction && _fLanguage.version < forms::kReturnInGenerator.version);
+}
+
+void CPlacementRules::_EndFunction(const CStrictFunction& function) {
     const CSpan& value = function.first_return;
     const CSpan& yield = function.first_yield;
     if (value.start == value.end || yield.start == yield.end) return;
-    _fProblems.push_back({ECode::kReturnInAsyncGenerator,
-                          value.start,
-                          value.end,
-                          "'return' with value in async generator",
-                          {},
-                          {{yield.start, yield.end, "makes the function a generator"}}});
+    const bool is_old = _IsStrict(EScope::kFunction);
+    _fProblems.push_back(
+        {is_old ? ECode::kNewerForm : ECode::kReturnInAsyncGenerator,
+         value.start,
+         value.end,
+         is_old ? MessageOf(forms::kReturnInGenerator) : "'return' with value in async generator",
+         {},
+         {{yield.start, yield.end, "makes the function a generator"}}});
 }
 
 // Imports of features come first in a file, after its docstring.
@@ -303,14 +287,20 @@ void CPlacementRules::_VisitAsync(const CTreeNode& node, const CPlacement& place
 void CPlacementRules::_VisitDefinition(const CTreeNode& node, const CPlacement& place, EScope body_scope) {
     const std::span<const CTreeNode> children = _fTree->Children(node);
     for (const CTreeNode& child : children.first(children.size() - 1)) _Visit(child, place);
+    const bool is_strict = _IsStrict(body_scope);
+    constexpr size_t kOnItsRow = SIZE_MAX;
+    if (is_strict) _fFunctions.push_back({kOnItsRow, 0, {}, {}});
     _Visit(children.back(), {.scope = body_scope, .depth = place.depth});
+    if (!is_strict) return;
+    _EndFunction(_fFunctions.back());
+    _fFunctions.pop_back();
 }
 
 // `for` and `while`: the body comes after the first colon, and that of `else` is outside the loop.
 void CPlacementRules::_VisitLoop(const CTreeNode& node, const CPlacement& place) {
     CPlacement body = place;
     body.in_loop = true;
-    body.in_except_star = body.in_finally = false;
+    body.left_by_jump = {};
     int colon_count = 0;
     for (const CTreeNode& child : _fTree->Children(node)) {
         colon_count += IsToken(child, kTokenId_COLON);
@@ -381,8 +371,9 @@ void CPlacementRules::_VisitComprehension(const CTreeNode& node, const CPlacemen
 void CPlacementRules::_CheckReturn(const CTreeNode& node, const CPlacement& place) {
     const CSpan span = SpanOf(*_fTree, node);
     if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'return' outside function");
-    if (place.in_except_star) return _ReportInExceptStar(span);
-    if (IsAsyncScope(place.scope) && !node.IsLeaf() && !_fFunctions.empty() &&
+    if (_CheckWayOut(place.left_by_return, span, "return")) return;
+    const bool has_value = !node.IsLeaf();
+    if (has_value && _IsStrict(place.scope) && !_fFunctions.empty() &&
         _fFunctions.back().first_return.end == 0)
         _fFunctions.back().first_return = span;
 }
@@ -394,8 +385,8 @@ void CPlacementRules::_CheckYield(const CTreeNode& node, const CPlacement& place
         place.comprehension != EComprehension::kNone && _fLanguage.version < kRefusesInComprehension;
     if (is_in_own_scope && _fLanguage.IsPython3()) return;
     if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'yield' outside function");
-    if (!IsAsyncScope(place.scope)) return;
-    if (!node.IsLeaf() && IsYieldFrom(*_fTree, node))
+    if (!_IsStrict(place.scope) || place.comprehension == EComprehension::kGenerator) return;
+    if (IsAsyncScope(place.scope) && !node.IsLeaf() && IsYieldFrom(*_fTree, node))
         return _Report(ECode::kYieldFromInAsync, span, "'yield from' inside async function");
     if (!_fFunctions.empty() && _fFunctions.back().first_yield.end == 0)
         _fFunctions.back().first_yield = span;
@@ -431,12 +422,14 @@ void CPlacementRules::_CheckAwait(const CTreeNode& leaf, const CPlacement& place
 void CPlacementRules::_CheckJump(const CTreeNode& leaf, const CPlacement& place) {
     const CSpan span = SpanOf(*_fTree, leaf);
     const bool is_break = leaf.word == EWord::kBreak;
-    if (place.in_except_star) return _ReportInExceptStar(span);
+    if (place.in_loop && _CheckWayOut(place.left_by_jump, span, TextOfWord(leaf.word))) return;
+    if (!place.in_loop && place.left_by_jump.except_star)
+        return _Report(ECode::kJumpOutOfExceptStar, span, std::string(kOutOfExceptStar));
     if (!place.in_loop)
         return _Report(ECode::kOutsideLoop, span,
                        is_break ? "'break' outside loop" : "'continue' not properly in loop");
     constexpr int kAllowsContinueInFinally = 308;
-    if (!is_break && place.in_finally && _fLanguage.version < kAllowsContinueInFinally)
+    if (!is_break && place.left_by_jump.finally && _fLanguage.version < kAllowsContinueInFinally)
         _Report(ECode::kContinueInFinally, span, "'continue' not supported inside 'finally' clause");
 }
 
@@ -448,34 +441,22 @@ void CPlacementRules::_CheckImportStar(const CTreeNode& node, const CPlacement& 
                 "import * only allowed at module level");
 }
 
-// Module level only, and nowhere where an exception of the import is expected (PEP 810).
-void CPlacementRules::_CheckLazyImport(const CTreeNode& node, const CBlockTracker& blocks) {
-    const bool is_from = node.Is(ENodeKind::kFromImport);
-    if (!is_from && !node.Is(ENodeKind::kImportNames)) return;
-    const std::string_view around = WhatForbidsLazyImport(blocks.Blocks());
-    std::string message;
-    if (!around.empty()) {
-        message.append("lazy import not allowed inside ").append(around);
-    } else if (is_from && StarOfFromImport(*_fTree, node) != nullptr) {
-        message = "lazy from ... import * is not allowed";
-    } else if (IsFutureImport(*_fTree, node)) {
-        message = "lazy from __future__ import is not allowed";
-    } else {
-        return;
-    }
-    const CRawToken& lazy = _fTree->Line().tokens.front();
-    _Report(ECode::kLazyImportPlaced, {lazy.start, lazy.start + lazy.length}, std::move(message));
-}
-
 void CPlacementRules::_CheckNonlocal(const CTreeNode& node, const CPlacement& place) {
     if (place.scope == EScope::kModule)
         _Report(ECode::kNonlocalInModule, SpanOf(*_fTree, node),
                 "nonlocal declaration not allowed at module level");
 }
 
-void CPlacementRules::_ReportInExceptStar(const CSpan& span) {
-    _Report(ECode::kJumpOutOfExceptStar, span,
-            "'break', 'continue' and 'return' cannot appear in an except* block");
+// True for one that is refused. One out of `finally` is only doubtful, since 3.14 (PEP 765).
+bool CPlacementRules::_CheckWayOut(const CPlacement::CLeft& left, const CSpan& span, std::string_view word) {
+    constexpr int kWarnsOfFinally = 314;
+    if (left.except_star) {
+        _Report(ECode::kJumpOutOfExceptStar, span, std::string(kOutOfExceptStar));
+    } else if (left.finally && _fLanguage.version >= kWarnsOfFinally) {
+        std::string message = "'";
+        _Report(ECode::kJumpOutOfFinally, span, message.append(word).append("' in a 'finally' block"));
+    }
+    return left.except_star;
 }
 
 void CPlacementRules::_ReportAsyncDisplay(const CPlacement& place) {

@@ -21,10 +21,16 @@ struct CPlacement {
     enum class EScope : uint8_t { kModule, kClass, kFunction, kAsyncFunction, kLambda };
     enum class EComprehension : uint8_t { kNone, kDisplay, kGenerator };
 
+    // Blocks that a way out goes through.
+    struct CLeft {
+        bool except_star = false;
+        bool finally = false;
+    };
+
     EScope scope = EScope::kModule;
     bool in_loop = false;
-    bool in_except_star = false;  // nearer than the loop and the function
-    bool in_finally = false;      // nearer than the loop
+    CLeft left_by_return = {};  // up to the function
+    CLeft left_by_jump = {};    // up to the loop
     int depth = 0;
 
     // The innermost comprehension, and the one to blame where it is asynchronous: null where it may be.
@@ -36,6 +42,7 @@ struct CPlacement {
     bool in_first_clause = false;
 
     bool IsInFunction() const { return scope >= EScope::kFunction; }
+    void Enter(EClause clause);
 };
 
 class CPlacementRules {
@@ -64,8 +71,8 @@ class CPlacementRules {
     void Finish() { _TrackFunctions({}); }
 
   private:
-    // A function whose body is under way.
-    struct CAsyncFunction {
+    // A function whose body is under way and must not both yield and return a value.
+    struct CStrictFunction {
         size_t block_i;  // of its body among the blocks around a line
         uint32_t header_start = 0;
         CSpan first_yield;   // empty where it has none
@@ -73,7 +80,8 @@ class CPlacementRules {
     };
 
     void _TrackFunctions(const std::vector<CBlock>& blocks);
-    void _EndFunction(const CAsyncFunction& function);
+    void _EndFunction(const CStrictFunction& function);
+    bool _IsStrict(CPlacement::EScope scope) const;
     void _CheckFuture(const CTreeNode& statement, const CBlockTracker& blocks);
     void _CheckFeature(const CTreeNode& name);
     void _Visit(const CTreeNode& node, CPlacement place);
@@ -95,16 +103,15 @@ class CPlacementRules {
     void _CheckAwait(const CTreeNode& leaf, const CPlacement& place);
     void _CheckJump(const CTreeNode& leaf, const CPlacement& place);
     void _CheckImportStar(const CTreeNode& node, const CPlacement& place);
-    void _CheckLazyImport(const CTreeNode& node, const CBlockTracker& blocks);
     void _CheckNonlocal(const CTreeNode& node, const CPlacement& place);
-    void _ReportInExceptStar(const CSpan& span);
+    bool _CheckWayOut(const CPlacement::CLeft& left, const CSpan& span, std::string_view word);
     void _ReportAsyncDisplay(const CPlacement& place);
     void _Report(ECode code, const CSpan& span, std::string message);
 
     const CLanguage& _fLanguage;
     CProblems& _fProblems;
     const CTree* _fTree = nullptr;
-    std::vector<CAsyncFunction> _fFunctions;  // by depth; only those whose body is under way
+    std::vector<CStrictFunction> _fFunctions;  // by depth; only those whose body is under way
     bool _fIsPastFutures = false;
     bool _fHasStatement = false;  // something came before
     bool _fHasFutures = false;    // an import from `__future__` did

@@ -4,6 +4,7 @@
 #include <span>
 
 #include "text/token_type.h"
+#include "tokenizer/keywords.h"
 
 namespace codeloom {
 
@@ -112,6 +113,18 @@ uint32_t CountWithItems(const CRawLogical& logical) {
     return is_in_parentheses ? count_inside : count_outside;
 }
 
+// `case [x]: y`, of which the tokens from `token_i` on come after the first word.
+bool MayBeAnnotation(std::span<const CRawToken> tokens, size_t token_i) {
+    const CRawToken* token = NextSignificant(tokens, token_i);
+    if (token == nullptr || token->type != kTokenId_LSQB) return false;
+    for (int depth = 0; token != nullptr; token = NextSignificant(tokens, token_i)) {
+        depth += IsOpenerType(token->type) - IsCloserType(token->type);
+        if (depth == 0 && token->type == kTokenId_COLON) break;
+    }
+    const CRawToken* const annotation = NextSignificant(tokens, token_i);
+    return annotation != nullptr && !IsStatementWord(annotation->word);
+}
+
 }  // namespace
 
 CStatementHead ReadStatementHead(const CRawLogical& logical) {
@@ -133,10 +146,7 @@ CStatementHead ReadStatementHead(const CRawLogical& logical) {
     } else {
         head.clause = ClauseOfWord(first->word);
     }
-    if (head.clause == EClause::kCase && !head.ends_in_colon) {
-        const CRawToken* const next = NextSignificant(logical.tokens, token_i);
-        head.may_be_annotation = next != nullptr && next->type == kTokenId_LSQB;
-    }
+    if (head.clause == EClause::kCase) head.may_be_annotation = MayBeAnnotation(logical.tokens, token_i);
     if (head.clause == EClause::kWith || head.clause == EClause::kAsyncWith)
         head.with_item_count = CountWithItems(logical);
     for (size_t last_i = logical.tokens.size(); last_i-- > 0;) {

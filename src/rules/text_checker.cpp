@@ -4,6 +4,7 @@
 
 #include "rules/line_rules.h"
 #include "rules/literals.h"
+#include "rules/parameters.h"
 #include "rules/patterns.h"
 
 namespace codeloom {
@@ -48,16 +49,27 @@ void CTextChecker::Enter(const CRawLogical& logical) {
 }
 
 void CTextChecker::Take(const CRawLogical& part, const CTree& tree) {
-    if (!IsHint(part)) CheckLine(tree, _fLanguage, _Setting(tree), _fProblems);
+    const CLineSetting setting = _Setting(tree);
+    if (!IsHint(part)) CheckLine(tree, _fLanguage, setting, _fProblems);
     if (&part == _fLine) {
+        _fAnnotations.clear();
+        if (setting.defers_annotations && !part.embedded.empty()) _fAnnotations = AnnotationsWithFields(tree);
         _fPlacement.Check(part, &tree, _fBlocks);
         if (!tree.fIsEmpty && _fProblems.size() == _fFirstProblem)
             if (const CTreeNode* const name = TakesAllCases(tree, tree.fRoot))
                 _fBlocks.TakeAllCases(SpanOf(tree, *name));
     } else {
         _fPlacement.CheckEmbedded(tree, _fBlocks);
+        if (!_fAnnotations.empty()) _CheckField(part, tree);
     }
     DropNested(_fProblems, _fFirstProblem);
+}
+
+void CTextChecker::_CheckField(const CRawLogical& part, const CTree& tree) {
+    const uint32_t start = part.StartOf(part.tokens.front());
+    const auto holds = [&](const CSpan& span) { return span.start <= start && start < span.end; };
+    if (std::any_of(_fAnnotations.begin(), _fAnnotations.end(), holds))
+        CheckFieldInAnnotation({tree, _fLanguage, _fProblems});
 }
 
 CLineSetting CTextChecker::_Setting(const CTree& tree) const {

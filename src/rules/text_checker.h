@@ -1,6 +1,8 @@
 // The rules for one text: what is around its lines, and what may stand where.
 #pragma once
 
+#include <vector>
+
 #include "rules/blocks.h"
 #include "rules/line_rules.h"
 #include "rules/placement.h"
@@ -32,6 +34,7 @@ class CTextChecker final : public CTreeObserver {
 
   private:
     CLineSetting _Setting(const CTree& tree) const;
+    void _CheckField(const CRawLogical& part, const CTree& tree);
 
     const CLanguage& _fLanguage;
     CProblems& _fProblems;
@@ -40,6 +43,7 @@ class CTextChecker final : public CTreeObserver {
     const CRawLogical* _fLine = nullptr;  // under way
     size_t _fFirstProblem = 0;            // of what its trees show
     CSpan _fLastToken;                    // of the last line
+    std::vector<CSpan> _fAnnotations;     // of the line, where they hold fields to check
 };
 
 }  // namespace codeloom

@@ -20,6 +20,7 @@ inline constexpr CForm kUnicodeName{"a name with other than ASCII letters", 300}
 inline constexpr CForm kUnicodePrefix{"the prefix `u` of a string", 303};
 inline constexpr CForm kRawBytes{"the prefix `rb` of bytes", 303};
 inline constexpr CForm kYieldFrom{"`yield from`", 303};
+inline constexpr CForm kReturnInGenerator{"a value returned by a generator", 303};
 inline constexpr CForm kAsync{"`async`", 305};
 inline constexpr CForm kMatrixProduct{"`@` as an operator", 305};
 inline constexpr CForm kUnpackingInCall{"unpacking in a call anywhere but once at the end", 305};

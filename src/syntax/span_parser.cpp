@@ -25,8 +25,28 @@ CParsed CSpanParser::_ParseNewestForms(const CTokenSpan& span, uint32_t token_i)
     return _fStatementParser.Parse(span.Without(ranges), *_fTree);
 }
 
-// None when the grammar takes the statement that begins at `i`.
+// In Python 2 each of the words may be a name, and parentheses after `with` are part of an expression.
 CParsed CSpanParser::_ParseBeyondGrammar(const CTokenSpan& span, uint32_t i) {
+    if (_fLanguage.has_newer_statements) return _ParseUnusual(span, i);
+    return _ParseOrByGrammar(span, [&] { return _ParseUnusual(span, i); });
+}
+
+// What the grammar takes isn't refused.
+template <class TParse>
+CParsed CSpanParser::_ParseOrByGrammar(const CTokenSpan& span, TParse parse) {
+    try {
+        return parse();
+    } catch (const CRefusal&) {
+        try {
+            return ParseByGrammar(span);
+        } catch (const CRefusal&) {  // the first one counts
+        }
+        throw;
+    }
+}
+
+// None when the grammar takes the statement that begins at `i`.
+CParsed CSpanParser::_ParseUnusual(const CTokenSpan& span, uint32_t i) {
     switch (span.Token(i).word) {
         case EWord::kWith:
             return _ParseWith(span, i);
@@ -100,7 +120,18 @@ void CSpanParser::_RefuseTypesWithTarget(const CTokenSpan& span, uint32_t except
 
 CParsed CSpanParser::_ParseMatchOrCase(const CTokenSpan& span, uint32_t word_i) {
     if (!_fLanguage.has_newer_statements) return _ParseMatchOrCaseAlone(span, word_i);
-    const CParsed node = _ParseMatchCaseOrName(span, word_i);
+    const bool may_be_name = span.IsType(span.Next(word_i), kTokenId_LSQB);
+    if (may_be_name && _fLanguage.forms_version < forms::kCase.version) {
+        // An annotation, unless a block follows.
+        try {
+            return ParseByGrammar(span);
+        } catch (const CRefusal&) {
+        }
+    }
+    // `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
+    const CParsed node = may_be_name
+                             ? _ParseOrByGrammar(span, [&] { return _ParseMatchOrCaseAlone(span, word_i); })
+                             : _ParseMatchOrCaseAlone(span, word_i);
     if (node && node->Is(ENodeKind::kMatch)) _fForms.Note(forms::kMatch, word_i);
     if (node && node->Is(ENodeKind::kCase)) _fForms.Note(forms::kCase, word_i);
     return node;
@@ -109,20 +140,6 @@ CParsed CSpanParser::_ParseMatchOrCase(const CTokenSpan& span, uint32_t word_i) 
 CParsed CSpanParser::_ParseMatchOrCaseAlone(const CTokenSpan& span, uint32_t word_i) {
     return span.IsWord(word_i, EWord::kMatch) ? _fMatchCaseParser.ParseMatch(span)
                                               : _fMatchCaseParser.ParseCase(span);
-}
-
-// `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name.
-CParsed CSpanParser::_ParseMatchCaseOrName(const CTokenSpan& span, uint32_t word_i) {
-    try {
-        return _ParseMatchOrCaseAlone(span, word_i);
-    } catch (const CRefusal&) {
-        if (!span.IsType(span.Next(word_i), kTokenId_LSQB)) throw;
-        try {
-            return ParseByGrammar(span);
-        } catch (const CRefusal&) {  // the first one counts
-        }
-        throw;
-    }
 }
 
 // Refuses what makes more of a node than one expression: a comma, a comprehension, `=`, `yield`, `*`.

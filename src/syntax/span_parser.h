@@ -73,6 +73,9 @@ class CSpanParser {
     // In a body after its header the grammar doesn't know an alias, and stumbles over its name.
     CParsed _ParseAfterRefusal(const CTokenSpan& span, uint32_t token_i);
     CParsed _ParseBeyondGrammar(const CTokenSpan& span, uint32_t i);
+    CParsed _ParseUnusual(const CTokenSpan& span, uint32_t i);
+    template <class TParse>
+    CParsed _ParseOrByGrammar(const CTokenSpan& span, TParse parse);
     CParsed _ParseNewestForms(const CTokenSpan& span, uint32_t token_i);
     CParsed _ParseAsync(const CTokenSpan& span, uint32_t async_i);
     CParsed _ParseExcept(const CTokenSpan& span, uint32_t except_i);
@@ -82,7 +85,6 @@ class CSpanParser {
     CParsed _ParseDecorator(const CTokenSpan& span, uint32_t at_i);
     bool _FitsDecoratorRule(const CTokenSpan& span, uint32_t at_i) const;
     CParsed _ParseMatchOrCase(const CTokenSpan& span, uint32_t word_i);
-    CParsed _ParseMatchCaseOrName(const CTokenSpan& span, uint32_t word_i);
     CParsed _ParseMatchOrCaseAlone(const CTokenSpan& span, uint32_t word_i);
 
     CParsed _ParseWithTypeParameters(const CTokenSpan& span, uint32_t word_i);
