@@ -20,6 +20,7 @@ COMMANDS = {
     "names": ("names", "NamesCommand", "list what each line reads and binds"),
     "hints": ("hints", "HintsCommand", "list each def with the types of its arguments and results"),
     "tree": ("tree", "TreeCommand", "print the syntax tree of a line"),
+    "serve": ("serve", "ServeCommand", "serve an editor by the language server protocol"),
     "explain": ("explain", "ExplainCommand", "explain the code of a problem, with examples"),
     "completion": ("completion", "CompletionCommand", "print a script that completes commands in your shell"),
 }

@@ -1,0 +1,32 @@
+"""`codeloom serve`: a language server for editors."""
+
+import argparse
+
+from codeloom.cli.command import Command, ExitStatus
+from codeloom.cli.options import Options, WrongUseError
+
+
+class ServeCommand(Command):
+    """Serves an editor."""
+
+    NAME = "serve"
+    DESCRIPTION = (
+        "Serve an editor by the language server protocol, over the standard input and output. It needs "
+        "the extra lsp: pip install 'codeloom[lsp]'. Settings are those of the project that a file is in."
+    )
+    EXAMPLES = ("codeloom serve                                     as an editor starts it",)
+
+    @classmethod
+    def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
+        """There are none, but for what clients add by habit."""
+        parser.add_argument("--stdio", action="store_true", help="taken for clients that give it: it is so")
+
+    def run(self, options: Options) -> ExitStatus:
+        """Serve until the client ends it."""
+        try:
+            from codeloom.server.run import serve
+        except ModuleNotFoundError as error:
+            if (error.name or "").partition(".")[0] not in ("pygls", "lsprotocol"):
+                raise
+            raise WrongUseError("serve needs the extra lsp: pip install 'codeloom[lsp]'") from None
+        return ExitStatus(serve())

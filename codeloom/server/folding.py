@@ -1,0 +1,107 @@
+"""What can be folded: blocks, statements on several rows, runs of comments and imports, marked regions."""
+
+import re
+from collections.abc import Iterable
+from typing import TYPE_CHECKING
+
+from lsprotocol import types
+
+from codeloom._analysis import Line, LineKind
+
+if TYPE_CHECKING:
+    from codeloom.server.server import Server
+
+_IMPORTS = frozenset({LineKind.IMPORT, LineKind.FROM_IMPORT})
+_REGION = re.compile(r"#\s*(?P<end>end)?region\b")
+
+
+def register(server: "Server") -> None:
+    """Answer what asks for parts to fold."""
+
+    @server.feature(types.TEXT_DOCUMENT_FOLDING_RANGE)
+    async def folding_range(params: types.FoldingRangeParams) -> list[types.FoldingRange]:
+        document = server.documents[params.text_document.uri]
+        folds = _Folds()
+        async for lines in document.slices(document.analysis.lines):
+            folds.add(lines)
+        return folds.end()
+
+
+class _Folds:
+    """The folds of a text, line by line; rows count from 1 until they are told."""
+
+    def __init__(self) -> None:
+        self._found: list[tuple[int, int, types.FoldingRangeKind | None]] = []
+        # Blocks that are open: the indentation and the last row of their header.
+        self._open: list[tuple[int, int]] = []
+        self._regions: list[int] = []
+        self._run: tuple[types.FoldingRangeKind, int, int] | None = None
+        self._last_row = 0
+        self._last_indent = 0
+
+    def add(self, lines: Iterable[Line]) -> None:
+        """Take the next lines."""
+        for line in lines:
+            self._add(line)
+
+    def end(self) -> list[types.FoldingRange]:
+        """All folds, in the order of their rows."""
+        self._close(-1)
+        self._end_run()
+        kinds: dict[tuple[int, int], types.FoldingRangeKind | None] = {}
+        for first, last, kind in self._found:
+            kinds[first, last] = kind or kinds.get((first, last))
+        return [
+            types.FoldingRange(first - 1, last - 1, kind=kind)
+            for (first, last), kind in sorted(kinds.items(), key=lambda fold: (fold[0][0], -fold[0][1]))
+        ]
+
+    def _add(self, line: Line) -> None:
+        place, indent = line.range, line.indent
+        if line.kind is LineKind.COMMENT:
+            self._add_comment(line)
+            return
+        if indent is not None:
+            self._close(indent)
+            if indent > self._last_indent and self._last_row:
+                self._open.append((self._last_indent, self._last_row))
+            self._last_indent = indent
+        self._extend_run(types.FoldingRangeKind.Imports if line.kind in _IMPORTS else None, line)
+        if place.end_row > place.row:
+            self._found.append((place.row, place.end_row, None))
+        self._last_row = place.end_row
+
+    def _close(self, indent: int) -> None:
+        """End the blocks whose lines are deeper than this."""
+        while self._open and self._open[-1][0] >= indent:
+            _, row = self._open.pop()
+            if self._last_row > row:
+                self._found.append((row, self._last_row, None))
+
+    def _add_comment(self, line: Line) -> None:
+        row = line.range.row
+        match = _REGION.match(line.text)
+        if match is None:
+            self._extend_run(types.FoldingRangeKind.Comment, line)
+        elif not match["end"]:
+            self._regions.append(row)
+        elif self._regions:
+            self._found.append((self._regions.pop(), row, types.FoldingRangeKind.Region))
+
+    def _extend_run(self, kind: types.FoldingRangeKind | None, line: Line) -> None:
+        if self._run is not None:
+            known, first, last = self._run
+            gap = 1 if known is types.FoldingRangeKind.Comment else 2
+            if kind is known and line.range.row <= last + gap:
+                self._run = known, first, line.range.end_row
+                return
+            self._end_run()
+        if kind is not None:
+            self._run = kind, line.range.row, line.range.end_row
+
+    def _end_run(self) -> None:
+        if self._run is not None:
+            kind, first, last = self._run
+            if last > first:
+                self._found.append((first, last, kind))
+            self._run = None

@@ -1,0 +1,33 @@
+"""How a client's session begins, and what it tells of files and settings."""
+
+import os
+from typing import TYPE_CHECKING
+
+from lsprotocol import types
+
+from codeloom.server.settings import SETTINGS_FILES
+
+if TYPE_CHECKING:
+    from codeloom.server.server import Server
+
+
+def register(server: "Server") -> None:
+    """Take part in the session."""
+
+    @server.feature(types.INITIALIZE)
+    def initialize(params: types.InitializeParams) -> None:
+        server.begin(params)
+
+    @server.feature(types.TEXT_DOCUMENT_DID_SAVE)
+    def did_save(params: types.DidSaveTextDocumentParams) -> None:
+        if os.path.basename(params.text_document.uri) in SETTINGS_FILES:
+            server.settings_changed()
+
+    @server.feature(types.WORKSPACE_DID_CHANGE_WATCHED_FILES)
+    def did_change_watched_files(params: types.DidChangeWatchedFilesParams) -> None:
+        if any(os.path.basename(change.uri) in SETTINGS_FILES for change in params.changes):
+            server.settings_changed()
+
+    @server.feature(types.WORKSPACE_DID_CHANGE_CONFIGURATION)
+    def did_change_configuration(params: types.DidChangeConfigurationParams) -> None:
+        server.settings_changed()

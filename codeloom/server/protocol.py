@@ -1,0 +1,113 @@
+"""Messages into calls. Whatever comes in, the client gets an error, and the server goes on."""
+
+import asyncio
+import logging
+from collections.abc import Generator
+from concurrent.futures import Future
+from typing import TYPE_CHECKING, Any
+
+from lsprotocol import types
+from pygls.exceptions import (
+    FeatureNotificationError,
+    JsonRpcException,
+    JsonRpcInvalidRequest,
+    JsonRpcParseError,
+    JsonRpcRequestCancelled,
+    JsonRpcServerNotInitialized,
+)
+from pygls.protocol import LanguageServerProtocol, lsp_method
+
+from codeloom.server.transport import Inbox
+
+if TYPE_CHECKING:
+    from codeloom.server.server import Server
+
+_JSON_RPC = "jsonrpc"
+# What a message has at least one of.
+_MARKS = ("method", "result", "error")
+
+
+class Protocol(LanguageServerProtocol):
+    """The protocol with documents of our own."""
+
+    _server: "Server"
+
+    def __init__(self, server: "Server", converter: Any) -> None:
+        super().__init__(server, converter)
+        self.inbox = Inbox()
+        self.ended: asyncio.Future[int] | None = None
+        self._is_initialized = False
+
+    def take(self, message: Any) -> None:
+        """Handle what was read: a message, something else that is JSON, or an error of reading."""
+        try:
+            if isinstance(message, Exception):
+                raise JsonRpcParseError(f"the message can't be read: {message}")
+            if not isinstance(message, dict) or message.get(_JSON_RPC) != self.VERSION:
+                raise JsonRpcInvalidRequest("this is no message of JSON-RPC 2.0")
+            if self.inbox.take(message):
+                raise JsonRpcRequestCancelled("the request was cancelled")
+            self._check_order(message)
+            self.handle_message(self._structured(message))
+        except JsonRpcException as error:
+            self._refuse(message, error)
+
+    def _check_order(self, message: dict[str, Any]) -> None:
+        method = message.get("method")
+        if not self._is_initialized and method not in (types.INITIALIZE, types.EXIT, None):
+            raise JsonRpcServerNotInitialized(f"{method} is sent before {types.INITIALIZE}")
+        if self._is_initialized and method == types.INITIALIZE:
+            raise JsonRpcInvalidRequest("the server is initialized already")
+        if self._shutdown and method not in (types.EXIT, None):
+            raise JsonRpcInvalidRequest(f"{method} is sent after {types.SHUTDOWN}")
+
+    def _structured(self, message: dict[str, Any]) -> Any:
+        try:
+            return self.structure_message(message)
+        except JsonRpcException as error:
+            method = message.get("method", "an answer")
+            raise type(error)(f"the parameters of {method} aren't as the protocol says") from None
+
+    def _refuse(self, message: Any, error: JsonRpcException) -> None:
+        """Tell the client: by an answer to what asks for one, else by a row in its log."""
+        is_message = isinstance(message, dict) and not message.keys().isdisjoint(_MARKS)
+        if not is_message or ("id" in message and "method" in message):
+            answer = {"code": error.code, "message": error.message}
+            identity = message.get("id") if is_message else None
+            self._send_data({_JSON_RPC: self.VERSION, "id": identity, "error": answer})
+        else:
+            self._server.report_server_error(error, FeatureNotificationError)
+
+    def _check_handler_result(self, future: "Future[Any]") -> None:
+        """Report what went wrong with a notification in its own words."""
+        if not future.cancelled() and (error := future.exception()) is not None:
+            if not isinstance(error, JsonRpcException):
+                logging.getLogger(__name__).error("a notification failed", exc_info=error)
+            self._server.report_server_error(error, FeatureNotificationError)  # type: ignore[arg-type]
+
+    @lsp_method(types.INITIALIZE)
+    def lsp_initialize(self, params: types.InitializeParams) -> Generator[Any, Any, types.InitializeResult]:
+        """Agree on what both sides can do."""
+        self._is_initialized = True
+        return (yield from super().lsp_initialize(params))
+
+    @lsp_method(types.EXIT)
+    def lsp_exit(self, *args: Any) -> None:  # type: ignore[override]
+        """End the process: with 0 when the client has shut the server down before."""
+        if self.ended is not None and not self.ended.done():
+            self.ended.set_result(0 if self._shutdown else 1)
+
+    @lsp_method(types.TEXT_DOCUMENT_DID_OPEN)
+    def lsp_text_document__did_open(self, params: types.DidOpenTextDocumentParams) -> None:
+        """Take a text."""
+        self._server.opened(params.text_document)
+
+    @lsp_method(types.TEXT_DOCUMENT_DID_CHANGE)
+    def lsp_text_document__did_change(self, params: types.DidChangeTextDocumentParams) -> None:
+        """Change a text."""
+        self._server.changed(params)
+
+    @lsp_method(types.TEXT_DOCUMENT_DID_CLOSE)
+    def lsp_text_document__did_close(self, params: types.DidCloseTextDocumentParams) -> None:
+        """Forget a text."""
+        self._server.closed(params.text_document.uri)

@@ -1,0 +1,205 @@
+"""Names by what they are, for colours; changes since the last answer alone where the client wants that."""
+
+import builtins
+import itertools
+from collections.abc import Sequence
+from typing import TYPE_CHECKING
+from weakref import WeakKeyDictionary
+
+from lsprotocol import types
+
+from codeloom._analysis import Analysis, Occurrence, Resolution, Role, Scope, ScopeKind
+from codeloom.server.documents import OpenDocument
+from codeloom.server.navigation import BINDINGS
+
+if TYPE_CHECKING:
+    from codeloom.server.server import Server
+
+_TYPES = (
+    "namespace",
+    "class",
+    "function",
+    "method",
+    "parameter",
+    "typeParameter",
+    "variable",
+    "property",
+)
+_MODIFIERS = ("declaration", "readonly", "modification", "defaultLibrary")
+_TYPE_NUMBERS = {name: i for i, name in enumerate(_TYPES)}
+_BITS = {name: 1 << i for i, name in enumerate(_MODIFIERS)}
+_LEGEND = types.SemanticTokensLegend(list(_TYPES), list(_MODIFIERS))
+
+# Five numbers a token.
+_WIDTH = 5
+
+_CLASSES = frozenset(name for name, value in vars(builtins).items() if isinstance(value, type))
+_ROLE_TYPES = {
+    Role.PARAMETER: "parameter",
+    Role.KEYWORD: "parameter",
+    Role.TYPE_PARAMETER: "typeParameter",
+    Role.ORIGIN: "namespace",
+    Role.ATTRIBUTE: "property",
+    Role.ATTRIBUTE_BIND: "property",
+    Role.ATTRIBUTE_AUGMENT: "property",
+    Role.ATTRIBUTE_DELETE: "property",
+}
+_MODIFYING = frozenset({Role.AUGMENT, Role.ATTRIBUTE_BIND, Role.ATTRIBUTE_AUGMENT})
+
+
+def register(server: "Server") -> None:
+    """Answer what asks for the kinds of names."""
+    kept = _Kept()
+
+    @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_FULL, _LEGEND)
+    async def full(params: types.SemanticTokensParams) -> types.SemanticTokens:
+        document = server.documents[params.text_document.uri]
+        return kept.keep(document, await _tokens(document, document.analysis.occurrences))
+
+    @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_FULL_DELTA, _LEGEND)
+    async def delta(
+        params: types.SemanticTokensDeltaParams,
+    ) -> types.SemanticTokens | types.SemanticTokensDelta:
+        document = server.documents[params.text_document.uri]
+        new = await _tokens(document, document.analysis.occurrences)
+        old = kept.known(document, params.previous_result_id)
+        answer = kept.keep(document, new)
+        if old is None:
+            return answer
+        return types.SemanticTokensDelta(_edits(old, new), answer.result_id)
+
+    @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_RANGE, _LEGEND)
+    async def in_range(params: types.SemanticTokensRangeParams) -> types.SemanticTokens:
+        document = server.documents[params.text_document.uri]
+        return types.SemanticTokens(await _tokens(document, _within(document, params.range)))
+
+
+class _Kept:
+    """The last answer for each text that is open."""
+
+    def __init__(self) -> None:
+        self._known: WeakKeyDictionary[OpenDocument, types.SemanticTokens] = WeakKeyDictionary()
+        self._numbers = itertools.count(1)
+
+    def keep(self, document: OpenDocument, data: list[int]) -> types.SemanticTokens:
+        """Keep an answer, and give it."""
+        answer = types.SemanticTokens(data, str(next(self._numbers)))
+        self._known[document] = answer
+        return answer
+
+    def known(self, document: OpenDocument, result_id: str) -> Sequence[int] | None:
+        """An answer by its name; None for one that isn't the last."""
+        answer = self._known.get(document)
+        return answer.data if answer is not None and answer.result_id == result_id else None
+
+
+def _within(document: OpenDocument, range: types.Range) -> Sequence[Occurrence]:
+    from bisect import bisect_left, bisect_right
+
+    occurrences = document.analysis.occurrences
+    first = bisect_left(occurrences, document.place(range.start), key=_start)
+    return occurrences[first : bisect_right(occurrences, document.place(range.end), key=_start)]
+
+
+def _start(occurrence: Occurrence) -> tuple[int, int]:
+    return occurrence.range.row, occurrence.range.column
+
+
+async def _tokens(document: OpenDocument, occurrences: Sequence[Occurrence]) -> list[int]:
+    """Five numbers a name: rows and columns from the one before, length, type and modifiers."""
+    kinds = _Kinds(document.analysis)
+    data: list[int] = []
+    row = column = 0
+    async for part in document.slices(occurrences):
+        for occurrence in part:
+            place = document.range(occurrence.range)
+            start, end = place.start, place.end
+            if (start.line, start.character) < (row, column) or end.line != start.line:
+                continue  # `*`, or a name that stands within another one's hint
+            before = column if start.line == row else 0
+            number, modifiers = kinds.of(occurrence)
+            data += (
+                start.line - row,
+                start.character - before,
+                end.character - start.character,
+                number,
+                modifiers,
+            )
+            row, column = start.line, start.character
+    return data
+
+
+class _Kinds:
+    """What the names of a text are."""
+
+    def __init__(self, analysis: Analysis) -> None:
+        self._of_symbol: dict[tuple[Scope, str], str] = {}
+        self._analysis = analysis
+        for scope in analysis.scopes:
+            if scope.parent is None or scope.kind not in (ScopeKind.CLASS, ScopeKind.FUNCTION):
+                continue
+            owner = scope.parent
+            if owner.kind is ScopeKind.TYPE_PARAMETERS and owner.parent is not None:
+                owner = owner.parent
+            kind = "class"
+            if scope.kind is ScopeKind.FUNCTION:
+                kind = "method" if owner.kind is ScopeKind.CLASS else "function"
+            self._of_symbol[owner, scope.name] = kind
+
+    def of(self, occurrence: Occurrence) -> tuple[int, int]:
+        """The number of the type and the bits of the modifiers."""
+        role = occurrence.role
+        modifiers = _BITS["declaration"] if role in BINDINGS else 0
+        if role in _MODIFYING:
+            modifiers |= _BITS["modification"]
+        kind = _ROLE_TYPES.get(role)
+        if kind is None:
+            kind = self._of_name(occurrence)
+            if occurrence.resolution is Resolution.BUILTIN:
+                modifiers |= _BITS["defaultLibrary"]
+            elif kind == "variable" and occurrence.name.isupper():
+                modifiers |= _BITS["readonly"]
+        return _TYPE_NUMBERS[kind], modifiers
+
+    def _of_name(self, occurrence: Occurrence) -> str:
+        name, home = occurrence.name, occurrence.home
+        if home is None:
+            if occurrence.resolution is not Resolution.BUILTIN:
+                return "variable"
+            return "class" if name in _CLASSES else "function"
+        key = home, name
+        if key not in self._of_symbol:
+            self._of_symbol[key] = _of_symbol(home, occurrence)
+        return self._of_symbol[key]
+
+
+def _of_symbol(home: Scope, occurrence: Occurrence) -> str:
+    symbol = occurrence.symbol
+    if symbol is None or symbol.scope != home:
+        symbol = next((one for one in home.symbols if one.name == occurrence.mangled), None)
+    if symbol is None:
+        return "variable"
+    if symbol.is_parameter:
+        return "parameter"
+    if symbol.is_type_parameter:
+        return "typeParameter"
+    if symbol.is_imported and not symbol.is_assigned:
+        return "namespace"
+    return "property" if home.kind is ScopeKind.CLASS else "variable"
+
+
+def _edits(old: Sequence[int], new: Sequence[int]) -> list[types.SemanticTokensEdit]:
+    """What turns one list of tokens into another: the part that differs, in whole tokens."""
+    if old == new:
+        return []
+    shorter = min(len(old), len(new))
+    first = _common(old, new, shorter)
+    last = _common(old[::-1], new[::-1], shorter - first)
+    end = len(new) - last
+    return [types.SemanticTokensEdit(first, len(old) - last - first, new[first:end])]
+
+
+def _common(one: Sequence[int], other: Sequence[int], most: int) -> int:
+    """How many numbers both begin with, in whole tokens."""
+    count = next((i for i in range(most) if one[i] != other[i]), most)
+    return count // _WIDTH * _WIDTH
