@@ -32,6 +32,7 @@ if TYPE_CHECKING:
         ScopeKind,
         Signature,
         Symbol,
+        Table,
     )
     from codeloom._document import Change, Document
     from codeloom._face import analyze, analyze_file, analyze_paths, read_notebook
@@ -66,6 +67,7 @@ __all__ = [
     "ScopeKind",
     "Signature",
     "Symbol",
+    "Table",
     "analyze",
     "analyze_file",
     "analyze_paths",

@@ -425,6 +425,11 @@ class Problems(Sequence[Problem]):
     def __reduce__(self) -> tuple[Any, ...]:
         ...
 
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
+
 class Lines(Sequence[Line]):
 
     def __len__(self) -> int:
@@ -464,6 +469,11 @@ class Lines(Sequence[Line]):
 
     def __reduce__(self) -> tuple[Any, ...]:
         ...
+
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
 
 class Records(Sequence[Record]):
 
@@ -505,6 +515,11 @@ class Records(Sequence[Record]):
     def __reduce__(self) -> tuple[Any, ...]:
         ...
 
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
+
 class Limits(Sequence[Limit]):
 
     def __len__(self) -> int:
@@ -544,6 +559,11 @@ class Limits(Sequence[Limit]):
 
     def __reduce__(self) -> tuple[Any, ...]:
         ...
+
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
 
 class Scope:
     """
@@ -787,6 +807,11 @@ class Occurrences(Sequence[Occurrence]):
     def __reduce__(self) -> tuple[Any, ...]:
         ...
 
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
+
 class Scopes(Sequence[Scope]):
 
     def __len__(self) -> int:
@@ -826,6 +851,11 @@ class Scopes(Sequence[Scope]):
 
     def __reduce__(self) -> tuple[Any, ...]:
         ...
+
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
 
 class Hint:
     """
@@ -1007,6 +1037,11 @@ class Hints(Sequence[Hint]):
     def __reduce__(self) -> tuple[Any, ...]:
         ...
 
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
+
 class Signatures(Sequence[Signature]):
 
     def __len__(self) -> int:
@@ -1046,6 +1081,40 @@ class Signatures(Sequence[Signature]):
 
     def __reduce__(self) -> tuple[Any, ...]:
         ...
+
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
+        """
+
+class Table:
+    """
+    Rows in columns. Libraries that know the Arrow C stream interface take it as it is: `pyarrow.table(t)`, `polars.DataFrame(t)`.
+    """
+
+    @property
+    def name(self) -> str:
+        """Such as "lines"."""
+
+    @property
+    def column_names(self) -> tuple[str, ...]:
+        """The names of its columns."""
+
+    def __len__(self) -> int:
+        ...
+
+    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+        """
+        The table as a stream of one batch. No other schema is made on request.
+        """
+
+    def __repr__(self) -> str:
+        ...
+
+def table_kinds() -> list[tuple[str, str, list[tuple[str, str, bool, str]]]]:
+    """
+    For each table its name, its meaning and its columns: name, type, whether it may hold nulls, meaning.
+    """
 
 class Analysis:
     """What a text says. Each part is worked out when it is first asked for."""
@@ -1138,6 +1207,11 @@ class Analysis:
     def hints(self) -> Hints:
         """
         Every type hint of the text, line by line: those of variables, attributes, parameters and of what functions give back, in annotations and in comments.
+        """
+
+    def table(self, name: str) -> Table:
+        """
+        One of the tables of docs/tables.md, such as "lines", whole; ValueError when there is none of that name.
         """
 
 def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, with_records: bool) -> list[Analysis | None]:

@@ -20,6 +20,7 @@ STEPS = [
     ["signatures"],
     ["causes"],
     ["file"],
+    ["arrow"],
     ["host"],
     ["neighbours", "strutils", "_fastaccess", "symbolinfo"],
     ["tree"],

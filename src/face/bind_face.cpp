@@ -4,8 +4,10 @@
 #include <nanobind/nanobind.h>
 #include <nanobind/operators.h>
 #include <nanobind/stl/string.h>
+#include <nanobind/stl/string_view.h>
 #include <nanobind/stl/tuple.h>
 
+#include "face/arrow_streams.h"
 #include "face/bind_items.h"
 #include "face/bind_names.h"
 #include "face/items.h"
@@ -89,7 +91,7 @@ void BindProblem(nb::module_& module) {
     problem.def_prop_ro("code", &CProblemItem::Code, "What kind of fault it is, such as \"CL201\".");
     problem.def_prop_ro(
         "severity",
-        [](const CProblemItem& self) { return nb::str(IsWarning(self.Data().code) ? "warning" : "error"); },
+        [](const CProblemItem& self) { return TextFromUtf8(WordOf(SeverityOf(self.Data().code))); },
         nb::sig("def severity(self) -> typing.Literal[\"error\", \"warning\"]"),
         "\"error\" for what the interpreter refuses; \"warning\" for a type hint that can't be read and for "
         "a "
@@ -122,7 +124,7 @@ void BindLine(nb::module_& module) {
         module, "Line", "A logical line: a statement, the header of one, or a comment on rows of its own.");
     line.def_prop_ro("range", &CLineItem::Range, "From its first character to its last one.");
     line.def_prop_ro(
-        "kind", [](const CLineItem& self) { return LineKindOf(self.Data().type); },
+        "kind", [](const CLineItem& self) { return MemberOf(self.Data().type); },
         nb::sig("def kind(self) -> LineKind"), "What kind of statement it holds or begins.");
     line.def_prop_ro(
         "text", [](const CLineItem& self) { return TextFromUtf8(self.Text()); },
@@ -150,7 +152,7 @@ void BindLine(nb::module_& module) {
 void BindRecord(nb::module_& module) {
     auto record = BindItem<CRecordItem>(module, "Record", "What a line says of one name.");
     record.def_prop_ro(
-        "kind", [](const CRecordItem& self) { return RecordKindOf(self.Data().kind); },
+        "kind", [](const CRecordItem& self) { return MemberOf(RecordKindOf(self.Data().kind)); },
         nb::sig("def kind(self) -> RecordKind"), "What is said.");
     record.def_prop_ro(
         "name", [](const CRecordItem& self) { return self.file->HostName(self.Data().name); },
@@ -181,7 +183,7 @@ void BindLimit(nb::module_& module) {
     auto limit = BindItem<CLimitItem>(
         module, "Limit", "A line that was too much for a full walk and lacks some of its records.");
     limit.def_prop_ro(
-        "kind", [](const CLimitItem& self) { return LimitKindOf(self.Data().limit); },
+        "kind", [](const CLimitItem& self) { return MemberOf(self.Data().limit); },
         nb::sig("def kind(self) -> LimitKind"), "Which limit it met.");
     limit.def_prop_ro("message", &CLimitItem::Message, "The same in words.");
     limit.def_prop_ro("line", &CLimitItem::Line, "The line.");
@@ -250,11 +252,18 @@ void BindFace(nb::module_& module) {
     BindItems<CLimitItems>(module, "Limits", "class Limits(collections.abc.Sequence[Limit])");
     BindNameItems(module);
     BindSignatureItems(module);
+    BindTables(module);
     nb::class_<CAnalysis> analysis(module, "Analysis",
                                    "What a text says. Each part is worked out when it is first asked for.");
     BindAnalysis(analysis);
     BindNamesOfAnalysis(analysis);
     BindSignaturesOfAnalysis(analysis);
+    analysis.def(
+        "table", [](const CAnalysis& self, std::string_view name) { return TableOf(*self.file, name); },
+        "name"_a, nb::sig("def table(self, name: str) -> Table"),
+        "One of the tables of docs/tables.md, such as \"lines\", whole; ValueError when there is none of "
+        "that "
+        "name.");
 }
 
 }  // namespace codeloom

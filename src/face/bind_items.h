@@ -4,6 +4,7 @@
 #include <nanobind/nanobind.h>
 #include <nanobind/operators.h>
 
+#include "face/arrow_streams.h"
 #include "face/items.h"
 #include "host/refuse_new.h"
 #include "host/sequence_slots.h"
@@ -92,6 +93,15 @@ void BindItems(nb::module_& module, const char* name, const char* signature) {
             return nb::make_tuple(Operator("getitem"), nb::make_tuple(all, self.AsSlice()));
         },
         nb::sig("def __reduce__(self) -> tuple[typing.Any, ...]"));
+    items.def(
+        "__arrow_c_stream__",
+        [](const Items& self, nb::handle) {
+            return StreamOfRows(*self.file, Item::kSequence, {self.first, self.step, self.count});
+        },
+        nb::arg("requested_schema").none() = nb::none(),
+        nb::sig("def __arrow_c_stream__(self, requested_schema: object = None) -> object"),
+        "The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists "
+        "its columns. No other schema is made on request.");
     nb::module_::import_("_collections_abc").attr("Sequence").attr("register")(items);
 }
 

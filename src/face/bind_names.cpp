@@ -50,7 +50,7 @@ void BindScope(nb::module_& module) {
     auto scope = BindItem<CScopeItem>(
         module, "Scope", "A module, class, function or other part of a text that has names of its own.");
     scope.def_prop_ro(
-        "kind", [](const CScopeItem& self) { return ScopeKindOf(self.Data().kind); },
+        "kind", [](const CScopeItem& self) { return MemberOf(self.Data().kind); },
         nb::sig("def kind(self) -> ScopeKind"), "What makes it a scope.");
     scope.def_prop_ro(
         "name", [](const CScopeItem& self) { return TextFromUtf8(self.Name()); },
@@ -87,8 +87,11 @@ void BindSymbol(nb::module_& module) {
         "name", [](const CSymbolItem& self) { return TextFromUtf8(self.Name()); },
         nb::sig("def name(self) -> str"), "The name, as a class around it mangles it.");
     symbol.def_prop_ro("scope", &CSymbolItem::Scope, "The scope.");
-    symbol.def_prop_ro("is_local", &CSymbolItem::IsLocal, "The scope binds it.");
-    symbol.def_prop_ro("is_global", &CSymbolItem::IsGlobal, "It is a name of the module, or none known.");
+    symbol.def_prop_ro(
+        "is_local", [](const CSymbolItem& self) { return self.Data().IsLocal(); }, "The scope binds it.");
+    symbol.def_prop_ro(
+        "is_global", [](const CSymbolItem& self) { return self.Data().IsGlobal(); },
+        "It is a name of the module, or none known.");
     BindBinding(symbol, "is_free", CSymbol::EBinding::kFree, "A function around the scope binds it.");
     BindBinding(symbol, "is_declared_global", CSymbol::EBinding::kGlobalExplicit, "A `global` names it.");
     BindFlag(symbol, "is_nonlocal", CSymbol::kIsDeclaredNonlocal, "A `nonlocal` names it.");
@@ -111,13 +114,13 @@ void BindOccurrence(nb::module_& module) {
         "name", [](const COccurrenceItem& self) { return self.file->HostNameOfOccurrence(self.Data().name); },
         nb::sig("def name(self) -> str"), "The name as written; `*` for what `import *` binds.");
     occurrence.def_prop_ro(
-        "role", [](const COccurrenceItem& self) { return RoleOf(self.Data().role); },
+        "role", [](const COccurrenceItem& self) { return MemberOf(self.Data().role); },
         nb::sig("def role(self) -> Role"), "What the name does there.");
     occurrence.def_prop_ro("range", &COccurrenceItem::Range, "Where it stands.");
     occurrence.def_prop_ro("line", &COccurrenceItem::Line, "The line that it stands on.");
     occurrence.def_prop_ro("scope", &COccurrenceItem::Scope, "The scope that it stands in.");
     occurrence.def_prop_ro(
-        "resolution", [](const COccurrenceItem& self) { return ResolutionOf(self.Resolution()); },
+        "resolution", [](const COccurrenceItem& self) { return MemberOf(self.Resolution()); },
         nb::sig("def resolution(self) -> Resolution | None"),
         "Where its name is bound; None for what belongs to no scope, such as an attribute.");
     occurrence.def_prop_ro("home", &COccurrenceItem::Home, nb::sig("def home(self) -> Scope | None"),
@@ -144,7 +147,7 @@ void BindOccurrence(nb::module_& module) {
         "It stands in a hint in a comment.");
     occurrence.def("__repr__", [](const COccurrenceItem& self) {
         const CRange range = self.Range();
-        const std::string_view role = WordOfRole(self.Data().role);
+        const std::string_view role = WordOf(self.Data().role);
         return nb::str("<Occurrence {}:{}: {} {}>")
             .format(range.row, range.column, TextFromUtf8(role), TextFromUtf8(self.Name()));
     });

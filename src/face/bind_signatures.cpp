@@ -19,7 +19,7 @@ void BindHint(nb::module_& module) {
         nb::sig("def text(self) -> str"), "The hint as written, quotes included.");
     hint.def_prop_ro("range", &CHintItem::Range, "Where it stands.");
     hint.def_prop_ro(
-        "kind", [](const CHintItem& self) { return HintKindOf(self.Data().kind); },
+        "kind", [](const CHintItem& self) { return MemberOf(self.Data().kind); },
         nb::sig("def kind(self) -> HintKind"), "What it is about.");
     hint.def_prop_ro(
         "name", [](const CHintItem& self) { return TextFromUtf8(TextOf(*self.file, self.Data().target)); },
@@ -47,7 +47,7 @@ void BindParameter(nb::module_& module) {
         nb::sig("def name(self) -> str"), "Its name.");
     parameter.def_prop_ro("range", &CParameterItem::Range, "Where the name stands.");
     parameter.def_prop_ro(
-        "kind", [](const CParameterItem& self) { return ParameterKindOf(self.Data().kind); },
+        "kind", [](const CParameterItem& self) { return MemberOf(self.Data().kind); },
         nb::sig("def kind(self) -> ParameterKind"), "How arguments reach it, in the words of `inspect`.");
     parameter.def_prop_ro("default", &CParameterItem::Default, nb::sig("def default(self) -> Range | None"),
                           "Where its default stands; None without one.");

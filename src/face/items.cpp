@@ -4,9 +4,7 @@
 #include <charconv>
 #include <functional>
 
-#include "face/kinds.h"
 #include "host/text.h"
-#include "text/place.h"
 
 namespace codeloom {
 
@@ -29,18 +27,7 @@ nb::object Split(std::string_view payload, size_t at, size_t after, bool may_lac
 
 }  // namespace
 
-CRange RangeOfBytes(const CSourceFile& file, uint32_t start, uint32_t end) {
-    const CRowIndex& rows = file.Rows();
-    const CCharPlace first = rows.PlaceOf(start);
-    const CCharPlace last = end == start ? first : rows.PlaceOf(end);
-    return {first.row + 1, first.column + 1, last.row + 1, last.column + 1};
-}
-
 // Problems
-
-std::string CProblemItem::Code() const {
-    return "CL" + std::to_string(static_cast<int>(Data().code));
-}
 
 nb::object CProblemItem::Related() const {
     nb::list related;
@@ -69,15 +56,6 @@ size_t CProblemItem::Hash() const {
 
 // Lines
 
-int CLineItem::Indent() const {
-    const std::string_view text = file->Text();
-    const CRowIndex& rows = file->Rows();
-    CPlace place;
-    place.pos = rows.Start(rows.PlaceOf(Data().start).row);
-    SkipIndent(text, place);
-    return place.pos == Data().start ? place.indent : -1;
-}
-
 bool CLineItem::operator==(const CLineItem& other) const {
     if (file == other.file && i == other.i) return true;
     return Data().type == other.Data().type && Text() == other.Text() && Range() == other.Range();
@@ -90,7 +68,8 @@ size_t CLineItem::Hash() const {
 // Records
 
 nb::object CRecordItem::Value() const {
-    const std::string_view form = PayloadFormOf(Data().kind), payload = Payload();
+    const std::string_view form = kRecordKinds[NumberOf(RecordKindOf(Data().kind))].payload,
+                           payload = Payload();
     if (form == "none" && payload.empty()) return nb::none();
     if (form == "index") {
         uint32_t number = 0;
@@ -112,7 +91,7 @@ nb::object CRecordItem::Value() const {
 
 std::string CRecordItem::Text() const {
     std::string text(Data().of_arg ? "arg " : "");
-    text += WordOfRecordKind(Data().kind);
+    text += WordOf(RecordKindOf(Data().kind));
     text.append(" ").append(Name());
     if (!Payload().empty()) text.append("  ").append(Payload());
     return text;

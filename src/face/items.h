@@ -5,21 +5,13 @@
 #include <utility>
 
 #include "face/source_file.h"
+#include "file/kind_words.h"
 
 namespace codeloom {
 
-// A piece of a text. Rows and columns count from 1, columns in characters; the end is after the last
-// character.
-struct CRange {
-    uint32_t row = 0;
-    uint32_t column = 0;
-    uint32_t end_row = 0;
-    uint32_t end_column = 0;
-
-    bool operator==(const CRange&) const = default;
-};
-
-CRange RangeOfBytes(const CSourceFile& file, uint32_t start, uint32_t end);
+inline CRange RangeOfBytes(const CSourceFile& file, uint32_t start, uint32_t end) {
+    return file.Rows().RangeOf(start, end);
+}
 
 // An object of the host around a new Class, made without a look for its class.
 template <class Class, class... Arguments>
@@ -45,8 +37,7 @@ struct CProblemItem : CItem {
 
     const CProblem& Data() const { return file->Analysis().problems[i]; }
     std::string_view Message() const { return Data().message; }
-    // "CL201"
-    std::string Code() const;
+    std::string Code() const { return CodeText(Data().code); }
     CRange Range() const { return RangeOfBytes(*file, Data().start, Data().end); }
     nb::object Related() const;
     // "path:row:column: CL201 message"
@@ -62,9 +53,7 @@ struct CLineItem : CItem {
     const CLine& Data() const { return file->Analysis().lines[i]; }
     std::string_view Text() const { return file->Text().substr(Data().start, Data().end - Data().start); }
     CRange Range() const { return RangeOfBytes(*file, Data().start, Data().end); }
-    // The width of the blanks before the line, tabs to the next multiple of eight; -1 after another line on
-    // the same row.
-    int Indent() const;
+    int Indent() const { return file->Rows().IndentOf(Data().start); }
     bool operator==(const CLineItem& other) const;
     size_t Hash() const;
 };

@@ -3,8 +3,7 @@
 
 #include <nanobind/nanobind.h>
 
-#include "file/file_analysis.h"
-#include "scopes/queries.h"
+#include "file/kind_words.h"
 
 namespace nb = nanobind;
 
@@ -14,21 +13,13 @@ namespace codeloom {
 void BindKinds(nb::module_& module);
 
 // Members of these enums.
-nb::object RecordKindOf(char kind);
-nb::object LineKindOf(ELogicalType type);
-nb::object LimitKindOf(ELimit limit);
-nb::object RoleOf(ERole role);
-nb::object ScopeKindOf(EScopeKind kind);
-nb::object ParameterKindOf(EParameterKind kind);
-nb::object HintKindOf(EHintKind kind);
-nb::object ResolutionOf(EResolution resolution);
-
-// The word for a role and for a kind of scope.
-std::string_view WordOfRole(ERole role);
-std::string_view WordOfScopeKind(EScopeKind kind);
-
-// The form of a kind's payload, and the word for the kind.
-std::string_view PayloadFormOf(char kind);
-std::string_view WordOfRecordKind(char kind);
+nb::object MemberOf(ERecordKind kind);
+nb::object MemberOf(ELogicalType type);
+nb::object MemberOf(ELimit limit);
+nb::object MemberOf(ERole role);
+nb::object MemberOf(EScopeKind kind);
+nb::object MemberOf(EParameterKind kind);
+nb::object MemberOf(EHintKind kind);
+nb::object MemberOf(EResolution resolution);  // None for none
 
 }  // namespace codeloom

@@ -26,7 +26,7 @@ nb::object CScopeItem::Symbols() const {
 }
 
 std::string CScopeItem::Text() const {
-    std::string text(WordOfScopeKind(Data().kind));
+    std::string text(WordOf(Data().kind));
     if (!Name().empty()) text.append(" ").append(Name());
     return text;
 }
@@ -37,18 +37,7 @@ bool CScopeItem::operator==(const CScopeItem& other) const {
            file->Path().equal(other.file->Path());
 }
 
-// Symbols. Questions and answers are those of the module `symtable`.
-
-bool CSymbolItem::IsGlobal() const {
-    const CSymbol::EBinding binding = Data().binding;
-    return binding == CSymbol::EBinding::kGlobalImplicit || binding == CSymbol::EBinding::kGlobalExplicit ||
-           (IsOfModule() && (Data().flags & CSymbol::kIsBound) != 0);
-}
-
-bool CSymbolItem::IsLocal() const {
-    return Data().binding == CSymbol::EBinding::kLocal ||
-           (IsOfModule() && (Data().flags & CSymbol::kIsBound) != 0);
-}
+// Symbols
 
 bool CSymbolItem::operator==(const CSymbolItem& other) const {
     if (file == other.file) return i == other.i;

@@ -33,9 +33,6 @@ struct CSymbolItem : CItem {
     const CSymbol& Data() const { return file->Names().scopes.symbols[i]; }
     std::string_view Name() const { return file->Names().occurrences.names.Text(Data().name); }
     CScopeItem Scope() const { return {file, Data().scope}; }
-    bool IsOfModule() const { return Data().scope == 0; }
-    bool IsGlobal() const;
-    bool IsLocal() const;
     bool operator==(const CSymbolItem& other) const;
     size_t Hash() const { return std::hash<std::string_view>()(Name()); }
 };

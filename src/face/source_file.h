@@ -46,8 +46,9 @@ class CSourceFile {
         return _fWithNames ? *_fWithNames : _Analyzed(_fQuick, false);
     }
     const CFileAnalysis& WithRecords() const { return _Analyzed(_fWithRecords, true); }
-    const CTextNames& Names() const { return _Analyzed(_fWithNames, false, true).names; }
-    const CSignatures& Signatures() const { return _Analyzed(_fWithNames, false, true).signatures; }
+    const CFileAnalysis& WithNames() const { return _Analyzed(_fWithNames, false, true); }
+    const CTextNames& Names() const { return WithNames().names; }
+    const CSignatures& Signatures() const { return WithNames().signatures; }
 
     // What a pass needs is made while the interpreter's lock is held: a process that is forked while another
     // thread makes it would wait for it forever.

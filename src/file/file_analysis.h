@@ -7,6 +7,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string_view>
 #include <vector>
 
@@ -55,6 +56,8 @@ struct CFileAnalysis {
                                      : static_cast<uint32_t>(records.records.size());
     }
     uint32_t LineOfRecord(uint32_t record_i) const;
+    // The line that holds a place, or the one before it; none in a text without lines.
+    std::optional<uint32_t> LineAt(uint32_t offset) const;
     // The problems of a line are those from FirstProblem(line_i) up to FirstProblem(line_i + 1).
     uint32_t FirstProblem(size_t line_i) const;
 };

@@ -242,6 +242,13 @@ uint32_t CFileAnalysis::LineOfRecord(uint32_t record_i) const {
     return static_cast<uint32_t>(next - lines.begin()) - 1;
 }
 
+std::optional<uint32_t> CFileAnalysis::LineAt(uint32_t offset) const {
+    if (lines.empty()) return std::nullopt;
+    const auto after = std::upper_bound(lines.begin() + 1, lines.end(), offset,
+                                        [](uint32_t place, const CLine& line) { return place < line.start; });
+    return static_cast<uint32_t>(after - lines.begin()) - 1;
+}
+
 uint32_t CFileAnalysis::FirstProblem(size_t line_i) const {
     if (line_i >= lines.size()) return static_cast<uint32_t>(problems.size());
     const uint32_t start = line_i == 0 ? 0 : lines[line_i].start;

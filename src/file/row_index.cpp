@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cassert>
 
+#include "text/place.h"
 #include "text/scan.h"
 
 namespace codeloom {
@@ -52,6 +53,19 @@ CCharPlace CRowIndex::PlaceOf(uint32_t offset) const {
     if (_fBeforeBlocks.empty()) return {row, offset - start};
     if (offset - start <= kBlock) return {row, CountCharacters(_fText.substr(start, offset - start))};
     return {row, _CharactersBefore(offset) - _CharactersBefore(start)};
+}
+
+CRange CRowIndex::RangeOf(uint32_t start, uint32_t end) const {
+    const CCharPlace first = PlaceOf(start);
+    const CCharPlace last = end == start ? first : PlaceOf(end);
+    return {first.row + 1, first.column + 1, last.row + 1, last.column + 1};
+}
+
+int CRowIndex::IndentOf(uint32_t offset) const {
+    CPlace place;
+    place.pos = _fStarts[_RowOf(offset)];
+    SkipIndent(_fText, place);
+    return place.pos == offset ? place.indent : -1;
 }
 
 std::string_view CRowIndex::Text(uint32_t row) const {

@@ -13,6 +13,17 @@ struct CCharPlace {
     uint32_t column = 0;
 };
 
+// A piece of a text as hosts see it. Rows and columns count from 1, columns in characters; the end is after
+// the last character.
+struct CRange {
+    uint32_t row = 0;
+    uint32_t column = 0;
+    uint32_t end_row = 0;
+    uint32_t end_column = 0;
+
+    bool operator==(const CRange&) const = default;
+};
+
 // Rows end at LF, CR LF and CR, and at nothing else. The text must outlive the index.
 class CRowIndex {
   public:
@@ -22,6 +33,11 @@ class CRowIndex {
 
     // Requires: `offset` is at most the length of the text.
     CCharPlace PlaceOf(uint32_t offset) const;
+    // Requires: start <= end, which is at most the length of the text.
+    CRange RangeOf(uint32_t start, uint32_t end) const;
+    // The width of the blanks before a place, tabs to the next multiple of eight; -1 after anything else on
+    // the same row.
+    int IndentOf(uint32_t offset) const;
     // A row without its end. Requires: row < Count().
     std::string_view Text(uint32_t row) const;
     uint32_t Start(uint32_t row) const { return _fStarts[row]; }

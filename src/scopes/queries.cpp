@@ -48,8 +48,12 @@ bool CNameQueries::_IsLost(uint32_t name) const {
 
 // In Python 2 a function may have one too.
 bool CNameQueries::_HasStarImport() const {
-    return std::any_of(_fNames.scopes.scopes.begin(), _fNames.scopes.scopes.end(),
-                       [](const CScope& scope) { return scope.has_star_import; });
+    if (!_fHasStarImport) {
+        const std::vector<CScope>& scopes = _fNames.scopes.scopes;
+        _fHasStarImport = std::any_of(scopes.begin(), scopes.end(),
+                                      [](const CScope& scope) { return scope.has_star_import; });
+    }
+    return *_fHasStarImport;
 }
 
 uint32_t CNameQueries::OccurrenceAt(uint32_t offset) const {

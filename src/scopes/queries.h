@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string_view>
 #include <vector>
 
@@ -62,6 +63,7 @@ class CNameQueries {
     const CTextNames& _fNames;
     const std::string_view _fText;
     const int _fVersion;
+    mutable std::optional<bool> _fHasStarImport;  // known when it was first asked for
 };
 
 }  // namespace codeloom

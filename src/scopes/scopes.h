@@ -39,6 +39,12 @@ struct CSymbol {
     EBinding binding = EBinding::kLocal;
 
     bool Is(EFlag flag) const { return (flags & flag) != 0; }
+    // As the module `symtable` answers; the module is scope zero.
+    bool IsGlobal() const {
+        return binding == EBinding::kGlobalImplicit || binding == EBinding::kGlobalExplicit ||
+               (scope == 0 && (flags & kIsBound) != 0);
+    }
+    bool IsLocal() const { return binding == EBinding::kLocal || (scope == 0 && (flags & kIsBound) != 0); }
     bool MayBeBound() const { return (flags & (kIsBound | kIsBoundElsewhere)) != 0; }
     // False for what only stands for a global name that the module itself doesn't mention.
     bool IsMentioned() const { return flags != 0 && flags != kIsBoundElsewhere; }

@@ -1,0 +1,102 @@
+// Fills the columns of a table row by row. What a table is made of is a class Source:
+//     using CRow = ...;                                  // a plain struct
+//     static const TColumns<CRow>& Columns();
+//     static size_t Count(const CFileAnalysis& analysis);
+//     explicit Source(const CTextFacts& text);
+//     CRow Of(uint32_t i);                               // i < Count(analysis)
+#pragma once
+
+#include <algorithm>
+
+#include "arrow/columns.h"
+#include "arrow/tables.h"
+
+namespace codeloom {
+
+inline constexpr const char* kFileIdColumn = "file_id";
+
+template <class Source>
+class TTableBuilder final : public CTableBuilder {
+  public:
+    explicit TTableBuilder(bool with_file_id) : _fWithFileId(with_file_id) { _Begin(); }
+
+    void Append(const CTextFacts& text, const CSelection& selection) override {
+        Source source(text);
+        for (size_t done = 0; done < selection.count; done += _fRows.size()) {
+            _fRows.clear();
+            const size_t end = std::min(selection.count, done + kMostRows);
+            for (size_t i = done; i < end; ++i) _fRows.push_back(source.Of(selection.At(i)));
+            _AppendRows(text.file_id);
+        }
+    }
+
+    void AppendAll(const CTextFacts& text) override { Append(text, {0, 1, Source::Count(text.analysis)}); }
+
+    std::shared_ptr<const CTable> Finish() override {
+        auto table = std::make_shared<const CTable>(std::move(_fTable));
+        _Begin();
+        return table;
+    }
+
+  private:
+    // As many as stay in the processor's cache while they are put into columns.
+    static constexpr size_t kMostRows = 256;
+
+    void _Begin() {
+        _fTable = {};
+        if (_fWithFileId)
+            _fTable.fields.push_back({kFileIdColumn, false, std::make_unique<TNumberColumn<int64_t>>()});
+        for (const auto& spec : Source::Columns().Specs())
+            _fTable.fields.push_back({spec.name, spec.is_nullable, spec.make()});
+    }
+
+    void _AppendRows(int64_t file_id) {
+        size_t field_i = 0;
+        if (_fWithFileId) {
+            auto& ids = static_cast<TNumberColumn<int64_t>&>(*_fTable.fields[field_i++].column);
+            for (size_t i = 0; i < _fRows.size(); ++i) ids.Add(file_id);
+        }
+        for (const auto& spec : Source::Columns().Specs())
+            spec.append(*_fTable.fields[field_i++].column, _fRows);
+        _fTable.count += _fRows.size();
+    }
+
+    const bool _fWithFileId;
+    CTable _fTable;
+    std::vector<typename Source::CRow> _fRows;
+};
+
+// The name of a column's type, for people.
+inline std::string_view TypeNameOf(const CColumn& column) {
+    if (column.Dictionary() != nullptr) return "dictionary";
+    switch (column.Format()[0]) {
+        case 'l':
+            return "int64";
+        case 'i':
+            return "int32";
+        case 'b':
+            return "bool";
+        default:
+            return "string";
+    }
+}
+
+template <class Source>
+CTableKind TableKindOf(std::string_view name, std::string_view meaning, bool wants_records,
+                       bool wants_names) {
+    return {name,
+            meaning,
+            wants_records,
+            wants_names,
+            [](bool with_file_id) -> std::unique_ptr<CTableBuilder> {
+                return std::make_unique<TTableBuilder<Source>>(with_file_id);
+            },
+            [] {
+                std::vector<CTableKind::CColumnInfo> columns;
+                for (const auto& spec : Source::Columns().Specs())
+                    columns.push_back({spec.name, spec.meaning, spec.is_nullable, TypeNameOf(*spec.make())});
+                return columns;
+            }};
+}
+
+}  // namespace codeloom

@@ -1,0 +1,101 @@
+#include "face/arrow_streams.h"
+
+#include <nanobind/stl/string_view.h>
+
+#include "host/errors.h"
+#include "host/refuse_new.h"
+
+using namespace nb::literals;
+
+namespace codeloom {
+
+namespace {
+
+void FreeStream(void* pointer) noexcept {
+    const std::unique_ptr<ArrowArrayStream> stream(static_cast<ArrowArrayStream*>(pointer));
+    if (stream->release != nullptr) stream->release(stream.get());
+}
+
+const CFileAnalysis& AnalysisFor(const CSourceFile& file, const CTableKind& kind) {
+    if (kind.wants_names) return file.WithNames();
+    return kind.wants_records ? file.WithRecords() : file.Analysis();
+}
+
+nb::list ColumnsOf(const CTableKind& kind) {
+    nb::list columns;
+    for (const CTableKind::CColumnInfo& column : kind.columns())
+        columns.append(nb::make_tuple(column.name.c_str(), column.type, column.is_nullable, column.meaning));
+    return columns;
+}
+
+// Raises ValueError for a name that no table has.
+const CTableKind& TableKindNamed(std::string_view name) {
+    if (const CTableKind* kind = FindTable(name)) return *kind;
+    std::string message = "no table is called '" + std::string(name) + "'; there are";
+    const char* before = " ";
+    for (const CTableKind& kind : TableKinds()) {
+        message.append(before).append(kind.name);
+        before = ", ";
+    }
+    RaiseHost(PyExc_ValueError, message.c_str());
+}
+
+}  // namespace
+
+nb::object StreamCapsule(std::shared_ptr<const CTable> table) {
+    auto stream = std::make_unique<ArrowArrayStream>();
+    ExportStream(std::move(table), *stream);
+    return nb::capsule(stream.release(), kArrowStreamCapsule, FreeStream);
+}
+
+nb::object StreamOfRows(const CSourceFile& file, const char* table, const CSelection& selection) {
+    const CTableKind& kind = *FindTable(table);
+    const std::unique_ptr<CTableBuilder> builder = kind.make(false);
+    builder->Append({file.Text(), AnalysisFor(file, kind), file.Rows(), file.Version()}, selection);
+    return StreamCapsule(builder->Finish());
+}
+
+CHostTable TableOf(const CSourceFile& file, std::string_view name) {
+    const CTableKind& kind = TableKindNamed(name);
+    const std::unique_ptr<CTableBuilder> builder = kind.make(false);
+    builder->AppendAll({file.Text(), AnalysisFor(file, kind), file.Rows(), file.Version()});
+    return {kind.name, builder->Finish()};
+}
+
+void BindTables(nb::module_& module) {
+    nb::class_<CHostTable> table(module, "Table",
+                                 "Rows in columns. Libraries that know the Arrow C stream interface take it "
+                                 "as it is: `pyarrow.table(t)`, `polars.DataFrame(t)`.",
+                                 nb::type_slots(kNotMadeByHost));
+    table.def_prop_ro("name", [](const CHostTable& self) { return self.name; }, "Such as \"lines\".");
+    table.def_prop_ro(
+        "column_names",
+        [](const CHostTable& self) {
+            nb::list names;
+            for (const CTable::CField& field : self.table->fields) names.append(field.name.c_str());
+            return nb::tuple(names);
+        },
+        nb::sig("def column_names(self) -> tuple[str, ...]"), "The names of its columns.");
+    table.def("__len__", [](const CHostTable& self) { return self.table->count; });
+    table.def(
+        "__arrow_c_stream__", [](const CHostTable& self, nb::handle) { return StreamCapsule(self.table); },
+        "requested_schema"_a.none() = nb::none(),
+        nb::sig("def __arrow_c_stream__(self, requested_schema: object = None) -> object"),
+        "The table as a stream of one batch. No other schema is made on request.");
+    table.def("__repr__", [](const CHostTable& self) {
+        return nb::str("<Table {}: {}>").format(self.name, self.table->count);
+    });
+    module.def(
+        "table_kinds",
+        [] {
+            nb::list kinds;
+            for (const CTableKind& kind : TableKinds())
+                kinds.append(nb::make_tuple(kind.name, kind.meaning, ColumnsOf(kind)));
+            return kinds;
+        },
+        nb::sig("def table_kinds() -> list[tuple[str, str, list[tuple[str, str, bool, str]]]]"),
+        "For each table its name, its meaning and its columns: name, type, whether it may hold nulls, "
+        "meaning.");
+}
+
+}  // namespace codeloom
