@@ -98,6 +98,48 @@ def test_settings(tmp_path):
         assert Brief(client.diagnostics()) == [("0:4-0:5", "CL203")]
 
 
+def test_files_that_are_not_open(tmp_path):
+    (tmp_path / "sub").mkdir()
+    files = {"a.py": "x = )\n", "sub/b.py": "x = 1\n", "sub/c.py": "x = (\n", "d.ipynb": "{", ".h/e.py": ")"}
+    for name, text in files.items():
+        (tmp_path / name).parent.mkdir(exist_ok=True)
+        (tmp_path / name).write_text(text)
+    options = {"workspaceDiagnostics": True}
+    with Client(tmp_path, options=options) as client:
+        assert [one.code for one in client.diagnostics("a.py")] == ["CL203"]
+        assert [one.code for one in client.diagnostics("sub/c.py")] == ["CL202"]
+        document = client.open("x = 2\n", "a.py")  # what is open counts as it is there
+        assert client.diagnostics("a.py") == []
+        client.notify("textDocument/didClose", document)
+        del client.versions["a.py"]
+        assert client.diagnostics("a.py") == []
+        assert [one.code for one in client.diagnostics("a.py")] == ["CL203"]
+        (tmp_path / "a.py").unlink()
+        (tmp_path / "sub/b.py").write_text("return\n")
+        changes = [{"uri": client.uri(name), "type": 2} for name in ("a.py", "sub/b.py")]
+        client.notify("workspace/didChangeWatchedFiles", {"changes": changes})
+        assert client.diagnostics("a.py") == []
+        assert [one.code for one in client.diagnostics("sub/b.py")] == ["CL321"]
+        (tmp_path / "pyproject.toml").write_text('[tool.codeloom]\nextend-exclude = ["sub/"]\n')
+        assert not client.errors
+    with Client(tmp_path, options=options, capabilities=PULL) as client:  # asked for, and waited for
+        first = client.request("workspace/diagnostic", {"previousResultIds": []})
+        assert first.items == ()
+        (tmp_path / "f.py").write_text("x = (\n")
+        known = [{"uri": client.uri("f.py"), "value": "none"}]
+        waiting = client.begin("workspace/diagnostic", {"previousResultIds": known})
+        changes = [{"uri": client.uri("f.py"), "type": 1}]
+        client.notify("workspace/didChangeWatchedFiles", {"changes": changes})
+        (report,) = client.answer(waiting, "workspace/diagnostic").items
+        assert (report.uri, report.kind, report.items[0].code) == (client.uri("f.py"), "full", "CL202")
+        known = [{"uri": report.uri, "value": report.result_id}]
+        waiting = client.begin("workspace/diagnostic", {"previousResultIds": known})
+        client.notify("$/cancelRequest", {"id": waiting})
+        with pytest.raises(Refused) as cancelled:
+            client.answer(waiting)
+        assert cancelled.value.code == -32800
+
+
 def test_random_edits(tmp_path, seed):
     """After any edits the server has the client's text: it says of it what `analyze` does."""
     chance = random.Random(seed)
@@ -133,7 +175,7 @@ def test_odd_messages(client):
     refused = [
         ("textDocument/hover", client.at(0, 0, "other.py"), -32602, "isn't open"),
         ("textDocument/hover", client.at(7, 0), -32602, "no position 7:0"),
-        ("textDocument/hover", client.at(0, -1), -32602, "no position 0:-1"),
+        ("textDocument/hover", client.at(0, -1), -32602, "parameters of textDocument/hover"),
         ("textDocument/hover", {"textDocument": 3}, -32602, "parameters of textDocument/hover"),
         ("textDocument/hover", None, -32602, "parameters of textDocument/hover"),
         ("no/such", {}, -32601, "no/such"),

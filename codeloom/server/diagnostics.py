@@ -9,6 +9,7 @@ from lsprotocol import types
 
 from codeloom.cli.items import Finding
 from codeloom.server.documents import OpenDocument
+from codeloom.server.places import PlacedText
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -53,15 +54,16 @@ class Publisher:
     def show(self, document: OpenDocument) -> None:
         """Tell the problems of a text."""
         if not self.is_asked:
-            self.publish(document.uri, diagnostics_of(document), document.version)
+            self.tell(document.uri, diagnostics_of(document), document.version)
 
     def clear(self, document: OpenDocument) -> None:
         """Tell that a text has none any more."""
-        if not self.is_asked:
-            self.publish(document.uri, [])
+        self.tell(document.uri, [])
 
-    def publish(self, uri: str, items: Sequence[types.Diagnostic], version: int | None = None) -> None:
+    def tell(self, uri: str, items: Sequence[types.Diagnostic], version: int | None = None) -> None:
         """Tell the diagnostics of any text."""
+        if self.is_asked:
+            return
         self._server.text_document_publish_diagnostics(types.PublishDiagnosticsParams(uri, items, version))
 
 
@@ -70,19 +72,18 @@ def diagnostics_of(document: OpenDocument) -> list[types.Diagnostic]:
     return [diagnostic_of(document, finding) for finding in document.findings]
 
 
-def diagnostic_of(document: OpenDocument, finding: Finding) -> types.Diagnostic:
+def diagnostic_of(text: PlacedText, finding: Finding) -> types.Diagnostic:
     """One problem, with its hint after the message."""
     hint = f" (hint: {finding.hint})" if finding.hint else ""
     return types.Diagnostic(
-        range=document.range(finding.range),
+        range=text.range(finding.range),
         message=finding.message + hint,
         severity=_SEVERITIES[finding.severity],
         code=finding.code,
         code_description=types.CodeDescription(_page(finding.code)),
         source=SOURCE,
         related_information=[
-            types.DiagnosticRelatedInformation(document.location(place), text)
-            for place, text in finding.related
+            types.DiagnosticRelatedInformation(text.location(place), said) for place, said in finding.related
         ]
         or None,
     )

@@ -15,6 +15,7 @@ from codeloom._document import Document
 from codeloom.cli.items import Finding
 from codeloom.cli.source import Source
 from codeloom.rows import RowTexts
+from codeloom.server.places import PlacedText
 from codeloom.server.rows import Place, Rows
 from codeloom.server.settings import Settings, SettingsByFolder
 from codeloom.server.units import Units
@@ -25,15 +26,13 @@ Item = TypeVar("Item")
 _SLICE = 256
 
 
-class OpenDocument:
+class OpenDocument(PlacedText):
     """One text. Places of the protocol count from zero in the client's units."""
 
     def __init__(self, item: types.TextDocumentItem, units: Units, settings: Settings) -> None:
-        self.uri = item.uri
+        super().__init__(item.uri, Rows(item.text), units)
         self.path = to_fs_path(item.uri) or item.uri
         self.version = item.version
-        self.units = units
-        self.rows = Rows(item.text)
         self.take(settings)
 
     def take(self, settings: Settings) -> None:
@@ -86,22 +85,6 @@ class OpenDocument:
     def place(self, position: types.Position) -> tuple[int, int]:
         """A position of the client as the analysis counts: row and column from 1."""
         return _from_one(self._edge(position))
-
-    def position(self, row: int, column: int) -> types.Position:
-        """A place of the analysis as the client counts."""
-        text = self.rows[row - 1]
-        units = column - 1 if text.isascii() else self.units.length(text[: column - 1])
-        return types.Position(row - 1, units)
-
-    def range(self, place: Range) -> types.Range:
-        """A range of the analysis as the client counts."""
-        return types.Range(
-            self.position(place.row, place.column), self.position(place.end_row, place.end_column)
-        )
-
-    def location(self, place: Range) -> types.Location:
-        """The same with the name of the text."""
-        return types.Location(self.uri, self.range(place))
 
     def occurrence_at(self, position: types.Position) -> Occurrence | None:
         """The name at a position, or that ends there."""
@@ -168,6 +151,10 @@ class Documents:
 
     def __iter__(self) -> Iterator[OpenDocument]:
         return iter(list(self._by_uri.values()))
+
+    def is_open(self, path: str) -> bool:
+        """True for the path of a text that is open."""
+        return any(document.path == path for document in self._by_uri.values())
 
     def open(self, item: types.TextDocumentItem) -> OpenDocument:
         """Take a text that the client has opened, also in the place of one of the same name."""

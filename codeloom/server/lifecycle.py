@@ -23,11 +23,6 @@ def register(server: "Server") -> None:
         if os.path.basename(params.text_document.uri) in SETTINGS_FILES:
             server.settings_changed()
 
-    @server.feature(types.WORKSPACE_DID_CHANGE_WATCHED_FILES)
-    def did_change_watched_files(params: types.DidChangeWatchedFilesParams) -> None:
-        if any(os.path.basename(change.uri) in SETTINGS_FILES for change in params.changes):
-            server.settings_changed()
-
     @server.feature(types.WORKSPACE_DID_CHANGE_CONFIGURATION)
     def did_change_configuration(params: types.DidChangeConfigurationParams) -> None:
         server.settings_changed()

@@ -36,10 +36,13 @@ class Protocol(LanguageServerProtocol):
         super().__init__(server, converter)
         self.inbox = Inbox()
         self.ended: asyncio.Future[int] | None = None
+        # When it came, in the time of the loop.
+        self.last_message = 0.0
         self._is_initialized = False
 
     def take(self, message: Any) -> None:
         """Handle what was read: a message, something else that is JSON, or an error of reading."""
+        self.last_message = asyncio.get_running_loop().time()
         try:
             if isinstance(message, Exception):
                 raise JsonRpcParseError(f"the message can't be read: {message}")

@@ -18,6 +18,7 @@ from codeloom.server import (
     selection,
     symbols,
     tokens,
+    workspace,
 )
 from codeloom.server.server import Server
 from codeloom.server.transport import Writer, read_messages, standard_streams
@@ -34,6 +35,7 @@ _FEATURES = (
     folding,
     selection,
     completion,
+    workspace,
 )
 
 # A thread that works in the background gives way to a message after so many seconds.

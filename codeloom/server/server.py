@@ -12,6 +12,7 @@ from codeloom.server.diagnostics import Publisher
 from codeloom.server.documents import Documents, OpenDocument
 from codeloom.server.protocol import Protocol
 from codeloom.server.units import Units
+from codeloom.server.workspace import ClosedFiles
 
 
 class Server(LanguageServer):
@@ -29,14 +30,18 @@ class Server(LanguageServer):
         )
         self.documents = Documents()
         self.publisher = Publisher(self)
+        self.closed_files = ClosedFiles(self)
 
     def begin(self, params: types.InitializeParams) -> None:
         """Take what the client has said of itself."""
-        self.documents.units = Units(str(getattr(self._encoding(), "value", self._encoding())))
+        encoding = self.workspace.position_encoding or types.PositionEncodingKind.Utf16
+        self.documents.units = Units(types.PositionEncodingKind(encoding).value)
+        self.closed_files.take_options(params.initialization_options)
 
     def opened(self, item: types.TextDocumentItem) -> None:
         """The client has opened a text."""
         document = self.documents.open(item)
+        self.closed_files.opened(document)
         self._tell_faults([document])
         self.publisher.show(document)
 
@@ -53,12 +58,15 @@ class Server(LanguageServer):
 
     def closed(self, uri: str) -> None:
         """The client has closed a text."""
-        self.publisher.clear(self.documents.close(uri))
+        document = self.documents.close(uri)
+        self.publisher.clear(document)
+        self.closed_files.look_at([document.path])
 
     def settings_changed(self) -> None:
         """A file of settings has changed, or may have."""
         self.documents.read_settings_anew()
         self._tell_faults(self.documents)
+        self.closed_files.begin()
         for document in self.documents:
             self.publisher.show(document)
 
@@ -66,13 +74,14 @@ class Server(LanguageServer):
         """Write into the client's log what nobody waits for; requests get their answers."""
         if source is not None and source.__name__ == "FeatureRequestError":
             return
-        self.window_log_message(types.LogMessageParams(types.MessageType.Error, str(error)))
+        self.log(str(error), types.MessageType.Error)
+
+    def log(self, text: str, kind: types.MessageType = types.MessageType.Info) -> None:
+        """Write into the client's log."""
+        self.window_log_message(types.LogMessageParams(kind, text))
 
     def _tell_faults(self, documents: Iterable[OpenDocument]) -> None:
         """Show why settings aren't taken, each time once."""
         for fault in dict.fromkeys(document.settings.fault for document in documents):
             if fault is not None:
                 self.window_show_message(types.ShowMessageParams(types.MessageType.Error, fault))
-
-    def _encoding(self) -> Any:
-        return self.workspace.position_encoding

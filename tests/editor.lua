@@ -1,0 +1,47 @@
+-- A session of Neovim without a screen: it opens a file, breaks it, sees the diagnostics, mends it,
+-- and renames a name. Given: the file, where to write what was seen, and the server's command.
+
+local file, report = vim.env.EDITED_FILE, vim.env.EDITOR_REPORT
+local command = vim.fn.json_decode(vim.env.SERVER_COMMAND)
+local seen = {}
+
+local function wait(what, condition)
+  if not vim.wait(20000, condition, 20) then
+    error('waited in vain: ' .. what)
+  end
+end
+
+local function diagnostics()
+  return vim.tbl_map(function(one)
+    return { one.lnum, one.col, one.code, one.message }
+  end, vim.diagnostic.get(0))
+end
+
+local function session()
+  vim.cmd('edit ' .. vim.fn.fnameescape(file))
+  local client = vim.lsp.start_client({ name = 'codeloom', cmd = command, root_dir = vim.fn.fnamemodify(file, ':h') })
+  assert(vim.lsp.buf_attach_client(0, client))
+  wait('the server', function()
+    return vim.lsp.buf_is_attached(0, client) and vim.lsp.get_client_by_id(client).initialized
+  end)
+
+  vim.api.nvim_buf_set_lines(0, 3, 3, false, { 'broken = (1' })
+  wait('a problem', function() return #diagnostics() == 1 end)
+  seen.broken = diagnostics()
+  vim.api.nvim_buf_set_text(0, 3, 11, 3, 11, { ')' })
+  wait('no problem', function() return #diagnostics() == 0 end)
+
+  vim.api.nvim_win_set_cursor(0, { 1, 4 })
+  vim.lsp.buf.rename('circle')
+  wait('the rename', function()
+    return vim.api.nvim_buf_get_lines(0, 0, 1, false)[1]:find('circle') ~= nil
+  end)
+  seen.rows = vim.api.nvim_buf_get_lines(0, 0, -1, false)
+  vim.cmd('write')
+  vim.lsp.stop_client(client)
+end
+
+local done, message = pcall(session)
+seen.failure = not done and tostring(message) or nil
+vim.fn.writefile({ vim.fn.json_encode(seen) }, report)
+vim.cmd('qall!')
