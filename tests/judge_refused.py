@@ -98,7 +98,8 @@ def is_same_cause(theirs: str, ours: str) -> bool:
     )
 
 
-def _rows_of_shortfalls(judged: Iterable[Judged], measure: str) -> Iterator[str]:
+def rows_of_shortfalls(judged: Iterable[Judged], measure: str) -> Iterator[str]:
+    """The texts that fall short by a measure, by the interpreter's words."""
     by_words = defaultdict(list)
     for text in judged:
         if not getattr(text, measure):
@@ -125,7 +126,7 @@ def main() -> None:
     version = subprocess.run(asked, capture_output=True, check=True, text=True).stdout.strip()
     judged = [judge(refused, version) for refused in texts]
     if options.show:
-        print("\n".join(_rows_of_shortfalls(judged, options.show)))
+        print("\n".join(rows_of_shortfalls(judged, options.show)))
     print(f"{len(judged)} texts that {version} refuses")
     for measure in MEASURES:
         count = sum(getattr(text, measure) for text in judged)

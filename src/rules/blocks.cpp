@@ -106,11 +106,38 @@ uint32_t CBlockTracker::_FramesOf(const CStatementHead& head) const {
     }
 }
 
-// The interpreter's limit, reported once: 20, and from 3.13 on 21, where an `async def` needs one for itself.
+// The interpreter's limit: 20, and from 3.13 on 21, where an `async def` and a generator need one for
+// themselves.
 void CBlockTracker::_CheckFrames() {
-    const uint32_t most = _fLanguage.version >= 313 ? 21 : 20;
-    if (_Top().frame_count + _FramesOf(_fHead) <= most || std::exchange(_fHasTooManyFrames, true)) return;
-    _Report(ECode::kTooManyBlocks, _fHead.start, _fHead.end, "too many statically nested blocks");
+    const bool counts_function = _fLanguage.version >= 313;
+    const uint32_t most = counts_function ? 21 : 20;
+    const uint32_t count = _Top().frame_count + _FramesOf(_fHead);
+    const CSpan place{_fHead.start, _fHead.end};
+    if (count > most) return _ReportTooManyFrames(place);
+    if (count < most || !counts_function) [[likely]]
+        return;
+    CBlock* const function = _InnermostFunction();
+    if (function == nullptr) return;
+    if (function->has_yield) return _ReportTooManyFrames(place);
+    function->full_header = place;
+}
+
+CBlock* CBlockTracker::_InnermostFunction() {
+    const auto found = std::find_if(_fBlocks.rbegin(), _fBlocks.rend(),
+                                    [](const CBlock& block) { return block.clause == EClause::kDef; });
+    return found == _fBlocks.rend() ? nullptr : &*found;
+}
+
+void CBlockTracker::TakeYield() {
+    CBlock* const function = _InnermostFunction();
+    if (function == nullptr || std::exchange(function->has_yield, true)) return;
+    if (function->full_header.end > 0) _ReportTooManyFrames(function->full_header);
+}
+
+// Once a text.
+void CBlockTracker::_ReportTooManyFrames(const CSpan& place) {
+    if (std::exchange(_fHasTooManyFrames, true)) return;
+    _Report(ECode::kTooManyBlocks, place.start, place.end, "too many statically nested blocks");
 }
 
 void CBlockTracker::_Place(const CIndent& indent) {

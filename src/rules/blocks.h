@@ -48,7 +48,9 @@ struct CBlock {
     bool is_of_try = false;            // the `else` before is that of a `try`
     EClause lacking_clause = EClause::kSimple;
     uint32_t bare_except_start = 0, bare_except_end = 0;  // of the `try` under way; equal where it has none
-    CSpan takes_all;  // in the pattern of a case before that leaves nothing to others; empty for none
+    CSpan takes_all;         // in the pattern of a case before that leaves nothing to others; empty for none
+    bool has_yield = false;  // of a function's
+    CSpan full_header;       // of a function's: the one within that leaves no frame; empty for none
     uint32_t frame_count = 0;  // of the function's blocks that the interpreter keeps a frame for, here
 };
 
@@ -64,6 +66,9 @@ class CBlockTracker {
 
     // The line that was entered last is a `case` whose pattern takes everything by this name.
     void TakeAllCases(const CSpan& name) { _fTakesAll = name; }
+
+    // The line that was entered last holds a `yield`.
+    void TakeYield();
 
     // Takes note of the line that was entered last: whether it has a fault of its own.
     void Leave(bool has_fault);
@@ -103,6 +108,8 @@ class CBlockTracker {
     void _CheckCase(CBlock& block);
     uint32_t _FramesOf(const CStatementHead& head) const;
     void _CheckFrames();
+    CBlock* _InnermostFunction();
+    void _ReportTooManyFrames(const CSpan& place);
     void _DropPlacementSince(uint32_t start);
     CProblem& _Report(ECode code, uint32_t start, uint32_t end, std::string message);
 

@@ -55,6 +55,8 @@ void CTextChecker::Take(const CRawLogical& part, const CTree& tree) {
         _fAnnotations.clear();
         if (setting.defers_annotations && !part.embedded.empty()) _fAnnotations = AnnotationsWithFields(tree);
         _fPlacement.Check(part, &tree, _fBlocks);
+        if (part.MayHaveWords(WordBits(EWord::kYield)) && !tree.HasKind(ENodeKind::kLambda))
+            _fBlocks.TakeYield();
         if (!tree.fIsEmpty && _fProblems.size() == _fFirstProblem)
             if (const CTreeNode* const name = TakesAllCases(tree, tree.fRoot))
                 _fBlocks.TakeAllCases(SpanOf(tree, *name));
