@@ -1,4 +1,4 @@
-"""Texts that the interpreter's own test suite expects to be refused: found, on its row, and with its cause."""
+"""Texts that the interpreter's own test suite expects to be refused: found, on its row, with its cause."""
 
 import sys
 
