@@ -180,17 +180,8 @@ bool CMatchCaseStatementParser::_IsTok(Py_ssize_t tok_i, std::string_view text) 
     return CUtf8(_Tok(tok_i)) == text;
 }
 
-bool CMatchCaseStatementParser::_IsSign(Py_ssize_t tok_i) const {
-    return _IsTok(tok_i, "+") || _IsTok(tok_i, "-");
-}
-
 Py_ssize_t CMatchCaseStatementParser::_Find(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i) {
     return CheckedIndex(_NonNestedFindTokenIndex(nb::str(tok), start_i, end_i), start_i, end_i);
-}
-
-Py_ssize_t CMatchCaseStatementParser::_FindOrEnd(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i) {
-    const Py_ssize_t tok_i = _Find(tok, start_i, end_i);
-    return tok_i == -1 ? end_i : tok_i;
 }
 
 void CMatchCaseStatementParser::_FailAt(Py_ssize_t error_i) {

@@ -127,9 +127,8 @@ class CMatchCaseStatementParser : public CHosted {
     int _TokType(Py_ssize_t tok_i) const;
     bool _IsTok(Py_ssize_t tok_i, std::string_view text) const;
 
-    // -1 where `tok` isn't found; or the end of the range.
+    // -1 where `tok` isn't found.
     Py_ssize_t _Find(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
-    Py_ssize_t _FindOrEnd(const char* tok, Py_ssize_t start_i, Py_ssize_t end_i);
 
     [[noreturn]] void _FailAt(Py_ssize_t error_i);
 
@@ -142,21 +141,9 @@ class CMatchCaseStatementParser : public CHosted {
     bool _IsStatementOfType(nb::handle logical_type) const;
     CNodeRef _ParseRange(Py_ssize_t start_i, Py_ssize_t end_i);
 
-    // Plans of patterns, see case_patterns.cpp.
+    // The node of one pattern, see case_patterns.cpp.
+    struct CPatternTokens;
     CNodeRef _NodeFor(const CPatternStep& first);
-    void _PlanPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i, bool allow_as);
-    void _PlanCapture(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanAlternatives(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanGroup(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanSingleToken(CPlan& plan, Py_ssize_t tok_i, int tok_type);
-    void _PlanStar(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanNumberPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanDottedNameValue(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanSequencePattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanMappingPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanClassPattern(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanClassArgument(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    bool _IsSign(Py_ssize_t tok_i) const;
 
     nb::object _fToks = nb::none();       // tuple of the line's token texts; none between two parses
     nb::object _fPositions = nb::none();  // tuple of their positions; none between two parses

@@ -150,9 +150,4 @@ uint32_t CMatchCaseParser::_FindWord(EWord word, uint32_t from, uint32_t to) con
     return _FindIf(from, to, [word](const CRawToken& token) { return token.word == word; });
 }
 
-uint32_t CMatchCaseParser::_FindOrEnd(int type, uint32_t from, uint32_t to) const {
-    const uint32_t i = _Find(type, from, to);
-    return i == kNone ? to : i;
-}
-
 }  // namespace codeloom

@@ -48,41 +48,25 @@ class CMatchCaseParser {
     uint32_t _Count() const { return static_cast<uint32_t>(_fTokens.size()); }
     const CRawToken& _Token(uint32_t i) const { return _fSpan.Token(_fTokens[i]); }
     int _Type(uint32_t i) const { return _Token(i).type; }
-    bool _IsSign(uint32_t i) const { return _Type(i) == kTokenId_PLUS || _Type(i) == kTokenId_MINUS; }
     CTreeNode _Leaf(uint32_t i) const;
     [[noreturn]] void _FailAt(uint32_t i) const;
 
-    // The token in [from, to) outside brackets that is of a type, or a word; kNone, or the end of the range,
-    // where there is none. Each takes one step over a whole bracket, so that nested brackets cost no more
-    // than flat ones.
+    // The token in [from, to) outside brackets that is of a type, or a word; kNone where there is none. Each
+    // takes one step over a whole bracket, so that nested brackets cost no more than flat ones.
     template <class IsWanted>
     uint32_t _FindIf(uint32_t from, uint32_t to, IsWanted is_wanted) const;
     uint32_t _Find(int type, uint32_t from, uint32_t to) const;
     uint32_t _FindWord(EWord word, uint32_t from, uint32_t to) const;
-    uint32_t _FindOrEnd(int type, uint32_t from, uint32_t to) const;
 
     // Patterns, see case_patterns.cpp.
+    struct CPatternTokens;
     CTreeNode _ParsePattern(uint32_t start_i, uint32_t end_i);
     void _DoStep(const CCasePatternStep& step);
     bool _PlanNewerPattern(const CCasePatternStep& step);
-    void _PlanPattern(CPlan&& plan, uint32_t start_i, uint32_t end_i, bool allow_as);
-    void _PlanCapture(CPlan& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanAlternatives(CPlan& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanGroup(CPlan& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanSingleToken(CPlan& plan, uint32_t i);
-    void _PlanStar(CPlan& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanNumber(CPlan&& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanDottedName(CPlan&& plan, uint32_t start_i, uint32_t end_i);
     void _PlanStrings(CPlan&& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanSequence(CPlan&& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanPatterns(CPlan& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanMapping(CPlan&& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanClassPattern(CPlan&& plan, uint32_t start_i, uint32_t end_i);
-    void _PlanClassArgument(CPlan&& plan, uint32_t start_i, uint32_t end_i);
     void _RefuseWhatNoPatternIs(const CCasePatternStep& step) const;
     void _RefuseKeyword(uint32_t i) const;
     bool _IsOpenSequence(const CCasePatternStep& step) const;
-    bool _IsCapture(uint32_t start_i, uint32_t end_i, bool allow_as) const;
     bool _BeginsWithStrings(const CCasePatternStep& step) const;
     bool _IsEmptySequence(const CCasePatternStep& step) const;
 
