@@ -3,6 +3,7 @@
 #include "host/errors.h"
 #include "host/restore.h"
 #include "parse/parentheses.h"
+#include "parse/pattern_tokens.h"
 #include "parse/pseudo_node.h"
 #include "parse/token_copy.h"
 #include "text/token_type.h"
@@ -23,6 +24,15 @@ bool IsSubject(const CNode& node) {
 }
 
 }  // namespace
+
+struct CExtendedMatchCaseParser::CPatternTokens : CMatchCaseStatementParser::CPatternTokens {
+    static constexpr Py_ssize_t kFirstAfterWord = kPatternIndex;
+    static constexpr CPatternNodeMaker kAtom = &NewPseudoNode<CAtom>;
+
+    CExtendedMatchCaseParser& extended_parser;
+
+    void RefuseKeyword(Py_ssize_t i) const { extended_parser._RefuseKeyword(i); }
+};
 
 // Removed tokens are none of the statement's: those before the bound in `def f[T: match.a]()`.
 nb::tuple CExtendedMatchCaseParser::_RemoveSkipToks(nb::tuple toks, nb::tuple positions) {
@@ -91,58 +101,15 @@ CNodeRef CExtendedMatchCaseParser::_NodeForPattern(Py_ssize_t start_i, Py_ssize_
 
 void CExtendedMatchCaseParser::DoPatternStep(CPatternWork& work, const CPatternStep& step) {
     const bool is_pattern = step.kind == CPatternStep::EKind::kPattern;
-    if (is_pattern) _RefuseWhatNoPatternIs(step);
+    if (is_pattern && TCasePatternPlans(CPatternTokens{{*this}, *this}).PlanExtended(CPlan(work), step))
+        return;
     if (step.kind == CPatternStep::EKind::kToken && !_IsTok(step.start_i, "as")) _RefuseKeyword(step.start_i);
-    if (is_pattern && _IsOpenSequence(step)) return _PlanOpenSequence(CPlan(work), step.start_i, step.end_i);
-    if (is_pattern && _BeginsWithStrings(step)) return _PlanStrings(CPlan(work), step.start_i, step.end_i);
-    if (is_pattern && _IsEmptySequence(step))
-        return CPlan(work).Part(CPatternStep::EKind::kSequence, step.start_i, step.end_i);
     CMatchCaseStatementParser::DoPatternStep(work, step);
-}
-
-// The parser beneath takes keywords for names, and a bar at the end.
-void CExtendedMatchCaseParser::_RefuseWhatNoPatternIs(const CPatternStep& step) {
-    if (step.start_i + 1 == step.end_i) _RefuseKeyword(step.start_i);
-    if (step.start_i + 1 < step.end_i && _IsTok(step.end_i - 1, "|")) _FailAt(step.end_i);
 }
 
 void CExtendedMatchCaseParser::_RefuseKeyword(Py_ssize_t tok_i) {
     const nb::object tok = _Tok(tok_i);
     if (_fPGenParser->IsKeyword(tok) && !TextIsOneOf(tok, "None", "True", "False")) _FailAt(tok_i);
-}
-
-// Of the ranges that begin after `case`, the whole pattern is the only one with a comma outside brackets.
-bool CExtendedMatchCaseParser::_IsOpenSequence(const CPatternStep& step) {
-    return step.start_i == kPatternIndex && step.allow_as && _Find(",", step.start_i, step.end_i) != -1;
-}
-
-bool CExtendedMatchCaseParser::_BeginsWithStrings(const CPatternStep& step) {
-    if (step.start_i + 1 >= step.end_i || _TokType(step.start_i) != kTokenId_STRING) return false;
-    const bool is_capture = step.allow_as && step.start_i + 2 < step.end_i && _IsTok(step.end_i - 2, "as");
-    return !is_capture && _Find("|", step.start_i, step.end_i) == -1;
-}
-
-bool CExtendedMatchCaseParser::_IsEmptySequence(const CPatternStep& step) const {
-    return step.start_i + 2 == step.end_i && _IsTok(step.start_i, "(") && _IsTok(step.start_i + 1, ")");
-}
-
-//   case a, *b:
-//        ^^^^^
-//   a CSequencePatternNode: the patterns with the commas, without brackets
-void CExtendedMatchCaseParser::_PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
-    _PlanPatterns(plan, start_i, end_i);
-    plan.Build(&NewPseudoNode<CSequencePatternNode>);
-}
-
-//   case "a" "b":
-//        ^^^^^^^
-//   a CAtom, as in an expression: a leaf for each string
-void CExtendedMatchCaseParser::_PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
-    for (Py_ssize_t i = start_i; i < end_i; ++i) {
-        if (_TokType(i) != kTokenId_STRING) _FailAt(i);
-        plan.Token(i);
-    }
-    plan.Build(&NewPseudoNode<CAtom>);
 }
 
 // Where a token stands among those of the line, comments and backslashes included.

@@ -33,13 +33,8 @@ class CExtendedMatchCaseParser : public CMatchCaseStatementParser {
     Py_ssize_t _FindCaseColon() override;
 
   private:
-    void _RefuseWhatNoPatternIs(const CPatternStep& step);
+    struct CPatternTokens;
     void _RefuseKeyword(Py_ssize_t tok_i);
-    bool _IsOpenSequence(const CPatternStep& step);
-    bool _BeginsWithStrings(const CPatternStep& step);
-    bool _IsEmptySequence(const CPatternStep& step) const;
-    void _PlanOpenSequence(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
-    void _PlanStrings(CPlan&& plan, Py_ssize_t start_i, Py_ssize_t end_i);
     Py_ssize_t _IndexInLine(Py_ssize_t tok_i) const;
     CNodeRef _Parse(nb::tuple toks);
 

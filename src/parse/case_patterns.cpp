@@ -2,38 +2,12 @@
 #include "host/errors.h"
 #include "host/text.h"
 #include "parse/match_case_parser.h"
-#include "parse/pattern_work.h"
-#include "syntax/case_pattern_plans.h"
-#include "tree/expression_nodes.h"
-#include "tree/statement_nodes.h"
+#include "parse/pattern_tokens.h"
 
 namespace codeloom {
 
 using EKind = CPatternStep::EKind;
 using CPlan = CPatternWork::CPlan;
-
-// The tokens of the line as plans of patterns look at them.
-struct CMatchCaseStatementParser::CPatternTokens {
-    using CIndex = Py_ssize_t;
-    using CPlan = CPatternWork::CPlan;
-
-    static constexpr Py_ssize_t kNone = -1;
-    static constexpr CPatternNodeMaker kPattern = &NewPseudoNode<CPatternNode>;
-    static constexpr CPatternNodeMaker kSequencePattern = &NewPseudoNode<CSequencePatternNode>;
-    static constexpr CPatternNodeMaker kClassPattern = &NewPseudoNode<CClassPatternNode>;
-    static constexpr CPatternNodeMaker kClassArgumentPattern = &NewPseudoNode<CClassArgumentPatternNode>;
-    static constexpr CPatternNodeMaker kExpression = &NewPseudoNode<CExpression>;
-
-    CMatchCaseStatementParser& parser;
-
-    int Type(Py_ssize_t i) const { return parser._TokType(i); }
-    Py_ssize_t Count() const { return parser._TokCount(); }
-    bool IsAs(Py_ssize_t i) const { return parser._IsTok(i, "as"); }
-    Py_ssize_t Find(const CPatternMark& mark, Py_ssize_t start_i, Py_ssize_t end_i) const {
-        return parser._Find(mark.text, start_i, end_i);
-    }
-    [[noreturn]] void FailAt(Py_ssize_t i) const { parser._FailAt(i); }
-};
 
 // The operations as the host calls them, and as overrides see them. Each does its own work to the end.
 
@@ -86,10 +60,6 @@ void CMatchCaseStatementParser::DoPatternStep(CPatternWork& work, const CPattern
         default:
             return TCasePatternPlans(CPatternTokens{*this}).Plan(CPlan(work), step);
     }
-}
-
-void CMatchCaseStatementParser::_PlanPatterns(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i) {
-    TCasePatternPlans(CPatternTokens{*this}).Patterns(plan, start_i, end_i);
 }
 
 }  // namespace codeloom

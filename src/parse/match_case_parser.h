@@ -113,8 +113,8 @@ class CMatchCaseStatementParser : public CHosted {
 
     using CPlan = CPatternWork::CPlan;
 
-    // Plans the patterns in [start_i, end_i) with the commas between them.
-    void _PlanPatterns(CPlan& plan, Py_ssize_t start_i, Py_ssize_t end_i);
+    struct CPatternTokens;  // see pattern_tokens.h
+
     // Where the header of a `case` ends; -1 when it doesn't.
     virtual Py_ssize_t _FindCaseColon();
     // The node that the steps which are left lead to.
@@ -142,7 +142,6 @@ class CMatchCaseStatementParser : public CHosted {
     CNodeRef _ParseRange(Py_ssize_t start_i, Py_ssize_t end_i);
 
     // The node of one pattern, see case_patterns.cpp.
-    struct CPatternTokens;
     CNodeRef _NodeFor(const CPatternStep& first);
 
     nb::object _fToks = nb::none();       // tuple of the line's token texts; none between two parses

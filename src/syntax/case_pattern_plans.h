@@ -6,7 +6,9 @@
 //
 // Tokens has CIndex, CPlan and kNone; Type(i) and Count(); Find(mark, start_i, end_i), the index of a mark
 // outside brackets or kNone; IsAs(i); FailAt(i), which doesn't return; and what makes each kind of node:
-// kPattern, kSequencePattern, kClassPattern, kClassArgumentPattern, kExpression.
+// kPattern, kSequencePattern, kClassPattern, kClassArgumentPattern, kExpression. Extended patterns take kAtom
+// and kFirstAfterWord, the index of the token after `case`, and RefuseKeyword(i), which fails at what can't
+// be a name.
 #pragma once
 
 #include <cassert>
@@ -64,8 +66,34 @@ class TCasePatternPlans {
         }
     }
 
+    // The same for what the step takes in the language as it is and not in the definition of the parser:
+    //   case a, *b:    case "a" "b":    case ():
+    // False for all other patterns. What the other steps would take wrongly is refused: keywords for names,
+    // and a bar at the end.
+    template <class Step>
+    bool PlanExtended(CPlan&& plan, const Step& step) {
+        assert(step.kind == EKind::kPattern);
+        const Index start_i = step.start_i, end_i = step.end_i;
+        if (start_i + 1 == end_i) _fTokens.RefuseKeyword(start_i);
+        if (start_i + 1 < end_i && _fTokens.Type(end_i - 1) == kTokenId_VBAR) _fTokens.FailAt(end_i);
+        if (_IsOpenSequence(step)) {
+            _Patterns(plan, start_i, end_i);
+            plan.Build(Tokens::kSequencePattern);
+        } else if (_BeginsWithStrings(step)) {
+            _Strings(plan, start_i, end_i);
+        } else if (_IsEmptySequence(start_i, end_i)) {
+            plan.Part(EKind::kSequence, start_i, end_i);
+        } else {
+            return false;
+        }
+        return true;
+    }
+
+  private:
+    static constexpr Index kNone = Tokens::kNone;
+
     // The patterns in [start_i, end_i) with the commas between them.
-    void Patterns(CPlan& plan, Index start_i, Index end_i) {
+    void _Patterns(CPlan& plan, Index start_i, Index end_i) {
         for (Index i = start_i; i < end_i;) {
             const Index comma_i = _FindOrEnd(pattern_mark::kComma, i, end_i);
             plan.Pattern(i, comma_i);
@@ -74,12 +102,28 @@ class TCasePatternPlans {
         }
     }
 
-    bool IsCapture(Index start_i, Index end_i, bool allow_as) {
+    bool _IsCapture(Index start_i, Index end_i, bool allow_as) {
         return allow_as && end_i > start_i + 2 && _fTokens.IsAs(end_i - 2);
     }
 
-  private:
-    static constexpr Index kNone = Tokens::kNone;
+    // Of the ranges that begin after `case`, the whole pattern is the only one with a comma outside brackets.
+    template <class Step>
+    bool _IsOpenSequence(const Step& step) {
+        return step.start_i == Tokens::kFirstAfterWord && step.allow_as &&
+               _Has(pattern_mark::kComma, step.start_i, step.end_i);
+    }
+
+    template <class Step>
+    bool _BeginsWithStrings(const Step& step) {
+        if (step.start_i + 1 >= step.end_i || _fTokens.Type(step.start_i) != kTokenId_STRING) return false;
+        return !_IsCapture(step.start_i, step.end_i, step.allow_as) &&
+               !_Has(pattern_mark::kBar, step.start_i, step.end_i);
+    }
+
+    bool _IsEmptySequence(Index start_i, Index end_i) {
+        return start_i + 2 == end_i && _fTokens.Type(start_i) == kTokenId_LPAR &&
+               _fTokens.Type(start_i + 1) == kTokenId_RPAR;
+    }
 
     bool _Has(const CPatternMark& mark, Index start_i, Index end_i) {
         return _fTokens.Find(mark, start_i, end_i) != kNone;
@@ -97,7 +141,7 @@ class TCasePatternPlans {
 
     void _Pattern(CPlan& plan, Index start_i, Index end_i, bool allow_as) {
         const int type = _fTokens.Type(start_i);
-        if (IsCapture(start_i, end_i, allow_as)) return _Capture(plan, start_i, end_i);
+        if (_IsCapture(start_i, end_i, allow_as)) return _Capture(plan, start_i, end_i);
         if (_Has(pattern_mark::kBar, start_i, end_i)) return _Alternatives(plan, start_i, end_i);
         if (type == kTokenId_LSQB) return plan.Part(EKind::kSequence, start_i, end_i);
         if (type == kTokenId_LPAR && _Has(pattern_mark::kComma, start_i + 1, end_i))
@@ -203,6 +247,17 @@ class TCasePatternPlans {
         plan.Build(Tokens::kExpression);
     }
 
+    //   case "a" "b":
+    //        ^^^^^^^
+    //   an atom, as in an expression: a leaf for each string
+    void _Strings(CPlan& plan, Index start_i, Index end_i) {
+        for (Index i = start_i; i < end_i; ++i) {
+            if (_fTokens.Type(i) != kTokenId_STRING) _fTokens.FailAt(i);
+            plan.Token(i);
+        }
+        plan.Build(Tokens::kAtom);
+    }
+
     //   case [a, b]:   case (a, b):
     //        ^^^^^^         ^^^^^^
     //   a sequence pattern: the bracket, the patterns with the commas, the bracket
@@ -211,7 +266,7 @@ class TCasePatternPlans {
         const Index close_i = end_i - 1;
         const int close_type = _fTokens.Type(start_i) == kTokenId_LSQB ? kTokenId_RSQB : kTokenId_RPAR;
         plan.Token(start_i);
-        Patterns(plan, start_i + 1, close_i);
+        _Patterns(plan, start_i + 1, close_i);
         if (_fTokens.Type(close_i) != close_type) plan.Fail(close_i);
         plan.Token(close_i);
         plan.Build(Tokens::kSequencePattern);

@@ -62,13 +62,7 @@ class CMatchCaseParser {
     struct CPatternTokens;
     CTreeNode _ParsePattern(uint32_t start_i, uint32_t end_i);
     void _DoStep(const CCasePatternStep& step);
-    bool _PlanNewerPattern(const CCasePatternStep& step);
-    void _PlanStrings(CPlan&& plan, uint32_t start_i, uint32_t end_i);
-    void _RefuseWhatNoPatternIs(const CCasePatternStep& step) const;
     void _RefuseKeyword(uint32_t i) const;
-    bool _IsOpenSequence(const CCasePatternStep& step) const;
-    bool _BeginsWithStrings(const CCasePatternStep& step) const;
-    bool _IsEmptySequence(const CCasePatternStep& step) const;
 
     CSpanParser& _fParser;
     CTokenSpan _fSpan;
