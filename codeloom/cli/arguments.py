@@ -13,6 +13,7 @@ from codeloom.cli.command import Command
 from codeloom.cli.console import print_error
 from codeloom.cli.options import Options
 from codeloom.cli.project import nearest
+from codeloom.reading.languages import NEWEST, VERSIONS
 
 # The module and the class of each command, and what it does.
 COMMANDS = {
@@ -27,7 +28,7 @@ COMMANDS = {
 
 _HELP = """usage: codeloom COMMAND ...
 
-Analyses Python source, from 2.7 to 3.15, one logical line at a time.
+Analyses Python source, from {oldest} to {newest}, one logical line at a time.
 
 commands:
 {commands}
@@ -70,9 +71,8 @@ def options_from(argv: Sequence[str]) -> Options:
 
 def _help() -> str:
     width = max(map(len, COMMANDS))
-    return _HELP.format(
-        commands="\n".join(f"  {name:<{width}}  {help}" for name, (*_, help) in COMMANDS.items())
-    )
+    commands = "\n".join(f"  {name:<{width}}  {help}" for name, (*_, help) in COMMANDS.items())
+    return _HELP.format(commands=commands, oldest=VERSIONS[0], newest=NEWEST)
 
 
 def command_named(name: str) -> type[Command]:
