@@ -6,6 +6,7 @@ text after it is what it prints. Blocks of a console hold commands after `$` wit
 """
 
 import ast
+import importlib.util
 import os
 import re
 import shutil
@@ -97,3 +98,18 @@ def test_links_lead_somewhere():
     for path in [ROOT / "README.md", *ROOT.glob("docs/*.md")]:
         for link in re.findall(r"\]\(([^)#:]+)(?:#[^)]*)?\)", path.read_text()):
             assert (path.parent / link).exists(), (path.name, link)
+
+
+def test_the_picture_is_what_the_command_prints():
+    path = ROOT / "tools/make_picture.py"
+    spec = importlib.util.spec_from_file_location("make_picture", path)
+    tool = importlib.util.module_from_spec(spec)
+    spec.loader.exec_module(tool)
+    assert tool.picture() == tool.PICTURE.read_text("utf-8"), "run: python tools/make_picture.py"
+
+
+def test_every_page_is_in_the_site_and_names_the_newest_version():
+    site = (ROOT / "mkdocs.yml").read_text()
+    assert [path.name for path in ROOT.glob("docs/*.md") if f"- {path.name}\n" not in site] == []
+    for page in ("README.md", "docs/index.md", "docs/versions.md"):
+        assert f"from {codeloom.VERSIONS[0]} to {codeloom.NEWEST}" in (ROOT / page).read_text(), page

@@ -1,17 +1,22 @@
 """The formats of the command line: each is valid, and says the same as the others."""
 
+import importlib.util
 import json
 import os
+import re
 import subprocess
 import sys
 import xml.etree.ElementTree as ElementTree
 from importlib.resources import files
+from pathlib import Path
 
+import junitparser
 import pytest
 from jsonschema import Draft202012Validator
 
 from codeloom import __version__
 
+ROOT = Path(__file__).parent.parent
 SCHEMA = json.loads((files("codeloom.cli.formats") / "report-1.schema.json").read_text())
 NOTEBOOK = {
     "cells": [{"cell_type": "markdown", "source": "# x"}, {"cell_type": "code", "source": "a\nb = )"}]
@@ -102,6 +107,18 @@ class TestJson:
         assert location["artifactLocation"]["uri"] == "%FF%C3%A9.py"
 
 
+def test_the_page_says_what_each_field_means():
+    path = ROOT / "tools/make_formats_page.py"
+    spec = importlib.util.spec_from_file_location("make_formats_page", path)
+    tool = importlib.util.module_from_spec(spec)
+    spec.loader.exec_module(tool)
+    page = tool.PAGE.read_text("utf-8")
+    assert tool.with_tables(page) == page, "run: python tools/make_formats_page.py"
+    objects = {name for name, definition in SCHEMA["$defs"].items() if "properties" in definition}
+    assert set(re.findall("<!-- fields of (.*) -->", page)) == objects - {"document"}
+    assert not re.findall(r"^\| `(?!type`).*\|  \|$", page, re.MULTILINE), "a field without a description"
+
+
 def test_concise(written, run_cli):
     assert [row.partition(" CL")[0] for row in written("concise").splitlines()] == [
         "./a & b.py:2:1:",
@@ -166,13 +183,18 @@ def test_gitlab(written):
 
 
 def test_junit(written):
-    suites = ElementTree.fromstring(written("junit"))
+    text = written("junit")
+    suites = ElementTree.fromstring(text)
     (suite,) = suites
     cases = list(suite)
     assert suite.attrib["tests"] == "6" and len(cases) == 6
     assert (suite.attrib["failures"], suite.attrib["errors"]) == ("4", "1")
     assert [[child.tag for child in case] for case in cases] == [["failure"]] * 4 + [[], ["error"]]
     assert "'<'" in cases[0][0].text and "a & b.py:2:1" in cases[0][0].text
+    (read,) = junitparser.JUnitXml.fromstring(text.encode())
+    assert (read.tests, read.failures, read.errors) == (6, 4, 1)
+    assert [case.is_passed for case in read] == [False] * 4 + [True, False]
+    assert next(iter(read)).result[0].type == "CL302"
 
 
 def test_github(written, write_files, run_cli):
