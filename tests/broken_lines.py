@@ -11,7 +11,6 @@ import ast
 import io
 import random
 import re
-import sysconfig
 import tokenize
 import warnings
 from collections import Counter
@@ -22,6 +21,7 @@ from functools import cached_property
 from pathlib import Path
 
 from faults import KINDS, QUOTES, Edit, Line, Lines, OpensTriple, TypedAbove
+from library import plain_texts
 
 from codeloom.logicalline import CLogicalLine
 from codeloom.treesift import CExtendedAnalyzer, CPGenAnalyzerImpl
@@ -251,16 +251,8 @@ def IsBreaking(line: Line, edit: Edit) -> bool:
 
 def SoundTexts(source: random.Random, analyzer: CPGenAnalyzerImpl) -> Iterator[SoundText]:
     """Random files of the interpreter's library without end."""
-    library = Path(sysconfig.get_path("stdlib"))
-    paths = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
-    while True:
-        path = source.choice(paths)
-        try:
-            text = path.read_text("utf-8")
-        except ValueError:
-            continue
-        is_usable = text.isascii() and not set("\f\r\0") & set(text) and 200 < len(text) < 100_000
-        if is_usable and not IsRefused(text):
+    for path, text in plain_texts(source, 100_000):
+        if not IsRefused(text):
             sound = SoundText(path, text, analyzer)
             if len(sound.lines) > 6 and not Errors(sound.logicals, analyzer):
                 yield sound

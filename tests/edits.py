@@ -9,7 +9,6 @@ import argparse
 import io
 import random
 import sys
-import sysconfig
 import tokenize
 import warnings
 from collections import Counter
@@ -17,6 +16,8 @@ from collections.abc import Callable, Iterator
 from dataclasses import dataclass
 from functools import cached_property
 from pathlib import Path
+
+from library import plain_texts
 
 from codeloom import NEWEST, analyze
 
@@ -247,16 +248,8 @@ def is_refused(text: str) -> bool:
 
 
 def sound_sources(chance: random.Random) -> Iterator[Source]:
-    library = Path(sysconfig.get_path("stdlib"))
-    paths = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
-    while True:
-        path = chance.choice(paths)
-        try:
-            text = path.read_text("utf-8")
-        except ValueError:
-            continue
-        plain = text.isascii() and not set("\f\r\0") & set(text) and 200 < len(text) < 60_000
-        if plain and not is_refused(text) and not analyze(text, python=PYTHON).problems:
+    for path, text in plain_texts(chance, 60_000):
+        if not is_refused(text) and not analyze(text, python=PYTHON).problems:
             yield Source(path, text)
 
 

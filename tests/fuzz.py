@@ -12,13 +12,13 @@ import io
 import random
 import re
 import sys
-import sysconfig
 import tempfile
 import time
 from contextlib import redirect_stderr, redirect_stdout
 from pathlib import Path
 
 from collecting import OnCollection
+from library import library_files
 from odd_hosts import OddHost
 from sentences import COMMENTS, WORDS, Sentences
 
@@ -63,8 +63,7 @@ class Fuzzer:
 
     def __init__(self, seed: int) -> None:
         self.random = random.Random(seed)
-        library = Path(sysconfig.get_path("stdlib"))
-        self.files = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
+        self.files = library_files()
         words = {**WORDS, "NEWLINE": ["\n", *COMMENTS]}
         self.sentences = [Sentences(version, self.random, words) for version in ("2.7", "3.8", "3.14")]
         self.engine = CPGenAnalyzerImpl((3, 11, 0))

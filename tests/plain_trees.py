@@ -6,11 +6,12 @@ Run it to compare whole files; tests/test_plain_trees.py holds what came out.
 """
 
 import argparse
-import sysconfig
 from collections.abc import Iterator
 from functools import cache
 from pathlib import Path
 from typing import NamedTuple
+
+from library import library_files
 
 from codeloom._analysis import DumpTrees
 from codeloom.line_trees import new_parser
@@ -118,8 +119,7 @@ def main() -> None:
     arguments.add_argument("--versions", default="2.7,3.4,3.6,3.8,3.11,3.14")
     arguments.add_argument("files", nargs="*", type=Path, default=None)
     options = arguments.parse_args()
-    library = Path(sysconfig.get_path("stdlib"))
-    files = options.files or [path for path in library.rglob("*.py") if "site-packages" not in path.parts]
+    files = options.files or library_files()
     for version in options.versions.split(","):
         count = 0
         for path in files:

@@ -3,13 +3,12 @@
 import ast
 import gc
 import random
-import sysconfig
 import warnings
 from contextlib import redirect_stdout
 from io import StringIO
-from pathlib import Path
 
 import pytest
+from library import library_files
 
 from codeloom import treesift
 from codeloom.logicalline import kComment
@@ -25,8 +24,7 @@ HAND_PARSED = {"match", "case", "type", "@"}
 
 def LibraryTexts(count=None, seed=None):
     """(path, text, tree) of the library's files that the interpreter accepts; `count` random ones."""
-    library = Path(sysconfig.get_path("stdlib"))
-    paths = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
+    paths = library_files()
     if count is not None:
         paths = random.Random(seed).sample(paths, count)
     for path in paths:

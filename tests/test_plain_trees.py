@@ -2,11 +2,11 @@
 
 import random
 import re
-import sysconfig
 from pathlib import Path
 
 import pytest
 from golden import Cases
+from library import library_files
 from plain_trees import Differences
 from sentences import COMMENTS, WORDS, Sentences
 
@@ -66,8 +66,7 @@ def test_sentences_of_the_grammars(version, seed):
 
 @pytest.mark.parametrize("version", VERSIONS)
 def test_the_library(version, seed):
-    library = Path(sysconfig.get_path("stdlib"))
-    paths = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
+    paths = library_files()
     texts = (path.read_text("utf-8", "replace") for path in random.Random(seed).sample(paths, 20))
     AssertSame(texts, version)
 

@@ -6,15 +6,14 @@ test_broken_lines.py.
 
 import io
 import random
-import sysconfig
 import tokenize
 import warnings
 from bisect import bisect_right
-from pathlib import Path
 
 import pytest
 from hypothesis import given, settings
 from hypothesis import strategies as st
+from library import library_files
 from test_tokens import CheckPositions
 
 from codeloom._fastaccess import GetTokenType, kTokenId_ERRORTOKEN
@@ -33,8 +32,7 @@ UNQUOTED = ["'a\n", '"""a b\n', '\\"""\n', '""" a b ', "f'{(\n", 'f"{', "f'{f\"{
 
 def LibraryTexts(count, seed):
     """The texts of `count` files of the interpreter's library; all that it compiles, so all sound."""
-    library = Path(sysconfig.get_path("stdlib"))
-    paths = [path for path in sorted(library.rglob("*.py")) if "site-packages" not in path.parts]
+    paths = library_files()
     source = random.Random(seed)
     while count:
         try:
