@@ -144,10 +144,9 @@ def test_random_edits(tmp_path, seed):
     """After any edits the server has the client's text: it says of it what `analyze` does."""
     chance = random.Random(seed)
     pieces = ["x", "(", ")", "'", '"""', "\n", "\r", "\r\n", "é", "😀", " ", "if x:\n    y = 1\n", "#", ""]
-    with Client(tmp_path, encodings=["utf-32"]) as client:
+    with Client(tmp_path, encodings=["utf-32"], capabilities=PULL) as client:
         text = "def f(a):\r\n    return a\rx = 'é'\n\n"
-        client.open(text)
-        client.diagnostics()
+        document = client.open(text)
         for _ in range(300):
             starts = [0, *(match.end() for match in ROW_END.finditer(text))]
             rows = RowTexts(text)
@@ -160,7 +159,39 @@ def test_random_edits(tmp_path, seed):
             text = text[: offsets[0]] + new + text[offsets[1] :]
             client.change((*places, new))
             expected = codeloom.analyze(text).problems
-            assert len(client.diagnostics()) == len(expected), (seed, text)
+            found = client.request("textDocument/diagnostic", document).items
+            assert [(one.code, shown(one.range)) for one in found] == [
+                (one.code, shown(Counted(one.range))) for one in expected
+            ], (seed, text)
+
+
+def Counted(place):
+    """A range of the analysis as the protocol counts it."""
+    start = types.Position(place.row - 1, place.column - 1)
+    return types.Range(start, types.Position(place.end_row - 1, place.end_column - 1))
+
+
+def test_what_is_typed_is_not_told_of_elsewhere(client):
+    """A header without its body marks the row after it: only when nobody types."""
+
+    def Type(text, row, column=0):
+        for character in text:
+            client.change(((row, column), (row, column), character))
+            row, column = (row + 1, 0) if character == "\n" else (row, column + 1)
+            yield [one.range.start.line - row for one in client.diagnostics()]
+
+    document = client.open("x = )\n\n\nprint(1)\n")
+    client.diagnostics()
+    seen = list(Type("def f(a,\n      b):\n    ", 1))
+    assert {row for rows in seen for row in rows} == {-1, -2, -3, 0}
+    assert all(len(rows) <= 2 for rows in seen) and seen[-1] == [-3]  # what was there before, and its own
+    assert Brief(client.diagnostics())[1:] == [("5:0-5:5", "CL302")]  # a moment later
+    assert list(Type("y = (", 3, 4))[-1] == [-3, 0]
+    assert list(Type("\n", 3, 9))[-1] == [-4]
+    client.notify("textDocument/didSave", document)
+    assert [one.code for one in client.diagnostics()] == ["CL203", "CL202"]
+    client.change(((4, 0), (4, 0), "1)"))
+    assert [one.code for one in client.diagnostics()] == ["CL203"]
 
 
 def test_odd_messages(client):

@@ -1,5 +1,6 @@
 """Problems as the client shows them: told by the server, or asked for by the client."""
 
+import asyncio
 from collections.abc import Sequence
 from functools import cache
 from importlib.resources import files
@@ -9,6 +10,7 @@ from lsprotocol import types
 
 from codeloom.cli.items import Finding
 from codeloom.server.documents import OpenDocument
+from codeloom.server.patience import SECONDS
 from codeloom.server.places import PlacedText
 
 if TYPE_CHECKING:
@@ -29,7 +31,7 @@ def register(server: "Server") -> None:
     )
     def diagnostic(params: types.DocumentDiagnosticParams) -> types.DocumentDiagnosticReport:
         document = server.documents[params.text_document.uri]
-        items = diagnostics_of(document)
+        items = diagnostics_of(document, server.publisher.told(document))
         identity = result_id(items)
         if identity == params.previous_result_id:
             return types.RelatedUnchangedDocumentDiagnosticReport(identity)
@@ -42,6 +44,8 @@ class Publisher:
     def __init__(self, server: "Server") -> None:
         self._server = server
         self._is_asked: bool | None = None
+        # Of each text with problems that wait.
+        self._timers: dict[str, asyncio.TimerHandle] = {}
 
     @property
     def is_asked(self) -> bool:
@@ -54,10 +58,40 @@ class Publisher:
     def show(self, document: OpenDocument) -> None:
         """Tell the problems of a text."""
         if not self.is_asked:
-            self.tell(document.uri, diagnostics_of(document), document.version)
+            self.tell(document.uri, diagnostics_of(document, self.told(document)), document.version)
+
+    def told(self, document: OpenDocument) -> Sequence[Finding]:
+        """The problems that are told now; where others wait, they are told when nobody types any more."""
+        findings, told = document.findings, document.told
+        if len(told) == len(findings) or not self._can_wait():
+            return findings
+        if (timer := self._timers.get(document.uri)) is not None:
+            timer.cancel()
+        loop = asyncio.get_running_loop()
+        self._timers[document.uri] = loop.call_later(SECONDS, self.settle, document)
+        return told
+
+    def settle(self, document: OpenDocument) -> None:
+        """Tell what has waited: nobody types any more."""
+        if (timer := self._timers.pop(document.uri, None)) is None:
+            return
+        timer.cancel()
+        document.patience.settle()
+        if self.is_asked:
+            self._server.workspace_diagnostic_refresh(None)
+        else:
+            self.show(document)
+
+    def _can_wait(self) -> bool:
+        """False for a client that asks, and can't be told to ask again."""
+        of_workspace = self._server.client_capabilities.workspace
+        of_diagnostics = of_workspace.diagnostics if of_workspace is not None else None
+        return not self.is_asked or bool(of_diagnostics is not None and of_diagnostics.refresh_support)
 
     def clear(self, document: OpenDocument) -> None:
         """Tell that a text has none any more."""
+        if (timer := self._timers.pop(document.uri, None)) is not None:
+            timer.cancel()
         self.tell(document.uri, [])
 
     def tell(self, uri: str, items: Sequence[types.Diagnostic], version: int | None = None) -> None:
@@ -67,9 +101,9 @@ class Publisher:
         self._server.text_document_publish_diagnostics(types.PublishDiagnosticsParams(uri, items, version))
 
 
-def diagnostics_of(document: OpenDocument) -> list[types.Diagnostic]:
-    """The problems of a text."""
-    return [diagnostic_of(document, finding) for finding in document.findings]
+def diagnostics_of(document: OpenDocument, findings: Sequence[Finding]) -> list[types.Diagnostic]:
+    """Problems of a text."""
+    return [diagnostic_of(document, finding) for finding in findings]
 
 
 def diagnostic_of(text: PlacedText, finding: Finding) -> types.Diagnostic:

@@ -15,6 +15,7 @@ from codeloom._document import Document
 from codeloom.cli.items import Finding
 from codeloom.cli.source import Source
 from codeloom.rows import RowTexts
+from codeloom.server.patience import Patience
 from codeloom.server.places import PlacedText
 from codeloom.server.rows import Place, Rows
 from codeloom.server.settings import Settings, SettingsByFolder
@@ -33,6 +34,7 @@ class OpenDocument(PlacedText):
         super().__init__(item.uri, Rows(item.text), units)
         self.path = to_fs_path(item.uri) or item.uri
         self.version = item.version
+        self.patience = Patience()
         self.take(settings)
 
     def take(self, settings: Settings) -> None:
@@ -53,6 +55,11 @@ class OpenDocument(PlacedText):
         """The problems that settings and comments let through."""
         return self.settings.passed(Source(self.path, self.analysis))
 
+    @property
+    def told(self) -> Sequence[Finding]:
+        """Those of the problems that don't wait for the end of the typing."""
+        return self.patience.told(self.findings, self.rows)
+
     def edit(self, change: types.TextDocumentContentChangeEvent) -> None:
         """Change the text as the client has; JsonRpcInvalidParams for a place that it doesn't have."""
         if isinstance(change, types.TextDocumentContentChangePartial):
@@ -61,9 +68,11 @@ class OpenDocument(PlacedText):
                 raise JsonRpcInvalidParams(f"{self.uri}: the end of an edit is before its start")
         else:
             start, end = (0, 0), self.rows.end
+        self.patience.before_edit(start, end, lambda: self.findings, self.rows)
         self.rows.replace(start, end, change.text)
         self._document.edit(_from_one(start), _from_one(end), change.text)
         self._forget()
+        self.patience.after_edit(start, end, change.text)
 
     @contextmanager
     def trial(self, edits: Sequence[tuple[Range, str]]) -> Iterator[Analysis]:

@@ -20,6 +20,8 @@ def register(server: "Server") -> None:
 
     @server.feature(types.TEXT_DOCUMENT_DID_SAVE)
     def did_save(params: types.DidSaveTextDocumentParams) -> None:
+        if params.text_document.uri in server.documents:
+            server.publisher.settle(server.documents[params.text_document.uri])
         if os.path.basename(params.text_document.uri) in SETTINGS_FILES:
             server.settings_changed()
 
