@@ -124,7 +124,7 @@ void CPlainAnalysis::_MakeRoom() {
     constexpr uint32_t kMostNames = 20'000;
     _fRecords.records.clear();
     _fRecords.values.clear();
-    if (_fRecords.names.Count() > kMostNames) _fRecords.names.Clear();
+    if (_fRecords.names->Count() > kMostNames) _fRecords.names->Clear();
 }
 
 }  // namespace codeloom

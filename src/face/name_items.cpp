@@ -19,7 +19,7 @@ nb::object CScopeItem::Parent() const {
 
 nb::object CScopeItem::Symbols() const {
     nb::list symbols;
-    const std::vector<CSymbol>& all = file->Names().scopes.symbols;
+    const TPlainArray<CSymbol>& all = file->Names().scopes.symbols;
     for (uint32_t symbol_i = Data().first_symbol; symbol_i != kNoIndex; symbol_i = all[symbol_i].next)
         if (all[symbol_i].IsMentioned()) symbols.append(NewObject<CSymbolItem>(file, symbol_i));
     return nb::tuple(symbols);
@@ -56,7 +56,7 @@ std::string_view COccurrenceItem::Mangled() const {
     const uint32_t symbol_i = file->Names().scopes.symbol_of[i];
     if (symbol_i == kNoIndex) return Name();
     const CTextNames& names = file->Names();
-    return names.occurrences.names.Text(names.scopes.symbols[symbol_i].name);
+    return names.occurrences.names->Text(names.scopes.symbols[symbol_i].name);
 }
 
 nb::object COccurrenceItem::Symbol() const {

@@ -17,7 +17,7 @@ struct CScopeItem : CItem {
     static constexpr const char* kSequence = "scopes";
 
     const CScope& Data() const { return file->Names().scopes.scopes[i]; }
-    std::string_view Name() const { return file->Names().occurrences.names.Text(Data().name); }
+    std::string_view Name() const { return file->Names().occurrences.names->Text(Data().name); }
     CRange Range() const;
     nb::object Parent() const;
     nb::object Symbols() const;
@@ -31,7 +31,7 @@ struct CSymbolItem : CItem {
     using CItem::CItem;
 
     const CSymbol& Data() const { return file->Names().scopes.symbols[i]; }
-    std::string_view Name() const { return file->Names().occurrences.names.Text(Data().name); }
+    std::string_view Name() const { return file->Names().occurrences.names->Text(Data().name); }
     CScopeItem Scope() const { return {file, Data().scope}; }
     bool operator==(const CSymbolItem& other) const;
     size_t Hash() const { return std::hash<std::string_view>()(Name()); }

@@ -58,10 +58,10 @@ class CSourceFile {
     nb::str HostText() const;
     // A name of the records, and one of the occurrences, by its number; the same object each time.
     nb::object HostName(uint32_t number) const {
-        return _Named(WithRecords().records.names, _fHostNames, number);
+        return _Named(*WithRecords().records.names, _fHostNames, number);
     }
     nb::object HostNameOfOccurrence(uint32_t number) const {
-        return _Named(Names().occurrences.names, _fHostNamesOfOccurrences, number);
+        return _Named(*Names().occurrences.names, _fHostNamesOfOccurrences, number);
     }
 
   private:

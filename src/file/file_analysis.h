@@ -17,6 +17,7 @@
 #include "scopes/text_names.h"
 #include "signatures/signatures.h"
 #include "syntax/language.h"
+#include "text/plain_array.h"
 #include "tokenizer/logical_types.h"
 
 namespace codeloom {
@@ -44,7 +45,7 @@ struct CLineLimit {
 
 struct CFileAnalysis {
     CProblems problems;  // by their place
-    std::vector<CLine> lines;
+    TPlainArray<CLine> lines;
     CRecords records;  // empty unless the settings ask for them
     std::vector<CLineLimit> limits;
     CTextNames names;  // empty unless the settings ask for them, as are the next ones

@@ -18,16 +18,12 @@ namespace codeloom {
 
 namespace {
 
-// More room than a line's own records need, for `items` that grow with the share of the text that is read. So
-// what lies unused at the end is little, where doubling could leave half.
-template <class Items>
-void MakeRoom(Items& items, size_t for_line, size_t read, size_t text_size) {
-    if (items.capacity() - items.size() >= for_line) return;
-    const double share = static_cast<double>(text_size) / static_cast<double>(std::max<size_t>(read, 1));
-    const size_t expected =
-        static_cast<size_t>(static_cast<double>(items.size()) * std::min(share, 4.0) * 1.05);
-    items.reserve(std::max(expected, items.size() + items.size() / 4) + 2 * for_line);
-}
+// Of a text of so many bytes, most have fewer. What is too much is given back at the end.
+constexpr size_t kBytesOfLine = 48;
+constexpr size_t kBytesOfRecord = 20;
+constexpr size_t kBytesOfValue = 4;
+constexpr size_t kBytesOfOccurrence = 24;
+constexpr size_t kMostExpected = size_t{1} << 24;  // longer texts grow what they need
 
 bool ImportsPrintFunction(const CRawLogical& logical) {
     if (logical.type != ELogicalType::kFromImport) return false;
@@ -58,6 +54,7 @@ class CFileAnalyzer final : CTreeObserver {
           _fMayDeclareNames(!_fDeclarations.IsEmpty()),
           _fWantsAllNames(settings.wants_names || wants_all_names),
           _fSignatures(_fResult.signatures) {
+        _fResult.names.occurrences.names = _fResult.records.names;
         if (settings.wants_names || _fMayDeclareNames)
             _fNames.emplace(LanguageOf(settings.version), _fMayDeclareNames, _fResult.names);
         _SetLanguage(LanguageOf(settings.version));
@@ -74,10 +71,12 @@ class CFileAnalyzer final : CTreeObserver {
     bool WantsHints() const override { return _fSettings.wants_names; }
     void TakeHintOf(const CHintNote& note) override { _fSignatures.TakeHintOf(note); }
     void _SetLanguage(const CLanguage& language);
+    void _MakeRoom();
+    void _GiveRoomBack();
     void _AnalyzeLine(const CRawLogical& logical);
     void _Enter(const CRawLogical& logical);
     void _Leave(const CRawLogical& logical, bool has_fault);
-    CLineResult _Analyze(const CRawLogical& logical, const CLine& line);
+    CLineResult _Analyze(const CRawLogical& logical);
     void _FindOutWhetherToCollect(const CRawLogical& logical);
     void _FinishNames();
     void _AddUnreadable();
@@ -106,15 +105,38 @@ class CFileAnalyzer final : CTreeObserver {
 };
 
 CFileAnalysis CFileAnalyzer::Run() {
+    _MakeRoom();
     CTokenizer tokenizer(_fText);
     CRawLogical logical;
     while (tokenizer.NextLogical(logical)) _AnalyzeLine(logical);
     _fChecker.Finish();
     if (_fNames) _FinishNames();
     _AddUnreadable();
+    _GiveRoomBack();
     std::stable_sort(_fResult.problems.begin(), _fResult.problems.end(),
                      [](const CProblem& one, const CProblem& other) { return one.start < other.start; });
     return std::move(_fResult);
+}
+
+// Storage that grew bit by bit would be copied more than once.
+void CFileAnalyzer::_MakeRoom() {
+    const size_t bytes = std::min(_fText.size(), kMostExpected);
+    _fResult.lines.Reserve(bytes / kBytesOfLine + 1);
+    if (_fSettings.wants_records) {
+        _fResult.records.records.Reserve(bytes / kBytesOfRecord + 1);
+        _fResult.records.values.reserve(bytes / kBytesOfValue + 1);
+    }
+    if (_fWantsAllNames) {
+        _fResult.names.lines.Reserve(bytes / kBytesOfLine + 1);
+        _fResult.names.occurrences.items.Reserve(bytes / kBytesOfOccurrence + 1);
+    }
+}
+
+void CFileAnalyzer::_GiveRoomBack() {
+    _fResult.lines.Shrink();
+    _fResult.records.records.Shrink();
+    _fResult.records.values.Shrink();
+    _fResult.names.Shrink();
 }
 
 // What the rules see, those see who look for names.
@@ -169,7 +191,6 @@ void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
     const auto first_record = static_cast<uint32_t>(_fResult.records.records.size());
     const CLine line = {logical.StartOf(logical.tokens.front()), logical.EndOf(logical.tokens.back()),
                         first_record, logical.type};
-    MakeRoom(_fResult.lines, 1, line.start, _fText.size());
     _fResult.lines.push_back(line);
     if (_fSettings.version < 300 && ImportsPrintFunction(logical))
         _SetLanguage(LanguageOf(_fSettings.version, true));
@@ -181,7 +202,7 @@ void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
         return _AddProblem(ECode::kLineTooLong, logical.StartOf(first), logical.EndOf(first),
                            CLengthLimits::Message(too_long, logical));
     }
-    CLineResult result = _Analyze(logical, line);
+    CLineResult result = _Analyze(logical);
     // `except A, a.b:` binds what isn't a name; in Python 2 that is sound.
     if (result.fault.kind == EFault::kExceptTarget && _fSettings.version < 300) result.fault = {};
     _Leave(logical, static_cast<bool>(result.fault));
@@ -194,12 +215,8 @@ void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
     if (_fSettings.wants_records) LeaveSelfOut(logical, _fResult.records, line.first_record);
 }
 
-CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical, const CLine& line) {
+CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical) {
     CRecords* const records = _fSettings.wants_records ? &_fResult.records : nullptr;
-    if (records != nullptr) {
-        MakeRoom(records->records, logical.tokens.size(), line.start, _fText.size());
-        MakeRoom(records->values, line.end - line.start, line.start, _fText.size());
-    }
     return _fAnalyzer->Analyze(logical, {.in_async_def = logical.in_async_def,
                                          .first_in_def = logical.first_in_def,
                                          .records = records,

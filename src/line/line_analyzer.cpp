@@ -127,7 +127,7 @@ CLineAnalyzer::CImpl::CMark CLineAnalyzer::CImpl::_Mark() const {
 
 void CLineAnalyzer::CImpl::_DropFrom(const CMark& mark) {
     if (_fRequest.records == nullptr) return;
-    _fRequest.records->records.resize(mark.records);
+    _fRequest.records->records.CutTo(mark.records);
     _fRequest.records->values.CutTo(mark.values);
 }
 
@@ -135,12 +135,11 @@ void CLineAnalyzer::CImpl::_DropFrom(const CMark& mark) {
 // records. Only a statement where an expression should stand has any.
 void CLineAnalyzer::CImpl::_DropArgumentsFrom(const CMark& mark) {
     if (_fRequest.records == nullptr) return;
-    std::vector<CRecord>& records = _fRequest.records->records;
-    const auto first = records.begin() + static_cast<std::ptrdiff_t>(mark.records);
-    const auto kept =
-        std::remove_if(first, records.end(), [](const CRecord& record) { return record.of_arg; });
+    TPlainArray<CRecord>& records = _fRequest.records->records;
+    CRecord* const kept = std::remove_if(records.begin() + mark.records, records.end(),
+                                         [](const CRecord& record) { return record.of_arg; });
     _fHasMoreToTell |= kept != records.end();
-    records.erase(kept, records.end());
+    records.CutTo(static_cast<size_t>(kept - records.begin()));
 }
 
 CLineAnalyzer::CLineAnalyzer(const CLanguage& language) : _fImpl(std::make_unique<CImpl>(language)) {}

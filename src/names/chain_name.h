@@ -33,7 +33,7 @@ class CChainName {
 
     // The text of the atom and the trailers up to the one at `i`, to which the name has gone on.
     std::string_view UpTo(size_t i) {
-        if (_fIsInSource) return _fTree.Line().file_text.substr(place.start, place.end - place.start);
+        if (_fIsInSource) return {_fTree.Line().file_text.data() + place.start, place.end - place.start};
         return _Rendered(i);
     }
 

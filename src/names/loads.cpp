@@ -13,12 +13,12 @@ void CNameWalker::_VisitName(const CTreeNode& name) {
     if (!_IsRecording() || _fContext == EContext::kStore || IsValueWord(name.word)) return;
     const CRawToken& token = _fTree->Token(name);
     const CSpan place{token.start, token.start + token.length};
-    _NoteName(_fTree->Line().Text(token), place, name.token, _fContext == EContext::kLoad);
+    _NoteName(_fTree->TextOfName(name), place, name.token, _fContext == EContext::kLoad);
 }
 
 // A name or a chain that ends with the token, read or bound within an expression. Gives its number.
 inline uint32_t CNameWalker::_NoteName(std::string_view text, CSpan place, uint32_t token, bool is_load) {
-    const uint32_t number = _fRecords->names.Number(text);
+    const uint32_t number = _fRecords->names->Number(text);
     if (is_load) {
         _fNotes.AddLoad(number, place);
     } else {
@@ -75,7 +75,7 @@ void CNameWalker::_VisitAtom(const CChain& chain, CChainName& name) {
     if (!name.is_dotted) return _VisitNode(atom);
     const bool is_load = _fContext == EContext::kLoad || !chain.trailers.empty();
     if (!_IsRecording() || IsValueWord(atom.word) || (!is_load && _fContext == EContext::kStore)) return;
-    name.number = _NoteName(_fTree->Text(atom), name.place, atom.token, is_load);
+    name.number = _NoteName(_fTree->TextOfName(atom), name.place, atom.token, is_load);
 }
 
 // `.name`
@@ -118,7 +118,7 @@ void CNameWalker::_VisitArguments(const CTreeNode* arguments, CFunctionName func
         });
     }
     if (function.number == CChainName::kNoNumber) return;
-    if (arguments != nullptr && _fRecords->names.Text(function.number) == "isinstance")
+    if (arguments != nullptr && _fRecords->names->Text(function.number) == "isinstance")
         _RecordIsInstance(*arguments);
     _RecordCall(arguments, function);
 }

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "syntax/nodes.h"
+#include "text/plain_array.h"
 
 namespace codeloom {
 
@@ -41,7 +42,7 @@ class CNameNotes {
         _fLoads.push_back({name, place});
     }
 
-    void AddStore(uint32_t name, uint32_t token, CSpan place) {
+    [[gnu::noinline]] void AddStore(uint32_t name, uint32_t token, CSpan place) {
         if (name >= _fStamps.size()) _fStamps.resize(2 * size_t{name} + 64);
         CStamp& stamp = _fStamps[name];
         if (stamp.line != _fLine) stamp = {_fLine, static_cast<uint32_t>(_fStores.size())};
@@ -49,10 +50,10 @@ class CNameNotes {
     }
 
     // Names read, each once, in the order first met.
-    const std::vector<CLoad>& Loads() const { return _fLoads; }
+    const TPlainArray<CLoad>& Loads() const { return _fLoads; }
 
     // Names bound within sub-expressions, those of one name together.
-    const std::vector<CStore>& SortedStores() {
+    const TPlainArray<CStore>& SortedStores() {
         const auto is_earlier = [](const CStore& a, const CStore& b) { return a.rank < b.rank; };
         if (!std::is_sorted(_fStores.begin(), _fStores.end(), is_earlier))
             std::stable_sort(_fStores.begin(), _fStores.end(), is_earlier);
@@ -65,8 +66,8 @@ class CNameNotes {
         uint32_t rank = 0;
     };
 
-    std::vector<CLoad> _fLoads;
-    std::vector<CStore> _fStores;
+    TPlainArray<CLoad> _fLoads;
+    TPlainArray<CStore> _fStores;
     std::vector<uint32_t> _fLinesOfLoads;  // by name, the last line that read it
     std::vector<CStamp> _fStamps;          // by name, the last line that bound it so
     uint32_t _fLine = 0;

@@ -149,7 +149,7 @@ void CNameWalker::_AddEquiv(uint32_t name, const CTreeNode& node, CSpan place, b
 }
 
 uint32_t CNameWalker::_Number(std::string_view name) {
-    return _fRecords->names.Number(name);
+    return _fRecords->names->Number(name);
 }
 
 // The number of the text of a node of any kind.

@@ -54,7 +54,7 @@ class CNameWalker {
         CSpan place;
     };
 
-    void _VisitNode(const CTreeNode& node) {
+    [[gnu::always_inline]] void _VisitNode(const CTreeNode& node) {
         _CountVisit();
         if (!node.IsLeaf()) return _VisitInner(node);
         if (node.Is(ENodeKind::kNameLiteral)) _VisitName(node);
@@ -65,7 +65,7 @@ class CNameWalker {
         if (_fDepth >= kMostDepth) [[unlikely]]
             throw CLimitHit{ELimit::kTooDeep};
     }
-    void _VisitInner(const CTreeNode& node);
+    [[gnu::noinline]] void _VisitInner(const CTreeNode& node);
     void _Dispatch(const CTreeNode& node);
     void _VisitChildren(const CTreeNode& node);
     void _VisitIn(EContext context, const CTreeNode& node);
@@ -143,7 +143,7 @@ class CNameWalker {
 
     bool _IsRecording() const { return _fRecords != nullptr; }
     uint32_t _Number(std::string_view name);
-    uint32_t _NumberOfLeaf(const CTreeNode& name) { return _Number(_fTree->Text(name)); }
+    uint32_t _NumberOfLeaf(const CTreeNode& name) { return _Number(_fTree->TextOfName(name)); }
     uint32_t _NumberOfText(const CTreeNode& node);
 
     const bool _fIsPython3;

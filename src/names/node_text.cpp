@@ -72,8 +72,31 @@ void CNodeText::AppendOperators(const CTreeNode& node, CTextBuffer& text, size_t
 // Chains
 
 void CNodeText::AppendChain(const CChain& chain, CTextBuffer& text) {
-    chain.trailers.empty() ? Append(*chain.atom, text) : _AppendShown(*chain.atom, text);
-    for (const CTreeNode& trailer : chain.trailers) AppendTrailer(trailer, text);
+    if (chain.trailers.empty()) return Append(*chain.atom, text);
+    size_t shown_count = 0;
+    if (chain.atom->Is(ENodeKind::kNameLiteral)) {
+        shown_count = _AppendNames(chain, text);
+    } else {
+        _AppendShown(*chain.atom, text);
+    }
+    for (const CTreeNode& trailer : chain.trailers.subspan(shown_count)) AppendTrailer(trailer, text);
+}
+
+// As much of `a.b.c` as stands in the source without blanks, in one piece. Gives the count of its trailers.
+size_t CNodeText::_AppendNames(const CChain& chain, CTextBuffer& text) {
+    const CRawToken* last = &_fTree.Token(*chain.atom);
+    const uint32_t start = last->start;
+    size_t count = 0;
+    for (; count < chain.trailers.size(); ++count) {
+        const CTreeNode& dot = _fTree.Child(chain.trailers[count], 0);
+        const uint32_t end = last->start + last->length;
+        if (!IsToken(dot, kTokenId_DOT) || _fTree.Token(dot).start != end) break;
+        const CRawToken& name = _fTree.Token(_fTree.Child(chain.trailers[count], 1));
+        if (name.start != end + 1) break;
+        last = &name;
+    }
+    text += std::string_view(_fTree.Line().file_text.data() + start, last->start + last->length - start);
+    return count;
 }
 
 void CNodeText::AppendTrailer(const CTreeNode& trailer, CTextBuffer& text) {

@@ -36,6 +36,7 @@ class CNodeText {
   private:
     void _AppendShown(const CTreeNode& node, CTextBuffer& text);
     void _AppendLeaf(const CTreeNode& leaf, CTextBuffer& text);
+    size_t _AppendNames(const CChain& chain, CTextBuffer& text);
     void _AppendAtom(const CTreeNode& atom, CTextBuffer& text);
     void _AppendJoined(const CTreeNode& node, CTextBuffer& text);
     void _AppendString(std::string_view literal, CTextBuffer& text) const;

@@ -2,11 +2,12 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <string_view>
 #include <type_traits>
-#include <vector>
 
 #include "names/name_table.h"
+#include "text/plain_array.h"
 #include "text/text_buffer.h"
 
 namespace codeloom {
@@ -26,14 +27,14 @@ static_assert(std::is_trivial_v<CRecord>);  // so that many are moved in one go
 
 // The records of one or many lines, in their order.
 struct CRecords {
-    std::vector<CRecord> records;
-    CTextBuffer values;  // payloads, one after the other
-    CNameTable names;
+    TPlainArray<CRecord> records;
+    CTextBuffer values;                                                  // payloads, one after the other
+    std::shared_ptr<CNameTable> names = std::make_shared<CNameTable>();  // others may share it
 
     std::string_view Value(const CRecord& record) const {
         return values.View().substr(record.value, record.value_length);
     }
-    std::string_view Name(const CRecord& record) const { return names.Text(record.name); }
+    std::string_view Name(const CRecord& record) const { return names->Text(record.name); }
 };
 
 }  // namespace codeloom

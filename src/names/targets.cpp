@@ -75,7 +75,7 @@ void CNameWalker::_RecordTarget(const CTreeNode& target, const CTreeNode* value)
     const uint32_t name = _NumberOfText(target);
     const CSpan place = SpanOf(*_fTree, target);
     const bool has_bracket =
-        !target.IsLeaf() && _fRecords->names.Text(name).find('[') != std::string_view::npos;
+        !target.IsLeaf() && _fRecords->names->Text(name).find('[') != std::string_view::npos;
     if (!has_bracket) _AddPlain(name, kSetKind, place);
     if (value != nullptr) _AddEquiv(name, *value, place);
 }

@@ -76,14 +76,14 @@ void COccurrenceFinder::TakeHint(const CTree& tree, const CTreeNode& node, uint3
 }
 
 void COccurrenceFinder::EndLine(bool has_fault) {
-    const auto first = _fFound.items.begin() + static_cast<ptrdiff_t>(_fFirstItem);
     if (has_fault) {
-        _fFound.items.erase(first, _fFound.items.end());
-        _fFound.scopes.resize(_fFirstScope);
+        _fFound.items.CutTo(_fFirstItem);
+        _fFound.scopes.CutTo(_fFirstScope);
         _fOpenedScope = 0;
         return;
     }
     if (!_fHasParts) return;
+    COccurrence* const first = _fFound.items.begin() + _fFirstItem;
     const auto is_before = [](const COccurrence& one, const COccurrence& other) {
         return one.start < other.start;
     };
@@ -262,9 +262,8 @@ bool COccurrenceFinder::_IsValue(const CTreeNode& name) const {
 
 COccurrence& COccurrenceFinder::_Add(const CTreeNode& leaf, ERole role) {
     const CRawToken& token = _fTree->Token(leaf);
-    const uint32_t name = _fFound.names.Number(_fTree->Line().Text(token)), start = token.start + _fShift;
-    _fFound.items.push_back({name, start, start + token.length, 0, 0, _fScope, role, _fFlags});
-    return _fFound.items.back();
+    const uint32_t name = _fFound.names->Number(_fTree->Line().Text(token)), start = token.start + _fShift;
+    return _fFound.items.push_back({name, start, start + token.length, 0, 0, _fScope, role, _fFlags});
 }
 
 void COccurrenceFinder::_AddName(const CTreeNode& node, ERole role, uint8_t flags) {

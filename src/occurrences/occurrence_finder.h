@@ -25,7 +25,7 @@ namespace codeloom {
 class COccurrenceFinder {
   public:
     COccurrenceFinder(const CLanguage& language, COccurrences& found)
-        : _fLanguage(language), _fFound(found), _fNoName(found.names.Number({})) {}
+        : _fLanguage(language), _fFound(found), _fNoName(found.names->Number({})) {}
 
     // Call for every line, in order.
     void BeginLine(const CRawLogical& line);
@@ -106,7 +106,7 @@ class COccurrenceFinder {
     // The same where the grammar takes more than a name, which the rules refuse: that is visited.
     void _AddName(const CTreeNode& node, ERole role, uint8_t flags);
     COccurrence& _AddAttribute(const CTreeNode& leaf, ERole role, uint32_t object_start, uint32_t object_end);
-    uint32_t _NumberOf(const CTreeNode& leaf) { return _fFound.names.Number(_fTree->Text(leaf)); }
+    uint32_t _NumberOf(const CTreeNode& leaf) { return _fFound.names->Number(_fTree->Text(leaf)); }
     bool _IsValue(const CTreeNode& name) const;
 
     const CLanguage& _fLanguage;

@@ -2,11 +2,12 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <string_view>
 #include <type_traits>
-#include <vector>
 
 #include "names/name_table.h"
+#include "text/plain_array.h"
 
 namespace codeloom {
 
@@ -107,11 +108,11 @@ struct CInnerScope {
 
 // Those of one or many lines.
 struct COccurrences {
-    std::vector<COccurrence> items;
-    std::vector<CInnerScope> scopes;
-    CNameTable names;
+    TPlainArray<COccurrence> items;
+    TPlainArray<CInnerScope> scopes;
+    std::shared_ptr<CNameTable> names = std::make_shared<CNameTable>();  // others may share it
 
-    std::string_view Name(const COccurrence& occurrence) const { return names.Text(occurrence.name); }
+    std::string_view Name(const COccurrence& occurrence) const { return names->Text(occurrence.name); }
 };
 
 }  // namespace codeloom

@@ -16,11 +16,11 @@ class CBlockScopes {
 
     // That of the innermost block whose header opens one; the module's, zero, for all others.
     uint32_t ScopeOf(const std::vector<CBlock>& blocks) {
-        for (size_t i = blocks.size(); i-- > 1;) {
-            const EClause clause = blocks[i].clause;
+        for (const CBlock* block = &blocks.back(); block != blocks.data(); --block) {
+            const EClause clause = block->clause;
             if (clause != EClause::kDef && clause != EClause::kAsyncDef && clause != EClause::kClass)
                 continue;
-            if (const CHeader* const header = _Find(blocks[i].header.start)) return header->scope;
+            if (const CHeader* const header = _Find(block->header.start)) return header->scope;
         }
         return 0;
     }

@@ -258,7 +258,7 @@ bool CDeclarationPlaces::HasOneIn(uint32_t start, uint32_t end) {
 }
 
 bool DeclaresInModule(const CTextNames& names) {
-    const std::vector<COccurrence>& items = names.occurrences.items;
+    const TPlainArray<COccurrence>& items = names.occurrences.items;
     for (uint32_t i = 0; i < items.size(); ++i)
         if ((items[i].role == ERole::kGlobal || items[i].role == ERole::kNonlocal) &&
             names.ScopeOfOccurrence(i) == 0)

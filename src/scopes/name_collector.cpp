@@ -44,12 +44,12 @@ void CNameCollector::_NoteLostLine(const CRawLogical& line, EClause clause, uint
     _fLostLines.push_back(static_cast<uint32_t>(_fNames.lines.size() - 1));
     for (const CRawToken& token : line.tokens)
         if (token.type == kTokenId_NAME && token.word == EWord::kNone)
-            _fNames.lost_names.push_back(_fNames.occurrences.names.Number(line.Text(token)));
+            _fNames.lost_names.push_back(_fNames.occurrences.names->Number(line.Text(token)));
     const CLineNames& names = _fNames.lines.back();
     const CLostBindings found = FindLostBindings(line, clause);
     const auto note = [&](const CRawToken* token, uint32_t scope) {
         _fNames.lost_bindings.push_back(
-            {_fNames.occurrences.names.Number(line.Text(*token)), _fNames.ScopeOf(names, scope)});
+            {_fNames.occurrences.names->Number(line.Text(*token)), _fNames.ScopeOf(names, scope)});
     };
     for (const CRawToken* const token : found.names) note(token, 0);
     for (const CRawToken* const token : found.parameters) note(token, opened_scope);
@@ -66,7 +66,7 @@ uint32_t CNameCollector::_AddLostScope(const CRawLogical& line, const CStatement
     const auto name = std::find_if(line.tokens.begin(), line.tokens.end(), [](const CRawToken& token) {
         return token.type == kTokenId_NAME && token.word == EWord::kNone;
     });
-    scope.name = found.names.Number(name == line.tokens.end() ? std::string_view() : line.Text(*name));
+    scope.name = found.names->Number(name == line.tokens.end() ? std::string_view() : line.Text(*name));
     found.scopes.push_back(scope);
     return 1;
 }

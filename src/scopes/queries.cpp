@@ -35,7 +35,7 @@ EResolution CNameQueries::Resolution(uint32_t occurrence_i) const {
     const CSymbol& symbol = _fNames.scopes.symbols[symbol_i];
     const CSymbol& home = _fNames.scopes.symbols[symbol.home];
     if (home.MayBeBound()) return EResolution::kScope;
-    const std::string_view name = _fNames.occurrences.names.Text(home.name);
+    const std::string_view name = _fNames.occurrences.names->Text(home.name);
     if (IsBuiltinName(name, _fVersion)) return EResolution::kBuiltin;
     if (IsNameOfClassBody(name) && _fNames.scopes.scopes[symbol.scope].kind == EScopeKind::kClass)
         return EResolution::kBuiltin;
@@ -57,7 +57,7 @@ bool CNameQueries::_HasStarImport() const {
 }
 
 uint32_t CNameQueries::OccurrenceAt(uint32_t offset) const {
-    const std::vector<COccurrence>& items = _fNames.occurrences.items;
+    const TPlainArray<COccurrence>& items = _fNames.occurrences.items;
     const auto after = std::upper_bound(
         items.begin(), items.end(), offset,
         [](uint32_t wanted, const COccurrence& occurrence) { return wanted < occurrence.start; });
@@ -67,7 +67,7 @@ uint32_t CNameQueries::OccurrenceAt(uint32_t offset) const {
 
 std::vector<uint32_t> CNameQueries::Definitions(std::string_view name) const {
     std::vector<uint32_t> found;
-    const std::vector<COccurrence>& items = _fNames.occurrences.items;
+    const TPlainArray<COccurrence>& items = _fNames.occurrences.items;
     for (uint32_t i = 0; i < items.size(); ++i)
         if (IsBinding(items[i].role) && _fNames.occurrences.Name(items[i]) == name) found.push_back(i);
     return found;
@@ -97,9 +97,9 @@ CNameQueries::CUses CNameQueries::_Uses() const {
     uses.is_used.resize(table.symbols.size());
     uses.is_all_read.resize(table.scopes.size());
     for (const CSymbol& symbol : table.symbols)
-        if (symbol.Is(CSymbol::kIsReferenced) && ReadsAllNames(_fNames.occurrences.names.Text(symbol.name)))
+        if (symbol.Is(CSymbol::kIsReferenced) && ReadsAllNames(_fNames.occurrences.names->Text(symbol.name)))
             uses.is_all_read[symbol.scope] = true;
-    const std::vector<COccurrence>& items = _fNames.occurrences.items;
+    const TPlainArray<COccurrence>& items = _fNames.occurrences.items;
     for (uint32_t i = 0; i < items.size(); ++i) {
         const uint32_t home = HomeOf(i);
         if (home == kNoIndex) continue;
@@ -149,7 +149,7 @@ bool CNameQueries::_MayBeUnused(uint32_t occurrence_i, const CUses& uses, bool w
 
 // `from __future__ import a`, and `from m import a as a`, which is how a module offers what it imports.
 bool CNameQueries::_IsImportForOthers(uint32_t occurrence_i) const {
-    const std::vector<COccurrence>& items = _fNames.occurrences.items;
+    const TPlainArray<COccurrence>& items = _fNames.occurrences.items;
     const uint32_t first = _fNames.lines[_fNames.LineOfOccurrence(occurrence_i)].first_occurrence;
     if (_fNames.occurrences.Name(items[first]) == "__future__") return true;
     const COccurrence& before = items[occurrence_i - (occurrence_i > first)];

@@ -31,10 +31,12 @@ class CScopeBuilder {
     explicit CScopeBuilder(CTextNames& names)
         : _fNames(names),
           _fScopes(names.scopes),
-          _fSymbols(names.scopes, names.occurrences.items.size()),
-          _fSuper(names.occurrences.names.Number("super")),
-          _fClassCell(names.occurrences.names.Number("__class__")),
-          _fStar(names.occurrences.names.Number("*")) {}
+          _fSymbols(names.scopes, names.occurrences.names->Count(), names.occurrences.items.size() / 2),
+          _fSuper(names.occurrences.names->Number("super")),
+          _fClassCell(names.occurrences.names->Number("__class__")),
+          _fStar(names.occurrences.names->Number("*")) {
+        names.scopes.symbols.Reserve(names.occurrences.items.size() / 2 + 1);
+    }
 
     void Run(std::span<const uint32_t> lost_lines);
 
@@ -49,6 +51,7 @@ class CScopeBuilder {
     uint32_t _AddFlags(uint32_t scope, uint32_t name, uint16_t flags);
     void _NoteNamespaces();
     void _Resolve();
+    void _NoteNamesBoundAround();
     void _ResolveOne(uint32_t symbol_i);
     void _LookUp(uint32_t symbol_i);
     bool _LookUpInClass(uint32_t symbol_i);
@@ -62,7 +65,9 @@ class CScopeBuilder {
     const uint32_t _fSuper;
     const uint32_t _fClassCell;
     const uint32_t _fStar;
-    std::vector<bool> _fPrivate;  // by name; empty in a text without classes
+    // By name. The first is empty in a text without classes.
+    std::vector<uint8_t> _fIsPrivate;
+    std::vector<uint8_t> _fIsBoundAround;  // in a scope that those within it see
 };
 
 void CScopeBuilder::Run(std::span<const uint32_t> lost_lines) {
@@ -80,10 +85,10 @@ void CScopeBuilder::Run(std::span<const uint32_t> lost_lines) {
 // Scopes
 
 void CScopeBuilder::_AddScopes() {
-    const std::vector<CInnerScope>& inner = _fNames.occurrences.scopes;
-    std::vector<CScope>& scopes = _fScopes.scopes;
-    scopes.resize(inner.size() + 1);
-    scopes[0].name = _fNames.occurrences.names.Number({});
+    const TPlainArray<CInnerScope>& inner = _fNames.occurrences.scopes;
+    TPlainArray<CScope>& scopes = _fScopes.scopes;
+    scopes.Resize(inner.size() + 1, {});
+    scopes[0].name = _fNames.occurrences.names->Number({});
     for (size_t line_i = 0; line_i < _fNames.lines.size(); ++line_i) {
         const CLineNames& line = _fNames.lines[line_i];
         const size_t end =
@@ -108,20 +113,20 @@ void CScopeBuilder::_NotePrivateNames() {
     const bool has_class = std::any_of(_fScopes.scopes.begin(), _fScopes.scopes.end(),
                                        [](const CScope& scope) { return scope.kind == EScopeKind::kClass; });
     if (!has_class) return;
-    const CNameTable& names = _fNames.occurrences.names;
-    _fPrivate.resize(names.Count());
-    for (uint32_t name = 0; name < names.Count(); ++name) _fPrivate[name] = IsPrivate(names.Text(name));
+    const CNameTable& names = *_fNames.occurrences.names;
+    _fIsPrivate.resize(names.Count());
+    for (uint32_t name = 0; name < names.Count(); ++name) _fIsPrivate[name] = IsPrivate(names.Text(name));
 }
 
 // The name as the class around mangles it.
 inline uint32_t CScopeBuilder::_Mangled(uint32_t name, uint32_t scope) {
-    return name < _fPrivate.size() && _fPrivate[name] ? _MangledByClass(name, scope) : name;
+    return name < _fIsPrivate.size() && _fIsPrivate[name] != 0 ? _MangledByClass(name, scope) : name;
 }
 
 uint32_t CScopeBuilder::_MangledByClass(uint32_t name, uint32_t scope) {
     while (scope != 0 && _fScopes.scopes[scope].kind != EScopeKind::kClass)
         scope = _fScopes.scopes[scope].parent;
-    CNameTable& names = _fNames.occurrences.names;
+    CNameTable& names = *_fNames.occurrences.names;
     std::string_view class_name = names.Text(_fScopes.scopes[scope].name);
     class_name.remove_prefix(std::min(class_name.find_first_not_of('_'), class_name.size()));
     if (class_name.empty()) return name;
@@ -129,8 +134,8 @@ uint32_t CScopeBuilder::_MangledByClass(uint32_t name, uint32_t scope) {
 }
 
 void CScopeBuilder::_AddOccurrences() {
-    const std::vector<COccurrence>& items = _fNames.occurrences.items;
-    _fScopes.symbol_of.assign(items.size(), kNoIndex);
+    const TPlainArray<COccurrence>& items = _fNames.occurrences.items;
+    _fScopes.symbol_of.Resize(items.size(), kNoIndex);
     for (size_t line_i = 0; line_i < _fNames.lines.size(); ++line_i) {
         const CLineNames& line = _fNames.lines[line_i];
         const uint32_t end = _fNames.FirstOccurrence(line_i + 1);
@@ -209,16 +214,26 @@ void CScopeBuilder::_NoteNamespaces() {
 // Where symbols are bound
 
 void CScopeBuilder::_Resolve() {
+    _NoteNamesBoundAround();
     const size_t count = _fScopes.symbols.size();
     for (uint32_t i = 0; i < count; ++i) _ResolveOne(i);
 }
 
+void CScopeBuilder::_NoteNamesBoundAround() {
+    _fIsBoundAround.resize(_fNames.occurrences.names->Count());
+    for (const CSymbol& symbol : _fScopes.symbols)
+        if (symbol.scope != 0 && symbol.MayBeBound() &&
+            _fScopes.scopes[symbol.scope].kind != EScopeKind::kClass)
+            _fIsBoundAround[symbol.name] = 1;
+    _fIsBoundAround[_fClassCell] = 1;
+}
+
 void CScopeBuilder::_ResolveOne(uint32_t symbol_i) {
-    const CSymbol symbol = _fScopes.symbols[symbol_i];
+    const CSymbol& symbol = _fScopes.symbols[symbol_i];
     if (symbol.Is(CSymbol::kIsDeclaredGlobal)) {
+        const bool is_bound = (symbol.flags & CSymbol::kIsBound) != 0;
         const uint32_t home = _fSymbols.FindOrAdd(0, symbol.name);
-        const bool is_bound_here = (symbol.flags & CSymbol::kIsBound) != 0 && home != symbol_i;
-        if (is_bound_here) _fScopes.symbols[home].flags |= CSymbol::kIsBoundElsewhere;
+        if (is_bound && home != symbol_i) _fScopes.symbols[home].flags |= CSymbol::kIsBoundElsewhere;
         return _Bind(symbol_i, EBinding::kGlobalExplicit, home);
     }
     if (symbol.MayBeBound() && !symbol.Is(CSymbol::kIsDeclaredNonlocal))
@@ -241,15 +256,16 @@ void CScopeBuilder::_LookUp(uint32_t symbol_i) {
 // What is annotated in a class, at any depth, sees the names of the class. The interpreter has them as global
 // ones, since the class isn't a function.
 bool CScopeBuilder::_LookUpInClass(uint32_t symbol_i) {
+    uint32_t scope = _fScopes.symbols[symbol_i].scope;
+    if (!IsAnnotationScope(_fScopes.scopes[scope].kind)) return false;
     const CSymbol symbol = _fScopes.symbols[symbol_i];
-    uint32_t scope = symbol.scope;
     while (IsAnnotationScope(_fScopes.scopes[scope].kind)) {
         scope = _fScopes.scopes[scope].parent;
         const uint32_t found_i = _fSymbols.Find(scope, symbol.name);
         const bool is_class = _fScopes.scopes[scope].kind == EScopeKind::kClass;
         if (!is_class && found_i != kNoIndex && _fScopes.symbols[found_i].MayBeBound()) return false;
     }
-    if (scope == symbol.scope || _fScopes.scopes[scope].kind != EScopeKind::kClass) return false;
+    if (_fScopes.scopes[scope].kind != EScopeKind::kClass) return false;
     const uint32_t of_class_i = _fSymbols.Find(scope, symbol.name);
     if (of_class_i == kNoIndex) return false;
     const CSymbol& of_class = _fScopes.symbols[of_class_i];
@@ -264,6 +280,7 @@ bool CScopeBuilder::_LookUpInClass(uint32_t symbol_i) {
 
 // The symbol of the nearest function around `scope` that binds the name, up to one that declares it global.
 uint32_t CScopeBuilder::_FindAround(uint32_t scope, uint32_t name) {
+    if (_fIsBoundAround[name] == 0) return kNoIndex;
     for (scope = _fScopes.scopes[scope].parent; scope != 0; scope = _fScopes.scopes[scope].parent) {
         if (_fScopes.scopes[scope].kind == EScopeKind::kClass) {
             if (name == _fClassCell) return _AddFlags(scope, name, CSymbol::kIsBoundElsewhere);
@@ -301,6 +318,14 @@ void CScopeBuilder::_PassOn(uint32_t symbol_i, uint32_t home) {
 
 void BuildScopes(CTextNames& names, std::span<const uint32_t> lost_lines) {
     CScopeBuilder(names).Run(lost_lines);
+}
+
+void CTextNames::Shrink() {
+    occurrences.items.Shrink();
+    occurrences.scopes.Shrink();
+    lines.Shrink();
+    scopes.scopes.Shrink();
+    scopes.symbols.Shrink();
 }
 
 uint32_t CTextNames::LineOfOccurrence(uint32_t occurrence_i) const {

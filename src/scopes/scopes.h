@@ -2,9 +2,9 @@
 #pragma once
 
 #include <cstdint>
-#include <vector>
 
 #include "occurrences/occurrences.h"
+#include "text/plain_array.h"
 
 namespace codeloom {
 
@@ -66,9 +66,9 @@ struct CScope {
 };
 
 struct CScopeTable {
-    std::vector<CScope> scopes;
-    std::vector<CSymbol> symbols;
-    std::vector<uint32_t> symbol_of;  // by occurrence; kNoIndex for names that belong to no scope
+    TPlainArray<CScope> scopes;
+    TPlainArray<CSymbol> symbols;
+    TPlainArray<uint32_t> symbol_of;  // by occurrence; kNoIndex for names that belong to no scope
 };
 
 }  // namespace codeloom

@@ -36,7 +36,7 @@ struct CLostBinding {
 
 struct CTextNames {
     COccurrences occurrences;
-    std::vector<CLineNames> lines;     // as many as lines of the text
+    TPlainArray<CLineNames> lines;     // as many as lines of the text
     std::vector<uint32_t> lost_names;  // those on lines with a fault, by number
     std::vector<CLostBinding> lost_bindings;
     CScopeTable scopes;
@@ -46,6 +46,9 @@ struct CTextNames {
         return line_i < lines.size() ? lines[line_i].first_occurrence
                                      : static_cast<uint32_t>(occurrences.items.size());
     }
+    // Gives back what lies unused.
+    void Shrink();
+
     uint32_t LineOfOccurrence(uint32_t occurrence_i) const;
 
     // Among all scopes, that of what is counted from a line. The module's is the first one.

@@ -39,15 +39,16 @@ void CSignatureFinder::BeginLine(const CRawLogical& line, uint32_t line_i) {
 
 void CSignatureFinder::EndLine(bool has_fault) {
     if (!has_fault) return _PlaceIndexedHints();
-    _fFound.items.resize(_fFirstSignature);
-    _fFound.parameters.resize(_fFirstParameter);
-    _fFound.hints.resize(_fFirstHint);
+    _fFound.items.CutTo(_fFirstSignature);
+    _fFound.parameters.CutTo(_fFirstParameter);
+    _fFound.hints.CutTo(_fFirstHint);
 }
 
 // Functions
 
 // `def`, `async def`, and either with type parameters
 void CSignatureFinder::Take(const CTree& tree) {
+    if (!tree.HasKind(ENodeKind::kFuncdef)) return;
     const CTreeNode* node = &tree.fRoot;
     bool is_async = false;
     while (!node->IsLeaf() && !node->Is(ENodeKind::kFuncdef)) {

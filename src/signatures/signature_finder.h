@@ -1,5 +1,7 @@
 #pragma once
 
+#include <vector>
+
 #include "signatures/signatures.h"
 #include "syntax/arguments.h"
 #include "syntax/tree.h"

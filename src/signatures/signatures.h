@@ -6,9 +6,9 @@
 #pragma once
 
 #include <cstdint>
-#include <vector>
 
 #include "syntax/nodes.h"
+#include "text/plain_array.h"
 
 namespace codeloom {
 
@@ -64,9 +64,9 @@ struct CHintInfo {
 };
 
 struct CSignatures {
-    std::vector<CSignature> items;
-    std::vector<CSignatureParameter> parameters;
-    std::vector<CHintInfo> hints;  // by place, for each line those of comments after the others
+    TPlainArray<CSignature> items;
+    TPlainArray<CSignatureParameter> parameters;
+    TPlainArray<CHintInfo> hints;  // by place, for each line those of comments after the others
 
     uint32_t FirstParameter(size_t signature_i) const {
         return signature_i < items.size() ? items[signature_i].first_parameter

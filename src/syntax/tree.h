@@ -97,6 +97,11 @@ class CTree {
         return {_fLine->file_text.data() + token.start, token.length};
     }
 
+    // The same of a leaf that isn't invented, as a name.
+    std::string_view TextOfName(const CTreeNode& leaf) const {
+        return TextOf(Token(leaf), _fLine->file_text);
+    }
+
     // Requires: the leaf is no invented one, as a name.
     const CRawToken& Token(const CTreeNode& leaf) const {
         assert(leaf.IsLeaf() && leaf.token < _fTokens.size());

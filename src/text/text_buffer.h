@@ -5,8 +5,10 @@
 #include <algorithm>
 #include <cassert>
 #include <cstddef>
+#include <cstdlib>
 #include <cstring>
 #include <memory>
+#include <new>
 #include <string_view>
 #include <utility>
 
@@ -32,10 +34,12 @@ class CTextBuffer {
 
     void reserve(size_t capacity) {
         if (capacity <= _fCapacity) return;
-        auto bytes = std::make_unique_for_overwrite<char[]>(capacity);
-        if (_fSize != 0) std::memcpy(bytes.get(), _fBytes.get(), _fSize);
-        _fBytes = std::move(bytes);
-        _fCapacity = capacity;
+        _SetCapacity(capacity);
+    }
+
+    // Gives back what lies unused.
+    void Shrink() {
+        if (_fSize != _fCapacity) _SetCapacity(std::max<size_t>(_fSize, 1));
     }
 
     CTextBuffer& operator+=(std::string_view piece) {
@@ -100,7 +104,19 @@ class CTextBuffer {
         return *this;
     }
 
-    std::unique_ptr<char[]> _fBytes;
+    [[gnu::noinline]] void _SetCapacity(size_t capacity) {
+        void* const bytes = std::realloc(_fBytes.get(), capacity);
+        if (bytes == nullptr) throw std::bad_alloc();
+        static_cast<void>(_fBytes.release());
+        _fBytes.reset(static_cast<char*>(bytes));
+        _fCapacity = capacity;
+    }
+
+    struct CFree {
+        void operator()(char* bytes) const { std::free(bytes); }
+    };
+
+    std::unique_ptr<char[], CFree> _fBytes;
     size_t _fSize = 0;
     size_t _fCapacity = 0;
 };

@@ -1,4 +1,4 @@
-// Hashes of texts that are short for the most part, and their comparison.
+// Hashes of texts that are short for the most part.
 #pragma once
 
 #include <cstddef>
@@ -25,6 +25,8 @@ Word Load(const char* pointer) {
 struct CEnds {
     uint64_t first = 0;
     uint64_t last = 0;
+
+    bool operator==(const CEnds&) const = default;
 };
 
 inline CEnds EndsOf(const char* text, size_t length) {
@@ -35,30 +37,32 @@ inline CEnds EndsOf(const char* text, size_t length) {
     return {byte_at(0) | byte_at(length / 2) << 8, byte_at(length - 1)};
 }
 
-inline uint64_t Mixed(uint64_t hash, uint64_t word) {
-    hash = (hash ^ word) * 0x9E3779B97F4A7C15ULL;
-    return hash ^ hash >> 32;
+// Both halves of a product, which each bit of both factors has a say in.
+inline uint64_t Mixed(uint64_t a, uint64_t b) {
+    __extension__ using CProduct = unsigned __int128;
+    const CProduct product = static_cast<CProduct>(a) * b;
+    return static_cast<uint64_t>(product) ^ static_cast<uint64_t>(product >> 64);
 }
 
 }  // namespace text_hash
 
-inline uint32_t HashOf(std::string_view text) {
-    using namespace text_hash;
-    const CEnds ends = EndsOf(text.data(), text.size());
-    uint64_t hash = Mixed(Mixed(gTextHashSeed + text.size(), ends.first), ends.last);
-    for (size_t pos = 8; pos + 8 < text.size(); pos += 8)
-        hash = Mixed(hash, Load<uint64_t>(text.data() + pos));
+// The ends tell texts of this length apart.
+inline constexpr size_t kMostInEnds = 16;
+
+// Of a text of at most so many bytes, whose ends are known.
+inline uint32_t HashOf(text_hash::CEnds ends, size_t length) {
+    constexpr uint64_t kOther = 0x9E3779B97F4A7C15ULL;
+    const uint64_t hash = text_hash::Mixed(ends.first ^ gTextHashSeed, ends.last ^ (kOther + length));
     return static_cast<uint32_t>(hash);
 }
 
-// Of two texts of one length.
-inline bool AreEqual(const char* a, const char* b, size_t length) {
-    using namespace text_hash;
-    const CEnds a_ends = EndsOf(a, length), b_ends = EndsOf(b, length);
-    if (a_ends.first != b_ends.first || a_ends.last != b_ends.last) return false;
-    for (size_t pos = 8; pos + 8 < length; pos += 8)
-        if (Load<uint64_t>(a + pos) != Load<uint64_t>(b + pos)) return false;
-    return true;
+// The same of a text of any length.
+inline uint32_t HashOf(text_hash::CEnds ends, std::string_view text) {
+    uint64_t hash = HashOf(ends, text.size());
+    if (text.size() <= kMostInEnds) return static_cast<uint32_t>(hash);
+    for (size_t pos = 8; pos + 8 < text.size(); pos += 8)
+        hash = text_hash::Mixed(hash ^ gTextHashSeed, text_hash::Load<uint64_t>(text.data() + pos));
+    return static_cast<uint32_t>(hash);
 }
 
 }  // namespace codeloom

@@ -34,7 +34,7 @@ struct CRawToken {
 static_assert(sizeof(CRawToken) == 20);
 
 constexpr std::string_view TextOf(const CRawToken& token, std::string_view file_text) {
-    return file_text.substr(token.start, token.length);
+    return {file_text.data() + token.start, token.length};
 }
 
 // A token of the text `text`, which begins at `start`.

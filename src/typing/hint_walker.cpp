@@ -172,7 +172,7 @@ void CHintWalker::_Record(std::string_view name, CSpan place, const CHint& hint)
     } else {
         CNodeText(tree, ECallText::kBare).Append(*hint.node, records.values);
     }
-    records.records.push_back({records.names.Number(name), static_cast<uint32_t>(value),
+    records.records.push_back({records.names->Number(name), static_cast<uint32_t>(value),
                                static_cast<uint32_t>(records.values.size() - value), place.start, place.end,
                                kTypeHintKind, hint.of_arg});
 }
