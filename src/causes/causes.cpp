@@ -36,13 +36,20 @@ constexpr auto kGrammarCauses = std::to_array<CRecogniser>({
     ImportFault,
     ExceptFault,
     ElseIf,
+    AsyncAlone,
+    ThenForColon,
+    CountingLoop,
     DefinitionHead,
     NestedHeader,
     MissingColon,
     PatternFault,
     NotAfterOperator,
     Increment,
+    NotIs,
     SplitOperator,
+    NewObject,
+    Declaration,
+    DeclaresAndAssigns,
     ArgumentFault,
     AssignmentForComparison,
     WalrusStatement,
@@ -56,9 +63,11 @@ constexpr auto kGrammarCauses = std::to_array<CRecogniser>({
     Misspelled,
     KeywordAsName,
     StatementInExpression,
+    LambdaFault,
     MissingComma,
     StillOpen,
     LaterUnmatchedCloser,
+    ColonAfterStatement,
     SideBySide,
     MissingExpression,
     MissingToken,
@@ -80,6 +89,8 @@ CCause LaterTokenCause(const CFaultyLine& line) {
 }
 
 CProblem CauseOfSyntax(const CFaultyLine& line) {
+    for (const CRecogniser recogniser : {ConflictMarker, ForeignText})
+        if (CCause cause = recogniser(line)) return *cause;
     const bool is_conversion = line.IsField() && line.Text(line.At()) == "!";
     if (!is_conversion)
         if (CCause cause = TokenCause(line, line.At())) return *cause;

@@ -28,6 +28,20 @@ CCause MissingElse(const CFaultyLine& line) {
                         "expected 'else' after 'if' expression");
 }
 
+// `lambda a b: a`, `lambda a = 1`
+CCause LambdaFault(const CFaultyLine& line) {
+    const int i = line.At();
+    const int lambda_i = line.FindBack(line.OpenerBefore(i) + 1, i, EWord::kLambda);
+    if (lambda_i < 0 || line.FindBack(lambda_i, i, kTokenId_COLON) >= 0) return {};
+    if (line.IsName(i) && line.EndsOperand(i - 1) && line.IsSoundWith({i, 0, {kTokenId_COMMA}}))
+        return line.Problem(ECode::kMissingComma, i - 1, i, "invalid syntax. Perhaps you forgot a comma?",
+                            Joined("write ',' before ", Quoted(line.Text(i))));
+    const bool is_early = line.IsAtEnd() || IsCloserType(line.Type(i)) || line.Is(i, kTokenId_COMMA);
+    if (!is_early || !line.Takes(kTokenId_COLON)) return {};
+    return line.Problem(ECode::kMissingColon, lambda_i, i - 1,
+                        "expected ':' after the parameters of 'lambda'");
+}
+
 CCause MissingComma(const CFaultyLine& line) {
     const int i = line.At();
     if (!line.IsInBrackets(i) || !line.EndsOperand(i - 1) || !line.BeginsOperand(i)) return {};

@@ -59,11 +59,18 @@ CCause ExceptFault(const CFaultyLine& line) {
                         "write 'except (A, B)'; 'except A, name' of Python 2 is 'except A as name'");
 }
 
-// `else if x:`
+// `else if x:`, `else x:`
 CCause ElseIf(const CFaultyLine& line) {
-    if (!line.Is(0, EWord::kElse) || line.At() != 1 || !line.Is(1, EWord::kIf)) return {};
-    if (!line.IsSoundWith({0, 2, {EWord::kElif}})) return {};
-    return line.Problem(ECode::kMissingColon, 0, 1, "expected ':' after 'else'", "write 'elif'");
+    if (!line.Is(0, EWord::kElse) || line.At() != 1) return {};
+    const bool has_if = line.Is(1, EWord::kIf);
+    if (!line.IsSoundWith({0, has_if ? 2 : 1, {EWord::kElif}})) return {};
+    return line.Problem(ECode::kMissingColon, 0, has_if ? 1 : 0, "expected ':' after 'else'", "write 'elif'");
+}
+
+// `async f()`
+CCause AsyncAlone(const CFaultyLine& line) {
+    if (line.At() != 1 || !line.Is(0, EWord::kAsync) || !line.IsKeyword(0)) return {};
+    return line.Problem(ECode::kMissingToken, 0, 0, "expected 'def', 'for' or 'with' after 'async'");
 }
 
 CCause DefinitionHead(const CFaultyLine& line) {
@@ -80,6 +87,9 @@ CCause DefinitionHead(const CFaultyLine& line) {
     if (closer_i == word_i + 3 && i == closer_i)
         return line.Problem(ECode::kMissingName, i - 1, i, "Type parameter list cannot be empty");
     const bool is_after_name = i == word_i + 2 || (closer_i > 0 && i == closer_i + 1);
+    if (is_after_name && line.Is(word_i, EWord::kClass) && line.Is(i, kTokenId_DOT))
+        return line.Problem(ECode::kMissingColon, i - 1, i + 1, "expected ':' or '(' after the class's name",
+                            "a definition binds a plain name");
     if (!is_def || !is_after_name) return {};
     if (line.Is(i, kTokenId_DOT))
         return line.Problem(ECode::kMissingParenthesis, i - 1, i + 1,

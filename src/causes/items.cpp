@@ -42,7 +42,28 @@ CCause ArgumentFault(const CFaultyLine& line) {
     return {};
 }
 
+// `f(a: 1)`, `[a: 1]`, `{1, a: 2}`
+CCause MisplacedEntry(const CFaultyLine& line) {
+    const int i = line.At();
+    const int opener_i = line.OpenerBefore(i);
+    if (opener_i < 0 || line.IsField() || !line.Is(i, kTokenId_COLON)) return {};
+    if (!line.EndsOperand(i - 1) || !line.BeginsOperand(i + 1)) return {};
+    const bool is_call = line.Is(opener_i, kTokenId_LPAR) && line.FollowsOperand(opener_i);
+    const bool is_list = line.Is(opener_i, kTokenId_LSQB) && !line.FollowsOperand(opener_i);
+    if (!is_call && !is_list && !line.Is(opener_i, kTokenId_LBRACE)) return {};
+    if (is_call && !line.IsSoundWith({i, 1, {kTokenId_EQUAL}}) && !line.IsSoundWith({i, 1, {kTokenId_COMMA}}))
+        return {};
+    return line.Problem(ECode::kDictionaryEntry, line.ItemStart(i), i,
+                        Joined("an entry of a dictionary can't be in ", is_call   ? "a call"
+                                                                        : is_list ? "a list"
+                                                                                  : "a set"),
+                        is_call   ? "write '=' to give an argument by its name"
+                        : is_list ? "write a dictionary in braces"
+                                  : "write ':' and a value after each key");
+}
+
 CCause DictionaryFault(const CFaultyLine& line) {
+    if (CCause cause = MisplacedEntry(line)) return cause;
     const int i = line.At();
     const int opener_i = line.OpenerBefore(i);
     if (opener_i < 0 || !line.Is(opener_i, kTokenId_LBRACE)) return {};
@@ -54,7 +75,8 @@ CCause DictionaryFault(const CFaultyLine& line) {
     if (colon_i == i - 1 && line.Is(i, kTokenId_STAR))
         return line.Problem(ECode::kDictionaryEntry, i, i,
                             "cannot use a starred expression in a dictionary value");
-    const bool is_dictionary = line.FindBack(opener_i + 1, start, kTokenId_COLON) >= 0;
+    const bool is_dictionary =
+        line.FindBack(opener_i + 1, start, kTokenId_COLON) >= 0 || line.Is(opener_i + 1, kTokenId_DOUBLESTAR);
     if (is_dictionary && colon_i < 0 && EndsItem(line.Type(i)) && i > start && line.Takes(kTokenId_COLON))
         return line.Problem(ECode::kDictionaryEntry, start, i - 1, "':' expected after dictionary key");
     if (is_dictionary && colon_i < 0 && line.EndsOperand(i - 1) && line.BeginsOperand(i) &&

@@ -81,7 +81,8 @@ bool IsMeant(const CFaultyLine& line, int i, EWord word) {
 
 CCause ForeignWordAt(const CFaultyLine& line, int i) {
     for (const CForeignWord& foreign : kForeignWords)
-        if (line.Text(i) == foreign.text && line.IsSoundWith({i, 1, {foreign.meant}}))
+        if (line.Text(i) == foreign.text &&
+            line.FaultWith({i, 1, {foreign.meant}}) > std::max(i + 1, line.At()))
             return MisspelledAt(line, i, foreign.meant);
     return {};
 }

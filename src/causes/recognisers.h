@@ -14,6 +14,17 @@ CCause AfterBackslash(const CFaultyLine& line, int i);  // characters.cpp
 CCause InvalidCharacter(const CFaultyLine& line, int i);
 CCause ForeignSign(const CFaultyLine& line, int i);  // signs.cpp
 
+CCause ConflictMarker(const CFaultyLine& line);  // foreign_text.cpp
+CCause ForeignText(const CFaultyLine& line);
+
+CCause Declaration(const CFaultyLine& line);  // foreign_forms.cpp
+CCause NewObject(const CFaultyLine& line);
+CCause ThenForColon(const CFaultyLine& line);
+CCause CountingLoop(const CFaultyLine& line);
+CCause NotIs(const CFaultyLine& line);
+CCause ColonAfterStatement(const CFaultyLine& line);
+CCause DeclaresAndAssigns(const CFaultyLine& line);
+
 // What is in braces in an f-string.
 CCause UnfinishedField(const CFaultyLine& line);  // fields.cpp
 CCause EmptyField(const CFaultyLine& line);
@@ -38,6 +49,7 @@ CCause ImportFault(const CFaultyLine& line);  // imports.cpp
 
 CCause ExceptFault(const CFaultyLine& line);  // headers.cpp
 CCause ElseIf(const CFaultyLine& line);
+CCause AsyncAlone(const CFaultyLine& line);
 CCause DefinitionHead(const CFaultyLine& line);
 CCause MissingIn(const CFaultyLine& line);
 CCause NestedHeader(const CFaultyLine& line);
@@ -64,6 +76,7 @@ CCause KeywordAsName(const CFaultyLine& line);  // keywords.cpp
 CCause StatementInExpression(const CFaultyLine& line);
 
 CCause MissingElse(const CFaultyLine& line);  // expected.cpp
+CCause LambdaFault(const CFaultyLine& line);
 CCause MissingComma(const CFaultyLine& line);
 CCause SideBySide(const CFaultyLine& line);
 CCause MissingExpression(const CFaultyLine& line);

@@ -5,6 +5,7 @@
 #include <optional>
 
 #include "causes/causes.h"
+#include "file/follow_ups.h"
 #include "file/method_hints.h"
 #include "line/line_length.h"
 #include "rules/text_checker.h"
@@ -92,6 +93,7 @@ class CFileAnalyzer final : CTreeObserver {
     const CLanguage* _fLanguage = nullptr;
     std::optional<CLineAnalyzer> _fAnalyzer;
     std::optional<CCauses> _fCauses;  // made for the first fault
+    CFollowUps _fFollowUps;
     CFileAnalysis _fResult;
     CTextChecker _fChecker;
     CDeclarationPlaces _fDeclarations;
@@ -110,6 +112,7 @@ CFileAnalysis CFileAnalyzer::Run() {
     CRawLogical logical;
     while (tokenizer.NextLogical(logical)) _AnalyzeLine(logical);
     _fChecker.Finish();
+    _fFollowUps.DropInConflicts(_fResult.problems);
     if (_fNames) _FinishNames();
     _AddUnreadable();
     _GiveRoomBack();
@@ -226,7 +229,9 @@ CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical) {
 
 void CFileAnalyzer::_AddFault(const CRawLogical& logical, const CFault& fault) {
     if (!_fCauses) _fCauses.emplace(*_fLanguage);
-    _fResult.problems.push_back(_fCauses->Of(fault, logical));
+    CProblem problem = _fCauses->Of(fault, logical);
+    if (!_fFollowUps.Take(problem, logical, _fResult.problems))
+        _fResult.problems.push_back(std::move(problem));
 }
 
 void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::string message) {

@@ -142,7 +142,10 @@ void CBlockTracker::_ReportTooManyFrames(const CSpan& place) {
 
 void CBlockTracker::_Place(const CIndent& indent) {
     CBlock& top = _Top();
-    if (_fOpensBlock && indent.column > top.header_depth) {
+    // As deep as its header only where tabs count eight.
+    const bool is_hidden = _fLanguage.IsPython3() && indent.column == top.indent.column &&
+                           indent.alt_column > top.indent.alt_column;
+    if (_fOpensBlock && (indent.column > top.header_depth || is_hidden)) {
         const bool has_mixed_tabs = !_CheckTabs(indent);
         _Open(indent, top.previous.clause, _fPreviousHasFault);
         _Top().has_mixed_tabs = has_mixed_tabs;
@@ -191,6 +194,7 @@ void CBlockTracker::_OpenOdd(const CIndent& indent) {
     }
     _Open(indent, EClause::kSimple, true);
     _Top().header_depth = header_depth;
+    _Top().has_mixed_tabs = true;  // which may be what is odd
 }
 
 void CBlockTracker::_PlaceOut(const CIndent& indent) {

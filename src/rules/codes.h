@@ -51,6 +51,8 @@ enum class ECode : uint16_t {
     kStatementInExpression = 233,
     kNestedHeader = 234,
     kDoubled = 235,
+    kForeignText = 236,
+    kConflictMarker = 237,
     kCallWithoutParentheses = 241,
     kEndedStatement = 242,
     kMissingNames = 251,
