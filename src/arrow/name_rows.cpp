@@ -79,7 +79,7 @@ CScopeRow CScopeSource::Of(uint32_t i) const {
     const auto text_end = static_cast<uint32_t>(_fText.text.size());
     return {.scope = i,
             .kind = scope.kind,
-            .name = {names.occurrences.names.Text(scope.name)},
+            .name = {names.occurrences.names->Text(scope.name)},
             .parent = i == 0 ? std::nullopt : std::optional(scope.parent),
             .range = i == 0 ? _fText.rows.RangeOf(0, text_end) : _fText.rows.RangeOf(scope.start, scope.end)};
 }
@@ -107,7 +107,7 @@ const TColumns<CSymbolRow>& CSymbolSource::Columns() {
 }
 
 size_t CSymbolSource::Count(const CFileAnalysis& analysis) {
-    const std::vector<CSymbol>& symbols = analysis.names.scopes.symbols;
+    const TPlainArray<CSymbol>& symbols = analysis.names.scopes.symbols;
     return static_cast<size_t>(std::count_if(symbols.begin(), symbols.end(),
                                              [](const CSymbol& symbol) { return symbol.IsMentioned(); }));
 }
@@ -124,7 +124,7 @@ CSymbolRow CSymbolSource::Of(uint32_t i) const {
     const CTextNames& names = _fText.analysis.names;
     const CSymbol& symbol = names.scopes.symbols[_fMentioned[i]];
     return {.scope = symbol.scope,
-            .name = {names.occurrences.names.Text(symbol.name)},
+            .name = {names.occurrences.names->Text(symbol.name)},
             .is_local = symbol.IsLocal(),
             .is_global = symbol.IsGlobal(),
             .is_free = symbol.binding == CSymbol::EBinding::kFree,

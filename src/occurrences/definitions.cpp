@@ -17,7 +17,8 @@ constexpr int kDefersAnnotations = 314;  // PEP 649
 uint32_t COccurrenceFinder::_AddScope(EScopeKind kind, uint32_t name, uint32_t parent,
                                       const CTreeNode& node) {
     const CSpan span = SpanOf(*_fTree, node);
-    _fFound.scopes.push_back({kind, false, false, name, parent, span.start + _fShift, span.end + _fShift});
+    _fFound.scopes.push_back(
+        {kind, false, false, false, name, parent, span.start + _fShift, span.end + _fShift});
     return static_cast<uint32_t>(_fFound.scopes.size() - _fFirstScope);
 }
 
@@ -107,6 +108,7 @@ void COccurrenceFinder::_VisitGeneric(const CTreeNode& node) {
     const CTreeNode& name = tree.Child(*statement, is_alias ? 0 : 1);
     _AddName(name, ERole::kBind, is_alias ? 0 : COccurrence::kIsDefinition);
     const uint32_t scope = _AddScope(EScopeKind::kTypeParameters, _NumberOf(name), _fScope, node);
+    _fFound.scopes.back().is_of_class = statement->Is(ENodeKind::kClassdef);
     for (const CTreeNode& parameter : TypeParametersOf(tree, node)) _VisitTypeParameter(parameter, scope);
     if (statement->Is(ENodeKind::kFuncdef)) return _VisitFuncdef(*statement, scope);
     if (statement->Is(ENodeKind::kClassdef)) return _VisitClassdef(*statement, scope);

@@ -49,7 +49,7 @@ bool CNameQueries::_IsLost(uint32_t name) const {
 // In Python 2 a function may have one too.
 bool CNameQueries::_HasStarImport() const {
     if (!_fHasStarImport) {
-        const std::vector<CScope>& scopes = _fNames.scopes.scopes;
+        const TPlainArray<CScope>& scopes = _fNames.scopes.scopes;
         _fHasStarImport = std::any_of(scopes.begin(), scopes.end(),
                                       [](const CScope& scope) { return scope.has_star_import; });
     }

@@ -46,6 +46,8 @@ class CScopeBuilder {
     void _NotePrivateNames();
     uint32_t _Mangled(uint32_t name, uint32_t scope);
     uint32_t _MangledByClass(uint32_t name, uint32_t scope);
+    uint32_t _MangledBy(const CScope& named, uint32_t name);
+    uint32_t _AddTypeParameter(uint32_t scope, uint32_t name);
     uint32_t _Add(const COccurrence& occurrence, uint32_t scope);
     uint32_t _AddWalrus(uint32_t scope, uint32_t name);
     uint32_t _AddFlags(uint32_t scope, uint32_t name, uint16_t flags);
@@ -98,6 +100,7 @@ void CScopeBuilder::_AddScopes() {
             scope.kind = inner[i].kind;
             scope.is_lost = inner[i].is_lost;
             scope.is_text = inner[i].is_text;
+            scope.is_of_class = inner[i].is_of_class;
             scope.name = inner[i].name;
             scope.parent = _fNames.ScopeOf(line, inner[i].parent);
             scope.start = inner[i].start;
@@ -123,11 +126,21 @@ inline uint32_t CScopeBuilder::_Mangled(uint32_t name, uint32_t scope) {
     return name < _fIsPrivate.size() && _fIsPrivate[name] != 0 ? _MangledByClass(name, scope) : name;
 }
 
+// Around the body of a class with type parameters, these alone are mangled: by that class.
 uint32_t CScopeBuilder::_MangledByClass(uint32_t name, uint32_t scope) {
-    while (scope != 0 && _fScopes.scopes[scope].kind != EScopeKind::kClass)
-        scope = _fScopes.scopes[scope].parent;
+    for (; scope != 0; scope = _fScopes.scopes[scope].parent) {
+        const CScope& around = _fScopes.scopes[scope];
+        if (around.kind == EScopeKind::kClass) return _MangledBy(around, name);
+        if (!around.is_of_class) continue;
+        const uint32_t mangled = _MangledBy(around, name);
+        return _fSymbols.Find(scope, mangled) != kNoIndex ? mangled : name;
+    }
+    return name;
+}
+
+uint32_t CScopeBuilder::_MangledBy(const CScope& named, uint32_t name) {
     CNameTable& names = *_fNames.occurrences.names;
-    std::string_view class_name = names.Text(_fScopes.scopes[scope].name);
+    std::string_view class_name = names.Text(named.name);
     class_name.remove_prefix(std::min(class_name.find_first_not_of('_'), class_name.size()));
     if (class_name.empty()) return name;
     return names.Number("_" + std::string(class_name) + std::string(names.Text(name)));
@@ -161,7 +174,7 @@ uint32_t CScopeBuilder::_Add(const COccurrence& occurrence, uint32_t scope) {
         case ERole::kParameter:
             return _AddFlags(scope, name, CSymbol::kIsParameter);
         case ERole::kTypeParameter:
-            return _AddFlags(scope, name, CSymbol::kIsTypeParameter | CSymbol::kIsAssigned);
+            return _AddTypeParameter(scope, occurrence.name);
         case ERole::kGlobal:
             _AddFlags(0, name, CSymbol::kIsDeclaredGlobal);
             return _AddFlags(scope, name, CSymbol::kIsDeclaredGlobal);
@@ -175,6 +188,13 @@ uint32_t CScopeBuilder::_Add(const COccurrence& occurrence, uint32_t scope) {
         return _AddWalrus(scope, name);
     const bool is_annotated = (occurrence.flags & COccurrence::kIsAnnotated) != 0;
     return _AddFlags(scope, name, CSymbol::kIsAssigned | (is_annotated ? CSymbol::kIsAnnotated : 0));
+}
+
+uint32_t CScopeBuilder::_AddTypeParameter(uint32_t scope, uint32_t name) {
+    const CScope& of = _fScopes.scopes[scope];
+    const bool is_mangled = of.is_of_class && _fIsPrivate[name] != 0;
+    return _AddFlags(scope, is_mangled ? _MangledBy(of, name) : _Mangled(name, scope),
+                     CSymbol::kIsTypeParameter | CSymbol::kIsAssigned);
 }
 
 // In a comprehension `:=` binds in the function or the module around.

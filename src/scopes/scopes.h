@@ -55,6 +55,7 @@ struct CScope {
     EScopeKind kind = EScopeKind::kModule;
     bool is_lost = false;          // its header has a fault
     bool is_text = false;          // annotations that are kept as text
+    bool is_of_class = false;      // type parameters of a class
     bool has_lost_lines = false;   // a line right in it has a fault
     bool has_star_import = false;  // it may bind any name
     uint32_t name = 0;             // in the table of names
