@@ -227,7 +227,7 @@ class Problem:
 
     @property
     def hint(self) -> str | None:
-        """What may have been meant, where that can be told."""
+        """What may have been meant, if that is known."""
 
     @property
     def source_row(self) -> str:
@@ -338,7 +338,7 @@ class Record:
 
     @property
     def range(self) -> Range | None:
-        """Where the name stands; None where it stands nowhere."""
+        """Where the name is; None if it has no place."""
 
     @property
     def line(self) -> Line:
@@ -712,15 +712,15 @@ class Occurrence:
 
     @property
     def range(self) -> Range:
-        """Where it stands."""
+        """Where it is."""
 
     @property
     def line(self) -> Line:
-        """The line that it stands on."""
+        """The line that it is on."""
 
     @property
     def scope(self) -> Scope:
-        """The scope that it stands in."""
+        """The scope that it is in."""
 
     @property
     def resolution(self) -> Resolution | None:
@@ -754,15 +754,15 @@ class Occurrence:
 
     @property
     def in_f_string(self) -> bool:
-        """It stands in a field of an f-string."""
+        """It is in a field of an f-string."""
 
     @property
     def in_quotes(self) -> bool:
-        """It stands in a hint in quotes."""
+        """It is in a hint in quotes."""
 
     @property
     def in_comment(self) -> bool:
-        """It stands in a hint in a comment."""
+        """It is in a hint in a comment."""
 
     def __repr__(self) -> str:
         ...
@@ -883,7 +883,7 @@ class Hint:
 
     @property
     def range(self) -> Range:
-        """Where it stands."""
+        """Where it is."""
 
     @property
     def kind(self) -> HintKind:
@@ -897,15 +897,15 @@ class Hint:
 
     @property
     def target(self) -> Range:
-        """Where that name stands."""
+        """Where that name is."""
 
     @property
     def in_comment(self) -> bool:
-        """It stands in a comment."""
+        """It is in a comment."""
 
     @property
     def line(self) -> Line:
-        """The line that it stands on."""
+        """The line that it is on."""
 
     def __repr__(self) -> str:
         ...
@@ -931,7 +931,7 @@ class Parameter:
 
     @property
     def range(self) -> Range:
-        """Where the name stands."""
+        """Where the name is."""
 
     @property
     def kind(self) -> ParameterKind:
@@ -939,7 +939,7 @@ class Parameter:
 
     @property
     def default(self) -> Range | None:
-        """Where its default stands; None without one."""
+        """Where its default is; None without one."""
 
     @property
     def hint(self) -> Hint | None:
@@ -972,7 +972,7 @@ class Signature:
 
     @property
     def range(self) -> Range:
-        """Where the name stands."""
+        """Where the name is."""
 
     @property
     def line(self) -> Line:
@@ -984,7 +984,7 @@ class Signature:
 
     @property
     def is_method(self) -> bool:
-        """It stands right in the body of a class."""
+        """It is right in the body of a class."""
 
     @property
     def parameters(self) -> tuple[Parameter, ...]:
@@ -1121,7 +1121,7 @@ class Analysis:
 
     def __init__(self, utf8: bytes, path: str, python: str, version: int, false_hints: bool, faults: list[tuple[int, int, str]], unreadable: list[int]) -> None:
         """
-        For `codeloom.analyze`, which decodes. `faults` are places that are no text, and `unreadable` the offset of each character that stands for something unreadable.
+        For `codeloom.analyze`, which decodes. `faults` are places that aren't text, and `unreadable` the offset of each character that stands for something unreadable.
         """
 
     @property
@@ -1191,12 +1191,12 @@ class Analysis:
 
     def unused(self, *, parameters: bool=False) -> tuple[Occurrence, ...]:
         """
-        The first binding of each import and of each local name of a function that nothing in the text reads; with `parameters` theirs too. Names that begin with `_` aren't told, nor what `__all__` lists. What other modules read, and what a name is looked up by as text, isn't known.
+        The first binding of each import and of each local name of a function that nothing in the text reads; with `parameters` theirs too. Names that begin with `_` are left out, and what `__all__` lists. What other modules read, and what a name is looked up by as text, isn't known.
         """
 
     def undefined(self) -> tuple[Occurrence, ...]:
         """
-        What is read although nothing in the text binds it and no builtin has the name; nothing is told that `import *` or a line with a fault may bind. Whether a binding runs before isn't known.
+        What is read although nothing in the text binds it and no builtin has the name; what `import *` or a line with a fault may bind is left out. Whether a binding runs before isn't known.
         """
 
     @property
@@ -1225,7 +1225,7 @@ def DumpNames(text: str, version: int, has_print_function: bool=False, with_reco
     """
     For developers: what the walk for names records of each logical line of a text, and of each expression embedded in it.
 
-    Each is the kind of its fault (0 for none), the token at fault, the limit that the walk hit (0 for none), and the records: name, info bytes, whether of an argument, and the bytes of the text at which the name stands. `version` is 312 for Python 3.12.
+    Each is the kind of its fault (0 for none), the token at fault, the limit that the walk hit (0 for none), and the records: name, info bytes, whether of an argument, and the bytes of the text at which the name is. `version` is 312 for Python 3.12.
     """
 
 def DumpTrees(text: str, version: int, has_print_function: bool=False) -> list[tuple[str, str | None, int]]:

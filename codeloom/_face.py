@@ -89,7 +89,7 @@ def analyze_paths(
 ) -> Iterator[Analysis]:
     """The same for many files, lazily and in their order.
 
-    A folder stands for the Python files below it, in the order of their names; hidden folders, caches
+    Of a folder these are the Python files below it, in the order of their names; hidden folders, caches
     and virtual environments are left out, unless they are named themselves. Nothing is read twice.
 
     `jobs` threads read and analyse files ahead, as many as the machine has processors unless told

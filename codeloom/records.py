@@ -65,7 +65,7 @@ _PREFIX_LENGTH = len(_PLAIN.prefix)
 class CRecord:
     """One record: a name, what is said about it, and whether the name is an argument's.
 
-    Bytes that are no UTF-8 stand in `name` and `payload` as the lone surrogates that the
+    Bytes that aren't UTF-8 are in `name` and `payload` as the lone surrogates that the
     interpreter's `surrogateescape` makes of them.
     """
 

@@ -37,7 +37,7 @@ class Value:
 class Argument:
     """One argument: its stars, its type by annotation or comment, and its default.
 
-    A bare `*` and a `/` stand among the arguments without a name.
+    A bare `*` and a `/` are among the arguments without a name.
     """
 
     name: str | None
@@ -199,7 +199,7 @@ def _filled(signature: Signature, tree: CNode, records: Iterable[Record]) -> Sig
         if record.of_argument:
             of_arguments.setdefault(record.name, []).append(record)
     funcdef = tree
-    while not isinstance(funcdef, CFuncdefStmt):  # it stands last, after `async` and type parameters
+    while not isinstance(funcdef, CFuncdefStmt):  # it is last, after `async` and type parameters
         funcdef = funcdef.fChildren[-1]
     return replace(
         signature,

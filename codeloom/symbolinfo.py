@@ -78,7 +78,7 @@ def ObjectForStringLiteral(text: bytes | str) -> str | bytes | None:
     """The value of a string literal, as the interpreter evaluates it; nothing is executed.
 
     None for what isn't exactly one string literal, for one that the interpreter refuses, and for
-    an f-string, whose value isn't in its text. TypeError for what is no text.
+    an f-string, whose value isn't in its text. TypeError for what isn't text.
     """
     from codeloom._literals import EvaluateStringLiteral  # not needed to load the engine
 

@@ -82,7 +82,7 @@ def test_the_examples(run_cli):
         (["chek", "a.py"], "did you mean 'check'?"),
         (["check", "--statistic", "a.py"], "no option --statistic: did you mean '--statistics'?"),
         (["check", "--format", "jsn", "a.py"], "did you mean 'json'?"),
-        (["check", "--select", "E9", "a.py"], "'E9' is no code"),
+        (["check", "--select", "E9", "a.py"], "'E9' isn't a code"),
         (["check", "--ignore", "CL399", "a.py"], "there is no code CL399: did you mean 'CL"),
         (["check", "--jobs", "0", "a.py"], "a number from 1"),
         (["check", "--python", "3.99", "a.py"], "choose 2.7, or one from 3.0 to 3.15"),
@@ -166,8 +166,8 @@ class TestFiles:
         done = run_cli("check", "pipe", "/dev/zero", "a.ipynb")
         assert (done.returncode, done.stdout) == (2, "0 problems in 0 files, 0 logical lines; 3 not read\n")
         assert done.stderr.splitlines() == [
-            "codeloom: can't read pipe: it is no regular file",
-            "codeloom: can't read /dev/zero: it is no regular file",
+            "codeloom: can't read pipe: it isn't a regular file",
+            "codeloom: can't read /dev/zero: it isn't a regular file",
             "codeloom: can't read a.ipynb: it isn't a notebook: it has no cells",
         ]
 

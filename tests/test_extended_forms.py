@@ -81,21 +81,21 @@ NEW_IN = {
     f(a := b, c)  #! `:=` needs Python 3.8
     def f(a, /, b): pass  #! `/` among parameters needs Python 3.8
     lambda a, /: 0  #! `/` among parameters needs Python 3.8
-    return *a, b  #! a starred expression without brackets behind `return` or `yield` needs Python 3.8
+    return *a, b  #! a starred expression without parentheses after `return` or `yield` needs Python 3.8
     x = f'{a = }'  #! `=` at the end of a field of an f-string needs Python 3.8
     with (a := b) as c, (d): e
     """,
     # 614, 617
     "3.9": r"""
-    @a[0].b\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
-    @(lambda f: f)\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
-    @a.b(c)(d)\nclass A: pass  #! a decorator that is no name or call of one needs Python 3.9
-    @lambda a, b: c\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
-    @...\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
-    @a := b\ndef f(): pass  #! a decorator that is no name or call of one needs Python 3.9
-    with (a as b, c): d  #! a `with` whose items stand in brackets needs Python 3.9
-    with (a as b, c as d,): e  #! a `with` whose items stand in brackets needs Python 3.9
-    async def f():\n  async with (a as b, c): d  #! a `with` whose items stand in brackets needs Python 3.9
+    @a[0].b\ndef f(): pass  #! a decorator that isn't a name or a call of one needs Python 3.9
+    @(lambda f: f)\ndef f(): pass  #! a decorator that isn't a name or a call of one needs Python 3.9
+    @a.b(c)(d)\nclass A: pass  #! a decorator that isn't a name or a call of one needs Python 3.9
+    @lambda a, b: c\ndef f(): pass  #! a decorator that isn't a name or a call of one needs Python 3.9
+    @...\ndef f(): pass  #! a decorator that isn't a name or a call of one needs Python 3.9
+    @a := b\ndef f(): pass  #! a decorator that isn't a name or a call of one needs Python 3.9
+    with (a as b, c): d  #! a `with` whose items are in parentheses needs Python 3.9
+    with (a as b, c as d,): e  #! a `with` whose items are in parentheses needs Python 3.9
+    async def f():\n  async with (a as b, c): d  #! a `with` whose items are in parentheses needs Python 3.9
     {a := b}  #! invalid syntax
     {*a, b := c}  #! invalid syntax
     {a := b for b in c}  #! invalid syntax
@@ -111,8 +111,8 @@ NEW_IN = {
     match a:\n  case 'b' 'c': d\n  case {'b' r'c': 'd' 'e' | 'f'}: g  #! `match` needs Python 3.10
     match a:\n  case A(b, c=[d, *_]) | {1: -2j, **e} as f if g: h  #! `match` needs Python 3.10
     match a:\n  case b if lambda c=lambda: 1, *d: c: e  #! `match` needs Python 3.10
-    a[b := c]  #! `:=` without brackets of its own in a subscript needs Python 3.10
-    a[b := c, d]  #! `:=` without brackets of its own in a subscript needs Python 3.10
+    a[b := c]  #! `:=` without its own parentheses in a subscript needs Python 3.10
+    a[b := c, d]  #! `:=` without its own parentheses in a subscript needs Python 3.10
     """,
     # 654, 646
     "3.11": r"""
@@ -146,8 +146,8 @@ NEW_IN = {
     """,
     # 758, 750
     "3.14": r"""
-    try: a\nexcept B, C: d  #! an `except` of several types without brackets needs Python 3.14
-    try: a\nexcept* B, C,: d  #! an `except` of several types without brackets needs Python 3.14
+    try: a\nexcept B, C: d  #! an `except` of several types without parentheses needs Python 3.14
+    try: a\nexcept* B, C,: d  #! an `except` of several types without parentheses needs Python 3.14
     x = t'{a}'  #! a t-string needs Python 3.14
     x = Rt'''{a!r:{b}}''' t'c'  #! a t-string needs Python 3.14
     x = f'{t'{a}'}'  #! a t-string needs Python 3.14

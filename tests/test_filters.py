@@ -59,7 +59,7 @@ def test_a_baseline(write_files, places, run_cli, form):
         write_files({"known.json": text})
         done = run_cli("check", "a.py")
         if text:
-            assert done.returncode == 2 and "is no report of codeloom" in done.stderr
+            assert done.returncode == 2 and "isn't a report of codeloom" in done.stderr
     assert "No such file" in run_cli("check", "a.py", "--baseline", "absent").stderr
 
 

@@ -37,7 +37,7 @@ class TestSettings:
         ("text", "words"),
         [
             ("selct = []", "codeloom.toml: selct isn't a setting: did you mean 'select'?"),
-            ("select = 'CL9x'", "codeloom.toml: select: 'CL9X' is no code"),
+            ("select = 'CL9x'", "codeloom.toml: select: 'CL9X' isn't a code"),
             ("jobs = true", "codeloom.toml: jobs: it must be a number"),
             ("python = 3.12", "codeloom.toml: python: it must be a string"),
             ("python = '4'", "codeloom.toml: python: python: unknown version '4'"),

@@ -88,14 +88,23 @@ class Console:
     def print_message(self, words: Sequence[tuple[Colour, str]], text: str, indent: str = "") -> None:
         """A row of words in colours and a text; on a terminal the text is broken between words."""
         head = indent + " ".join(self.coloured(colour, word) for colour, word in words)
-        rows = [printable(text)]
-        if self.is_terminal:
-            first_room = self._columns - len(indent) - sum(len(word) + 1 for _, word in words)
-            room = self._columns - len(_CONTINUATION)
-            rows = list(wrapped(printable(text), first_room, room))
-        self.print_row(f"{head} {rows[0]}".rstrip())
-        for row in rows[1:]:
+        used = len(indent) + sum(len(word) + 1 for _, word in words)
+        first, *others = self._broken(text, used, len(_CONTINUATION))
+        self.print_row(f"{head} {first}".rstrip())
+        for row in others:
             self.print_row(_CONTINUATION + row)
+
+    def print_paragraph(self, text: str) -> None:
+        """A text of some sentences, likewise."""
+        for row in self._broken(text):
+            self.print_row(row)
+
+    def _broken(self, text: str, used: int = 0, indent: int = 0) -> list[str]:
+        """`text` on rows of the terminal; in the first one some columns are used already."""
+        text = printable(text)
+        if not self.is_terminal:
+            return [text]
+        return list(wrapped(text, self._columns - used, self._columns - indent))
 
     def print_row(self, row: str) -> None:
         """A row of a command's result."""

@@ -45,7 +45,7 @@ class ExplainCommand(Command):
 def _print(console: Console, explanation: Explanation) -> None:
     console.print_row(f"{console.coloured(Colour.BOLD, explanation.code)} {explanation.title}")
     console.print_row("")
-    console.print_row(explanation.meaning)
+    console.print_paragraph(explanation.meaning)
     version = "" if explanation.python == NEWEST else f", in Python {explanation.python}"
     for label, example in ((f"wrong{version}", explanation.wrong), ("right", explanation.right)):
         _print_example(console, label, example)

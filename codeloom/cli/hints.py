@@ -78,7 +78,7 @@ class SignatureItem(Item):
 def _head(signature: "Signature") -> str:
     arguments = signature.arguments
     names = ", ".join(argument.prefix + (argument.name or "") for argument in arguments or ())
-    if arguments is None:  # nested too deep to be told
+    if arguments is None:  # nested too deep to be listed
         names = _CUT
     parameters = ", ".join(signature.type_parameters)
     head = f"{'async ' if signature.is_async else ''}def {signature.name}"

@@ -129,7 +129,7 @@ def files_of(
 ) -> Iterator[str | OSError]:
     """The paths of the files that the options name, and what keeps a folder from being listed.
 
-    `on_nothing` gets each path that stands for no file, and the reason.
+    `on_nothing` gets each path that gives no file, and the reason.
     """
     exclusion = options.exclusion
     for path in find_files([as_named(path) for path in options.paths], exclusion, on_nothing):

@@ -58,7 +58,7 @@ class Source:
         return {**self.path_fields(), **self.place_fields(place)}
 
     def path_fields(self) -> dict[str, str]:
-        """The path, and its bytes where it is no text."""
+        """The path, and its bytes where it isn't text."""
         return path_fields(self.path)
 
     def place_fields(self, place: Range) -> dict[str, int]:
@@ -96,7 +96,7 @@ def printable_path(path: str) -> str:
 
 
 def path_fields(path: str) -> dict[str, str]:
-    """A path for programs: `path` as text, and `path_bytes` in hexadecimal where it is none."""
+    """A path for programs: `path` as text, and `path_bytes` in hexadecimal where it isn't."""
     raw = os.fsencode(path)
     try:
         return {"path": raw.decode()}

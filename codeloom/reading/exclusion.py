@@ -1,7 +1,7 @@
 """What a search through folders leaves out, by patterns and by .gitignore files.
 
 All patterns are those of .gitignore files. One that holds a slash before its end is relative to the folder
-that it was written for, any other stands for names at any depth.
+that it was written for, any other matches names at any depth.
 """
 
 import os
@@ -158,7 +158,7 @@ class _Rules:
     """The patterns of a .gitignore file, or those of an option."""
 
     def __init__(self, rows: Iterable[tuple[int, str]], path: str = "") -> None:
-        """From numbered rows; ValueError when one of them is no pattern."""
+        """From numbered rows; ValueError when one of them isn't a pattern."""
         self._rows = [(number, row) for number, row in rows if row]
         self._path = path
         self._spec = _spec_of([row for _, row in self._rows])
@@ -200,7 +200,7 @@ def _read_ignore_file(path: str) -> _Rules | None:
         return None
     try:
         return _Rules(rows, path) if rows else None
-    except ValueError:  # a row that is no pattern: the others hold
+    except ValueError:  # a row that isn't a pattern: the others count
         return _Rules([row for row in rows if is_pattern(row[1])], path)
 
 

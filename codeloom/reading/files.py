@@ -11,7 +11,7 @@ NOTEBOOK_SUFFIX = ".ipynb"
 _SUFFIXES = (".py", ".pyi", ".pyw", NOTEBOOK_SUFFIX)
 _ENVIRONMENT_MARK = "pyvenv.cfg"
 
-# Where the files lie that a process has open: pipes there were handed over by the shell.
+# Where the open files of a process are: pipes there come from the shell.
 _OPEN_FILES = ("/dev/fd/", "/dev/stdin", "/proc/self/fd/")
 
 
@@ -32,7 +32,7 @@ def read_file(path: str) -> bytes:
     if stat.S_ISDIR(mode):
         raise IsADirectoryError(errno.EISDIR, os.strerror(errno.EISDIR), path)
     if not stat.S_ISREG(mode) and not is_handed_over:
-        raise OSError(errno.EINVAL, "it is no regular file", path)
+        raise OSError(errno.EINVAL, "it isn't a regular file", path)
     with open(path, "rb") as file:
         return file.read()
 
@@ -44,11 +44,11 @@ def find_files(
 ) -> Iterator[str | OSError]:
     """The paths of the files that `paths` name, and an error for each folder that can't be listed.
 
-    A folder stands for the Python files and notebooks below it, in the order of their names. What
+    Of a folder these are the Python files and notebooks below it, in the order of their names. What
     `exclusion` names is left out, hidden folders and caches unless told otherwise, and virtual
     environments; unless they are named themselves. Links to folders aren't followed. No file is found
-    twice, whatever its names. `on_nothing` is called with each of the paths that stands for no file, and
-    with the reason.
+    twice, whatever its names. `on_nothing` is called with each of the paths that gives no file, and with
+    the reason.
     """
     return _FileFinder(paths, exclusion or Exclusion(), on_nothing).files()
 
@@ -111,7 +111,7 @@ class _FileFinder:
             yield path
 
     def _why_nothing(self, path: str) -> str | None:
-        """Why a path stands for no file; None when all of its files were found before."""
+        """Why a path gives no file; None when all of its files were found before."""
         cause = None if isinstance(path, StandardInput) else self._exclusion.cause_for_named(path)
         if cause is not None:
             return left_out_by_force(cause)
@@ -180,7 +180,7 @@ class _FileFinder:
 
 
 def _path_of_file(entry: os.DirEntry[str]) -> str | None:
-    """The path of a file that is to be read, or that can't be; None for what is no file."""
+    """The path of a file that is to be read, or that can't be; None for anything else."""
     is_hidden = entry.name.startswith(".")
     try:
         is_broken = entry.is_symlink() and not os.path.exists(entry.path)

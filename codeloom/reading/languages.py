@@ -31,7 +31,7 @@ _PRINT_FUNCTION = re.compile(
 def version_number(name: str) -> int:
     """A version as one number: 207 for "2.7", 312 for "3.12".
 
-    ValueError for a version that isn't among `VERSIONS`, and TypeError for what is no text.
+    ValueError for a version that isn't among `VERSIONS`, and TypeError for what isn't text.
     """
     if not isinstance(name, str):
         raise TypeError(f'python must be a str such as "{NEWEST}", not {type(name).__name__}')

@@ -59,7 +59,7 @@ def source_from_bytes(data: bytes) -> Source:
     else:
         source = _encoded(data.decode(encoding.name, _MARK_UNDECODABLE), encoding)
     if encoding.fault is not None:
-        # What can't be decoded follows from the wrong encoding and is no fault of its own.
+        # What can't be decoded follows from the wrong encoding and isn't a fault of its own.
         source.faults = [encoding.fault]
     return source
 
@@ -97,7 +97,7 @@ def _encoding_of(data: bytes) -> _Encoding:
             "encoding: remove one of the two"
         )
     elif not _can_hold_source(name):
-        message = f"{declared!r} is no encoding of source text: name the one of the file, or utf-8"
+        message = f"{declared!r} isn't an encoding of source text: name the one of the file, or utf-8"
     else:
         return _Encoding(name, f"correct the name {declared!r} in row {row}, or save the file so")
     return _Encoding(fault=(offset, offset + len(declared), message))
@@ -180,7 +180,7 @@ def _fault_message(unusable: bytes, encoding: _Encoding | None) -> str:
         return "a NUL byte, which Python source can't hold: remove it"
     code = ord(unusable.decode("utf-8", "surrogatepass"))
     if encoding is None:
-        return f"the lone surrogate U+{code:04X} is no character: replace it"
+        return f"the lone surrogate U+{code:04X} isn't a character: replace it"
     return f"byte 0x{code & 0xFF:02X} can't be read as {encoding.name}: {encoding.remedy}"
 
 

@@ -106,7 +106,7 @@ void BindProblem(nb::module_& module) {
         [](const CProblemItem& self) -> nb::object {
             return self.Data().hint.empty() ? nb::none() : TextFromUtf8(self.Data().hint);
         },
-        nb::sig("def hint(self) -> str | None"), "What may have been meant, where that can be told.");
+        nb::sig("def hint(self) -> str | None"), "What may have been meant, if that is known.");
     problem.def_prop_ro(
         "source_row",
         [](const CProblemItem& self) {
@@ -172,7 +172,7 @@ void BindRecord(nb::module_& module) {
         [](const CRecordItem& self) -> nb::object {
             return self.HasPlace() ? NewObject<CRange>(self.Range()) : nb::none();
         },
-        nb::sig("def range(self) -> Range | None"), "Where the name stands; None where it stands nowhere.");
+        nb::sig("def range(self) -> Range | None"), "Where the name is; None if it has no place.");
     record.def_prop_ro("line", &CRecordItem::Line, "The line that says it.");
     record.def("__str__", &CRecordItem::Text);
     record.def("__repr__",
@@ -203,7 +203,7 @@ void BindAnalysis(nb::class_<CAnalysis>& analysis) {
         "utf8"_a, "path"_a, "python"_a, "version"_a, "false_hints"_a, "faults"_a, "unreadable"_a,
         nb::sig("def __init__(self, utf8: bytes, path: str, python: str, version: int, false_hints: bool, "
                 "faults: list[tuple[int, int, str]], unreadable: list[int]) -> None"),
-        "For `codeloom.analyze`, which decodes. `faults` are places that are no text, and `unreadable` the "
+        "For `codeloom.analyze`, which decodes. `faults` are places that aren't text, and `unreadable` the "
         "offset of each character that stands for something unreadable.");
     analysis.def_prop_ro(
         "path", [](const CAnalysis& self) { return self.file->Path(); }, "The name that problems bear.");

@@ -116,9 +116,9 @@ void BindOccurrence(nb::module_& module) {
     occurrence.def_prop_ro(
         "role", [](const COccurrenceItem& self) { return MemberOf(self.Data().role); },
         nb::sig("def role(self) -> Role"), "What the name does there.");
-    occurrence.def_prop_ro("range", &COccurrenceItem::Range, "Where it stands.");
-    occurrence.def_prop_ro("line", &COccurrenceItem::Line, "The line that it stands on.");
-    occurrence.def_prop_ro("scope", &COccurrenceItem::Scope, "The scope that it stands in.");
+    occurrence.def_prop_ro("range", &COccurrenceItem::Range, "Where it is.");
+    occurrence.def_prop_ro("line", &COccurrenceItem::Line, "The line that it is on.");
+    occurrence.def_prop_ro("scope", &COccurrenceItem::Scope, "The scope that it is in.");
     occurrence.def_prop_ro(
         "resolution", [](const COccurrenceItem& self) { return MemberOf(self.Resolution()); },
         nb::sig("def resolution(self) -> Resolution | None"),
@@ -138,13 +138,13 @@ void BindOccurrence(nb::module_& module) {
         "It is the name of a `def` or a `class`.");
     occurrence.def_prop_ro(
         "in_f_string", [](const COccurrenceItem& self) { return self.Has(COccurrence::kInField); },
-        "It stands in a field of an f-string.");
+        "It is in a field of an f-string.");
     occurrence.def_prop_ro(
         "in_quotes", [](const COccurrenceItem& self) { return self.Has(COccurrence::kInQuotes); },
-        "It stands in a hint in quotes.");
+        "It is in a hint in quotes.");
     occurrence.def_prop_ro(
         "in_comment", [](const COccurrenceItem& self) { return self.Has(COccurrence::kInComment); },
-        "It stands in a hint in a comment.");
+        "It is in a hint in a comment.");
     occurrence.def("__repr__", [](const COccurrenceItem& self) {
         const CRange range = self.Range();
         const std::string_view role = WordOf(self.Data().role);
@@ -202,15 +202,15 @@ void BindNamesOfAnalysis(nb::class_<CAnalysis>& analysis) {
         nb::kw_only(), "parameters"_a = false,
         nb::sig("def unused(self, *, parameters: bool = False) -> tuple[Occurrence, ...]"),
         "The first binding of each import and of each local name of a function that nothing in the text "
-        "reads; with `parameters` theirs too. Names that begin with `_` aren't told, nor what `__all__` "
+        "reads; with `parameters` theirs too. Names that begin with `_` are left out, and what `__all__` "
         "lists. "
         "What other modules read, and what a name is looked up by as text, isn't known.");
     analysis.def(
         "undefined",
         [](const CAnalysis& self) { return TupleOf(self.file, QueriesOf(*self.file).Undefined()); },
         nb::sig("def undefined(self) -> tuple[Occurrence, ...]"),
-        "What is read although nothing in the text binds it and no builtin has the name; nothing is told "
-        "that `import *` or a line with a fault may bind. Whether a binding runs before isn't known.");
+        "What is read although nothing in the text binds it and no builtin has the name; what "
+        "`import *` or a line with a fault may bind is left out. Whether a binding runs before isn't known.");
 }
 
 }  // namespace codeloom

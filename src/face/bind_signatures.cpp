@@ -17,7 +17,7 @@ void BindHint(nb::module_& module) {
     hint.def_prop_ro(
         "text", [](const CHintItem& self) { return TextFromUtf8(TextOf(*self.file, self.Data().hint)); },
         nb::sig("def text(self) -> str"), "The hint as written, quotes included.");
-    hint.def_prop_ro("range", &CHintItem::Range, "Where it stands.");
+    hint.def_prop_ro("range", &CHintItem::Range, "Where it is.");
     hint.def_prop_ro(
         "kind", [](const CHintItem& self) { return MemberOf(self.Data().kind); },
         nb::sig("def kind(self) -> HintKind"), "What it is about.");
@@ -25,11 +25,10 @@ void BindHint(nb::module_& module) {
         "name", [](const CHintItem& self) { return TextFromUtf8(TextOf(*self.file, self.Data().target)); },
         nb::sig("def name(self) -> str"),
         "The name or chain that it is about; of what a function gives back, that of the function.");
-    hint.def_prop_ro("target", &CHintItem::Target, "Where that name stands.");
+    hint.def_prop_ro("target", &CHintItem::Target, "Where that name is.");
     hint.def_prop_ro(
-        "in_comment", [](const CHintItem& self) { return self.Data().in_comment; },
-        "It stands in a comment.");
-    hint.def_prop_ro("line", &CHintItem::Line, "The line that it stands on.");
+        "in_comment", [](const CHintItem& self) { return self.Data().in_comment; }, "It is in a comment.");
+    hint.def_prop_ro("line", &CHintItem::Line, "The line that it is on.");
     hint.def("__repr__", [](const CHintItem& self) {
         return nb::str("<Hint {}: {}: {}>")
             .format(self.Range().row, TextFromUtf8(TextOf(*self.file, self.Data().target)),
@@ -45,12 +44,12 @@ void BindParameter(nb::module_& module) {
     parameter.def_prop_ro(
         "name", [](const CParameterItem& self) { return TextFromUtf8(TextOf(*self.file, self.Data().name)); },
         nb::sig("def name(self) -> str"), "Its name.");
-    parameter.def_prop_ro("range", &CParameterItem::Range, "Where the name stands.");
+    parameter.def_prop_ro("range", &CParameterItem::Range, "Where the name is.");
     parameter.def_prop_ro(
         "kind", [](const CParameterItem& self) { return MemberOf(self.Data().kind); },
         nb::sig("def kind(self) -> ParameterKind"), "How arguments reach it, in the words of `inspect`.");
     parameter.def_prop_ro("default", &CParameterItem::Default, nb::sig("def default(self) -> Range | None"),
-                          "Where its default stands; None without one.");
+                          "Where its default is; None without one.");
     parameter.def_prop_ro("hint", &CParameterItem::Hint, nb::sig("def hint(self) -> Hint | None"),
                           "Its annotation, else its hint in a comment; None without any.");
     parameter.def("__repr__", [](const CParameterItem& self) {
@@ -63,13 +62,13 @@ void BindSignature(nb::module_& module) {
     signature.def_prop_ro(
         "name", [](const CSignatureItem& self) { return TextFromUtf8(TextOf(*self.file, self.Data().name)); },
         nb::sig("def name(self) -> str"), "The function's name.");
-    signature.def_prop_ro("range", &CSignatureItem::Range, "Where the name stands.");
+    signature.def_prop_ro("range", &CSignatureItem::Range, "Where the name is.");
     signature.def_prop_ro("line", &CSignatureItem::Line, "The line of the header.");
     signature.def_prop_ro(
         "is_async", [](const CSignatureItem& self) { return self.Data().is_async; }, "It is an `async def`.");
     signature.def_prop_ro(
         "is_method", [](const CSignatureItem& self) { return self.Data().is_method; },
-        "It stands right in the body of a class.");
+        "It is right in the body of a class.");
     signature.def_prop_ro("parameters", &CSignatureItem::Parameters,
                           nb::sig("def parameters(self) -> tuple[Parameter, ...]"),
                           "Its parameters; those within a tuple of Python 2 one by one.");

@@ -1,4 +1,4 @@
-// The entry of codeloom._analysis, on which the package's face stands.
+// The entry of codeloom._analysis, which the package's face is made of.
 #include <nanobind/nanobind.h>
 
 #include "face/bind_face.h"

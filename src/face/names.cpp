@@ -78,7 +78,7 @@ void BindNames(nb::module_& module) {
         "Each is the kind of its fault (0 for none), the token at fault, the limit that the walk hit (0 for "
         "none), and the records: name, info bytes, whether of an argument, and the bytes of the text at "
         "which "
-        "the name stands. `version` is 312 for Python 3.12.");
+        "the name is. `version` is 312 for Python 3.12.");
 }
 
 }  // namespace codeloom

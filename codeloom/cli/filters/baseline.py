@@ -25,7 +25,7 @@ class Baseline:
             items = _items_of(text)
             self._known = {item["fingerprint"] for item in items if item["type"] == "problem"}
         except (ValueError, KeyError, TypeError, RecursionError):
-            raise ValueError(f"{path} is no report of codeloom in the format json or jsonl") from None
+            raise ValueError(f"{path} isn't a report of codeloom in the format json or jsonl") from None
 
     def __call__(self, source: Source, findings: Sequence[Finding]) -> Sequence[Finding]:
         """The findings that are new."""

@@ -22,7 +22,7 @@ def selectors_of(text: str) -> list[str]:
     selectors = re.split(r"[,\s]+", text.strip().upper())
     for selector in selectors:
         if not _SELECTOR.fullmatch(selector):
-            raise ValueError(f"{selector!r} is no code: give one such as CL301, its beginning, or ALL")
+            raise ValueError(f"{selector!r} isn't a code: give one such as CL301, its beginning, or ALL")
         if selector != "ALL" and not any(code.startswith(selector) for code in known):
             raise ValueError(f"there is no code {selector}{nearest(selector, known)}")
     return selectors
