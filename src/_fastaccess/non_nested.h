@@ -14,7 +14,7 @@ namespace codeloom {
 
 // Sets up a search of search_ptr[start..end) for `to_find_bytes`, which the caller keeps alive. An empty one
 // is never found. 0, or -1 on failure: AssertionError when `start` or `end` lies outside the zero-terminated
-// text, TypeError when `to_find_bytes` is no byte string.
+// text, TypeError when `to_find_bytes` isn't a byte string.
 inline int InitNonNestedStruct(tNonNestedStruct& search, const char* search_ptr, nb::handle to_find_bytes,
                                Py_ssize_t start, Py_ssize_t end) {
     if (search_ptr != nullptr) {

@@ -18,8 +18,8 @@ inline double DoubleValueForULongLongBits(uint64_t l) {
     return std::bit_cast<double>(l);
 }
 
-// Of a host integer of any sign and size the low 64 bits count. On failure -1.0, for what is no integer with
-// a TypeError.
+// Of a host integer of any sign and size the low 64 bits count. On failure -1.0, with a TypeError for
+// what isn't an integer.
 inline double DoubleValueForPyIntBits(nb::handle l) {
     const uint64_t bits = PyLong_AsUnsignedLongLongMask(l.ptr());
     return PyErr_Occurred() != nullptr ? -1.0 : std::bit_cast<double>(bits);

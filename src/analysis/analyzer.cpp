@@ -25,7 +25,7 @@ void RaiseCouldNotAnalyze(CLogicalLine& logical, const CHostError& inner) {
     kRaiseWithTraceback(nb::borrow(PyExc_ValueError)(text), exc_info[2]);
 }
 
-// What leaves an inspection whose walk failed: syntax errors and what is no Exception pass unchanged.
+// What leaves an inspection whose walk failed: syntax errors and what isn't an Exception pass unchanged.
 CHostError InspectionFailure(CLogicalLine& logical, CHostError error) {
     if (error.Is(PyExc_SyntaxError) || !error.Is(PyExc_Exception)) return error;
     try {

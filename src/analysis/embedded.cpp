@@ -21,7 +21,7 @@ nb::object EmbeddedError(const CLogicalLine& logical, const CLogicalLine& exp_lo
     const nb::str message(MessageFor(exp_logical));
     const nb::object inner = CreateSyntaxError(message, exp_logical.Self(), context, nb::none());
     const nb::int_ rows_down(int64_t{exp_logical.fFirstLine} - logical.fFirstLine);
-    // The message stands in the place of the file name too.
+    // The message replaces the file name too.
     return nb::borrow(PyExc_SyntaxError)(message, nb::make_tuple(message, rows_down + inner.attr("lineno"),
                                                                  inner.attr("offset"), inner.attr("text")));
 }

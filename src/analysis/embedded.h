@@ -1,4 +1,4 @@
-// Expressions embedded in a line: their errors and records, moved to the line that they stand in.
+// Expressions embedded in a line: their errors and records, moved to the line that they are in.
 #pragma once
 
 #include <nanobind/nanobind.h>

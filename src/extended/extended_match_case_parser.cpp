@@ -16,7 +16,7 @@ namespace {
 
 constexpr Py_ssize_t kPatternIndex = 1;  // of the first token after `case`
 
-// What stands in the invented brackets needs none: no comprehension, no `yield`, no lone star.
+// What is in the invented brackets needs none: no comprehension, no `yield`, no lone star.
 bool IsSubject(const CNode& node) {
     if (node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield")) return false;
     CTestListStarExpr* const list = node.As<CTestListStarExpr>();
@@ -112,7 +112,7 @@ void CExtendedMatchCaseParser::_RefuseKeyword(Py_ssize_t tok_i) {
     if (_fPGenParser->IsKeyword(tok) && !TextIsOneOf(tok, "None", "True", "False")) _FailAt(tok_i);
 }
 
-// Where a token stands among those of the line, comments and backslashes included.
+// Where a token is among those of the line, comments and backslashes included.
 Py_ssize_t CExtendedMatchCaseParser::_IndexInLine(Py_ssize_t tok_i) const {
     const nb::object position = _Position(tok_i);
     for (Py_ssize_t i = tok_i; i < TupleSize(_fLinePositions); ++i)

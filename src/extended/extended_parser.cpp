@@ -159,7 +159,7 @@ CNodeRef CExtendedParser::_ParseSpecialCaseParenthesizedWith(nb::tuple toks, boo
 }
 
 //   with a, b,:
-//             ^    stands within brackets only, which are off when the grammar reads the items
+//             ^    is within brackets only, which are off when the grammar reads the items
 void CExtendedParser::_RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i) {
     bool is_after_comma = false;
     ForEachOutsideBrackets(toks, with_i + 1, TupleSize(toks), [&](Py_ssize_t i, std::string_view text) {
@@ -278,7 +278,7 @@ void CExtendedParser::_RequireSingle(const CNode& node) {
         _RaiseParseError(node.fContext);
 }
 
-// A name that is no keyword.
+// A name that isn't a keyword.
 bool CExtendedParser::_IsPlainName(const nb::tuple& toks, Py_ssize_t i) const {
     return i < TupleSize(toks) && IsName(toks, i) && !IsKeyword(TupleItem(toks, i));
 }

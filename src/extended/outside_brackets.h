@@ -1,4 +1,4 @@
-// Going through the tokens of a line that stand outside brackets.
+// Going through the tokens of a line that are outside brackets.
 #pragma once
 
 #include "host/collections.h"
@@ -8,7 +8,7 @@
 namespace codeloom {
 
 // Calls visit(index, text) for each token in [start, end) outside brackets, closing brackets not among them,
-// until it returns false. Comments, backslashes and removed tokens are passed over, and what stands between
+// until it returns false. Comments, backslashes and removed tokens are passed over, and what is between
 // a `lambda` and its `:`.
 template <class Visit>
 void ForEachOutsideBrackets(const nb::tuple& toks, Py_ssize_t start, Py_ssize_t end, Visit visit) {

@@ -15,7 +15,7 @@ namespace codeloom {
 namespace {
 
 // Calls visit(start, end) for each statement on a row: for those of the body after a header, or for all.
-// The first token of the row stands at `first_i`.
+// The first token of the row is at `first_i`.
 template <class Visit>
 void ForEachStatement(const nb::tuple& toks, Py_ssize_t first_i, Visit visit) {
     const Py_ssize_t count = TupleSize(toks);

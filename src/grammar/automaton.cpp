@@ -63,7 +63,7 @@ CDfa Determinise(const CNfa& nfa) {
     return dfa;
 }
 
-// The states with targets replaced by the groups they are in: equal ones can't be told apart by one symbol.
+// The states with targets replaced by the groups they are in: no symbol distinguishes equal ones.
 CDfaState SeenByGroups(const CDfaState& state, const std::vector<int>& group_of) {
     CDfaState seen = state;
     for (CArc& arc : seen.arcs) arc.target = group_of[arc.target];

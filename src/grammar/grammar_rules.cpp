@@ -83,7 +83,7 @@ int CGrammarRules::_ResolveQuoted(const CSymbolText& symbol, const CTokenTypes& 
     }
     const auto type = token_types.type_of_operator.find(symbol.text);
     if (type == token_types.type_of_operator.end())
-        _Raise(symbol.row, symbol.Shown() + " is no operator that the tokens know");
+        _Raise(symbol.row, symbol.Shown() + " isn't an operator that the tokens know");
     const bool is_shared = token_types.IsShared(type->second);
     return _SymbolOfTerminal({type->second, is_shared ? symbol.text : "", symbol.Shown()}, symbol.row);
 }

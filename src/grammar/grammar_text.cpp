@@ -37,7 +37,7 @@ struct CPiece {
     }
 };
 
-// Cuts the text into pieces. Ends of rows within brackets are no pieces.
+// Cuts the text into pieces. Ends of rows within brackets aren't pieces.
 class CPieceReader {
   public:
     CPieceReader(const std::string& file_name, std::string_view text) : _fFileName(file_name), _fText(text) {

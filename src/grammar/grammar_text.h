@@ -24,7 +24,7 @@ struct CGrammarError : std::invalid_argument {
 struct CSymbolText {
     std::string text;  // without quotes
     bool is_quoted;
-    int row;  // where it stands first, from 1
+    int row;  // where it is first, from 1
 
     std::string Shown() const { return is_quoted ? "'" + text + "'" : text; }
 };

@@ -143,7 +143,7 @@ void CParseTables::_SetMove(int row, int label, const CMove& move) {
     _fCells[row + label] = static_cast<uint16_t>(id);
 }
 
-// The move where `rule` begins with `label`, and the rule that it stands in goes on in `next_row`.
+// The move where `rule` begins with `label`, and the rule that it is in goes on in `next_row`.
 CMove CParseTables::_MoveInto(const CGrammarRules& rules, int rule, int next_row, int label) {
     if (!_fPromotesSingleChild)
         return {.kind = EMove::kOpen,

@@ -42,8 +42,8 @@ bool IsComment(nb::handle tok) {
     return IsText(tok) && CUtf8(tok)->starts_with('#');
 }
 
-// The row on which a leaf starts: that of its token, or its own position. An invented token stands where the
-// last real one does.
+// The row on which a leaf starts: that of its token, or its own position. An invented token is where the
+// last real one is.
 Py_ssize_t StartRow(CLogicalLine& logical, const CNode& leaf) {
     if (nb::isinstance<nb::tuple>(leaf.fContext))
         return ResultFromHost<Py_ssize_t>(nb::borrow(TupleItem(leaf.fContext, 0)));
@@ -172,7 +172,7 @@ void CTypeHintWalker::_RaiseHintSyntaxError(Py_ssize_t tok_i, Py_ssize_t utf8_of
     RaiseHostError(error);
 }
 
-// The names that a hint uses are read by the line that it stands on.
+// The names that a hint uses are read by the line that it is on.
 void CTypeHintWalker::_WalkNamesOf(const CNodeRef& hint_node) {
     if (_fGeneralNodeWalker) _fGeneralNodeWalker->Walk(hint_node, *_fLogical);
 }

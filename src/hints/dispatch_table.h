@@ -17,7 +17,7 @@ namespace codeloom {
 
 class CDispatchWalker;
 
-// A visit of a native class: what stands in the dictionary, and the shorter road to it. Its result says by
+// A visit of a native class: what is in the dictionary, and the shorter road to it. Its result says by
 // its truth whether the children are wanted.
 struct CNativeVisit {
     using Function = nb::object (*)(CDispatchWalker& walker, CNode& node);

@@ -28,7 +28,7 @@ bool HostAssertionsOn();
 // Prints a report as the host's print() does, which is silent where there is no standard output.
 void PrintReport(nb::handle line);
 
-// Raises an exception that is made already; TypeError for what is no exception.
+// Raises an exception that is made already; TypeError for what isn't an exception.
 [[noreturn]] void RaiseHostError(nb::handle error);
 
 template <class MakeValue>

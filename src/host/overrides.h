@@ -11,7 +11,7 @@
 //                   "child_i"_a);
 //         END_OPERATIONS
 //       ...
-// An OPERATION declares a virtual function; a body may follow it in the place of the semicolon. A class
+// An OPERATION declares a virtual function; a body may follow it instead of the semicolon. A class
 // without bases says CNoOperations. A class without operations of its own lists nothing, and one that
 // overrides an operation natively declares it as any other function: both are bound as they should be.
 // THostSubclass<CStmt> is CStmt with an override for each operation, its own and inherited.

@@ -1,4 +1,4 @@
-// Booleans as the host gives them: whatever stands where one is asked for counts by its truth value.
+// Booleans as the host gives them: whatever is given where one is asked for counts by its truth value.
 #pragma once
 
 #include <nanobind/nanobind.h>

@@ -1,9 +1,10 @@
-// codeloom._neighbours: what stands beside the engine. The importable modules are thin Python files over it.
+// codeloom._neighbours: what is beside the engine. The importable modules are thin Python files over it.
 #include "host/module_entry.h"
 #include "neighbours/bind.h"
 
 CODELOOM_MODULE(_neighbours, module) {
-    // An analyzer that a host still holds when the interpreter ends is no leak; `make leaks` looks for those.
+    // An analyzer that a host still holds at the interpreter's end isn't a leak; `make leaks` looks for
+    // those.
     nanobind::set_leak_warnings(false);
     codeloom::BindTokenTypes(module);
     codeloom::BindLogicals(module);

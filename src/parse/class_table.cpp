@@ -10,7 +10,7 @@ namespace {
 
 nb::handle gOriginalClsForState;  // lives as long as the process
 
-// Node classes are what stands in the module's namespace: a class joins the table by being defined there.
+// Node classes are what is in the module's namespace: a class joins the table by being defined there.
 nb::list NodeClasses() {
     const nb::handle node_class = nb::type<CNode>();
     nb::list classes;

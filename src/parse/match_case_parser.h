@@ -19,7 +19,7 @@ namespace codeloom {
 
 class CPGenParserImpl;
 
-// Subject, guard and body go to the grammar, patterns are parsed here by descent. It is no full
+// Subject, guard and body go to the grammar, patterns are parsed here by descent. It isn't a full
 // checker of patterns: it decides by the first token and by separators outside brackets.
 //
 // Comments and continuation backslashes are taken out first, so that the tokens have other indexes here than

@@ -51,11 +51,10 @@ class CPGenParserImpl : public CPGenAnalyzer {
     OPERATION(CNodeRef, _ParseSpecialCases, (nb::tuple toks, bool in_async_def, CPositions positions),
               "The node of a statement that is parsed by hand; None for the ordinary road.", "toks"_a,
               "in_async_def"_a, "positions"_a.none());
-    OPERATION(
-        CNodeRef, _ParseSpecialCaseParenthesizedWith,
-        (nb::tuple toks, bool in_async_def, CPositions positions, Py_ssize_t i),
-        "A `with` whose items stand in parentheses, with `i` the index of `with`; None when they don't.",
-        "toks"_a, "in_async_def"_a, "positions"_a.none(), "i"_a);
+    OPERATION(CNodeRef, _ParseSpecialCaseParenthesizedWith,
+              (nb::tuple toks, bool in_async_def, CPositions positions, Py_ssize_t i),
+              "A `with` whose items are in parentheses, with `i` the index of `with`; None when they aren't.",
+              "toks"_a, "in_async_def"_a, "positions"_a.none(), "i"_a);
     OPERATION(CNodeRef, _ParseSpecialCaseExceptStar,
               (nb::tuple toks, bool in_async_def, CPositions positions, Py_ssize_t i),
               "An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.",

@@ -94,7 +94,7 @@ nb::list CPGenParserImpl::_NodesForTypeParameters(nb::tuple toks, bool in_async_
     for (Py_ssize_t i = start + 1; i < end;) {
         Py_ssize_t comma = CheckedIndex(_NonNestedFindTokenIndex(nb::str(","), toks, i, end), i, end);
         if (comma == -1) comma = end;
-        const Py_ssize_t name_i = _FindNextNonSkipIndex(toks, i - 1);  // a comment may stand before it
+        const Py_ssize_t name_i = _FindNextNonSkipIndex(toks, i - 1);  // a comment may be before it
         CNodeRef node =
             _CreateSingleTypeParameterNode(toks, in_async_def, positions, name_i, comma, raise_errors);
         if (node) nodes.append(node.Release());

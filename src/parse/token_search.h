@@ -14,7 +14,7 @@ namespace codeloom {
 // 1 for an opening bracket, -1 for a closing one, 0 for any other token.
 int DepthStep(std::string_view token);
 
-// True for a comment, a backslash and an empty text, which are no part of a statement.
+// True for a comment, a backslash and an empty text, which aren't part of a statement.
 constexpr bool IsPassedOver(std::string_view token) {
     return token.empty() || token.front() == '#' || token.front() == '\\';
 }

@@ -76,7 +76,7 @@ void BindPositionPrimitives(nb::module_& module) {
         "AdjustUtf8Pos", &HostAdjustUtf8Pos, "utf8_ptr"_a, "pos"_a, "diff"_a, "end_pos"_a,
         "The byte offset of the character that lies `diff` characters after (before, if negative) the one\n"
         "that byte `pos` is part of; -1 or `end_pos` when it isn't in the buffer. A `pos` outside the\n"
-        "buffer is no part of a character, and each byte between it and the buffer counts as one.\n"
+        "buffer isn't part of a character, and each byte between it and the buffer counts as one.\n"
         "ValueError when `end_pos` lies outside the buffer.");
     module.def(
         "Ucs4CharAtUtf8Pos", &HostUcs4CharAtUtf8Pos, "utf8_ptr"_a, "pos"_a, "end_pos"_a,
@@ -97,8 +97,9 @@ void BindPositionPrimitives(nb::module_& module) {
         "IsIdentifierCharAtUtf8Pos", &HostIsIdentifierCharAtUtf8Pos, "utf8_ptr"_a, "pos"_a, "end_pos"_a,
         "initial"_a,
         "True when the character at byte `pos` could be part of a name, its first character if `initial`;\n"
-        "False when `pos` isn't in the buffer. Beyond ASCII, a character that is no name on its own and no\n"
-        "digit is refused. ValueError when `end_pos` lies outside the buffer.");
+        "False when `pos` isn't in the buffer. Beyond ASCII, a character that is neither a name on its own "
+        "nor\n"
+        "a digit is refused. ValueError when `end_pos` lies outside the buffer.");
     module.def(
         "PtrFindByte", &HostPtrFindByte, "ptr"_a, "length"_a, "c"_a, "start"_a,
         "The offset of the first byte `c` in ptr[start:length]; -1 when there is none. ValueError unless\n"
@@ -106,7 +107,7 @@ void BindPositionPrimitives(nb::module_& module) {
     module.def("BytesFindByte", &HostBytesFindByte, "b"_a.none(), "c"_a, "start"_a = 0,
                nb::sig("def BytesFindByte(b: bytes, c: int | bytes | str, start: int = 0) -> int"),
                "The offset of the first byte `c` in b[start:]; -1 when there is none. ValueError unless\n"
-               "0 <= start < len(b), TypeError when `b` is no byte string.");
+               "0 <= start < len(b), TypeError when `b` isn't a byte string.");
 }
 
 }  // namespace

@@ -49,7 +49,7 @@ inline const char* GetUtf8Ptr(nb::handle u) {
     return nullptr;
 }
 
-// PtrFindByte in a byte string. On failure -2, for what is no byte string with a TypeError.
+// PtrFindByte in a byte string. On failure -2, for what isn't a byte string with a TypeError.
 inline Py_ssize_t BytesFindByte(nb::handle b, char c, Py_ssize_t start = 0) {
     if (PyBytes_Check(b.ptr()))
         return PtrFindByte(PyBytes_AS_STRING(b.ptr()), PyBytes_GET_SIZE(b.ptr()), c, start);

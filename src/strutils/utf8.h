@@ -38,7 +38,7 @@ inline Py_ssize_t MoveToBuffer(Py_ssize_t pos, Py_ssize_t& diff, Py_ssize_t end_
 }
 
 // The offset of the character that lies `diff` characters after (before, if negative) the one that `pos` is
-// part of; -1 or `end_pos` when the buffer ends before it. A `pos` outside the buffer is no part of a
+// part of; -1 or `end_pos` when the buffer ends before it. A `pos` outside the buffer isn't part of a
 // character, and each byte between it and the buffer counts as one.
 inline Py_ssize_t AdjustUtf8Pos(const char* utf8_ptr, Py_ssize_t pos, Py_ssize_t diff, Py_ssize_t end_pos) {
     while (!BeginsCharAt(utf8_ptr, pos, end_pos)) --pos;
@@ -101,7 +101,7 @@ inline int IsNameChar(Py_UCS4 ch, bool initial) {
 }
 
 // True when the character could be part of a name, its first one if `initial`. Beyond ASCII, one that can
-// only continue a name and is no digit, as a combining mark, is refused.
+// only continue a name and isn't a digit, as a combining mark, is refused.
 inline int IsIdentifierCharAtUtf8Pos(const char* utf8_ptr, Py_ssize_t pos, Py_ssize_t end_pos, bool initial) {
     return TestCharAtUtf8Pos(
         utf8_ptr, pos, end_pos, [&](char c) { return IsNameByte(c) && !(initial && IsDigit(c)); },

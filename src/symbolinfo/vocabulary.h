@@ -11,7 +11,7 @@
 
 namespace codeloom {
 
-// Scopes are dotted names; the module's own is empty. Behind a name the separator and a number say which
+// Scopes are dotted names; the module's own is empty. After a name the separator and a number say which
 // definition of that name in its scope is meant, counted from zero.
 inline constexpr std::string_view kScopeIndexSep = "#";
 inline constexpr std::string_view kModuleScopeName;

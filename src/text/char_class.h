@@ -87,7 +87,7 @@ inline constexpr char ByteAt(std::string_view text, size_t pos) {
     return pos < text.size() ? text[pos] : '\0';
 }
 
-// The first position from `pos` on that is no blank.
+// The first position from `pos` on that isn't a blank.
 inline constexpr size_t SkipBlanks(std::string_view text, size_t pos) {
     while (pos < text.size() && IsBlank(text[pos])) ++pos;
     return pos;

@@ -1,4 +1,4 @@
-// Where the tokenizer stands in the text.
+// Where the tokenizer is in the text.
 #pragma once
 
 #include <cstddef>
@@ -19,8 +19,8 @@ struct CPlace {
     int32_t Column() const { return static_cast<int32_t>(pos - row_start); }
 };
 
-// Moves from the beginning of a row to its first character that is no blank, and measures the indentation. A
-// form feed begins it anew.
+// Moves from the beginning of a row to its first character that isn't a blank, and measures the
+// indentation. A form feed begins it anew.
 inline void SkipIndent(std::string_view text, CPlace& place) {
     constexpr int32_t kTabSize = 8;
     const size_t start = place.pos;
@@ -41,7 +41,7 @@ inline void SkipIndent(std::string_view text, CPlace& place) {
     place.indent = indent;
 }
 
-// Moves over the row end at the place to the beginning of the next row; false where no row end stands.
+// Moves over the row end at the place to the beginning of the next row; false where there is no row end.
 inline bool SkipRowEnd(std::string_view text, CPlace& place) {
     const size_t length = RowEndLength(text, place.pos);
     if (length == 0) return false;

@@ -79,7 +79,7 @@ inline size_t SkipNameBytes(std::string_view text, size_t pos) {
     return FindByte<kContinuesName, false>(text, pos);
 }
 
-// The first position from `pos` on that is no space.
+// The first position from `pos` on that isn't a space.
 inline size_t SkipSpaces(std::string_view text, size_t pos) {
     constexpr uint64_t kSpaces = ' ' * scan::kEachByte;
     for (; pos + scan::kStep <= text.size(); pos += scan::kStep) {

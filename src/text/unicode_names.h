@@ -66,7 +66,7 @@ inline size_t UnicodeNameEnd(std::string_view text, size_t pos, bool at_start) {
     return pos;
 }
 
-// The end of the name at `pos`, which stands on a name byte; `pos` itself when no name stands there.
+// The end of the name at `pos`, which is on a name byte; `pos` itself when there is no name.
 inline size_t NameEnd(std::string_view text, size_t pos) {
     const size_t end = SkipNameBytes(text, pos);
     if (end == text.size() || IsAscii(text[end])) return end;

@@ -14,7 +14,7 @@ constexpr bool IsSpaceCode(uint32_t code) {
            code == 0x2028 || code == 0x2029 || code == 0x202F || code == 0x205F || code == 0x3000;
 }
 
-// The length of the white-space character at `pos`; zero where none stands.
+// The length of the white-space character at `pos`; zero where there is none.
 inline size_t SpaceLength(std::string_view text, size_t pos) {
     if (pos >= text.size()) return 0;
     if (IsAscii(text[pos])) return IsSpaceCode(static_cast<unsigned char>(text[pos])) ? 1 : 0;
@@ -47,7 +47,7 @@ inline std::string_view WithoutSpaceAround(std::string_view text) {
     return WithoutSpaceAtEnd(text.substr(SkipSpace(text, 0)));
 }
 
-// The length of the letter, digit or underscore at `pos`; zero where none stands.
+// The length of the letter, digit or underscore at `pos`; zero where there is none.
 inline size_t WordCharLength(std::string_view text, size_t pos) {
     if (pos >= text.size()) return 0;
     if (IsAscii(text[pos])) return IsNameByte(text[pos]) ? 1 : 0;
@@ -65,7 +65,7 @@ inline bool EndsInWord(std::string_view text) {
     return start < text.size() && WordCharLength(text, start) == text.size() - start;
 }
 
-// The end of the word that `pos` stands in; `pos` itself outside words.
+// The end of the word that `pos` is in; `pos` itself outside words.
 inline size_t WordEnd(std::string_view text, size_t pos) {
     while (const size_t length = WordCharLength(text, pos)) pos += length;
     return pos;

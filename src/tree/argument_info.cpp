@@ -77,7 +77,7 @@ class CParameterReader {
         }
     }
 
-    // A default, an annotation or the name, by what stands before it.
+    // A default, an annotation or the name, by what is before it.
     void _ReadPart(const CNodeRef& child) {
         if (_fAfterEqual) {
             _fCurrent.value = child;
@@ -229,7 +229,7 @@ void BindArgumentInfo(nb::module_& module) {
         "GetDefiningArgInfoList", &GetDefiningArgInfoList, "node"_a.none(),
         "A new list of CArgInfo, one for each parameter of a definition: `node` is its parameter list, with "
         "or without brackets, or a lone parameter. A parameter that is a tuple of names (Python 2) is a list "
-        "of the same kind. AssertionError for a child that is no parameter.");
+        "of the same kind. AssertionError for a child that isn't a parameter.");
     module.def(
         "GetUsedArgInfoList", &GetUsedArgInfoList, "node"_a.none(),
         "A new list of CArgInfo, one for each argument of a call: `node` is its argument list, or a lone "

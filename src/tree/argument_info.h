@@ -1,5 +1,5 @@
 // Arguments as plain records, whatever shape the grammar gave them.
-//   in     a parameter list or an argument list, or the lone parameter or argument that stands in its place
+//   in     a parameter list or an argument list, or the lone parameter or argument that is in its place
 //   out    one CArgument for each; the host sees a list of CArgInfo
 // The records are native until the host looks: a call costs no host object.
 #pragma once
@@ -16,7 +16,7 @@ using CArgumentList = std::vector<CArgument>;
 // What is known of one argument of a definition or of a call. The nodes belong to the tree, so a record is
 // good only as long as that.
 struct CArgument {
-    CNodeRef name;       // of a parameter; in a call what stands before `=`
+    CNodeRef name;       // of a parameter; in a call what is before `=`
     CNodeRef value;      // the default of a parameter; what a call passes
     CTextOrNone prefix;  // "*" or "**"
     CNodeRef type_expr;  // the annotation
@@ -25,7 +25,7 @@ struct CArgument {
     bool is_tuple = false;
     CArgumentList tuple;
 
-    bool is_foreign = false;  // stands for an item of a host's list that is no argument
+    bool is_foreign = false;  // stands for an item of a host's list that isn't an argument
 };
 
 // An argument as the host sees it. A tuple of parameters is a nested list there.
@@ -43,7 +43,7 @@ class CArgInfo : public CHosted, public CArgument {
 };
 
 // The parameters of a definition. `node` is a CParametersNode, a CDefiningArglistNode, or a lone parameter.
-// AssertionError for a child that is no parameter.
+// AssertionError for a child that isn't a parameter.
 CArgumentList GetDefiningArgInfoList(CNodeRef node);
 
 // The arguments of a call. `node` is a CUsedArglistNode, a CTestListStarExpr, or a lone argument. The prefix

@@ -1,4 +1,4 @@
-// Arguments of calls and of definitions. A lone argument stands without its list, as a node of this file
+// Arguments of calls and of definitions. A lone argument is without its list, as a node of this file
 // where it has parts, or else as the name or expression itself: argument_info.h tells of all shapes alike.
 #pragma once
 
@@ -16,10 +16,10 @@ class CSingleUsedArgumentNode : public CNode {
   public:
     OPERATIONS_OF(CSingleUsedArgumentNode, CNode)
     OPERATION(CTextOrNone, GetPrefix, (), "\"*\" or \"**\"; None without such.");
-    OPERATION(CNodeRef, GetName, (), "What stands before `=`; None when there is no `=`.");
+    OPERATION(CNodeRef, GetName, (), "What is before `=`; None when there is no `=`.");
     OPERATION(CNodeRef, GetValue, (), "The value after `=`; the node itself when there is no `=`.");
     OPERATION(bool, IsUnparenthesizedGenExpr, (), "True for a comprehension without brackets of its own.");
-    OPERATION(CNodeRef, GetNameAssigned, (), "What stands before `:=`; None when there is no `:=`.");
+    OPERATION(CNodeRef, GetNameAssigned, (), "What is before `:=`; None when there is no `:=`.");
     OPERATION(CNodeRef, GetNamedRightHandExpression, (), "The value after `:=`; None when there is no `:=`.");
     END_OPERATIONS
 
@@ -47,7 +47,7 @@ class CFunctionParameterDef : public CNode {
 
 // `a, b=1, *c` in a definition or a lambda
 //   child    ['*' or '**']  parameter  ['='  default]  ','  parameter ...
-// The parameter is a name or a CFunctionParameterDef; a bare `*` and a `/` stand without one.
+// The parameter is a name or a CFunctionParameterDef; a bare `*` and a `/` are without one.
 class CDefiningArglistNode : public CNode {};
 
 // `a, b=1, *c` in a call

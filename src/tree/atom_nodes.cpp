@@ -96,7 +96,7 @@ nb::object CStringLiteral::GetStringValue() {
 
 CExpressionRef CAtom::GetSubExpr(int i) {
     if (GetSubExprCount() == 0) return CExpressionRef();
-    const CRecursionScope recursion;  // brackets may stand in brackets of any depth
+    const CRecursionScope recursion;  // brackets may be in brackets of any depth
     if (const CExpressionRef contents(TryChild<CExpression>(kContentsIndex)); contents)
         return i == 0 && contents->GetSubExprCount() == 0 ? contents : contents->GetSubExpr(i);
     if (const CRef<CListmakerNode> items(TryChild<CListmakerNode>(kContentsIndex)); items)

@@ -1,4 +1,4 @@
-// Atoms and literals: the leaves that carry text, and what stands in brackets.
+// Atoms and literals: the leaves that carry text, and what is in brackets.
 #pragma once
 
 #include "tree/expression_nodes.h"
@@ -30,7 +30,7 @@ class CStringLiteral : public CExpression {
     OPERATION(bool, IsUnicode, (), "True with the prefix `u`, a raw marker before it allowed.");
     OPERATION(bool, IsBytes, (), "True with the prefix `b`, a raw marker before it allowed.");
     OPERATION(CTextOrNone, GetStringContents, (),
-              "The source between the quotes, escapes as they stand; up to the end of an unterminated "
+              "The source between the quotes, escapes as written; up to the end of an unterminated "
               "literal.");
     OPERATION(nb::object, GetStringValue, (), "The value of the literal; None for an f-string.");
     END_OPERATIONS

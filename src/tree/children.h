@@ -34,14 +34,14 @@ class TChildren {
     // A negative index counts from the end. For one outside of the children it is IndexError, and TypeError
     // when there are none.
 
-    // The child at `i`, borrowed; TypeError when it is no node.
+    // The child at `i`, borrowed; TypeError when it isn't a node.
     Node& At(Py_ssize_t i) const {
         if (_HasList()) [[unlikely]]
             return *Instance<Node>(ListItem(_fList, i));
         return *_fNodes[_IndexOf(i)];
     }
 
-    // The child at `i`, borrowed; null when it is no node.
+    // The child at `i`, borrowed; null when it isn't a node.
     Node* TryAt(Py_ssize_t i) const {
         if (_HasList()) [[unlikely]]
             return TryInstance<Node>(ListItem(_fList, i));

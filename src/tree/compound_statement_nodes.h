@@ -58,7 +58,7 @@ class CWithStmt : public CStmt {
   public:
     OPERATIONS_OF(CWithStmt, CStmt)
     OPERATION(CWithItemList, GetWithItems, (),
-              "A new list of the items with `as`; those without are no CWithItem.");
+              "A new list of the items with `as`; those without one aren't CWithItems.");
     END_OPERATIONS
 };
 

@@ -21,7 +21,7 @@ class CExpression : public CNode {
               "i"_a);
     OPERATION(int, GetSubExprCount, (),
               "The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a "
-              "comprehension that stands without its brackets.");
+              "comprehension that is without its brackets.");
     END_OPERATIONS
 };
 
@@ -104,7 +104,7 @@ class CTestListStarExpr : public CExpression {
     int GetSubExprCount() override;
     OPERATIONS_OF(CTestListStarExpr, CExpression)
     OPERATION(bool, IsTuple, (), "True for a comma list; False for a comprehension.");
-    OPERATION(bool, IsGenExpr, (), "True for a comprehension, which stands here without its brackets.");
+    OPERATION(bool, IsGenExpr, (), "True for a comprehension, which is here without its brackets.");
     END_OPERATIONS
 };
 
@@ -136,7 +136,7 @@ class CPower : public CExpression {
     END_OPERATIONS
 };
 
-// What a chain is made of: a CAtomExpr or a CPower, whose exponent is no part of it.
+// What a chain is made of: a CAtomExpr or a CPower, whose exponent isn't part of it.
 struct CChainParts {
     CNodeRef atom;
     CNodeRange trailers;

@@ -44,9 +44,8 @@ class CImportNamesStmt : public CNode {
 class CFromImportStmt : public CNode {
   public:
     OPERATIONS_OF(CFromImportStmt, CNode)
-    OPERATION(
-        CTextOrNone, GetFromString, (),
-        "The module after `from`, with its dots; None when nothing stands between `from` and `import`.");
+    OPERATION(CTextOrNone, GetFromString, (),
+              "The module after `from`, with its dots; None when nothing is between `from` and `import`.");
     OPERATION(bool, GetImportStar, (), "True for `from a import *`.");
     OPERATION(CAsNameList, GetAsNameList, (),
               "A new list of CAsName, one for each imported name; a star is such a name.");

@@ -43,7 +43,7 @@ class CNodeFactory : public CHosted {
     END_OPERATIONS
 
     // ConvertSingleNode for native parsers, whose factory has no overrides: for a token, and for a rule whose
-    // children, all of them nodes, stand on a stack from `first` to its top. They leave it.
+    // children, all of them nodes, are on a stack from `first` to its top. They leave it.
     CNodeRef ConvertToken(int type, nb::handle text, nb::handle context) {
         return _NewLeaf(_RecordFor(type, text), text, context);
     }

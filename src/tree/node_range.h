@@ -1,4 +1,4 @@
-// Nodes that stand side by side, without a list of their own: a run of a node's children, or of a list that
+// Nodes that are side by side, without a list of their own: a run of a node's children, or of a list that
 // the host gave. The host sees a new list.
 #pragma once
 

@@ -220,8 +220,7 @@ void BindNodeToText(nb::module_& module) {
         converter(module, "CNodeToTextConverterImpl", "Turns nodes into short texts, as names are recorded.");
     converter
         .def(TInit<bool, bool, bool>(), "include_bracket_text"_a = false, "include_string_contents"_a = false,
-             "include_arg_text"_a = false,
-             "Whether what stands in brackets, in strings and in calls is shown.")
+             "include_arg_text"_a = false, "Whether what is in brackets, in strings and in calls is shown.")
         .def_ro("_fIncludeArgText", &CNodeToTextConverterImpl::_fIncludeArgText,
                 "True when the arguments of calls are shown.");
     BindOperations(converter);

@@ -37,7 +37,7 @@ class CNodeToTextConverter : public CHosted {
     END_OPERATIONS
 };
 
-// Appends what an operation of a host gave; false for none, TypeError for what is no text.
+// Appends what an operation of a host gave; false for none, TypeError for what isn't text.
 bool AppendHostText(std::string& text, const nb::object& host_text);
 
 class CNodeToTextConverterImpl : public CNodeToTextConverter {
@@ -91,8 +91,8 @@ class CNodeToTextConverterImpl : public CNodeToTextConverter {
     void AppendTextForTrailers(std::string& text, const CNodeRange& trailers,
                                const CNodeTextOptions& options = {});
 
-    bool _fIncludeBracketText = false;     // what stands in `[...]`, `{...}` and `(...)`
-    bool _fIncludeStringContents = false;  // strings of harmless characters as they stand
+    bool _fIncludeBracketText = false;     // what is in `[...]`, `{...}` and `(...)`
+    bool _fIncludeStringContents = false;  // strings of harmless characters as written
     bool _fIncludeArgText = false;         // the arguments of a call
 
   private:

@@ -83,7 +83,7 @@ class CRecycling {
         CheckFreeList(*node.fClsInfo);
     }
 
-    // The first child comes next. A child of the host's that is no node leaves the node as it is.
+    // The first child comes next. A child of the host's that isn't a node leaves the node as it is.
     nb::object _TakeChildren(CNode& node, Py_ssize_t depth) {
         const auto first = static_cast<Py_ssize_t>(_fWaiting.size());
         if (const nb::object list = node.fChildren.ListOfHost(); list.is_valid()) [[unlikely]]

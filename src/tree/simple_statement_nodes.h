@@ -24,7 +24,7 @@ class CAnnotatedAssignNode : public CNode {
     static constexpr Py_ssize_t kHintIndex = 1, kValueIndex = 3;
 };
 
-// `a = b = c`, `a += b`, `a: b = c`; an expression alone is no statement node
+// `a = b = c`, `a += b`, `a: b = c`; an expression alone isn't a statement node
 //   child    target  '='  target or value  '='  target or value ...
 //   child    target  operator  value
 //   child    target  annotated assignment

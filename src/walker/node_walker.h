@@ -7,7 +7,7 @@
 //
 // loads.cpp          names, chains, calls, comprehensions, decorators
 // definitions.cpp    `def`, `lambda`, `class`, imports, `global`, type parameters
-// targets.cpp        assignments: the names on the left with what stands on the right
+// targets.cpp        assignments: the names on the left with what is on the right
 // statements.cpp     `for`, `with`, `except`, `return`, `yield`, `:=`, `match`, `case`
 // type_equivs.cpp    what a value is recorded as
 #pragma once
@@ -132,13 +132,13 @@ class CNodeWalker : public CHosted {
     OPERATION(void, _AddNodeInfoStr, (CNode& name_node, CTextOrUtf8OrNone istr),
               "Record `istr` for the name that a node shows.", "name_node"_a, "istr"_a.none());
     OPERATION(CBytesOrNone, _TypeEquivForNode, (CNode& node, CBytesOrNone extra_trailer = CBytesOrNone()),
-              "What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, "
+              "What a value stands for, as a record; None when that isn't known. `extra_trailer`, bytes, "
               "follows it where a part of the value is meant.",
               "node"_a, "extra_trailer"_a.none()= nb::none());
     OPERATION(
         CBytesOrNone, _TypeEquivForOperatorExpression, (COperatorExpression& op_expr),
         "An operator expression with each operand replaced by what it stands for; None when one of them "
-        "can't be told.",
+        "isn't known.",
         "op_expr"_a);
     OPERATION(void, _VisitNamedExpr, (CNode& node),
               "`a := b`, as an expression or as an argument. AssertionError for others.", "node"_a);
@@ -204,7 +204,7 @@ class CNodeWalker : public CHosted {
     CRef<CLogicalLine> _fLogical;       // the line being walked; it guards against re-entry
     bool _fLoadNameContext = true;      // a name that is met is read; false below a target
     bool _fStoreWithinSubExpr = false;  // below a target: one of a comprehension or a lambda
-    // What parentheses that are no tuple's hold. So nested ones are told from a tuple's but once.
+    // What parentheses hold that aren't a tuple's: nested ones are looked at only once.
     const CNode* _fInnerGrouping = nullptr;
     CChainText* _fChainText = nullptr;  // of the chain that is being visited
     CNamesFound _fNames;

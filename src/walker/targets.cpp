@@ -18,7 +18,7 @@ CExpression* AsSequence(const CNode& node) {
     return node.As<CAtom>();
 }
 
-// Behind what the whole target receives, what position `i` of it does.
+// After what the whole target receives, what position `i` of it does.
 CBytesOrNone PositionTrailer(const CBytesOrNone& extra_trailer, int i) {
     return Utf8Concat4(extra_trailer, nb::bytes("["), BytesForInteger(i), nb::bytes("]"));
 }
@@ -63,7 +63,7 @@ void CNodeWalker::_VisitAnnotatedAssign(CExprStmt& node) {
     if (const CNodeRef value = annotation->GetPostEqualsTestExpr()) _ProcessTargets(*target, value);
 }
 
-// Once a trailer is in force, the right side isn't taken apart any more. Behind a starred target positions
+// Once a trailer is in force, the right side isn't taken apart any more. After a starred target positions
 // aren't corrected.
 void CNodeWalker::_ProcessTargets(CNode& lhs, CNodeRef rhs, CBytesOrNone extra_trailer) {
     CExpression* const targets = AsSequence(lhs);

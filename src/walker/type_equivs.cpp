@@ -1,5 +1,5 @@
 // What a value stands for: a typed literal, the text of a name or chain, the text of an expression. None
-// where that can't be told, which writes no record.
+// where that isn't known, which writes no record.
 #include "host/errors.h"
 #include "host/restore.h"
 #include "host/text.h"

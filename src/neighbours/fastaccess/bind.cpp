@@ -31,8 +31,8 @@ class CStringTokenizer : public CHosted {
 
 constexpr const char* kStringTokenizerDoc =
     "The tokens of a piece of Python text, one after the other.\n\n"
-    "CStringTokenizer(utf8) stands on the first token of a byte or text string; comments and blanks, row\n"
-    "ends among them, are no tokens.";
+    "CStringTokenizer(utf8) is on the first token of a byte or text string; comments and blanks, row\n"
+    "ends among them, aren't tokens.";
 
 constexpr const char* kNonNestedSearchDoc =
     "A search for bytes that lie outside brackets and string literals of Python source.\n\n"
@@ -80,7 +80,7 @@ void BindNonNestedSearch(nb::module_& module) {
                 "def InitWith(self, to_search: object, to_find_bytes: bytes, start: int, end: int) -> int"),
             "Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything\n"
             "else, None included, leaves the search idle. Returns 0. TypeError for a subclass of either\n"
-            "or when `to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside\n"
+            "or when `to_find_bytes` isn't a byte string, AssertionError when `start` or `end` lies outside\n"
             "the text.")
         .def(
             "FindNext",
@@ -89,7 +89,7 @@ void BindNonNestedSearch(nb::module_& module) {
         .def("Clear", &CNonNestedSearch::Clear, "Make the search idle and let go of the text.");
     module.def(
         "_FindStringEndNonNested", &HostFindStringEnd, "search"_a, "quote_i"_a,
-        "The byte index after the string literal whose opening quote stands at `quote_i` of the text\n"
+        "The byte index after the string literal whose opening quote is at `quote_i` of the text\n"
         "searched. An unterminated one ends with its row, with triple quotes at the end of the search.\n"
         "IndexError when `quote_i` lies outside the text searched.");
 }

@@ -8,7 +8,7 @@
 
 namespace codeloom {
 
-// The position after the string literal whose opening quote stands at `quote_pos`. A prefix before the quote
+// The position after the string literal whose opening quote is at `quote_pos`. A prefix before the quote
 // counts, so that the fields of an f-string may hold its own quotes. Without closing quotes the string ends
 // with its row or, opened by triple quotes, with the text.
 size_t FindStringLiteralEnd(std::string_view text, size_t quote_pos);

@@ -44,7 +44,7 @@ void BindLogicalLine(nb::module_& module) {
             [](const CLogicalLine& logical) {
                 return nb::make_tuple(logical.fOrigin.row, logical.fOrigin.col);
             },
-            "Where position (0, 0) stands in the file, as (row, column in UTF-8 bytes), both from zero. "
+            "Where position (0, 0) is in the file, as (row, column in UTF-8 bytes), both from zero. "
             "Columns of row 0 count from it, columns of later rows from the start of the file's row.")
         .def_ro("fInAsyncDef", &CLogicalLine::fInAsyncDef,
                 "True in the header and the body of an `async def`.")
@@ -60,7 +60,7 @@ void BindLogicals(nb::module_& module) {
     module.def(
         "GetLogicalsFromText", &GetLogicalsFromText, "text"_a,
         "The logical lines of a source text, a list of CLogicalLine. It never fails on what the text says:\n"
-        "what isn't Python becomes tokens that the parser refuses, on the line where it stands.");
+        "what isn't Python becomes tokens that the parser refuses, on the line where it is.");
 }
 
 }  // namespace codeloom

@@ -37,7 +37,7 @@ class CLogicalLine : public CHosted {
     // The tokens as the tokenizer found them; null for a record made by hand.
     const CRawToken* Tokens() const { return _fSource ? _fTokens.View().data() : nullptr; }
 
-    // The records of an analysis on plain data, in the place of all that were there before: of the line, of
+    // The records of an analysis on plain data, which replace all that were there: of the line, of
     // its arguments, and those of each embedded logical. Requires: the tokenizer made the record.
     void SetRecords(CPackedRecords equivs, CPackedRecords arg_equivs, std::vector<CPackedRecords> embedded);
 

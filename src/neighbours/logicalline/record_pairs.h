@@ -29,7 +29,7 @@ class CRecordPairs {
     bool IsEmpty() const { return _fPacked.IsEmpty() && _fPairs.empty() && _fHostPairs.is_none(); }
 
     // Calls visit(name, equiv) for each record that is there now. ValueError for an item of the host's that
-    // is no pair.
+    // isn't a pair.
     template <class Visit>
     void ForEach(Visit visit) const {
         if (!_fHostPairs.is_none()) return _ForEachOfHost(visit);

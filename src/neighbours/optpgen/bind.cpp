@@ -18,7 +18,7 @@ constexpr const char* kParserGeneratorDoc =
     "ParserGenerator(grammar_file, tok_number2name, op_text2number): the path of a grammar text in pgen\n"
     "notation, a dict from token type (int) to its name (str), and one from operator text (str) to token\n"
     "type. The first rule is the start symbol. Raises OSError when the file can't be read, and ValueError\n"
-    "with file, row and reason when it is no grammar.";
+    "with file, row and reason when it isn't a grammar.";
 
 constexpr const char* kMakeGrammarDoc =
     "The Grammar that the file defines.\n\n"

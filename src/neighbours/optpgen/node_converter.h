@@ -41,7 +41,7 @@ class NodeConverter : public CHosted {
     FOR_HOST_SUBCLASSES(TOfHost)
     END_OPERATIONS
 
-    // The same for a rule whose children stand on a stack, from `first` to its top; they leave it. A native
+    // The same for a rule whose children are on a stack, from `first` to its top; they leave it. A native
     // converter that needs no list of them has its own; all of them come from that converter then.
     virtual nb::object ConvertRule(nb::handle grammar, int type, nb::handle context, CObjectStack& stack,
                                    size_t first) {

@@ -5,7 +5,7 @@
 //   start  at addtoken
 //
 // An open rule that has more than one child is a frame of its own. Rules that have one child so far share the
-// frame of their chain (parse_tables.h). The children of all frames stand on one stack, so that a rule with a
+// frame of their chain (parse_tables.h). The children of all frames are on one stack, so that a rule with a
 // single child turns into that child without a move. Nothing here calls itself: nesting of the text costs
 // frames, no call depth.
 #pragma once
