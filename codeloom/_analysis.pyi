@@ -1116,6 +1116,54 @@ def table_kinds() -> list[tuple[str, str, list[tuple[str, str, bool, str]]]]:
     For each table its name, its meaning and its columns: name, type, whether it may hold nulls, meaning.
     """
 
+def file_columns() -> list[tuple[str, str, bool, str]]:
+    """The same for the columns of the table `files`, which only a batch has."""
+
+class SourceBatch:
+    """For `codeloom.corpus`: the sources in a table of another library."""
+
+    def __init__(self, table: object, path: str, content: str, python: str) -> None:
+        ...
+
+    def __len__(self) -> int:
+        ...
+
+    def path(self, i: int) -> str | None:
+        ...
+
+    def python(self, i: int) -> str | None:
+        ...
+
+    def size(self, i: int) -> int | None:
+        ...
+
+    def content(self, i: int) -> bytes | None:
+        ...
+
+    def digest(self, i: int, hash: Any) -> str | None:
+        """
+        The hash of the content by a function of hashlib, in hexadecimal digits.
+        """
+
+    @property
+    def holds_text(self) -> bool:
+        """True where contents are text, not bytes."""
+
+    def is_plain(self, i: int) -> bool:
+        """True where the content needs no decoding."""
+
+    def take(self, i: int, file_id: int, path: str, sha256: str | None, python: str, version: int) -> None:
+        """Says how a source is called and which version it is read as."""
+
+    def take_decoded(self, utf8: bytes, faults: list[tuple[int, int, str]], unreadable: list[int]) -> None:
+        """The text of the source that was taken last."""
+
+    def mark(self, state: str, reason: str) -> None:
+        """What is wrong with the source that was taken last."""
+
+    def analyze(self, tables: list[str], false_hints: bool, max_seconds: float) -> dict[str, Table]:
+        ...
+
 class Analysis:
     """What a text says. Each part is worked out when it is first asked for."""
 

@@ -6,7 +6,7 @@ python tools/make_tables_page.py
 import pathlib
 import re
 
-from codeloom._analysis import table_kinds
+from codeloom._analysis import file_columns, table_kinds
 
 PAGE = pathlib.Path(__file__).parent.parent / "docs/tables.md"
 
@@ -14,7 +14,8 @@ PAGE = pathlib.Path(__file__).parent.parent / "docs/tables.md"
 def all_tables() -> str:
     """A heading for each table, and its columns."""
     parts = []
-    for name, meaning, columns in table_kinds():
+    files = ("files", "The sources of a batch, in their order.", file_columns())
+    for name, meaning, columns in (*table_kinds(), files):
         rows = [
             f"| `{column}` | {kind}{', may be null' if is_nullable else ''} | {told} |"
             for column, kind, is_nullable, told in columns

@@ -66,6 +66,18 @@ class TTableBuilder final : public CTableBuilder {
     std::vector<typename Source::CRow> _fRows;
 };
 
+// A table of rows that are there already.
+template <class Row>
+std::shared_ptr<const CTable> TableOfRows(const TColumns<Row>& columns, const std::vector<Row>& rows) {
+    CTable table;
+    table.count = rows.size();
+    for (const auto& spec : columns.Specs()) {
+        table.fields.push_back({spec.name, spec.is_nullable, spec.make()});
+        spec.append(*table.fields.back().column, rows);
+    }
+    return std::make_shared<const CTable>(std::move(table));
+}
+
 // The name of a column's type, for people.
 inline std::string_view TypeNameOf(const CColumn& column) {
     if (column.Dictionary() != nullptr) return "dictionary";
@@ -81,6 +93,14 @@ inline std::string_view TypeNameOf(const CColumn& column) {
     }
 }
 
+template <class Row>
+std::vector<CTableKind::CColumnInfo> ColumnInfosOf(const TColumns<Row>& columns) {
+    std::vector<CTableKind::CColumnInfo> infos;
+    for (const auto& spec : columns.Specs())
+        infos.push_back({spec.name, spec.meaning, spec.is_nullable, TypeNameOf(*spec.make())});
+    return infos;
+}
+
 template <class Source>
 CTableKind TableKindOf(std::string_view name, std::string_view meaning, bool wants_records,
                        bool wants_names) {
@@ -91,12 +111,7 @@ CTableKind TableKindOf(std::string_view name, std::string_view meaning, bool wan
             [](bool with_file_id) -> std::unique_ptr<CTableBuilder> {
                 return std::make_unique<TTableBuilder<Source>>(with_file_id);
             },
-            [] {
-                std::vector<CTableKind::CColumnInfo> columns;
-                for (const auto& spec : Source::Columns().Specs())
-                    columns.push_back({spec.name, spec.meaning, spec.is_nullable, TypeNameOf(*spec.make())});
-                return columns;
-            }};
+            [] { return ColumnInfosOf(Source::Columns()); }};
 }
 
 }  // namespace codeloom

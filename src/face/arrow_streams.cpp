@@ -2,6 +2,7 @@
 
 #include <nanobind/stl/string_view.h>
 
+#include "arrow/batch.h"
 #include "host/errors.h"
 #include "host/refuse_new.h"
 
@@ -21,14 +22,15 @@ const CFileAnalysis& AnalysisFor(const CSourceFile& file, const CTableKind& kind
     return kind.wants_records ? file.WithRecords() : file.Analysis();
 }
 
-nb::list ColumnsOf(const CTableKind& kind) {
+nb::list ColumnsOf(const std::vector<CTableKind::CColumnInfo>& infos) {
     nb::list columns;
-    for (const CTableKind::CColumnInfo& column : kind.columns())
+    for (const CTableKind::CColumnInfo& column : infos)
         columns.append(nb::make_tuple(column.name.c_str(), column.type, column.is_nullable, column.meaning));
     return columns;
 }
 
-// Raises ValueError for a name that no table has.
+}  // namespace
+
 const CTableKind& TableKindNamed(std::string_view name) {
     if (const CTableKind* kind = FindTable(name)) return *kind;
     std::string message = "no table is called '" + std::string(name) + "'; there are";
@@ -39,8 +41,6 @@ const CTableKind& TableKindNamed(std::string_view name) {
     }
     RaiseHost(PyExc_ValueError, message.c_str());
 }
-
-}  // namespace
 
 nb::object StreamCapsule(std::shared_ptr<const CTable> table) {
     auto stream = std::make_unique<ArrowArrayStream>();
@@ -90,12 +90,16 @@ void BindTables(nb::module_& module) {
         [] {
             nb::list kinds;
             for (const CTableKind& kind : TableKinds())
-                kinds.append(nb::make_tuple(kind.name, kind.meaning, ColumnsOf(kind)));
+                kinds.append(nb::make_tuple(kind.name, kind.meaning, ColumnsOf(kind.columns())));
             return kinds;
         },
         nb::sig("def table_kinds() -> list[tuple[str, str, list[tuple[str, str, bool, str]]]]"),
         "For each table its name, its meaning and its columns: name, type, whether it may hold nulls, "
         "meaning.");
+    module.def(
+        "file_columns", [] { return ColumnsOf(FileColumnInfos()); },
+        nb::sig("def file_columns() -> list[tuple[str, str, bool, str]]"),
+        "The same for the columns of the table `files`, which only a batch has.");
 }
 
 }  // namespace codeloom

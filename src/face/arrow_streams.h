@@ -20,6 +20,9 @@ nb::object StreamCapsule(std::shared_ptr<const CTable> table);
 // Some rows of a table of a file. Requires: a table has this name.
 nb::object StreamOfRows(const CSourceFile& file, const char* table, const CSelection& selection);
 
+// Raises ValueError for a name that no table has.
+const CTableKind& TableKindNamed(std::string_view name);
+
 // A whole table of a file. Raises ValueError where no table has the name.
 CHostTable TableOf(const CSourceFile& file, std::string_view name);
 

@@ -12,6 +12,7 @@
 #include "face/bind_names.h"
 #include "face/items.h"
 #include "face/kinds.h"
+#include "face/source_batch.h"
 #include "host/errors.h"
 #include "host/refuse_new.h"
 #include "host/text.h"
@@ -25,18 +26,12 @@ namespace {
 
 CAnalysis MakeAnalysis(nb::bytes utf8, nb::str path, nb::str python, int version, bool false_hints,
                        nb::list faults, nb::list unreadable) {
-    CUnreadable places;
-    for (nb::handle fault : faults) {
-        const auto [start, end, message] = nb::cast<std::tuple<uint32_t, uint32_t, std::string>>(fault);
-        places.faults.push_back({start, end, message});
-    }
-    for (nb::handle offset : unreadable) places.offsets.push_back(nb::cast<uint32_t>(offset));
     if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
     CFileSettings settings;
     settings.version = version;
     settings.false_hints = false_hints;
     return {std::make_shared<const CSourceFile>(std::move(utf8), std::move(path), std::move(python), settings,
-                                                std::move(places))};
+                                                UnreadableOf(faults, unreadable))};
 }
 
 // The arguments that make the analysis anew.
@@ -253,6 +248,7 @@ void BindFace(nb::module_& module) {
     BindNameItems(module);
     BindSignatureItems(module);
     BindTables(module);
+    BindSourceBatch(module);
     nb::class_<CAnalysis> analysis(module, "Analysis",
                                    "What a text says. Each part is worked out when it is first asked for.");
     BindAnalysis(analysis);

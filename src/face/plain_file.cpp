@@ -52,12 +52,12 @@ bool MayNameItsEncoding(std::string_view text) {
     return text.substr(0, second_end).find("coding") != std::string_view::npos;
 }
 
-bool IsPlain(std::string_view text) {
+}  // namespace
+
+bool IsPlainSource(std::string_view text) {
     return !text.starts_with("\xEF\xBB\xBF") && !MayNameItsEncoding(text) &&
            text.find('\0') == std::string_view::npos && IsUtf8(text);
 }
-
-}  // namespace
 
 std::optional<CPlainFile> ReadPlainFile(const char* path) {
     struct stat status;
@@ -66,7 +66,7 @@ std::optional<CPlainFile> ReadPlainFile(const char* path) {
     const CDescriptor file(open(path, O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     if (file.Number() < 0 || fstat(file.Number(), &status) != 0 || !IsRegular(status)) return std::nullopt;
     std::optional<CPlainFile> plain = ReadAll(file.Number(), static_cast<size_t>(status.st_size));
-    if (plain && !IsPlain(plain->Text())) plain.reset();
+    if (plain && !IsPlainSource(plain->Text())) plain.reset();
     return plain;
 }
 

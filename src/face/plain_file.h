@@ -8,6 +8,9 @@
 
 namespace codeloom {
 
+// True for UTF-8 text as it is: no byte order mark, no coding comment (PEP 263), no NUL.
+bool IsPlainSource(std::string_view text);
+
 struct CPlainFile {
     std::unique_ptr<char[]> bytes;
     size_t size = 0;

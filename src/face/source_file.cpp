@@ -1,9 +1,22 @@
 #include "face/source_file.h"
 
+#include <nanobind/stl/string.h>
+#include <nanobind/stl/tuple.h>
+
 #include "host/errors.h"
 #include "host/text.h"
 
 namespace codeloom {
+
+CUnreadable UnreadableOf(const nb::list& faults, const nb::list& offsets) {
+    CUnreadable places;
+    for (nb::handle fault : faults) {
+        const auto [start, end, message] = nb::cast<std::tuple<uint32_t, uint32_t, std::string>>(fault);
+        places.faults.push_back({start, end, message});
+    }
+    for (nb::handle offset : offsets) places.offsets.push_back(nb::cast<uint32_t>(offset));
+    return places;
+}
 
 CSourceFile::CSourceFile(nb::bytes utf8, nb::str path, nb::str python, const CFileSettings& settings,
                          CUnreadable unreadable)

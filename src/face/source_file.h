@@ -21,6 +21,9 @@ namespace nb = nanobind;
 
 namespace codeloom {
 
+// What the Python layer says of what was no text.
+CUnreadable UnreadableOf(const nb::list& faults, const nb::list& offsets);
+
 // One text with all that is known of it. Everything but the text is worked out when it is first asked for,
 // and stays as it is from then on.
 class CSourceFile {

@@ -11,6 +11,7 @@
 #include <string_view>
 #include <vector>
 
+#include "file/time_limit.h"
 #include "line/line_analyzer.h"
 #include "names/records.h"
 #include "rules/problem.h"
@@ -26,7 +27,8 @@ struct CFileSettings {
     int version = CLanguage::kNewest;
     bool false_hints = false;  // take all that looks like a type hint for one
     bool wants_records = true;
-    bool wants_names = false;  // occurrences, scopes, signatures and hints
+    const CTimeLimit* time_limit = nullptr;  // none unless given
+    bool wants_names = false;                // occurrences, scopes, signatures and hints
 };
 
 // A logical line: from its first token to the end of its last one, a comment at its end included.
@@ -44,7 +46,8 @@ struct CLineLimit {
 };
 
 struct CFileAnalysis {
-    CProblems problems;  // by their place
+    bool is_cut = false;  // the pass met its time limit, and there is nothing else
+    CProblems problems;   // by their place
     TPlainArray<CLine> lines;
     CRecords records;  // empty unless the settings ask for them
     std::vector<CLineLimit> limits;

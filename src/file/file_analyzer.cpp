@@ -71,6 +71,7 @@ class CFileAnalyzer final : CTreeObserver {
     void TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) override;
     bool WantsHints() const override { return _fSettings.wants_names; }
     void TakeHintOf(const CHintNote& note) override { _fSignatures.TakeHintOf(note); }
+    bool _IsOutOfTime() const;
     void _SetLanguage(const CLanguage& language);
     void _MakeRoom();
     void _GiveRoomBack();
@@ -110,7 +111,14 @@ CFileAnalysis CFileAnalyzer::Run() {
     _MakeRoom();
     CTokenizer tokenizer(_fText);
     CRawLogical logical;
-    while (tokenizer.NextLogical(logical)) _AnalyzeLine(logical);
+    while (tokenizer.NextLogical(logical)) {
+        _AnalyzeLine(logical);
+        if (_IsOutOfTime()) [[unlikely]] {
+            CFileAnalysis cut;
+            cut.is_cut = true;
+            return cut;
+        }
+    }
     _fChecker.Finish();
     _fFollowUps.DropInConflicts(_fResult.problems);
     if (_fNames) _FinishNames();
@@ -140,6 +148,13 @@ void CFileAnalyzer::_GiveRoomBack() {
     _fResult.records.records.Shrink();
     _fResult.records.values.Shrink();
     _fResult.names.Shrink();
+}
+
+// Asked after each line; the clock is looked at now and then.
+bool CFileAnalyzer::_IsOutOfTime() const {
+    constexpr size_t kLinesBetween = 64;
+    return _fSettings.time_limit != nullptr && _fResult.lines.size() % kLinesBetween == 0 &&
+           _fSettings.time_limit->IsOver();
 }
 
 // What the rules see, those see who look for names.
