@@ -31,16 +31,16 @@ class Protocol(LanguageServerProtocol):
     """The protocol with documents of our own."""
 
     _server: "Server"
+    inbox: Inbox
 
     def __init__(self, server: "Server", converter: Any) -> None:
         super().__init__(server, converter)
-        self.inbox = Inbox()
         self.ended: asyncio.Future[int] | None = None
         # When it came, in the time of the loop.
         self.last_message = 0.0
         self._is_initialized = False
 
-    def take(self, message: Any) -> None:
+    def take(self, message: Any, is_cancelled: bool = False) -> None:
         """Handle what was read: a message, something else that is JSON, or an error of reading."""
         self.last_message = asyncio.get_running_loop().time()
         try:
@@ -48,7 +48,7 @@ class Protocol(LanguageServerProtocol):
                 raise JsonRpcParseError(f"the message can't be read: {message}")
             if not isinstance(message, dict) or message.get(_JSON_RPC) != self.VERSION:
                 raise JsonRpcInvalidRequest("this is no message of JSON-RPC 2.0")
-            if self.inbox.take(message):
+            if is_cancelled:
                 raise JsonRpcRequestCancelled("the request was cancelled")
             self._check_order(message)
             self.handle_message(self._structured(message))

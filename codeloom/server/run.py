@@ -1,10 +1,9 @@
-"""The server's process: one thread reads, the loop handles, whatever else runs waits for both."""
+"""The server's process: a loop that reads, handles and answers; files in the background have a thread."""
 
 import asyncio
 import logging
+import selectors
 import sys
-import threading
-from typing import Any, BinaryIO
 
 from codeloom.server import (
     completion,
@@ -21,7 +20,7 @@ from codeloom.server import (
     workspace,
 )
 from codeloom.server.server import Server
-from codeloom.server.transport import Writer, read_messages, standard_streams
+from codeloom.server.transport import Inbox, Writer, standard_streams
 
 _FEATURES = (
     lifecycle,
@@ -44,11 +43,16 @@ _SWITCH_SECONDS = 0.0005
 
 def serve() -> int:
     """Serve the client at the standard streams until it ends; the exit status."""
-    # What matters goes to the client; a thread that ends with the process may find no stream left.
+    # What matters goes to the client's log.
     logging.getLogger("pygls").setLevel(logging.CRITICAL)
     sys.setswitchinterval(_SWITCH_SECONDS)
-    with standard_streams() as (source, sink):
-        return asyncio.run(_serve(make_server(), source, sink))
+    with standard_streams() as (source, sink), asyncio.Runner(loop_factory=_new_loop) as runner:
+        return runner.run(_serve(make_server(), source, sink))
+
+
+def _new_loop() -> asyncio.AbstractEventLoop:
+    """A loop that can wait for a file too, which a shell may have put in the place of the input."""
+    return asyncio.SelectorEventLoop(selectors.PollSelector())
 
 
 def make_server() -> Server:
@@ -59,24 +63,33 @@ def make_server() -> Server:
     return server
 
 
-async def _serve(server: Server, source: BinaryIO, sink: BinaryIO) -> int:
+async def _serve(server: Server, source: int, sink: int) -> int:
     loop = asyncio.get_running_loop()
-    protocol = server.protocol
-    protocol.ended = loop.create_future()
-    protocol.set_writer(Writer(sink))
+    protocol, inbox = server.protocol, Inbox(source)
+    protocol.inbox, protocol.ended = inbox, loop.create_future()
+    writer = Writer(sink, loop)
+    protocol.set_writer(writer)
 
-    def handle(message: Any) -> None:
-        protocol.inbox.add(message)
-        loop.call_soon_threadsafe(protocol.take, message)
+    def handle_one() -> None:
+        """Handle the next message; others have their turn before the one after it."""
+        inbox.read()
+        if inbox:
+            protocol.take(*inbox.next())
+        if inbox:
+            loop.call_soon(handle_one)
+        elif inbox.has_ended:
+            loop.remove_reader(source)
+            protocol.lsp_exit()
+        else:
+            loop.add_reader(source, begin)
 
-    def read() -> None:
-        try:
-            read_messages(source, handle)
-        finally:
-            loop.call_soon_threadsafe(protocol.lsp_exit)
+    def begin() -> None:
+        loop.remove_reader(source)
+        handle_one()
 
-    threading.Thread(target=read, name="codeloom-reader", daemon=True).start()
+    loop.add_reader(source, begin)
     try:
         return await protocol.ended
     finally:
         server.shutdown()  # type: ignore[no-untyped-call]
+        writer.close()
