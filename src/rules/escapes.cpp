@@ -6,6 +6,7 @@
 
 #include "rules/fields.h"
 #include "text/char_class.h"
+#include "text/character_names.h"
 #include "tokenizer/number_lexer.h"
 #include "tokenizer/string_lexer.h"
 
@@ -39,7 +40,6 @@ std::optional<CBadEscape> CheckCode(std::string_view escape) {
     return {};
 }
 
-// Names have letters, digits, blanks and hyphens.
 std::optional<CBadEscape> CheckName(std::string_view escape) {
     constexpr size_t kNameStart = 3;
     constexpr const char* kMalformed = "malformed \\N character escape";
@@ -48,9 +48,7 @@ std::optional<CBadEscape> CheckName(std::string_view escape) {
     if (end == std::string_view::npos || end == kNameStart)
         return CBadEscape{end == kNameStart ? end + 1 : kNameStart, kMalformed};
     const std::string_view name = escape.substr(kNameStart, end - kNameStart);
-    const auto belongs_to_name = [](char c) { return IsNameByte(c) || c == ' ' || c == '-'; };
-    const bool is_name = std::all_of(name.begin(), name.end(), belongs_to_name);
-    if (!is_name) return CBadEscape{end + 1, "unknown Unicode character name"};
+    if (!MayBeCharacterName(name)) return CBadEscape{end + 1, "unknown Unicode character name"};
     return {};
 }
 
