@@ -21,7 +21,8 @@ class TChildren {
     TChildren(const TChildren&) = delete;
     TChildren& operator=(const TChildren&) = delete;
     ~TChildren() {
-        if (!_fNodes.empty()) _DropInLoop(_fNodes);
+        if (!_fNodes.empty()) _DropInLoop(std::move(_fNodes));
+        if (_HasList()) _DropInLoop(std::move(_fList));
     }
 
     // True for those of a leaf, which the host sees as none.
@@ -154,16 +155,17 @@ class TChildren {
         RaiseIndexError("list index out of range");
     }
 
-    // A deep tree is dropped in a loop: by recursion it would overflow the stack.
-    static void _DropInLoop(std::vector<CRef<Node>>& nodes) {
-        static std::vector<CRef<Node>> waiting;
+    // A deep tree is dropped in a loop: by recursion it would overflow the stack. That holds for the host's
+    // lists too, whose own drop goes as deep as a main thread's stack allows on 3.13.
+    template <class Children>
+    static void _DropInLoop(Children children) {
+        static std::vector<Children> waiting;
         static bool is_dropping = false;
-        waiting.insert(waiting.end(), std::make_move_iterator(nodes.begin()),
-                       std::make_move_iterator(nodes.end()));
+        waiting.push_back(std::move(children));
         if (is_dropping) return;
         is_dropping = true;
         while (!waiting.empty()) {
-            const CRef<Node> dropped = std::move(waiting.back());
+            const Children dropped = std::move(waiting.back());
             waiting.pop_back();
         }
         is_dropping = false;
