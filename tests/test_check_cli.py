@@ -304,24 +304,3 @@ class TestEndings:
             "    you meant '==' instead of '='?",
         ]
         assert all(len(row) + row.count("日") + row.count("本") <= 60 for row in rows)
-
-    def test_progress_on_a_terminal(self, write_files, start_cli):
-        """A row on the standard error, which is taken away; the results aren't touched by it."""
-        pty = pytest.importorskip("pty")
-        write_files({f"{i}.py": "x = )\n" if i == 99 else "x = 1\n" for i in range(100, 0, -1)})
-        terminal, terminal_of_process = pty.openpty()
-        code = (
-            "import codeloom.cli.progress as p, codeloom.cli as c; p._PATIENCE = p._INTERVAL = 0;"
-            "c.main(['check', '.'])"
-        )
-        command = [sys.executable, "-P", "-c", code]
-        process = subprocess.Popen(
-            command, cwd=write_files({}), stdout=subprocess.PIPE, stderr=terminal_of_process, text=True
-        )
-        os.close(terminal_of_process)
-        stdout, _ = process.communicate(timeout=60)
-        shown = os.read(terminal, 1 << 20).decode()
-        os.close(terminal)
-        assert "files, " in shown and shown.endswith("\r\033[K")
-        assert stdout.splitlines()[-1] == "1 problem in 1 of 100 files, 100 logical lines"
-        assert "\033" not in stdout

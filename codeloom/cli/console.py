@@ -4,7 +4,7 @@ import io
 import os
 import shutil
 import sys
-from collections.abc import Sequence
+from collections.abc import Iterable, Sequence
 from enum import StrEnum
 from typing import TextIO
 
@@ -109,6 +109,19 @@ class Console:
     def print_row(self, row: str) -> None:
         """A row of a command's result."""
         print(row, file=self._stream)
+
+    def print_table(self, headings: Sequence[str], rows: Iterable[Sequence[int | str]]) -> None:
+        """Rows of cells; beneath headings where a person looks and rich is installed."""
+        cells = list(rows)
+        if cells and self.is_terminal:
+            try:
+                from codeloom.cli.rich_output import print_table
+            except ModuleNotFoundError:
+                pass
+            else:
+                return print_table(self._stream, headings, cells, has_colour=self._has_colour)
+        for row in cells:
+            self.print_row("  ".join(f"{cell:>7,}" if isinstance(cell, int) else cell for cell in row))
 
     def write(self, text: str) -> None:
         """A piece of a command's result."""

@@ -37,8 +37,7 @@ class ExplainCommand(Command):
         for code in codes:
             _print(console, known[code])
         if not codes:
-            for explanation in known.values():
-                console.print_row(f"{explanation.code}  {explanation.title}")
+            console.print_table(("Code", "Title"), ((each.code, each.title) for each in known.values()))
         return ExitStatus.SOUND
 
 

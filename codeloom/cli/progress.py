@@ -2,6 +2,8 @@
 
 import sys
 import time
+from collections.abc import Callable
+from typing import Protocol
 
 from codeloom.cli.console import Console
 from codeloom.cli.tally import Tally
@@ -11,13 +13,44 @@ _PATIENCE = 1.0
 _INTERVAL = 0.1
 
 
-class Progress:
+class ProgressRow(Protocol):
     """A row that is written over again and again, and gone when there is something else to show."""
 
-    def __init__(self, console: Console, *, is_wanted: bool) -> None:
+    def show(self, tally: Tally) -> None:
+        """Write how much is done."""
+
+    def clear(self) -> None:
+        """Take the row away."""
+
+
+class PlainRow:
+    """Counts of files and problems; `total` is the number of files."""
+
+    def __init__(self, total: int) -> None:
+        self._total = total
+
+    def show(self, tally: Tally) -> None:
+        """Write how much is done."""
+        row = f"{tally.files:,} of {self._total:,} files, {tally.problems:,} problems ..."
+        print(f"\r\033[K{row}", end="", file=sys.stderr, flush=True)
+
+    def clear(self) -> None:
+        """Take the row away."""
+        print("\r\033[K", end="", file=sys.stderr, flush=True)
+
+
+class Progress:
+    """Shows the row now and then; with rich installed it is a bar.
+
+    `count_files` counts the files of the run, and is called when the run has become a long one.
+    """
+
+    def __init__(self, console: Console, count_files: Callable[[], int], *, is_wanted: bool) -> None:
         self._console = console
+        self._count_files = count_files
         self._is_wanted = is_wanted and sys.stderr is not None and sys.stderr.isatty()
         self._next = time.monotonic() + _PATIENCE
+        self._row: ProgressRow | None = None
         self._is_shown = False
 
     def __enter__(self) -> "Progress":
@@ -30,18 +63,23 @@ class Progress:
         """Write how much is done, unless that was said a moment ago."""
         if not self._is_wanted or time.monotonic() < self._next:
             return
+        if self._row is None:
+            self._row = _row_for(self._count_files())
         self._next = time.monotonic() + _INTERVAL
         self._console.flush()
-        print(
-            f"\r\033[K{tally.files:,} files, {tally.problems:,} problems ...",
-            end="",
-            file=sys.stderr,
-            flush=True,
-        )
+        self._row.show(tally)
         self._is_shown = True
 
     def clear(self) -> None:
         """Take the row away."""
-        if self._is_shown:
-            print("\r\033[K", end="", file=sys.stderr, flush=True)
-            self._is_shown = False
+        if self._is_shown and self._row is not None:
+            self._row.clear()
+        self._is_shown = False
+
+
+def _row_for(total: int) -> ProgressRow:
+    try:
+        from codeloom.cli.rich_output import Bar
+    except ModuleNotFoundError:
+        return PlainRow(total)
+    return Bar(total)

@@ -47,11 +47,18 @@ class Run:
         self._filters, self._changes = _filters_of(options)
         self._version = options.version
         # What is printed on the terminal all the time shows well enough how far a run is.
-        self._progress = Progress(console, is_wanted=not (with_records and console.is_terminal))
+        is_wanted = not (with_records and console.is_terminal)
+        self._progress = Progress(console, self._count_files, is_wanted=is_wanted)
 
     def files(self) -> Iterator[str | OSError]:
         """The paths of the files to read, and what keeps a folder from being listed."""
-        for path in files_of(self.options, self._on_nothing):
+        yield from self._concerned(files_of(self.options, self._on_nothing))
+
+    def _count_files(self) -> int:
+        return sum(1 for _ in self._concerned(files_of(self.options)))
+
+    def _concerned(self, paths: Iterator[str | OSError]) -> Iterator[str | OSError]:
+        for path in paths:
             is_named = isinstance(path, OSError | StandardInput)
             if is_named or self._changes is None or self._changes.concern(str(path)):
                 yield path
@@ -97,8 +104,7 @@ class Run:
     def _print_counts(self) -> None:
         options = self.options
         if options.statistics:
-            for count, code, message in self.tally.statistics():
-                self.console.print_row(f"{count:>7,}  {code}  {message}")
+            self.console.print_table(("Count", "Code", "First message"), self.tally.statistics())
         if options.command.HAS_SUMMARY and options.format == "text" and not options.quiet:
             self.console.print_row(str(self.tally))
 
