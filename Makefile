@@ -2,8 +2,9 @@
 # make test    set up what is missing, build, and run all tests
 # The rest: docs, lint, tidy, format, asan, leaks, fuzz, bench, bench-short, clean.
 
+# Another host has an environment of its own: make test PYTHON=python3.13
 PYTHON ?= python3.11
-VENV   := .venv
+VENV   := .venv$(if $(filter-out python3.11,$(notdir $(PYTHON))),-$(notdir $(PYTHON)))
 BIN    := $(VENV)/bin
 STAMP  := $(VENV)/.installed
 

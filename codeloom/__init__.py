@@ -9,6 +9,8 @@ about names. A broken line never spoils its neighbours.
 The engine beneath is the native module `codeloom.treesift`.
 """
 
+import sys
+
 TYPE_CHECKING = False  # true for those who check types; `typing` takes longer to import than this package
 if TYPE_CHECKING:
     from codeloom._analysis import (
@@ -38,6 +40,11 @@ if TYPE_CHECKING:
     from codeloom._face import analyze, analyze_file, analyze_paths, read_notebook
     from codeloom.reading.languages import NEWEST, VERSIONS
     from codeloom.reading.notebooks import Notebook
+
+if "t" in getattr(sys, "abiflags", ""):
+    raise ImportError(
+        "codeloom doesn't run on a free-threaded Python: use a usual build of CPython 3.11, 3.12 or 3.13"
+    )
 
 __version__ = "0.1.0"
 

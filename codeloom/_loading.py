@@ -51,8 +51,12 @@ def StandinsOffered() -> Iterator[None]:
 
 
 def ImportPgen() -> ModuleType:
-    """The interpreter's pgen module, for its operator table, without the warning of its own age."""
+    """The interpreter's pgen module, for its operator table, without the warning of its own age.
+
+    The interpreter has none from 3.13 on; ours holds the same table.
+    """
+    if sys.version_info >= (3, 13):
+        return importlib.import_module("codeloom._standins.pgen")
     with warnings.catch_warnings():
         warnings.simplefilter("ignore", DeprecationWarning)
-        from lib2to3.pgen2 import pgen
-    return pgen
+        return importlib.import_module("lib2to3.pgen2.pgen")

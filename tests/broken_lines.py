@@ -21,6 +21,7 @@ from functools import cached_property
 from pathlib import Path
 
 from faults import KINDS, QUOTES, Edit, Line, Lines, OpensTriple, TypedAbove
+from host_tokens import host_tokens
 from library import plain_texts
 
 from codeloom.logicalline import CLogicalLine
@@ -176,7 +177,7 @@ def _Told(text: str, damaged: list[range]) -> list[range]:
 
 def _LeavesOpen(line: str) -> bool:
     try:
-        tokens = list(tokenize.generate_tokens(io.StringIO(f"{line}\n").readline))
+        tokens = list(host_tokens(f"{line}\n"))
     except (tokenize.TokenError, SyntaxError):
         return True
     return any(token.string in QUOTES for token in tokens if token.type == tokenize.ERRORTOKEN)

@@ -5,17 +5,14 @@ converter for the same nodes in the same order as ours has to.
 """
 
 import re
-import warnings
 from pathlib import Path
 from typing import NamedTuple
 from unittest.mock import patch
 
+from lib2to3_of_host import grammar, parse, pgen, token
+
 import codeloom
 from codeloom import _fastaccess, optpgen
-
-with warnings.catch_warnings():
-    warnings.simplefilter("ignore", DeprecationWarning)
-    from lib2to3.pgen2 import grammar, parse, pgen, token
 
 
 class TokenTables(NamedTuple):

@@ -17,15 +17,12 @@ import warnings
 from collections import Counter, defaultdict
 from pathlib import Path
 
-with warnings.catch_warnings():
-    warnings.simplefilter("ignore")
-    from lib2to3 import pygram, pytree
-    from lib2to3.pgen2 import driver, token
-    from lib2to3.pgen2.parse import ParseError
-    from lib2to3.pgen2.tokenize import TokenError
+from lib2to3_of_host import TokenError, driver, parse, pygram, pytree, token
 
 from codeloom import Role, ScopeKind, analyze
 
+# The version that the interpreter reads.
+HOST = "{}.{}".format(*sys.version_info)
 KNOWN = {"line with a problem": "a hint in quotes that is no expression"}
 
 CONTEXT_ROLES = {ast.Load: Role.READ, ast.Store: Role.BIND, ast.Del: Role.DELETE}
@@ -182,10 +179,12 @@ def token_disagreements(text, by_place):
 
     `tokenize` takes names with combining characters apart, so only rows of ASCII are looked at.
     """
+    before = ""
     for each in tokenize.generate_tokens(io.StringIO(text).readline):
+        is_conversion, before = before == "!", each.string  # of a field
         is_name = each.type == tokenize.NAME and each.string not in {*keyword.kwlist, *keyword.softkwlist}
         place = (each.start[0], each.start[1] + 1)
-        if is_name and each.line.isascii() and place not in by_place:
+        if is_name and not is_conversion and each.line.isascii() and place not in by_place:
             yield "name without an occurrence", f"{place} {each.string}"
 
 
@@ -243,7 +242,16 @@ def ordered(scopes):
     return sorted(scopes, key=lambda scope: (scope[0].value, repr(scope[1:])))
 
 
+# From 3.12 on these are within the scope around them, and their names among its own (PEP 709).
+INLINED = (
+    {ScopeKind.LIST_COMPREHENSION, ScopeKind.SET_COMPREHENSION, ScopeKind.DICT_COMPREHENSION}
+    if sys.version_info >= (3, 12)
+    else set()
+)
+
+
 def our_scopes(analysis):
+    """The same of ours, with the names that came from inlined scopes."""
     within = defaultdict(list)
     for scope in analysis.scopes:
         if scope.kind is not ScopeKind.ANNOTATION:
@@ -255,7 +263,14 @@ def our_scopes(analysis):
             for symbol in sorted(scope.symbols, key=lambda symbol: normal(symbol.name))
         }
         row = scope.range.row if scope.name else 0
-        return scope.kind, normal(scope.name), row, symbols, ordered(map(shown, within[scope]))
+        children, inlined = [], set()
+        for child in map(shown, within[scope]):
+            if child[0] in INLINED:
+                children += child[4]
+                inlined |= {*child[3], *child[5]}
+            else:
+                children.append(child)
+        return scope.kind, normal(scope.name), row, symbols, ordered(children), inlined
 
     (module,) = within[None]
     return shown(module)
@@ -267,7 +282,7 @@ def differences(ours, theirs, where):
         return
     if ours[2] != theirs[2]:
         yield "row of a scope differs", f"{where}: {ours[2]} {theirs[2]}"
-    for name in {*ours[3], *theirs[3]}:
+    for name in {*ours[3], *theirs[3]} - ours[5]:
         mine, flags = ours[3].get(name), theirs[3].get(name)
         if mine is None or flags is None:
             yield f"symbol {'missing' if mine is None else 'unexpected'}", f"{where}.{name} {flags or mine}"
@@ -318,7 +333,7 @@ def python2_texts_of(folders):
                 if "\t" not in text and not analyze(text, python="2.7").problems:
                     list(python2_disagreements(text))
                     yield path, text
-            except (UnicodeDecodeError, ParseError, TokenError, IndentationError):
+            except (UnicodeDecodeError, parse.ParseError, TokenError, IndentationError):
                 continue
 
 
@@ -340,7 +355,7 @@ def disagreements_of(text):
         table = symtable.symtable(text, "<string>", "exec")
     except SyntaxError:
         return
-    analysis = analyze(text, python="3.11")
+    analysis = analyze(text, python=HOST)
     if analysis.problems:
         yield "line with a problem", str(analysis.problems[0])
         return
@@ -358,7 +373,7 @@ def main(arguments):
     for path, text in texts:
         for kind, what in (python2_disagreements if is_python2 else disagreements_of)(text):
             found[kind].append((path, what))
-        analysis = analyze(text, python="2.7" if is_python2 else "3.11")
+        analysis = analyze(text, python="2.7" if is_python2 else HOST)
         counts["files"] += 1
         counts["occurrences"] += len(analysis.occurrences)
         counts["scopes"] += len(analysis.scopes)

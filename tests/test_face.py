@@ -268,15 +268,6 @@ def test_a_line_as_long_as_a_file_takes_no_longer():
     assert time.process_time() - start < 10
 
 
-def test_it_refuses_subinterpreters():
-    code = """
-import _xxsubinterpreters as interpreters
-interpreters.run_string(interpreters.create(), "import codeloom._analysis")
-"""
-    with pytest.raises(AssertionError, match="ImportError"):
-        RunPython(code)
-
-
 @pytest.mark.skipif(
     "ASAN_OPTIONS" in os.environ, reason="the sanitizer ends a process that runs out of memory"
 )

@@ -3,10 +3,11 @@
 import ast
 import importlib.util
 import inspect
+import sys
 from pathlib import Path
 
 import pytest
-from run_python import RunPython
+from run_python import RunInSubinterpreter, RunPython
 
 from codeloom import _fastaccess, _neighbours, logicalline, strutils, symbolinfo, treesift
 
@@ -184,15 +185,21 @@ def test_no_object_changes_its_class():
                 cls.__new__(cls).__class__ = cls
 
 
-@pytest.mark.parametrize("name", ["treesift", "_neighbours"])
-@pytest.mark.parametrize("first", ["", "import codeloom.treesift, codeloom._neighbours"])
-def test_a_subinterpreter_is_refused(name, first):
-    inside = f"try: import codeloom.{name}\nexcept ImportError as error: print(error, flush=True)"
-    code = f"{first}\nimport _xxsubinterpreters as sub\nsub.run_string(sub.create(), {inside!r})"
-    printed = RunPython(code)
-    assert printed.startswith("codeloom.") and "can't be loaded in a subinterpreter" in printed
+@pytest.mark.parametrize("name", ["treesift", "_neighbours", "_analysis"])
+@pytest.mark.parametrize("configuration", ["isolated", "legacy"])
+@pytest.mark.parametrize("before", ["", "import codeloom.treesift, codeloom._neighbours, codeloom._analysis"])
+def test_a_subinterpreter_is_refused(name, configuration, before):
+    code = f"try: import codeloom.{name}\nexcept ImportError as error: print(error, flush=True)"
+    printed = RunInSubinterpreter(code, before, configuration)
+    assert printed.startswith("codeloom.") and "can't be loaded in a subinterpreter: use it in" in printed
 
 
+def test_a_free_threaded_python_is_refused():
+    code = "import sys\nsys.abiflags = 't'\ntry: import codeloom\nexcept ImportError as error: print(error)"
+    assert "free-threaded Python: use a usual build of CPython 3.11" in RunPython(code)
+
+
+@pytest.mark.skipif(sys.version_info >= (3, 12), reason="they are made with 3.11")
 def test_the_stubs_are_up_to_date():
     pytest.importorskip("nanobind")
     path = ROOT / "tools/make_stubs.py"

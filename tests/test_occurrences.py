@@ -8,7 +8,8 @@ from pathlib import Path
 
 import pytest
 from golden import Cases, Check
-from names_against_interpreter import KNOWN, disagreements_of, python2_disagreements, pytree
+from lib2to3_of_host import PYTHON2_TEXT
+from names_against_interpreter import KNOWN, disagreements_of, python2_disagreements
 from test_library import LibraryTexts
 
 from codeloom import Role, analyze
@@ -230,8 +231,7 @@ def test_items_are_values():
 
 
 def test_python2_against_lib2to3():
-    text = (Path(pytree.__file__).parent / "tests/data/py2_test_grammar.py").read_text()
-    assert list(python2_disagreements(text)) == []
+    assert list(python2_disagreements(PYTHON2_TEXT.read_text())) == []
 
 
 def test_what_python2_unpacks_of_an_exception():

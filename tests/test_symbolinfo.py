@@ -3,11 +3,11 @@
 import argparse
 import ast
 import inspect
-import io
 import statistics
 import tokenize
 
 import pytest
+from host_tokens import host_tokens
 from hypothesis import example, given
 from hypothesis import strategies as st
 
@@ -188,7 +188,7 @@ LITERALS = st.builds(
 def test_the_value_of_a_literal_is_the_interpreters(text):
     try:
         (statement,) = ast.parse(text).body
-        tokens = [token.string for token in tokenize.generate_tokens(io.StringIO(text).readline)]
+        tokens = [token.string for token in host_tokens(text)]
         is_one_literal = tokens[0] == text or tokens[0] == text.replace("\r\n", "\n")
         value = ast.literal_eval(statement.value) if is_one_literal else None
     except (SyntaxError, ValueError, tokenize.TokenError):
@@ -248,7 +248,7 @@ lambda *a, **k: a; lambda: 0; x if not y else z; not (a); a in [b]; (x := 3); a 
 
 @pytest.mark.parametrize("text", JOINED.strip().replace("\n", "; ").split("; "))
 def test_tokens_are_joined_as_a_formatter_would(text):
-    tokens = [token.string for token in tokenize.generate_tokens(io.StringIO(text).readline)]
+    tokens = [token.string for token in host_tokens(text)]
     assert JoinTokens(tokens).decode() == text
 
 
@@ -268,8 +268,7 @@ def test_joining_keeps_the_meaning_of_every_expression(source):
             node, ast.Slice | ast.JoinedStr | ast.FormattedValue | ast.Starred
         ):
             continue
-        rows = io.StringIO(ast.unparse(node)).readline
-        tokens = [token.string for token in tokenize.generate_tokens(rows)]
+        tokens = [token.string for token in host_tokens(ast.unparse(node))]
         joined = JoinTokens(tokens).decode()
         again = ast.parse(joined, mode="eval").body
         assert ast.unparse(again) == ast.unparse(node)

@@ -11,6 +11,7 @@ import warnings
 from bisect import bisect_right
 
 import pytest
+from host_tokens import host_tokens
 from hypothesis import given, settings
 from hypothesis import strategies as st
 from library import library_files
@@ -107,7 +108,7 @@ def ExpectedTokens(text):
     each statement, or behind those that semicolons part.
     """
     rows = io.StringIO(text).readlines()
-    for token in tokenize.generate_tokens(io.StringIO(text).readline):
+    for token in host_tokens(text):
         if token.type == tokenize.NEWLINE:
             yield LINE_END
         elif token.string.strip() and token.string != ";":

@@ -69,9 +69,16 @@ inline bool DictContains(nb::handle dict, nb::handle key) {
 // The value of `key`; an invalid object when there is none, or no dictionary at all.
 nb::object FindInDict(nb::handle dict_or_none, nb::handle key);
 
-// Another number after each change of a dictionary, and another for each dictionary; 0 for none.
+// Another number after each change of a dictionary, and another for each dictionary; 0 for none. 3.12
+// and 3.13 keep these numbers, which they call deprecated.
 inline uint64_t DictVersion(nb::handle dict_or_none) {
-    return dict_or_none.is_none() ? 0 : reinterpret_cast<PyDictObject*>(dict_or_none.ptr())->ma_version_tag;
+    static_assert(PY_VERSION_HEX < 0x030E0000,
+                  "3.14 has no version of a dictionary: watch it by PyDict_Watch");
+    if (dict_or_none.is_none()) return 0;
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wdeprecated-declarations"
+    return reinterpret_cast<PyDictObject*>(dict_or_none.ptr())->ma_version_tag;
+#pragma GCC diagnostic pop
 }
 
 // True when `candidate` is a class derived from `base`, or `base` itself.
