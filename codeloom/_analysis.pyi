@@ -1276,6 +1276,11 @@ def DumpNames(text: str, version: int, has_print_function: bool=False, with_reco
     Each is the kind of its fault (0 for none), the token at fault, the limit that the walk hit (0 for none), and the records: name, info bytes, whether of an argument, and the bytes of the text at which the name is. `version` is 312 for Python 3.12.
     """
 
+def DumpJoinedNames(text: str, version: int, starts: list[int]) -> tuple[str, str]:
+    """
+    For developers: the names of a text joined from those of its parts, which begin at these bytes, and those of the text in one go. Both are the same where each part begins with a statement of the module.
+    """
+
 def DumpTrees(text: str, version: int, has_print_function: bool=False) -> list[tuple[str, str | None, int]]:
     """
     For developers: the tree of each logical line of a text, and of each expression embedded in it, as text.

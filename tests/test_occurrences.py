@@ -12,7 +12,8 @@ from lib2to3_of_host import PYTHON2_TEXT
 from names_against_interpreter import KNOWN, disagreements_of, python2_disagreements
 from test_library import LibraryTexts
 
-from codeloom import Role, analyze
+from codeloom import LineKind, Role, analyze
+from codeloom._analysis import DumpJoinedNames
 
 FOLDER = Path(__file__).parent / "occurrences"
 
@@ -152,6 +153,29 @@ def test_broken_lines_leave_the_others_alone(seed):
         count += len(sound)
         same += sum(spoilt[key] == home for key, home in sound.items())
     assert same > 0.99 * count
+
+
+# An edit leaves the names of other parts as they are.
+
+
+def StartsOfParts(analysis, text, random_source):
+    """Some bytes of the text at which statements of the module begin."""
+    before = [0]
+    for row in text.split("\n"):
+        before.append(before[-1] + len(row.encode()) + 1)
+    clauses = {LineKind.ELIF, LineKind.ELSE, LineKind.EXCEPT, LineKind.FINALLY, LineKind.COMMENT}
+    lines = [line for line in analysis.lines if line.range.column == 1 and line.kind not in clauses]
+    rows = [line.range.row for line in lines]
+    return sorted({0, *(before[row - 1] for row in rows if random_source.random() < 0.3)})
+
+
+def test_names_of_parts_are_those_of_the_text(seed):
+    for path, text, _ in LibraryTexts(20, seed):
+        random_source = random.Random(f"{seed} {path.name}")
+        for each in (text, Broken(text, random_source)[0]):
+            starts = StartsOfParts(analyze(each), each, random_source)
+            joined, whole = DumpJoinedNames(each, 314, starts)
+            assert joined == whole, path
 
 
 # Questions

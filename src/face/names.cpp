@@ -1,11 +1,16 @@
 #include "face/names.h"
 
 #include <string>
+#include <vector>
 
+#include <nanobind/stl/vector.h>
+
+#include "file/file_analyzer.h"
 #include "host/errors.h"
 #include "host/text.h"
 #include "names/name_walker.h"
 #include "names/record_kinds.h"
+#include "scopes/join_names.h"
 #include "syntax/line_parser.h"
 #include "tokenizer/tokenizer.h"
 
@@ -65,6 +70,50 @@ nb::list DumpNames(nb::str text, int version, bool has_print_function, bool with
     return lines;
 }
 
+// All that is told of a text's names.
+std::string ShownNames(const CTextNames& names) {
+    std::string shown;
+    const auto add = [&](auto... numbers) { ((shown += std::to_string(numbers) + ' '), ...); };
+    const auto add_name = [&](uint32_t name) { (shown += names.occurrences.names->Text(name)) += '\n'; };
+    for (uint32_t i = 0; i < names.occurrences.items.size(); ++i) {
+        const COccurrence& item = names.occurrences.items[i];
+        add(item.start, item.end, item.object_start, item.object_end, static_cast<int>(item.role), item.flags,
+            names.ScopeOfOccurrence(i), names.scopes.symbol_of[i]);
+        add_name(item.name);
+    }
+    for (const CScope& scope : names.scopes.scopes) {
+        add(static_cast<int>(scope.kind), scope.parent, scope.start, scope.end, scope.has_lost_lines);
+        add_name(scope.name);
+    }
+    for (const CSymbol& symbol : names.scopes.symbols) {
+        add(symbol.scope, symbol.home, symbol.flags, static_cast<int>(symbol.binding));
+        add_name(symbol.name);
+    }
+    return shown;
+}
+
+nb::tuple DumpJoinedNames(nb::str text, int version, const std::vector<uint32_t>& starts) {
+    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    const CUtf8 utf8(text);
+    const std::string_view whole = utf8;
+    CFileSettings settings;
+    settings.version = version;
+    settings.wants_records = false;
+    settings.wants_names = true;
+    settings.names = std::make_shared<CNameTable>();
+    std::vector<CFileAnalysis> analyses;
+    for (size_t i = 0; i < starts.size(); ++i) {
+        const size_t end = i + 1 < starts.size() ? starts[i + 1] : whole.size();
+        if (starts[i] > end || end > whole.size()) RaiseHost(PyExc_ValueError, "starts are out of order");
+        analyses.push_back(AnalyzeFile(whole.substr(starts[i], end - starts[i]), settings, {}));
+    }
+    std::vector<CNamePart> parts;
+    for (size_t i = 0; i < starts.size(); ++i) parts.push_back({&analyses[i].names, starts[i]});
+    const std::string joined = ShownNames(JoinNames(parts, settings.names));
+    const std::string in_one_go = ShownNames(AnalyzeFile(whole, settings, {}).names);
+    return nb::make_tuple(nb::str(joined.data(), joined.size()), nb::str(in_one_go.data(), in_one_go.size()));
+}
+
 }  // namespace
 
 void BindNames(nb::module_& module) {
@@ -79,6 +128,11 @@ void BindNames(nb::module_& module) {
         "none), and the records: name, info bytes, whether of an argument, and the bytes of the text at "
         "which "
         "the name is. `version` is 312 for Python 3.12.");
+    module.def("DumpJoinedNames", &DumpJoinedNames, "text"_a, "version"_a, "starts"_a,
+               nb::sig("def DumpJoinedNames(text: str, version: int, starts: list[int]) -> tuple[str, str]"),
+               "For developers: the names of a text joined from those of its parts, which begin at these "
+               "bytes, and those of the text in one go. Both are the same where each part begins with a "
+               "statement of the module.");
 }
 
 }  // namespace codeloom

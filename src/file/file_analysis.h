@@ -7,6 +7,7 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <optional>
 #include <string_view>
 #include <vector>
@@ -29,6 +30,8 @@ struct CFileSettings {
     bool wants_records = true;
     const CTimeLimit* time_limit = nullptr;  // none unless given
     bool wants_names = false;                // occurrences, scopes, signatures and hints
+    // Gets the names of the text; null for a table of its own. Not for two threads at once.
+    std::shared_ptr<CNameTable> names;
 };
 
 // A logical line: from its first token to the end of its last one, a comment at its end included.

@@ -11,6 +11,7 @@
 #include "rules/text_checker.h"
 #include "scopes/declarations.h"
 #include "scopes/name_collector.h"
+#include "scopes/scope_builder.h"
 #include "signatures/signature_finder.h"
 #include "tokenizer/tokenizer.h"
 #include "typing/false_hints.h"
@@ -55,6 +56,8 @@ class CFileAnalyzer final : CTreeObserver {
           _fMayDeclareNames(!_fDeclarations.IsEmpty()),
           _fWantsAllNames(settings.wants_names || wants_all_names),
           _fSignatures(_fResult.signatures) {
+        if (settings.names) _fResult.records.names = settings.names;
+        if (settings.names) _fResult.records.names = settings.names;
         _fResult.names.occurrences.names = _fResult.records.names;
         if (settings.wants_names || _fMayDeclareNames)
             _fNames.emplace(LanguageOf(settings.version), _fMayDeclareNames, _fResult.names);
@@ -255,6 +258,7 @@ void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::s
 
 void CFileAnalyzer::_FinishNames() {
     _fNames->Finish();
+    BuildScopes(_fResult.names);
     _fNeedsAllNames |= !_fWantsAllNames && DeclaresInModule(_fResult.names);
     if (_fMayDeclareNames) CheckDeclarations(_fResult.names, _fSettings.version, _fResult.problems);
     if (!_fSettings.wants_names) _fResult.names = {};

@@ -27,6 +27,10 @@ class COccurrenceFinder {
     COccurrenceFinder(const CLanguage& language, COccurrences& found)
         : _fLanguage(language), _fFound(found), _fNoName(found.names->Number({})) {}
 
+    // True after an import from the future that defers annotations, which may come before a part of a text.
+    bool HasDeferredAnnotations() const { return _fHasDeferredAnnotations; }
+    void SetDefersAnnotations(bool defers) { _fHasDeferredAnnotations = defers; }
+
     // Call for every line, in order.
     void BeginLine(const CRawLogical& line);
 

@@ -98,12 +98,12 @@ static_assert(std::is_trivially_copyable_v<COccurrence>);
 // A scope that begins on a line, in the order of the source.
 struct CInnerScope {
     EScopeKind kind = EScopeKind::kFunction;
-    bool is_lost = false;  // its header has a fault: what it binds isn't known
-    bool is_text = false;  // annotations that are kept as text, which no code is made of
+    bool is_lost = false;      // its header has a fault: what it binds isn't known
+    bool is_text = false;      // annotations that are kept as text, which no code is made of
     bool is_of_class = false;  // type parameters of a class
-    uint32_t name = 0;     // of a definition or alias; number of the empty name for others
-    uint32_t parent = 0;   // counted like the scope of an occurrence
-    uint32_t start = 0;    // bytes of its header or expression
+    uint32_t name = 0;         // of a definition or alias; number of the empty name for others
+    uint32_t parent = 0;       // counted like the scope of an occurrence
+    uint32_t start = 0;        // bytes of its header or expression
     uint32_t end = 0;
 };
 

@@ -3,7 +3,6 @@
 #include <algorithm>
 
 #include "scopes/lost_bindings.h"
-#include "scopes/scope_builder.h"
 
 namespace codeloom {
 
@@ -41,7 +40,7 @@ void CNameCollector::EndLine(const CRawLogical& line, bool has_fault, const CBlo
 }
 
 void CNameCollector::_NoteLostLine(const CRawLogical& line, EClause clause, uint32_t opened_scope) {
-    _fLostLines.push_back(static_cast<uint32_t>(_fNames.lines.size() - 1));
+    _fNames.lines.back().has_fault = true;
     for (const CRawToken& token : line.tokens)
         if (token.type == kTokenId_NAME && token.word == EWord::kNone)
             _fNames.lost_names.push_back(_fNames.occurrences.names->Number(line.Text(token)));
@@ -75,7 +74,6 @@ void CNameCollector::Finish() {
     std::vector<uint32_t>& lost = _fNames.lost_names;
     std::sort(lost.begin(), lost.end());
     lost.erase(std::unique(lost.begin(), lost.end()), lost.end());
-    BuildScopes(_fNames, _fLostLines);
 }
 
 }  // namespace codeloom

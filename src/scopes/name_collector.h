@@ -22,8 +22,12 @@ class CNameCollector {
     }
     void EndLine(const CRawLogical& line, bool has_fault, const CBlockTracker& blocks);
 
-    // Call once, after the last line.
+    // Call once, after the last line. Scopes are then to be built.
     void Finish();
+
+    // Whether an import from the future defers annotations: what came before a part of a text says so.
+    void SetDefersAnnotations(bool defers) { _fFinder.SetDefersAnnotations(defers); }
+    bool DefersAnnotations() const { return _fFinder.HasDeferredAnnotations(); }
 
   private:
     void _NoteLostLine(const CRawLogical& line, EClause clause, uint32_t opened_scope);
@@ -33,7 +37,6 @@ class CNameCollector {
     COccurrenceFinder _fFinder;
     CBlockScopes _fBlocks;
     const bool _fMayDeclareNames;
-    std::vector<uint32_t> _fLostLines;  // by number
 };
 
 }  // namespace codeloom

@@ -38,7 +38,7 @@ class CScopeBuilder {
         names.scopes.symbols.Reserve(names.occurrences.items.size() / 2 + 1);
     }
 
-    void Run(std::span<const uint32_t> lost_lines);
+    void Run();
 
   private:
     void _AddScopes();
@@ -72,10 +72,8 @@ class CScopeBuilder {
     std::vector<uint8_t> _fIsBoundAround;  // in a scope that those within it see
 };
 
-void CScopeBuilder::Run(std::span<const uint32_t> lost_lines) {
+void CScopeBuilder::Run() {
     _AddScopes();
-    for (const uint32_t line_i : lost_lines)
-        _fScopes.scopes[_fNames.lines[line_i].scope].has_lost_lines = true;
     _NotePrivateNames();
     _AddOccurrences();
     for (const CLostBinding& binding : _fNames.lost_bindings)
@@ -107,6 +105,7 @@ void CScopeBuilder::_AddScopes() {
             scope.end = inner[i].end;
         }
         scopes[line.scope].end = std::max(scopes[line.scope].end, line.end);
+        scopes[line.scope].has_lost_lines |= line.has_fault;
     }
 }
 
@@ -336,8 +335,8 @@ void CScopeBuilder::_PassOn(uint32_t symbol_i, uint32_t home) {
 
 }  // namespace
 
-void BuildScopes(CTextNames& names, std::span<const uint32_t> lost_lines) {
-    CScopeBuilder(names).Run(lost_lines);
+void BuildScopes(CTextNames& names) {
+    CScopeBuilder(names).Run();
 }
 
 void CTextNames::Shrink() {

@@ -1,11 +1,13 @@
 // scopes/: which scope each name of a text belongs to.
 //   in     the occurrences of each line, and the blocks around it
 //   out    scopes with their symbols; for each occurrence the symbol that it is, and so the scope that binds
-//   it keeps  nothing start  at CNameCollector, which gathers a text's lines; BuildScopes makes scopes of
-//   them
+//          it
+//   keeps  nothing
+//   start  at CNameCollector, which gathers a text's lines; BuildScopes makes scopes of them
 //
 // block_scopes.h     the scope around a line, by its blocks
 // scope_builder.cpp  symbols, then where each is bound
+// join_names.h       the names of a text out of those of its parts
 // lost_bindings.cpp  what a line with a fault binds by all appearances
 // declarations.cpp   what is wrong with `global` and `nonlocal`
 // A line with a fault is a gap: nothing is known of its names but that they stand there, and what it plainly
@@ -26,6 +28,7 @@ struct CLineNames {
     uint32_t scope = 0;        // around the line, among all
     uint32_t end = 0;          // of the line in bytes; zero for a comment
     bool is_in_doubt = false;  // a fault may have moved what is around it
+    bool has_fault = false;
 };
 
 // What a line with a fault binds by all appearances.

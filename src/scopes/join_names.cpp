@@ -1,0 +1,80 @@
+#include "scopes/join_names.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "scopes/scope_builder.h"
+
+namespace codeloom {
+
+namespace {
+
+// Appends part by part.
+class CNameJoiner {
+  public:
+    explicit CNameJoiner(CTextNames& joined) : _fJoined(joined) {}
+
+    void Append(const CNamePart& part) {
+        const CTextNames& names = *part.names;
+        _fStart = part.start;
+        _fFirstOccurrence = static_cast<uint32_t>(_fJoined.occurrences.items.size());
+        _fFirstScope = static_cast<uint32_t>(_fJoined.occurrences.scopes.size());
+        for (const COccurrence& occurrence : names.occurrences.items) _Append(occurrence);
+        for (const CInnerScope& scope : names.occurrences.scopes) _Append(scope);
+        for (const CLineNames& line : names.lines) _Append(line);
+        for (const CLostBinding& binding : names.lost_bindings)
+            _fJoined.lost_bindings.push_back({binding.name, _Moved(binding.scope)});
+        _fJoined.lost_names.insert(_fJoined.lost_names.end(), names.lost_names.begin(),
+                                   names.lost_names.end());
+    }
+
+  private:
+    void _Append(COccurrence occurrence) {
+        occurrence.start += _fStart;
+        occurrence.end += _fStart;
+        if (occurrence.object_start != occurrence.object_end) {
+            occurrence.object_start += _fStart;
+            occurrence.object_end += _fStart;
+        }
+        _fJoined.occurrences.items.push_back(occurrence);
+    }
+
+    void _Append(CInnerScope scope) {
+        scope.start += _fStart;
+        scope.end += _fStart;
+        _fJoined.occurrences.scopes.push_back(scope);
+    }
+
+    // A comment has no end.
+    void _Append(CLineNames line) {
+        line.first_occurrence += _fFirstOccurrence;
+        line.first_scope += _fFirstScope;
+        line.scope = _Moved(line.scope);
+        if (line.end != 0) line.end += _fStart;
+        _fJoined.lines.push_back(line);
+    }
+
+    // The module is the same scope for all.
+    uint32_t _Moved(uint32_t scope) const { return scope == 0 ? 0 : scope + _fFirstScope; }
+
+    CTextNames& _fJoined;
+    uint32_t _fStart = 0;
+    uint32_t _fFirstOccurrence = 0;
+    uint32_t _fFirstScope = 0;
+};
+
+}  // namespace
+
+CTextNames JoinNames(std::span<const CNamePart> parts, std::shared_ptr<CNameTable> table) {
+    CTextNames joined;
+    joined.occurrences.names = std::move(table);
+    CNameJoiner joiner(joined);
+    for (const CNamePart& part : parts) joiner.Append(part);
+    std::vector<uint32_t>& lost = joined.lost_names;
+    std::sort(lost.begin(), lost.end());
+    lost.erase(std::unique(lost.begin(), lost.end()), lost.end());
+    BuildScopes(joined);
+    return joined;
+}
+
+}  // namespace codeloom

@@ -1,0 +1,21 @@
+// The names of a text out of those of its parts. What a part says of names doesn't change with its place, so
+// that after an edit only the part around it is gone over anew, and the scopes are made of what is there.
+#pragma once
+
+#include <memory>
+#include <span>
+
+#include "scopes/text_names.h"
+
+namespace codeloom {
+
+// A part begins with a statement of the module. Its places count from its beginning; scopes needn't be built.
+struct CNamePart {
+    const CTextNames* names = nullptr;
+    uint32_t start = 0;  // of the part, in bytes of the text
+};
+
+// The names with their scopes, as those of the text in one go. All parts have their names in `table`.
+CTextNames JoinNames(std::span<const CNamePart> parts, std::shared_ptr<CNameTable> table);
+
+}  // namespace codeloom
