@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <cassert>
+#include <optional>
 
 #include "causes/recognisers.h"
 #include "line/fault_words.h"
@@ -116,16 +117,55 @@ bool IsHint(const CFault& fault, ELogicalType part) {
            part == ELogicalType::kCommentedTypeHint;
 }
 
-CProblem CauseOfHint(const CFault& fault, const CRawLogical& line, const CFaultyLine& faulty) {
-    const bool is_stringified = faulty.LineType() == ELogicalType::kStringifiedTypeHint;
-    CProblem problem = faulty.Problem(
-        ECode::kInvalidHint, faulty.At(), faulty.At(),
-        is_stringified ? "invalid syntax in stringified type hint" : "invalid syntax in commented type hint");
+//   (int, str) -> int    a function's hint has two sides, each an expression; `place` is on one of them
+CRawLogical SideOfArrow(const CRawLogical& hint, uint32_t place) {
+    CRawLogical side = hint;
+    int depth = 0;
+    for (size_t i = 0; i < hint.tokens.size(); ++i) {
+        const CRawToken& token = hint.tokens[i];
+        depth += IsOpenerType(token.type) - IsCloserType(token.type);
+        if (depth != 0 || token.word != EWord::kArrow) continue;
+        const auto arrow = side.tokens.begin() + static_cast<ptrdiff_t>(i);
+        if (place > token.start) {
+            side.tokens.erase(side.tokens.begin(), arrow + 1);
+        } else {
+            side.tokens.erase(arrow, side.tokens.end());
+        }
+        break;
+    }
+    return side;
+}
+
+// The hint as a line of its own, which has its tokens and its fault; none where only the whole shows it.
+std::optional<CProblem> CauseWithin(const CSpan& place, const CRawLogical& line, const CFaultyLine& faulty,
+                                    CLineProbe& probe) {
+    if (faulty.LineType() == ELogicalType::kStringifiedTypeHint) return CauseOfSyntax(faulty);
+    for (const CRawLogical& part : line.embedded) {
+        const bool is_meant =
+            part.type == ELogicalType::kCommentedTypeHint && part.EndOf(part.tokens.back()) >= place.start;
+        if (!is_meant) continue;
+        const CRawLogical side = SideOfArrow(part, place.start);
+        const int token_i = side.tokens.empty() ? CLineProbe::kSound : probe.FaultWith(side, false, {});
+        if (token_i == CLineProbe::kSound) return {};
+        return CauseOfSyntax({line, side, static_cast<uint32_t>(token_i), faulty.Language(), probe});
+    }
+    return {};
+}
+
+CProblem CauseOfHint(const CFault& fault, const CRawLogical& line, const CFaultyLine& faulty,
+                     CLineProbe& probe) {
     const CSpan place = PlaceOf(fault, line);
-    if (place.start == place.end) return problem;
-    problem.start = place.start;
-    problem.end = place.end;
-    return problem;
+    std::optional<CProblem> cause = CauseWithin(place, line, faulty, probe);
+    if (!cause) {
+        cause = faulty.Problem(ECode::kInvalidHint, faulty.At(), faulty.At(), "invalid syntax");
+        if (place.start < place.end) {
+            cause->start = place.start;
+            cause->end = place.end;
+        }
+    }
+    cause->code = ECode::kInvalidHint;
+    cause->message.insert(0, "type hint: ");
+    return *cause;
 }
 
 }  // namespace
@@ -140,7 +180,7 @@ CProblem CCauses::Of(const CFault& fault, const CRawLogical& line) {
     const CRawLogical& part = PartAtFault(fault, line);
     const CFaultyLine faulty(line, part, fault.token_i, _fLanguage, *_fProbe);
     const int at = faulty.At();
-    if (IsHint(fault, part.type)) return CauseOfHint(fault, line, faulty);
+    if (IsHint(fault, part.type)) return CauseOfHint(fault, line, faulty, *_fProbe);
     switch (fault.kind) {
         case EFault::kNewerForm:
             return faulty.Problem(fault.form->version == CForm::kNone ? ECode::kEndedForm : ECode::kNewerForm,

@@ -59,7 +59,10 @@ CCause SideBySide(const CFaultyLine& line) {
     const bool is_header =
         line.IsKeyword(0) && line.FindBack(0, i, kTokenId_COLON) < 0 && line.Takes(kTokenId_COLON);
     return line.Problem(ECode::kSideBySide, i, i,
-                        Joined("expected an operator or ", is_header ? "':'" : "the end of the statement",
+                        Joined("expected an operator or ",
+                               is_header       ? "':'"
+                               : line.IsHint() ? "the end of the hint"
+                                               : "the end of the statement",
                                " before ", Quoted(line.Text(i))));
 }
 

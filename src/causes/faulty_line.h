@@ -28,6 +28,11 @@ class CFaultyLine {
     // In braces of an f-string or a t-string; `Outer` is the line that holds the string.
     bool IsField() const { return _fPart.type == ELogicalType::kFstringFieldExp; }
     const CRawLogical& Outer() const { return _fOuter; }
+    // In quotes or in a comment.
+    bool IsHint() const {
+        return LineType() == ELogicalType::kStringifiedTypeHint ||
+               LineType() == ELogicalType::kCommentedTypeHint;
+    }
 
     // Indexes of tokens. At is Count where the line ends too early.
     int At() const { return _fAt; }

@@ -94,7 +94,7 @@ CCause ForeignComment(const CFaultyLine& line) {
     };
     for (int i = 0; i <= line.At(); ++i) {
         const bool is_row = i == 0 && line.Is(i, kTokenId_DOUBLESLASH);
-        if (!is_row && !begins(i)) continue;
+        if (!is_row && (!begins(i) || line.IsInBrackets(i))) continue;
         return line.Problem(ECode::kForeignText, i, is_row ? i : i + 1,
                             Joined("'", is_row ? "//" : "/*", "' doesn't begin a comment in Python"),
                             "begin a comment with '#'");
@@ -119,7 +119,7 @@ CCause ConflictMarker(const CFaultyLine& line) {
 }
 
 CCause ForeignText(const CFaultyLine& line) {
-    if (line.IsField() || line.LineType() == ELogicalType::kStringifiedTypeHint) return {};
+    if (line.IsField() || line.IsHint()) return {};
     for (const auto recogniser : {Prompt, Markup, ForeignComment, ShellCommand})
         if (CCause cause = recogniser(line)) return cause;
     return {};

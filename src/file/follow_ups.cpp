@@ -20,7 +20,7 @@ char QuoteAt(std::string_view text, uint32_t start) {
 
 }  // namespace
 
-bool CFollowUps::Take(const CProblem& problem, const CRawLogical& line, const CProblems& reported) {
+bool CFollowUps::Take(const CProblem& problem, const CRawLogical& line, CProblems& reported) {
     bool follows = false;
     switch (problem.code) {
         case ECode::kForeignText:
@@ -36,7 +36,7 @@ bool CFollowUps::Take(const CProblem& problem, const CRawLogical& line, const CP
             follows = _EndsTriple(problem, line.file_text);
             break;
         case ECode::kUnmatchedCloser:
-            follows = _ClosesEarlier(problem, line);
+            follows = _ClosesEarlier(problem, line, reported);
             break;
         default:
             break;
@@ -72,7 +72,7 @@ bool CFollowUps::_EndsTriple(const CProblem& problem, std::string_view text) {
 //   )           stands where the line began
 //   (def f():
 //       pass)   ends what the other one began
-bool CFollowUps::_ClosesEarlier(const CProblem& problem, const CRawLogical& line) {
+bool CFollowUps::_ClosesEarlier(const CProblem& problem, const CRawLogical& line, CProblems& reported) {
     const CRawToken& first = line.tokens.front();
     const CRawToken& last = line.tokens.back();
     const bool is_first = line.StartOf(first) == problem.start;
@@ -84,6 +84,9 @@ bool CFollowUps::_ClosesEarlier(const CProblem& problem, const CRawLogical& line
     };
     const auto found = std::find_if(_fOpen.rbegin(), _fOpen.rend(), closes);
     if (found == _fOpen.rend()) return false;
+    for (CProblem& earlier : reported)
+        if (earlier.code == ECode::kNeverClosed && earlier.start == found->start)
+            earlier.related.push_back({problem.start, problem.end, "closes it, after a statement"});
     _fOpen.erase(found.base() - 1, _fOpen.end());
     return true;
 }
@@ -92,7 +95,8 @@ void CFollowUps::_NoteOpen(const CRawLogical& line) {
     const size_t before = _fOpen.size();
     for (const CRawToken& token : line.tokens) {
         if (IsOpenerType(token.type))
-            _fOpen.push_back({token.type, line.tokens.front().position.col, &token == line.tokens.data()});
+            _fOpen.push_back(
+                {token.type, token.start, line.tokens.front().position.col, &token == line.tokens.data()});
         if (IsCloserType(token.type) && _fOpen.size() > before) _fOpen.pop_back();
     }
 }

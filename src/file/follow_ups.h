@@ -16,7 +16,7 @@ namespace codeloom {
 class CFollowUps {
   public:
     // True for one that isn't to be reported. `reported` are the problems so far.
-    bool Take(const CProblem& problem, const CRawLogical& line, const CProblems& reported);
+    bool Take(const CProblem& problem, const CRawLogical& line, CProblems& reported);
 
     // Call once, after the last line: drops what lies within conflicts of a merge, whose two versions are
     // both there.
@@ -26,11 +26,12 @@ class CFollowUps {
     // A bracket that its line leaves open, since the line is broken off.
     struct COpen {
         int16_t type;
+        uint32_t start;
         int32_t column;  // of its line
         bool is_first;   // it begins the line
     };
 
-    bool _ClosesEarlier(const CProblem& problem, const CRawLogical& line);
+    bool _ClosesEarlier(const CProblem& problem, const CRawLogical& line, CProblems& reported);
     bool _EndsTriple(const CProblem& problem, std::string_view text);
     void _NoteOpen(const CRawLogical& line);
     void _NoteConflict(const CProblem& problem, std::string_view text);
