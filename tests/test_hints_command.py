@@ -1,4 +1,4 @@
-"""`codeloom hints` and the signatures behind it.
+"""`codeloom hints` and what it tells of each def.
 
 Golden files in signatures/ hold sources with what the command prints of them.
 """
@@ -16,14 +16,14 @@ from test_library import LibraryTexts
 
 from codeloom import analyze, analyze_file
 from codeloom.cli.console import Console
+from codeloom.cli.defs import Argument, Value, defs_of
 from codeloom.cli.hints import HintsCommand
 from codeloom.cli.items import Finding, show_items
 from codeloom.cli.source import Source
-from codeloom.signatures import Argument, Value, signatures_of
 
 
-def Signatures(text, python="3.12"):
-    return signatures_of(analyze(text, python=python))
+def Defs(text, python="3.12"):
+    return [found for _, found in defs_of(analyze(text, python=python))]
 
 
 def Printed(source):
@@ -55,45 +55,44 @@ def DefsByTree(tree):
             yield node.lineno, node.name, *((name, Plain(hint and ast.unparse(hint))) for name, hint in hints)
 
 
-def Def(signature):
-    arguments = ((argument.name, Plain(argument.hint)) for argument in signature.arguments if argument.name)
-    name = signature.name.rpartition(".")[2]
-    return signature.row, name, *arguments, ("return", Plain(signature.return_hint))
+def Def(found):
+    arguments = ((argument.name, Plain(argument.hint)) for argument in found.arguments if argument.name)
+    name = found.name.rpartition(".")[2]
+    return found.range.row, name, *arguments, ("return", Plain(found.return_hint))
 
 
 def test_signatures_are_those_of_the_interpreter(seed):
     for path, text, tree in LibraryTexts(80, seed):
         if "# type:" not in text:
-            signatures = Signatures(text)
-            ours = {Def(signature) for signature in signatures if signature.problem is None}
+            defs = Defs(text)
+            ours = {Def(found) for found in defs if found is not None}
             theirs = {*DefsByTree(tree)}
-            assert ours <= theirs and len(theirs) <= len(signatures), (seed, path)
+            assert ours <= theirs and len(theirs) <= len(defs), (seed, path)
 
 
 def test_an_api_of_values(tmp_path):
     path = tmp_path / "a.py"
     path.write_text("class A:\n  def f(self, a: int = 1): return 2\n  def g(self):\n    return b\n")
-    f, g = signatures_of(analyze_file(path))
-    assert (f.path, f.row, f.column, f.name) == (str(path), 2, 3, "A.f")
+    (_, f), (_, g) = defs_of(analyze_file(path))
+    assert (f.range.row, f.range.column, f.name) == (2, 3, "A.f")
     assert f.arguments == (Argument("self"), Argument("a", "", "int", Value(2, "int", "1")))
-    assert (f.returns, g.returns) == ((), (Value(4, None, "b"),))
+    assert (f.returns, g.returns) == ([], [Value(4, None, "b")])
     with pytest.raises(FileNotFoundError):
         analyze_file(tmp_path / "absent.py")
 
 
 def test_depth():
     text = "[" * 199 + "]" * 199
-    (signature,) = Signatures(f"def f(a={text}): pass")
-    assert signature.arguments[0].default.text == text
-    (signature,) = Signatures(f"def f(a={'[' * 20_000}{']' * 20_000}): pass")
-    assert signature.problem.code == "CL904"
-    (signature,) = Signatures(f"def f({'(' * 20_000}a,{')' * 20_000}): pass", "2.7")
-    assert signature.arguments is None
+    (found,) = Defs(f"def f(a={text}): pass")
+    assert found.arguments[0].default.text == text
+    assert Defs(f"def f(a={'[' * 20_000}{']' * 20_000}): pass") == [None]
+    (found,) = Defs(f"def f({'(' * 20_000}a,{')' * 20_000}): pass", "2.7")
+    assert found.arguments is None
 
 
 def test_what_a_signature_is_written_as():
     """Defaults as they stand, hints in quotes by their value; a comment must fit the arguments."""
-    (f,) = Signatures("def f(a=('==', '<'), b: \"Literal['\\\\n']\" = 'x'): pass")
+    (f,) = Defs("def f(a=('==', '<'), b: \"Literal['\\\\n']\" = 'x'): pass")
     assert [argument.default.text for argument in f.arguments] == ["('==', '<')", "'x'"]
     assert f.arguments[1].hint == "Literal['\\n']"
     text = "class A:\n  def f(self, a, b):\n    # type: ({}) -> c\n    pass\n"
@@ -103,8 +102,8 @@ def test_what_a_signature_is_written_as():
         ("x", [None, None, None]),
         ("s, x, y, z", [None, None, None]),
     ]:
-        (signature,) = Signatures(text.format(hints))
-        assert [argument.hint for argument in signature.arguments] == found
+        (known,) = Defs(text.format(hints))
+        assert [argument.hint for argument in known.arguments] == found
 
 
 @pytest.mark.parametrize(

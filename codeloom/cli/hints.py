@@ -11,7 +11,7 @@ from codeloom.cli.source import Source
 from codeloom.cli.source_command import SourceCommand
 
 if TYPE_CHECKING:
-    from codeloom.signatures import Argument, Signature, Value
+    from codeloom.cli.defs import Argument, Def, Value
 
 _INDENT = "    "
 _CUT = "..."
@@ -20,13 +20,13 @@ _CUT = "..."
 class SignatureItem(Item):
     """A def that is sound."""
 
-    def __init__(self, source: Source, signature: "Signature") -> None:
+    def __init__(self, source: Source, signature: "Def") -> None:
         self._source = source
         self._signature = signature
 
     @property
     def _place(self) -> Range:
-        row, column = self._signature.row, self._signature.column
+        row, column = self._signature.range.row, self._signature.range.column
         return Range(row, column, row, column)
 
     def show(self, console: Console) -> None:
@@ -75,7 +75,7 @@ class SignatureItem(Item):
         return {"row": self._source.cell_and_row(value.row)[1], "type": value.type, "text": value.text}
 
 
-def _head(signature: "Signature") -> str:
+def _head(signature: "Def") -> str:
     arguments = signature.arguments
     names = ", ".join(argument.prefix + (argument.name or "") for argument in arguments or ())
     if arguments is None:  # nested too deep to be listed
@@ -85,7 +85,7 @@ def _head(signature: "Signature") -> str:
     return f"{head}{f'[{parameters}]' if parameters else ''}({names})"
 
 
-def _rows(signature: "Signature") -> Iterator[tuple[str, str]]:
+def _rows(signature: "Def") -> Iterator[tuple[str, str]]:
     for argument in signature.arguments or ():
         yield argument.prefix + (argument.name or ""), _described(argument)
     yield "returns", signature.return_hint or ""
@@ -132,12 +132,13 @@ class HintsCommand(SourceCommand):
 
     def items(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
         """The defs, and the problems of those that aren't sound."""
-        from codeloom.signatures import signatures_of  # it loads the engine
+        from codeloom.cli.defs import defs_of  # only this command needs it
 
         by_place = {(finding.range, finding.code): finding for finding in findings}
-        for signature in signatures_of(source.analysis):
-            problem = signature.problem
-            if problem is None:
-                yield SignatureItem(source, signature)
-            elif finding := by_place.get((problem.range, problem.code)):
-                yield finding
+        for line, found in defs_of(source.analysis):
+            if found is not None:
+                yield SignatureItem(source, found)
+                continue
+            for problem in line.problems[:1]:
+                if finding := by_place.get((problem.range, problem.code)):
+                    yield finding
