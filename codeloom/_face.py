@@ -35,8 +35,7 @@ def analyze(
         text = source_from_bytes(bytes(source))
     else:
         raise TypeError(f"source must be str or bytes, not {type(source).__name__}")
-    if not isinstance(false_hints, bool):
-        raise TypeError(f"false_hints must be a bool, not {type(false_hints).__name__}")
+    _check_flag("false_hints", false_hints)
     return Analysis(
         text.utf8,
         _path_text(path),
@@ -101,7 +100,13 @@ def analyze_paths(
     """
     if isinstance(paths, str | bytes | os.PathLike):
         raise TypeError("paths must be an iterable of paths, not a single one")
+    if not isinstance(paths, Iterable):
+        raise TypeError(f"paths must be an iterable of paths, not {type(paths).__name__}")
     names = [_path_text(path) for path in paths]
+    _check_flag("false_hints", false_hints)
+    _check_flag("records", records)
+    if on_error is not None and not callable(on_error):
+        raise TypeError(f"on_error must be callable, not {type(on_error).__name__}")
     version_number(python)
     if jobs is None:
         jobs = processor_count()
@@ -152,6 +157,11 @@ def _is_plain(name: str) -> bool:
 def processor_count() -> int:
     """How many processors this process may use."""
     return len(os.sched_getaffinity(0)) if hasattr(os, "sched_getaffinity") else os.cpu_count() or 1
+
+
+def _check_flag(name: str, value: object) -> None:
+    if not isinstance(value, bool):
+        raise TypeError(f"{name} must be a bool, not {type(value).__name__}")
 
 
 def _path_text(path: str | os.PathLike[str]) -> str:

@@ -182,8 +182,8 @@ def IsAlnumAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int) -> bool:
 def IsIdentifierCharAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int, initial: bool) -> bool:
     """
     True when the character at byte `pos` could be part of a name, its first character if `initial`;
-    False when `pos` isn't in the buffer. Beyond ASCII, a character that isn't a name on its own and no
-    digit is refused. ValueError when `end_pos` lies outside the buffer.
+    False when `pos` isn't in the buffer. Beyond ASCII, a character that is neither a name on its own nor
+    a digit is refused. ValueError when `end_pos` lies outside the buffer.
     """
 
 def PtrFindByte(ptr: bytes | str, length: int, c: int | bytes | str, start: int) -> int:

@@ -160,6 +160,42 @@ class TestFiles:
             "codeloom: can't read ./self.py: Too many levels of symbolic links",
         ]
 
+    @pytest.mark.parametrize("jobs", ["1", "2"])
+    def test_files_that_vanish(self, write_files, cli_environment, jobs):
+        """Between the search and the reading; the others are read."""
+        folder = write_files({f"{i:03}.py": "x = )\n" for i in range(300)})
+        program = f"""if True:
+            import os, sys, codeloom.cli as cli, codeloom.cli.run as run
+            find = run.find_files
+            def find_and_remove(*arguments):
+                for path in find(*arguments):
+                    if path.endswith("7.py"):
+                        os.remove(path)
+                    yield path
+            run.find_files = find_and_remove
+            sys.exit(cli.main(["check", "--jobs", "{jobs}", "--format", "concise", "."]))"""
+        command = [sys.executable, "-P", "-c", program]
+        done = subprocess.run(command, capture_output=True, text=True, cwd=folder, env=cli_environment)
+        gone = [f"{i:03}.py" for i in range(300) if i % 10 == 7]
+        assert done.returncode == 2
+        assert done.stderr.splitlines() == [
+            f"codeloom: can't read ./{name}: No such file or directory" for name in gone
+        ]
+        assert len(done.stdout.splitlines()) == 300 - len(gone)
+
+    @pytest.mark.skipif(os.geteuid() == 0, reason="root may read everything")
+    def test_files_that_nobody_may_read(self, write_files, run_cli):
+        folder = write_files({"a.py": ")", "b/c.py": ")"})
+        (folder / "a.py").chmod(0)
+        (folder / "b").chmod(0)
+        done = run_cli("check", ".")
+        (folder / "b").chmod(0o755)
+        assert (done.returncode, done.stdout[:10]) == (2, "0 problems")
+        assert done.stderr.splitlines() == [
+            "codeloom: can't read ./a.py: Permission denied",
+            "codeloom: can't read ./b/: Permission denied",
+        ]
+
     def test_what_is_no_regular_file_or_no_source(self, write_files, run_cli):
         folder = write_files({"a.ipynb": "{}"})
         os.mkfifo(folder / "pipe")

@@ -1,6 +1,7 @@
 """Each code has its explanation, and the examples do what they say."""
 
 import importlib.util
+import json
 import re
 from pathlib import Path
 
@@ -48,3 +49,10 @@ def test_the_command(run_cli):
     assert len(run_cli("explain").stdout.splitlines()) == len(EXPLAINED)
     done = run_cli("explain", "CL999")
     assert (done.returncode, done.stdout) == (2, "") and "there is no code 'CL999'" in done.stderr
+
+
+def test_the_command_for_programs(run_cli):
+    items = json.loads(run_cli("explain", "cl101", "CL301", "--format", "json").stdout)["items"]
+    assert [(item["code"], item["wrong"]["is_made"]) for item in items] == [("CL101", True), ("CL301", False)]
+    assert items[1]["right"]["text"] == EXPLAINED["CL301"].right.text
+    assert len(run_cli("explain", "--format", "jsonl").stdout.splitlines()) == len(EXPLAINED) + 2

@@ -58,6 +58,8 @@ class TestJson:
             ("hints", "."),
             ("tree", "sub/sound.py"),
             ("tree", "-c", "x = [f'{a b}', )"),
+            ("explain",),
+            ("explain", "CL301", "cl101"),
         ],
     )
     def test_every_command_keeps_to_the_schema(self, write_files, run_cli, arguments):

@@ -90,6 +90,12 @@ def test_a_broken_line(run_cli):
     assert run_cli("tree", "-c", "case [a b]: pass").stdout.startswith("<string>:1:7: CL211 invalid")
 
 
+def test_a_row_for_each_line(write_files, run_cli):
+    write_files({"f.py": "x = 1\ny = )\n"})
+    rows = run_cli("tree", "f.py", "--format", "concise").stdout.splitlines()
+    assert rows == ["f.py:1:1: x = 1", "f.py:2:5: CL203 unmatched ')'"]
+
+
 def test_a_line_that_parses_and_is_refused(run_cli):
     """It has its problems above its tree; what only looks like a hint isn't a line."""
     done = run_cli("tree", "-c", "f() = 1")

@@ -4,8 +4,12 @@ import argparse
 
 from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Colour, Console
-from codeloom.cli.options import Options
+from codeloom.cli.formats import FOR_FACTS, format_named
+from codeloom.cli.formats.json import ObjectFormat
+from codeloom.cli.options import Options, add_output_arguments
 from codeloom.cli.project import WrongUseError, nearest
+from codeloom.cli.run import opened_console
+from codeloom.cli.tally import Tally
 from codeloom.explanations import Example, Explanation, explanations
 from codeloom.reading.languages import NEWEST
 
@@ -19,26 +23,51 @@ class ExplainCommand(Command):
     DESCRIPTION = (
         "Explain the code of a problem, with a wrong and a right example. Without a code, list all codes."
     )
-    EXAMPLES = ("codeloom explain CL301", "codeloom explain")
+    EXAMPLES = (
+        "codeloom explain CL301",
+        "codeloom explain",
+        "codeloom explain --format json | jq '.items[].code'",
+    )
+    FORMATS = FOR_FACTS
 
     @classmethod
     def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
         """Add the codes."""
         parser.add_argument("codes", nargs="*", metavar="CODE", help="a code such as CL301, in either case")
+        add_output_arguments(parser, cls.FORMATS)
 
     def run(self, options: Options) -> ExitStatus:
         """Print them; WrongUseError for a code that doesn't exist."""
-        console = Console()
         known = explanations()
         codes = [code.upper() for code in options.codes]
         for code in codes:
             if code not in known:
                 raise WrongUseError(f"there is no code {code!r}{nearest(code, known)}")
-        for code in codes:
-            _print(console, known[code])
-        if not codes:
-            console.print_table(("Code", "Title"), ((each.code, each.title) for each in known.values()))
+        chosen = [known[code] for code in codes or known]
+        with opened_console(options) as console:
+            if options.format == "text":
+                _print_all(console, chosen, is_list=not codes)
+            else:
+                _write_all(console, options.format, chosen)
         return ExitStatus.SOUND
+
+
+def _print_all(console: Console, chosen: list[Explanation], is_list: bool) -> None:
+    if is_list:
+        console.print_table(("Code", "Title"), ((each.code, each.title) for each in chosen))
+        return
+    for explanation in chosen:
+        _print(console, explanation)
+
+
+def _write_all(console: Console, name: str, chosen: list[Explanation]) -> None:
+    report = format_named(name)(console, ExplainCommand.NAME)
+    assert isinstance(report, ObjectFormat)
+    report.begin()
+    for explanation in chosen:
+        examples = {"wrong": explanation.wrong._asdict(), "right": explanation.right._asdict()}
+        report.add_fact({"type": "explanation", **explanation._asdict(), **examples})
+    report.end(Tally())
 
 
 def _print(console: Console, explanation: Explanation) -> None:

@@ -4,6 +4,7 @@
 
 #include "face/kinds.h"
 #include "face/name_items.h"
+#include "host/arguments.h"
 #include "host/errors.h"
 #include "host/text.h"
 
@@ -35,13 +36,14 @@ uint32_t OffsetOf(const CSourceFile& file, int row, int column) {
     return rows.Start(static_cast<uint32_t>(row - 1)) + static_cast<uint32_t>(pos);
 }
 
-nb::object OccurrenceAt(const CAnalysis& analysis, int row, int column) {
-    const uint32_t offset = OffsetOf(*analysis.file, row, column);
+nb::object OccurrenceAt(const CAnalysis& analysis, nb::handle row, nb::handle column) {
+    const uint32_t offset = OffsetOf(*analysis.file, IntArgument(row, "row"), IntArgument(column, "column"));
     const uint32_t found = QueriesOf(*analysis.file).OccurrenceAt(offset);
     return found == kNoIndex ? nb::none() : NewObject<COccurrenceItem>(analysis.file, found);
 }
 
-nb::object References(const CAnalysis& analysis, const COccurrenceItem& occurrence) {
+nb::object References(const CAnalysis& analysis, nb::handle argument) {
+    const auto& occurrence = InstanceArgument<COccurrenceItem>(argument, "occurrence", "an Occurrence");
     if (occurrence.file != analysis.file) RaiseHost(PyExc_ValueError, "occurrence is of another analysis");
     return TupleOf(analysis.file, QueriesOf(*analysis.file).References(occurrence.i));
 }
@@ -181,8 +183,9 @@ void BindNamesOfAnalysis(nb::class_<CAnalysis>& analysis) {
         "The scopes, in the order in which they begin; the module is the first.");
     analysis.def(
         "definitions",
-        [](const CAnalysis& self, nb::str name) {
-            return TupleOf(self.file, QueriesOf(*self.file).Definitions(name.c_str()));
+        [](const CAnalysis& self, nb::handle name) {
+            const nb::str text = StrArgument(name, "name");
+            return TupleOf(self.file, QueriesOf(*self.file).Definitions(text.c_str()));
         },
         "name"_a, nb::sig("def definitions(self, name: str) -> tuple[Occurrence, ...]"),
         "Where the name gets a value, in any scope. Which of them is the one at run time isn't known.");
@@ -196,8 +199,9 @@ void BindNamesOfAnalysis(nb::class_<CAnalysis>& analysis) {
                  "ValueError for less.");
     analysis.def(
         "unused",
-        [](const CAnalysis& self, bool parameters) {
-            return TupleOf(self.file, QueriesOf(*self.file).Unused(parameters));
+        [](const CAnalysis& self, nb::handle parameters) {
+            const bool with_parameters = BoolArgument(parameters, "parameters");
+            return TupleOf(self.file, QueriesOf(*self.file).Unused(with_parameters));
         },
         nb::kw_only(), "parameters"_a = false,
         nb::sig("def unused(self, *, parameters: bool = False) -> tuple[Occurrence, ...]"),

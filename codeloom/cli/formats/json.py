@@ -6,6 +6,7 @@ A document holds `run`, `items` and `summary`; in JSON Lines the same objects fo
 import json
 from abc import abstractmethod
 from collections.abc import Iterable
+from typing import Any
 
 from codeloom import __version__
 from codeloom.cli.formats.base import Format, failed_path
@@ -17,7 +18,7 @@ from codeloom.cli.tally import Tally
 VERSION = 1
 
 
-class _ObjectFormat(Format):
+class ObjectFormat(Format):
     """Writes objects as they come."""
 
     NEEDS_FINGERPRINTS = True
@@ -27,6 +28,10 @@ class _ObjectFormat(Format):
         for item in items:
             for text in item.json():
                 self._write(text)
+
+    def add_fact(self, fields: dict[str, Any]) -> None:
+        """Write an object that isn't about a source."""
+        self._write(json.dumps(fields))
 
     def add_failure(self, error: OSError) -> None:
         """Write an object for a file that can't be read."""
@@ -43,7 +48,7 @@ class _ObjectFormat(Format):
         """Write one object."""
 
 
-class JsonLinesFormat(_ObjectFormat):
+class JsonLinesFormat(ObjectFormat):
     """An object on each row."""
 
     def begin(self) -> None:
@@ -58,7 +63,7 @@ class JsonLinesFormat(_ObjectFormat):
         self._console.print_row(text)
 
 
-class JsonFormat(_ObjectFormat):
+class JsonFormat(ObjectFormat):
     """One document, with each object on a row of its own."""
 
     _separator = ""
