@@ -97,7 +97,7 @@ bool CLineAnalyzer::CImpl::_AnalyzeEmbedded(const CRawLogical& line) {
     return true;
 }
 
-// Hints in comments are read where they stand.
+// Hints in comments are read where they are.
 bool CLineAnalyzer::CImpl::_IsPassedOver(const CRawLogical& embedded) const {
     if (embedded.type == ELogicalType::kCommentedTypeHint) return true;
     return embedded.type == ELogicalType::kStringifiedTypeHint && _fRequest.false_hints != nullptr &&
@@ -131,8 +131,8 @@ void CLineAnalyzer::CImpl::_DropFrom(const CMark& mark) {
     _fRequest.records->values.CutTo(mark.values);
 }
 
-// Records of arguments stay with the embedded logical that they are about, which is no part of the text's
-// records. Only a statement where an expression should stand has any.
+// Records of arguments stay with the embedded logical that they are about, which isn't part of the text's
+// records. Only a statement where an expression should be has any.
 void CLineAnalyzer::CImpl::_DropArgumentsFrom(const CMark& mark) {
     if (_fRequest.records == nullptr) return;
     TPlainArray<CRecord>& records = _fRequest.records->records;

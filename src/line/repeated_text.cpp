@@ -10,7 +10,7 @@ namespace codeloom {
 
 namespace {
 
-// The token stands between two chains: it is no part of a name, or a word that joins expressions.
+// The token is between two chains: it isn't part of a name, or it is a word that joins expressions.
 bool EndsChain(const CRawToken& token) {
     if (token.type != kTokenId_NAME) return true;
     switch (token.word) {

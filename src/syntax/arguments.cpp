@@ -21,7 +21,7 @@ CParameter PartsOfParameter(const CTree& tree, const CTreeNode& parameter) {
     return parts;
 }
 
-// The name, an annotation or a default, by what stands before it.
+// The name, an annotation or a default, by what is before it.
 void CParameterReader::_ReadPart(const CTreeNode& child) {
     if (const EStars stars = StarsOf(child); stars != EStars::kNone) {
         _fCurrent.stars = stars;

@@ -57,7 +57,7 @@ inline bool IsArgumentList(const CTreeNode& arguments) {
     return arguments.Is(ENodeKind::kUsedArglist) || arguments.Is(ENodeKind::kTestList);
 }
 
-// Calls visit(parts) for each argument of a list or of the lone one that stands in its place.
+// Calls visit(parts) for each argument of a list or of the lone one that is in its place.
 template <class Visit>
 void ForEachArgument(const CTree& tree, const CTreeNode& arguments, Visit visit) {
     if (!IsArgumentList(arguments)) return visit(PartsOfArgument(tree, arguments));
@@ -97,7 +97,7 @@ CParameter PartsOfParameter(const CTree& tree, const CTreeNode& parameter);
 
 // Reads a list of parameters, child by child.
 //   child    ['*' or '**']  parameter  ['='  default]  ','  parameter ...
-// A bare `*` and a `/` stand without a parameter.
+// A bare `*` and a `/` are without a parameter.
 class CParameterReader {
   public:
     explicit CParameterReader(const CTree& tree) : _fTree(tree) {}

@@ -50,7 +50,7 @@ struct CItems {
     const CTreeNode* single = nullptr;  // the only item; null for a comprehension
     uint32_t count = 0;
 
-    // Requires: i < count. Null for what stands in a comprehension.
+    // Requires: i < count. Null for what is in a comprehension.
     const CTreeNode* At(const CTree& tree, uint32_t i) const {
         if (list == nullptr) return single;
         return TryChild(tree, *list, i * 2, ENodeKind::kExpression);
@@ -85,7 +85,7 @@ inline bool IsUnicodeText(std::string_view literal) {
     return HasStringPrefix(literal, 'u');
 }
 
-// The source between the quotes, escapes as they stand; up to the end of an unterminated literal.
+// The source between the quotes, escapes as written; up to the end of an unterminated literal.
 std::string_view ContentsOfString(std::string_view literal);
 
 }  // namespace codeloom

@@ -1,11 +1,11 @@
-// `with` statements whose items stand in parentheses.
+// `with` statements whose items are in parentheses.
 #include "syntax/span_parser.h"
 
 namespace codeloom {
 
 namespace {
 
-// What stands in the parentheses after a `with`.
+// What is in the parentheses after a `with`.
 struct CWithContents {
     bool has_target = false;  // `a as b`, which no expression has
     bool are_items = false;   // without a target, expressions with commas between them
@@ -27,7 +27,7 @@ CWithContents ReadWithContents(const CTokenSpan& span) {
 }
 
 //   with a, b,:
-//             ^    stands within parentheses only, which are off when the grammar reads the items
+//             ^    is within parentheses only, which are off when the grammar reads the items
 void RefuseLastComma(const CTokenSpan& span, uint32_t with_i) {
     bool is_after_comma = false;
     ForEachOutsideBrackets(span, with_i + 1, [&](uint32_t i, const CRawToken& token) {

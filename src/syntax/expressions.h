@@ -35,7 +35,7 @@ inline CChain ChainOfPower(const CTree& tree, const CTreeNode& node) {
     return {&children[0], children.subspan(1, end - 1), false};
 }
 
-// What stands after `**` in a power; null without it.
+// What is after `**` in a power; null without it.
 inline const CTreeNode* ExponentOf(const CTree& tree, const CTreeNode& power) {
     return HasToken(tree, power, kTokenId_DOUBLESTAR) ? &LastChild(tree, power) : nullptr;
 }
@@ -139,7 +139,7 @@ inline const CTreeNode& ValueOfNamed(const CTree& tree, const CTreeNode& named) 
     return tree.Child(named, 2);
 }
 
-// `a, b` and `a,`; `a for b in c` where it stands without brackets of its own
+// `a, b` and `a,`; `a for b in c` where it is without brackets of its own
 //   child    item  ','  item  ',' ...
 //   child    item  comprehension
 // The lists of these forms are kTestList, and kListmaker within the brackets of the 2.7 grammar.

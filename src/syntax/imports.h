@@ -50,7 +50,7 @@ inline const CTreeNode& NamesOfFromImport(const CTree& tree, const CTreeNode& st
     return tree.Child(statement, HasTokenAt(tree, statement, names_i, kTokenId_LPAR) ? names_i + 1 : names_i);
 }
 
-// Calls visit(imported) for each name of a list, or for the one that stands in its place.
+// Calls visit(imported) for each name of a list, or for the one that is in its place.
 template <class Visit>
 void ForEachImportedName(const CTree& tree, const CTreeNode& names, Visit visit) {
     if (!HasTokenAt(tree, names, 1, kTokenId_COMMA)) return visit(ImportedNameOf(tree, names));

@@ -30,7 +30,7 @@ struct alignas(8) CLeafClass {
     static constexpr uint8_t kComment = 255;
 
     // Traits: a string or a number, whose text may be a form of some versions; a token with which a statement
-    // may begin that the grammar's tables don't know as it stands.
+    // may begin that the grammar's tables don't know as it is.
     static constexpr uint8_t kLiteral = 1;
     static constexpr uint8_t kBeginsUnusual = 2;
 

@@ -21,7 +21,7 @@ class CLineParser {
     // be empty without a fault: the line holds no statement then, or more than one.
     CFault Parse(const CRawLogical& logical, bool in_async_def, CTree& tree);
 
-    // The same for tokens that only the grammar reads, in the order that they have, wherever they stand:
+    // The same for tokens that only the grammar reads, in the order that they have, wherever they are:
     // statements beyond the grammar are refused, no form is.
     CFault ParseTokens(const CRawLogical& logical, bool in_async_def, CTree& tree);
 

@@ -9,7 +9,7 @@ namespace codeloom {
 
 namespace {
 
-// What stands in the invented parentheses needs none: no comprehension, no `yield`, no lone star.
+// What is in the invented parentheses needs none: no comprehension, no `yield`, no lone star.
 bool IsSubject(const CTree& tree, const CTreeNode& node) {
     if (node.Is(ENodeKind::kStar) || node.Is(ENodeKind::kYield) || node.word == EWord::kYield) return false;
     return !node.Is(ENodeKind::kTestList) || !tree.Child(node, 1).Is(ENodeKind::kCompFor);
@@ -88,7 +88,7 @@ uint32_t CMatchCaseParser::_FindCaseColon() const {
 void CMatchCaseParser::_SetSpan(const CTokenSpan& span) {
     assert(span.removed.empty());
     _fSpan = span;
-    _fSpan.in_async_def = true;  // nothing is refused for where it stands
+    _fSpan.in_async_def = true;  // nothing is refused for where it is
     _fTokens.clear();
     for (uint32_t i = span.start; i < span.end; ++i) {
         const bool is_skipped = span.Token(i).type == kTokenId_COMMENT ||
@@ -133,7 +133,7 @@ uint32_t CMatchCaseParser::_FindIf(uint32_t from, uint32_t to, IsWanted is_wante
         if (is_wanted(_Token(i))) return i;
         if (DepthStep(_Token(i)) < 0) break;
     }
-    // Behind a bracket that the range doesn't open, only what further brackets open is on its level.
+    // After a bracket that the range doesn't open, only what further brackets open is on its level.
     int depth = -1;
     for (++i; i < to; ++i) {
         if (depth == 0 && is_wanted(_Token(i))) return i;

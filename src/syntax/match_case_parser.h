@@ -4,7 +4,7 @@
 //   keeps  its lists, reused from statement to statement
 //   start  at ParseMatch and ParseCase here; patterns are in case_patterns.cpp
 //
-// Subject, guard and body go to the grammar, patterns are parsed here by descent. It is no full checker of
+// Subject, guard and body go to the grammar, patterns are parsed here by descent. It isn't a full checker of
 // patterns: it decides by the first token and by separators outside brackets. Tokens are counted without
 // comments and continuation backslashes here; `_fTokens` has their places in the line.
 #pragma once

@@ -1,4 +1,4 @@
-// Reading a CTree: what any node answers. What a kind of node answers stands in the header of its topic; each
+// Reading a CTree: what any node answers. What a kind of node answers is in the header of its topic; each
 // says above it which source it reads. An index is that of a child, as the comment lays the children out.
 #pragma once
 
@@ -45,7 +45,7 @@ inline bool HasWordAt(const CTree& tree, const CTreeNode& node, uint32_t i, EWor
     return i < node.child_count && IsWord(tree.Child(node, i), word);
 }
 
-// Requires: the node is no leaf.
+// Requires: the node isn't a leaf.
 inline const CTreeNode& LastChild(const CTree& tree, const CTreeNode& node) {
     return tree.Child(node, node.child_count - 1);
 }

@@ -150,7 +150,7 @@ void CSpanParser::_RequireSingle(const CTreeNode& node) const {
         throw CRefusal{node.token};
 }
 
-// A name that is no keyword.
+// A name that isn't a keyword.
 bool CSpanParser::_IsPlainName(const CTokenSpan& span, uint32_t i) const {
     return span.IsName(i) && !_fLanguage.IsKeyword(span.Token(i).word);
 }

@@ -55,9 +55,9 @@ class CSpanParser {
         return _ParseAfterRefusal(span, refused_i);
     }
 
-    // What stands in `span`, in parentheses that take the place of the tokens at `open_i` and `close_i`.
+    // What is in `span`, in parentheses that take the place of the tokens at `open_i` and `close_i`.
     CTreeNode ParseInParentheses(const CTokenSpan& span, uint32_t open_i, uint32_t close_i);
-    // What stands in the parentheses that are all of a node; or the node itself.
+    // What is in the parentheses that are all of a node; or the node itself.
     CTreeNode WithoutParentheses(const CTreeNode& node) const;
 
     const CFormNotes& Forms() const { return _fForms; }

@@ -120,7 +120,7 @@ void CStatementParser::_FeedTokens(const CTokenSpan& span, uint32_t from, uint32
     }
 }
 
-// A token that is skipped, or not fed as it stands.
+// A token that is skipped, or not fed as it is.
 void CStatementParser::_FeedSpecial(const CTokenSpan& span, uint32_t i) {
     if (_fClasses->Of(span.Token(i)).label == CLeafClass::kThreeDots) {
         for (int dot_i = 0; dot_i < 3; ++dot_i) _FeedInvented({kTokenId_DOT}, i);

@@ -8,7 +8,7 @@
 //   try:               | try: | pass NEWLINE finally: pass NEWLINE end
 //   @foo.bar(1)        | @foo.bar(1) | NEWLINE def function(): pass NEWLINE end
 //   class X:           | class X: | pass NEWLINE end
-//                        the real tokens stand between the bars
+//                        the real tokens are between the bars
 #pragma once
 
 #include <initializer_list>

@@ -7,7 +7,7 @@ namespace codeloom {
 
 // Simple statements
 
-// `a = b = c`, `a += b`, `a: b = c`; an expression alone is no statement node
+// `a = b = c`, `a += b`, `a: b = c`; an expression alone isn't a statement node
 //   child    target  '='  target or value  '='  target or value ...
 //   child    target  operator  value
 //   child    target  annotated assignment
@@ -29,7 +29,7 @@ inline const CTreeNode& TargetOf(const CTree& tree, const CTreeNode& statement, 
     return tree.Child(statement, i * 2);
 }
 
-// What stands after the last `=` of an assignment, or after the operator of an augmented one.
+// What is after the last `=` of an assignment, or after the operator of an augmented one.
 inline const CTreeNode& ValueOfAssignment(const CTree& tree, const CTreeNode& statement) {
     return LastChild(tree, statement);
 }
@@ -62,7 +62,7 @@ void ForEachDeclaredName(const CTree& tree, const CTreeNode& statement, Visit vi
 
 // Compound statements
 
-// `if test: suite`; an `elif` is read as `if`, and an `else` stands after an invented `if 0: pass`
+// `if test: suite`; an `elif` is read as `if`, and an `else` is after an invented `if 0: pass`
 //   child    'if'  test  ':'  suite  ['elif'  test  ':'  suite] ...  ['else'  ':'  suite]
 inline const CTreeNode& TestOfIf(const CTree& tree, const CTreeNode& statement) {
     return tree.Child(statement, 1);

@@ -5,7 +5,7 @@
 //   start  at Begin and Feed
 //
 // An open rule that has more than one child is a frame of its own. Rules that have one child so far share the
-// frame of their chain (grammar/parse_tables.h). The children of all frames stand on one stack. Nothing here
+// frame of their chain (grammar/parse_tables.h). The children of all frames are on one stack. Nothing here
 // calls itself: nesting of the text costs frames, no call depth.
 #pragma once
 
@@ -56,7 +56,7 @@ class CTableParser {
     // when all are fed.
     uint32_t FeedTokens(const CLeafClasses& classes, uint32_t from, uint32_t to);
 
-    // Ends the file with a newline and the end marker, which stand at `tail`. Gives the only statement that
+    // Ends the file with a newline and the end marker, which are at `tail`. Gives the only statement that
     // it holds; none when it holds another number of them.
     CParsed Finish(const CLeafClasses& classes, uint32_t tail);
 

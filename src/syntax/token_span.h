@@ -58,7 +58,7 @@ struct CTokenSpan {
         return false;
     }
 
-    // True for a comment or a backslash, which are no part of a statement; for a backslash before blanks too.
+    // True for a comment or a backslash, which aren't part of a statement; for a backslash before blanks too.
     bool IsPassedOver(uint32_t i) const {
         const CRawToken& token = Token(i);
         return codeloom::IsPassedOver(token) ||
@@ -107,9 +107,9 @@ struct CTokenSpan {
     }
 };
 
-// Calls visit(i, token) for each token of `span` from `from` on that stands outside brackets, closing
+// Calls visit(i, token) for each token of `span` from `from` on that is outside brackets, closing
 // brackets not among them, until it returns false. Comments, backslashes and removed tokens are passed over,
-// and what stands between a `lambda` and its `:`.
+// and what is between a `lambda` and its `:`.
 template <class Visit>
 void ForEachOutsideBrackets(const CTokenSpan& span, uint32_t from, Visit visit) {
     int depth = 0, lambda_count = 0;

@@ -26,7 +26,7 @@ struct CTreeNode {
     uint32_t first_child =
         0;  // in the tree; of a leaf zero, or kInventedText when its text isn't its token's
     uint32_t child_count = 0;  // zero for a leaf
-    uint32_t token = 0;        // index of its first token in the line; of an invented one, where it stands
+    uint32_t token = 0;        // index of its first token in the line; of an invented one, where it is
     uint16_t symbol = 0;       // token type of a leaf, else the number of the grammar rule
     ENodeKind kind = ENodeKind::kNode;
     EWord word = EWord::kNone;  // of a leaf
@@ -102,7 +102,7 @@ class CTree {
         return TextOf(Token(leaf), _fLine->file_text);
     }
 
-    // Requires: the leaf is no invented one, as a name.
+    // Requires: the leaf isn't invented, as a name may be.
     const CRawToken& Token(const CTreeNode& leaf) const {
         assert(leaf.IsLeaf() && leaf.token < _fTokens.size());
         return _fTokens[leaf.token];
@@ -115,10 +115,10 @@ class CTree {
 
     const CRawLogical& Line() const { return *_fLine; }
 
-    // True when a node of exactly this kind was made that is no leaf.
+    // True when a node of exactly this kind was made that isn't a leaf.
     bool HasKind(ENodeKind kind) const { return (_fKinds & BitOf(kind)) != 0; }
 
-    // A bit for each kind of node that was made and is no leaf.
+    // A bit for each kind of node that was made and isn't a leaf.
     uint64_t Kinds() const { return _fKinds; }
     static constexpr uint64_t BitOf(ENodeKind kind) { return uint64_t{1} << static_cast<unsigned>(kind); }
 

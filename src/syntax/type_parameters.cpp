@@ -115,7 +115,7 @@ void CSpanParser::_ParseTypeParameters(const CTokenSpan& span, uint32_t open_i, 
     if (is_empty && _fLanguage.has_newer_statements) throw CRefusal{close_i};
     for (uint32_t i = open_i + 1; i < close_i;) {
         const uint32_t comma_i = std::min(span.Find(kTokenId_COMMA, i, close_i), close_i);
-        const uint32_t start = span.Next(i - 1);  // a comment may stand before it
+        const uint32_t start = span.Next(i - 1);  // a comment may be before it
         if (start < comma_i) _fNodes.push_back(_ParseTypeParameter(span, start, comma_i));
         i = comma_i + 1;
     }

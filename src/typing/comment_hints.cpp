@@ -82,7 +82,7 @@ std::optional<uint32_t> CHintWalker::_FindComment(int32_t row) const {
     return std::nullopt;
 }
 
-// The row on which a node ends. An invented leaf stands where the last token does.
+// The row on which a node ends. An invented leaf is where the last token is.
 int32_t CHintWalker::_LastRowOf(const CTreeNode& node) const {
     const CTreeNode& leaf = LastLeaf(*_fTree, node);
     const size_t token_i = std::min<size_t>(leaf.token, _fLine->tokens.size() - 1);
@@ -107,7 +107,7 @@ bool CHintWalker::_PairArgumentComment(const CParameter& parameter) {
 }
 
 // True when the comment after the header is that of its last argument, which has no room for its own but
-// there: it stands on the argument's row and isn't in a function's form.
+// there: it is on the argument's row and isn't in a function's form.
 bool CHintWalker::_IsForArgument(const CParameter& parameter) const {
     return parameter.name != nullptr && !HasFunctionForm(_fHint.text) &&
            _LastRowOf(LastPiece(parameter)) == _fLine->tokens[_fHint.token_i].position.row;
@@ -171,7 +171,7 @@ void CHintWalker::_GiveUp() {
     throw CStop();
 }
 
-// The names that a hint in a comment uses are read by the line that it stands on.
+// The names that a hint in a comment uses are read by the line that it is on.
 void CHintWalker::_WalkNames(const CHint& hint) {
     if (_fContext.observer != nullptr)
         _fContext.observer->TakeHint(*hint.tree.tree, *hint.node, hint.tree.shift);

@@ -28,7 +28,7 @@ bool HasArguments(std::string_view hint) {
     return !first.starts_with(')') && !first.starts_with("...");
 }
 
-// The stars of parameters, which stand first within the brackets or after a comma.
+// The stars of parameters, which are first within the brackets or after a comma.
 void BlankStars(std::string& hint) {
     int depth = 0;
     char last = '\0';
@@ -102,7 +102,7 @@ bool CFalseHints::IsFalseInQuotes(const CRawLogical& quoted) {
     return IsProseInQuotes(_fText.substr(start, end - start)) || _IsInLiteral(start);
 }
 
-// The byte at `pos` stands within a `Literal` under another name.
+// The byte at `pos` is within a `Literal` under another name.
 bool CFalseHints::_IsInLiteral(uint32_t pos) {
     const std::unordered_set<std::string_view>& names = _LiteralNames();
     return !names.empty() && names.contains(_NameBeforeBracketAt(pos));

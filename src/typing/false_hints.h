@@ -30,7 +30,7 @@ class CFalseHints {
     // The hint of a comment of the line, as HintInComment gives it.
     bool IsFalseInComment(std::string_view hint) const;
 
-    // Puts blanks in the place of what the grammar doesn't know: `(int, *str) -> (bool)`.
+    // Replaces by blanks what the grammar doesn't know: `(int, *str) -> (bool)`.
     static void MakeReadable(std::string& hint);
 
     // A hint in quotes, one of those embedded in the line. Asked for in their order.
@@ -46,7 +46,7 @@ class CFalseHints {
     std::optional<std::unordered_set<std::string_view>>
         _fLiteralNames;  // beside its own; none until it matters
     const CRawLogical* _fLine = nullptr;
-    // The tokens that were passed, and what stands before each bracket that is open after them.
+    // The tokens that were passed, and what is before each bracket that is open after them.
     size_t _fPassedCount = 0;
     std::vector<std::string_view> _fOpenNames;
 };

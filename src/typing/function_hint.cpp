@@ -18,7 +18,7 @@ class CDefWriter {
     explicit CDefWriter(std::vector<CDefForHint::CToken>& tokens) : _fTokens(tokens) {}
 
     void Add(std::string_view text, size_t open_count, const CDefForHint::CToken& token) {
-        // A token that stands directly among the parameters may begin one.
+        // A token that is directly among the parameters may begin one.
         const bool is_direct = _fNesting == 1 && open_count == 1 && text != "]" && text != "}";
         ++_fCount;
         const std::string_view last = std::exchange(_fLast, text);

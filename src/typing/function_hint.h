@@ -10,7 +10,7 @@ namespace codeloom {
 
 // `(int, str) -> bool` as `def function (a: int, a: str) -> bool:`. Of `(...) -> bool` no parameter is left.
 struct CDefForHint {
-    // What stands before the hint in `text`: the name of all parameters with its colon, and the `def`.
+    // What is before the hint in `text`: the name of all parameters with its colon, and the `def`.
     static constexpr std::string_view kHead = "a:def function ";
 
     struct CToken {

@@ -12,7 +12,7 @@ namespace codeloom {
 
 namespace {
 
-// No hint stands below an expression; statements stand below nodes that are none.
+// No hint is below an expression; statements are below nodes that are none.
 bool MayHoldHints(const CTree& tree, const CTreeNode& root) {
     switch (root.kind) {
         case ENodeKind::kFuncdef:

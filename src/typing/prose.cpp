@@ -43,7 +43,7 @@ std::string_view WholeWordAt(std::string_view text, size_t pos) {
     return text.substr(pos, WordEnd(text, pos) - pos);
 }
 
-// A word that no operator joins to what is before it stands at `pos`.
+// A word that no operator joins to what is before it is at `pos`.
 bool IsUnjoinedWord(std::string_view text, size_t pos) {
     return WordCharLength(text, pos) != 0 && !IsOperatorWord(WholeWordAt(text, pos));
 }
@@ -76,7 +76,7 @@ bool IsNoSignOfHints(std::string_view text, size_t pos) {
     return code == 0x2013 || code == 0x2014 || code == 0x2026 || code == 0x2192;
 }
 
-// The bytes of the prefix of a string whose quote stands at `quote`; npos where a longer word is in the way.
+// The bytes of the prefix of a string whose quote is at `quote`; npos where a longer word is in the way.
 size_t PrefixLength(std::string_view text, size_t quote) {
     for (size_t length = 0;; ++length) {
         const std::string_view before = text.substr(0, quote - length);
@@ -85,7 +85,7 @@ size_t PrefixLength(std::string_view text, size_t quote) {
     }
 }
 
-// The text with a word in the place of each string.
+// The text with a word instead of each string.
 std::string WithoutStrings(std::string_view text) {
     std::string result;
     size_t copied = 0;

@@ -5,11 +5,11 @@
 
 namespace codeloom {
 
-// What stands in a comment in the place of a hint can't be one: it holds two words that no operator joins, a
+// What is in a comment where a hint would be can't be one: it holds two words that no operator joins, a
 // sign that no hint has, or it begins as no expression does.
 bool IsProseInComment(std::string_view hint);
 
-// What stands in quotes in the place of a hint is a sentence: of three words, two of them in front of any
+// What is in quotes where a hint would be is a sentence: of three words, two of them in front of any
 // bracket, or with the mark at its end. What is shorter is taken for a hint with a fault.
 bool IsProseInQuotes(std::string_view text);
 
