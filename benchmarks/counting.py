@@ -22,7 +22,7 @@ def can_count() -> bool:
 def instructions_per_row(name: str, short: bool = False) -> int:
     """What a row costs a workload, start-up left out: many files less a few."""
     paths, warm_up = (files()[:SHORT], SHORT_WARM_UP) if short else (files(), WARM_UP)
-    many, few = _instructions(_command(name, paths)), _instructions(_command(name, paths[:warm_up]))
+    many, few = instructions(_command(name, paths)), instructions(_command(name, paths[:warm_up]))
     return round((many - few) / count_rows(paths[warm_up:]))
 
 
@@ -34,7 +34,8 @@ def _command(name: str, paths: list[str]) -> list[str]:
     return [sys.executable, str(Path(__file__).with_name("workloads.py")), name, *paths]
 
 
-def _instructions(command: list[str]) -> int:
+def instructions(command: list[str]) -> int:
+    """What a command executes, counted."""
     environment = os.environ | {"PYTHONHASHSEED": "0", "RAYON_NUM_THREADS": "1"}
     done = subprocess.run([*_VALGRIND, *command], capture_output=True, text=True, env=environment)
     found = _COLLECTED.search(done.stderr)
