@@ -1,6 +1,7 @@
 // The rules of `global` and `nonlocal`, doing nothing, so that no names are collected for them. The linker
 // takes these instead of the library's own.
 
+#include "scopes/declaration_places.h"
 #include "scopes/declarations.h"
 
 namespace codeloom {

@@ -9,6 +9,7 @@
 #include "file/method_hints.h"
 #include "line/line_length.h"
 #include "rules/text_checker.h"
+#include "scopes/declaration_places.h"
 #include "scopes/declarations.h"
 #include "scopes/name_collector.h"
 #include "scopes/scope_builder.h"

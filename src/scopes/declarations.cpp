@@ -1,12 +1,6 @@
 #include "scopes/declarations.h"
 
-#include <algorithm>
-#include <array>
-#include <bit>
-#include <cstring>
 #include <string>
-
-#include "text/char_class.h"
 
 namespace codeloom {
 
@@ -24,29 +18,6 @@ struct CSeen {
     uint32_t global = kNoIndex;
     uint32_t nonlocal = kNoIndex;
 };
-
-using CBytes [[gnu::vector_size(16)]] = unsigned char;
-constexpr size_t kStep = sizeof(CBytes);
-
-CBytes Load(const char* bytes) {
-    CBytes loaded;
-    std::memcpy(&loaded, bytes, kStep);
-    return loaded;
-}
-
-bool MayHoldEither(std::string_view text) {
-    if (text.size() < kStep + 4) return true;
-    CBytes found{};
-    const size_t last = text.size() - kStep - 4;
-    for (size_t i = 0;; i = std::min(i + kStep, last)) {
-        const char* const bytes = text.data() + i;
-        found |= (Load(bytes) == 'l') & (Load(bytes + 1) == 'o') & (Load(bytes + 3) == 'a') &
-                 (Load(bytes + 4) == 'l');
-        if (i == last) break;
-    }
-    return std::ranges::any_of(std::bit_cast<std::array<unsigned char, kStep>>(found),
-                               [](unsigned char byte) { return byte != 0; });
-}
 
 class CDeclarationCheck {
   public:
@@ -190,72 +161,7 @@ void CDeclarationCheck::_ReportEarlier(ECode code, uint32_t i, std::string_view 
         .related.push_back({_Item(earlier).start, _Item(earlier).end, std::string(earlier_is)});
 }
 
-// The word stands where a statement may begin, with a blank after it.
-bool MayBeginStatement(std::string_view text, size_t pos, size_t length) {
-    const char next = ByteAt(text, pos + length);
-    if (!IsBlank(next) && next != '\\') return false;
-    while (pos > 0 && IsBlank(text[pos - 1])) --pos;
-    const char last = pos == 0 ? '\n' : text[pos - 1];
-    return IsRowEnd(last) || last == ';' || last == ':';
-}
-
-// The first place from `start` up to `end`; npos when there is none.
-size_t FindPlace(std::string_view text, size_t start, size_t end) {
-    size_t first = std::string_view::npos;
-    for (const std::string_view word : {std::string_view("global"), std::string_view("nonlocal")}) {
-        const std::string_view part = text.substr(0, std::min(first, end));
-        size_t pos = part.find(word, start);
-        while (pos != std::string_view::npos && !MayBeginStatement(text, pos, word.size()))
-            pos = part.find(word, pos + 1);
-        first = std::min(first, pos);
-    }
-    return first;
-}
-
-// The last definition before `end` that begins a row at column 0, from `start` on; `start` when there is
-// none.
-size_t LastDefinition(std::string_view text, size_t start, size_t end) {
-    for (size_t pos = end; pos > start;) {
-        pos = text.find_last_of('\n', pos - 1);
-        if (pos == std::string_view::npos || pos < start) return start;
-        const std::string_view row = text.substr(pos + 1, 6);
-        if (row.starts_with("def ") || row.starts_with("class ") || row.starts_with("async ")) return pos + 1;
-    }
-    return start;
-}
-
 }  // namespace
-
-// Both words hold "lo?al", which is searched sixteen bytes at a time and without a branch.
-CDeclarationPlaces::CDeclarationPlaces(std::string_view text) {
-    constexpr size_t kBlock = 4096, kOverlap = kStep + 8;
-    size_t definition = 0, after_last = 0;
-    for (size_t start = 0; start < text.size(); start += kBlock) {
-        if (!MayHoldEither(text.substr(start, kBlock + kOverlap))) continue;
-        const size_t end = std::min(start + kBlock + kOverlap, text.size());
-        for (size_t pos = std::max(start, after_last);
-             (pos = FindPlace(text, pos, end)) != std::string_view::npos; ++pos) {
-            definition = std::max(definition, LastDefinition(text, definition, pos));
-            _fPlaces.push_back({static_cast<uint32_t>(pos), static_cast<uint32_t>(definition)});
-            after_last = pos + 1;
-        }
-    }
-}
-
-const CDeclarationPlaces::CPlace* CDeclarationPlaces::_From(uint32_t start) {
-    while (_fNext < _fPlaces.size() && _fPlaces[_fNext].start < start) ++_fNext;
-    return _fNext < _fPlaces.size() ? &_fPlaces[_fNext] : nullptr;
-}
-
-bool CDeclarationPlaces::MayLieInBlockOf(uint32_t line_start) {
-    const CPlace* const place = _From(line_start);
-    return place != nullptr && place->definition <= line_start;
-}
-
-bool CDeclarationPlaces::HasOneIn(uint32_t start, uint32_t end) {
-    const CPlace* const place = _From(start);
-    return place != nullptr && place->start < end;
-}
 
 bool DeclaresInModule(const CTextNames& names) {
     const TPlainArray<COccurrence>& items = names.occurrences.items;
