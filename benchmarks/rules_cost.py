@@ -2,8 +2,8 @@
 
     python benchmarks/rules_cost.py [FOLDER]
 
-The one pass is counted as a program of its own, with all rules and with some of them replaced by empty functions. FOLDER
-is where it is built, build/rules_cost unless given.
+The one pass is counted as a program of its own, with all rules and with some of them replaced by empty
+functions. FOLDER is where it is built, build/rules_cost unless given.
 """
 
 import subprocess
@@ -37,8 +37,10 @@ def build(folder: Path) -> None:
         scripts = Path(sysconfig.get_path("scripts"))
         if (scripts / "ninja").exists():
             settings += ["-G", "Ninja", f"-DCMAKE_MAKE_PROGRAM={scripts / 'ninja'}"]
-        subprocess.run(["cmake", "-S", ROOT, "-B", folder, *settings], check=True, stdout=subprocess.DEVNULL)
-    command = ["cmake", "--build", folder, "--target", *PROGRAMS]
+        subprocess.run(
+            ["cmake", "-S", str(ROOT), "-B", str(folder), *settings], check=True, stdout=subprocess.DEVNULL
+        )
+    command = ["cmake", "--build", str(folder), "--target", *PROGRAMS]
     subprocess.run(command, check=True, stdout=subprocess.DEVNULL)
 
 

@@ -5,7 +5,7 @@
 namespace codeloom {
 
 void CTextChecker::Enter(const CRawLogical&) {}
-void CTextChecker::Take(const CRawLogical&, const CTree&) {}
+void CTextChecker::_Check(const CRawLogical&, const CTree&) {}
 void CTextChecker::Leave(const CRawLogical&, bool) {}
 void CTextChecker::Finish() {}
 

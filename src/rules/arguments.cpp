@@ -86,7 +86,8 @@ void CheckGenerators(const CRuleContext& context, const CTreeNode& list) {
 
 void CheckArguments(const CRuleContext& context, const CTreeNode& list) {
     const CTree& tree = context.tree;
-    CNameSet keywords;
+    CNameSet& keywords = context.names;
+    keywords.Clear();
     for (const CTreeNode& child : tree.Children(list)) {
         if (!IsNamedArgument(tree, child)) continue;
         const CTreeNode& name = tree.Child(child, 0);

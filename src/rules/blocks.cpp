@@ -47,6 +47,22 @@ bool IsContinuation(EClause clause) {
            clause == EClause::kFinally;
 }
 
+constexpr uint32_t BitOf(EClause clause) {
+    return uint32_t{1} << static_cast<unsigned>(clause);
+}
+
+template <class... Clauses>
+constexpr uint32_t BitsOf(Clauses... clauses) {
+    return (BitOf(clauses) | ...);
+}
+
+// What depends on the statement before it.
+constexpr uint32_t kDependOnBefore =
+    BitsOf(EClause::kElif, EClause::kElse, EClause::kExcept, EClause::kBareExcept, EClause::kExceptStar,
+           EClause::kFinally, EClause::kCase);
+// What isn't complete by itself.
+constexpr uint32_t kAskForMore = BitsOf(EClause::kTry, EClause::kDecorator);
+
 bool IsDefinition(EClause clause) {
     return clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass ||
            clause == EClause::kDecorator;
@@ -63,21 +79,24 @@ std::string_view WhatComesBefore(EClause clause) {
 
 void CBlockTracker::Enter(const CRawLogical& logical) {
     _fHead = ReadStatementHead(logical);
-    _fText = logical.file_text;
-    _fTakesAll = {};
     _fHasPlaceProblem = _fHasMixedTabs = _fHaveChanged = false;
     _FindPlace(logical);
-    if (_fHead.IsHeader()) _CheckFrames();
+    if (!_fHead.IsHeader()) return;
+    _fText = logical.file_text;
+    _fTakesAll = {};
+    _CheckFrames();
 }
 
 void CBlockTracker::_FindPlace(const CRawLogical& logical) {
     const CRawToken& first = logical.tokens.front();
+    if (logical.is_indented_by_spaces) {
+        _fIsMidRow = false;
+        const CIndent indent{first.position.col, first.position.col};
+        if (_fOpensBlock || indent != _Top().indent) _Place(indent);
+        return;
+    }
     const uint32_t token_start = logical.StartOf(first);
     const uint32_t row_start = token_start - static_cast<uint32_t>(first.position.col);
-    if (SkipSpaces(logical.file_text, row_start) == token_start) {
-        _fIsMidRow = false;
-        return _Place({first.position.col, first.position.col});
-    }
     const std::string_view before = logical.file_text.substr(row_start, token_start - row_start);
     _fIsMidRow = std::any_of(before.begin(), before.end(), [](char c) { return !IsBlank(c); });
     if (!_fIsMidRow) _Place(MeasureIndent(before));
@@ -188,6 +207,7 @@ void CBlockTracker::_OpenOdd(const CIndent& indent) {
         reopened.may_follow_anything = true;
         reopened.is_unknown = true;
         reopened.header_depth = header_depth;
+        _fAreInDoubt |= reopened.is_in_doubt;
         _fHaveChanged = true;
         _fBlocks.push_back(std::move(reopened));
         return;
@@ -226,20 +246,20 @@ void CBlockTracker::_PlaceOut(const CIndent& indent) {
 }
 
 void CBlockTracker::_Open(const CIndent& indent, EClause clause, bool is_unknown) {
-    CBlock block;
+    CBlock& block = _fBlocks.emplace_back();
+    const CBlock& outer = *(&block - 1);
     block.indent = indent;
     block.header_depth = indent.column;
     block.clause = clause;
     block.is_unknown = is_unknown;
-    block.header = _Top().previous;
+    block.header = outer.previous;
     const bool is_scope =
         clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass;
     block.frame_count = is_scope ? clause == EClause::kAsyncDef && _fLanguage.version >= 313
-                                 : _Top().frame_count + _FramesOf(block.header);
-    block.has_mixed_tabs = _Top().has_mixed_tabs;
-    block.is_depth_in_doubt = _fPreviousHasFault || _Top().lacks_block;
+                                 : outer.frame_count + _FramesOf(block.header);
+    block.has_mixed_tabs = outer.has_mixed_tabs;
+    block.is_depth_in_doubt = _fPreviousHasFault || outer.lacks_block;
     _fHaveChanged = true;
-    _fBlocks.push_back(std::move(block));
     if (_fBlocks.size() > kMostIndents && !std::exchange(_fHasTooMany, true))
         _Report(ECode::kTooManyIndents, _fHead.start, _fHead.end, "too many levels of indentation");
 }
@@ -294,29 +314,42 @@ void CBlockTracker::_CheckPending(CBlock& block, uint32_t start, uint32_t end) {
     }
 }
 
+// What later clauses of the statement must know.
+void CBlockTracker::_NoteClause(CBlock& block) const {
+    switch (_fHead.clause) {
+        case EClause::kTry:
+            block.bare_except_start = block.bare_except_end = 0;
+            break;
+        case EClause::kBareExcept:
+            block.bare_except_start = _fHead.start;
+            block.bare_except_end = _fHead.end;
+            break;
+        case EClause::kCase:
+            block.takes_all = _fTakesAll;
+            break;
+        case EClause::kElse:
+            block.is_of_try = IsHandler(block.previous.clause);
+            break;
+        default:
+            break;
+    }
+}
+
 void CBlockTracker::Leave(bool has_fault) {
     CBlock& block = _Top();
-    if (!has_fault && !_fHasPlaceProblem) {
-        const size_t problem_count = _fProblems.size();
-        _CheckClause(block);
-        has_fault = _fProblems.size() > problem_count;
-    }
+    if (!has_fault && !_fHasPlaceProblem && _MayBreakClause(block)) has_fault = _BreaksClause(block);
     if (has_fault || _fHasPlaceProblem) {
         for (CBlock& around : _fBlocks) around.may_follow_anything = around.is_in_doubt = true;
-    } else if (IsDefinition(_fHead.clause)) {
+        _fAreInDoubt = true;
+    } else if (_fAreInDoubt && IsDefinition(_fHead.clause)) {
         for (CBlock& around : _fBlocks) around.is_in_doubt = false;
+        _fAreInDoubt = false;
     }
     if (_fIsMidRow) {
         _fPreviousHasFault |= has_fault;
         return;
     }
-    if (_fHead.clause == EClause::kTry) block.bare_except_start = block.bare_except_end = 0;
-    if (_fHead.clause == EClause::kBareExcept) {
-        block.bare_except_start = _fHead.start;
-        block.bare_except_end = _fHead.end;
-    }
-    if (_fHead.clause == EClause::kCase) block.takes_all = _fTakesAll;
-    if (_fHead.clause == EClause::kElse) block.is_of_try = IsHandler(block.previous.clause);
+    if (_fHead.clause != EClause::kSimple) _NoteClause(block);
     block.is_first = block.is_empty;
     block.is_empty = false;
     block.previous = _fHead;
@@ -325,6 +358,18 @@ void CBlockTracker::Leave(bool has_fault) {
     _fPreviousHasFault = has_fault || _fHasMixedTabs;  // then its depth isn't known
     _fOpensBlock = _fHead.ends_in_colon || (has_fault && _fHead.IsHeader());
     if (!_fHead.IsHeader() && !has_fault) _fOpensBlock = false;
+}
+
+// False for most lines: they depend on nothing before them, which in turn asks for nothing.
+bool CBlockTracker::_MayBreakClause(const CBlock& block) const {
+    return (BitOf(_fHead.clause) & kDependOnBefore) != 0 ||
+           (BitOf(block.previous.clause) & kAskForMore) != 0 || block.clause == EClause::kMatch;
+}
+
+bool CBlockTracker::_BreaksClause(CBlock& block) {
+    const size_t problem_count = _fProblems.size();
+    _CheckClause(block);
+    return _fProblems.size() > problem_count;
 }
 
 void CBlockTracker::_CheckClause(CBlock& block) {

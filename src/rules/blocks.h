@@ -25,6 +25,8 @@ namespace codeloom {
 struct CIndent {
     int32_t column = 0;
     int32_t alt_column = 0;
+
+    bool operator==(const CIndent&) const = default;
 };
 
 struct CBlock {
@@ -78,6 +80,7 @@ class CBlockTracker {
 
     // The blocks around the line, the module first.
     const std::vector<CBlock>& Blocks() const { return _fBlocks; }
+    const CBlock& Innermost() const { return _fBlocks.back(); }
     // False when they are those of the line before.
     bool HaveChanged() const { return _fHaveChanged; }
     const CStatementHead& Head() const { return _fHead; }
@@ -102,7 +105,10 @@ class CBlockTracker {
     void _ReportMissingBlock(uint32_t start, uint32_t end);
     bool _CheckTabs(const CIndent& indent);
     void _CheckPending(CBlock& block, uint32_t start, uint32_t end);
+    bool _MayBreakClause(const CBlock& block) const;
+    bool _BreaksClause(CBlock& block);
     void _CheckClause(CBlock& block);
+    void _NoteClause(CBlock& block) const;
     bool _MayFollow(const CBlock& block, EClause clause) const;
     void _CheckExcept(CBlock& block);
     void _CheckCase(CBlock& block);
@@ -126,6 +132,7 @@ class CBlockTracker {
     bool _fHasMixedTabs = false;  // reported for the line
     bool _fOpensBlock = false;    // the line before is a header without a body on its row
     bool _fPreviousHasFault = false;
+    bool _fAreInDoubt = false;  // at least one of them
     bool _fHasTooMany = false;
     bool _fHasTooManyFrames = false;
 };

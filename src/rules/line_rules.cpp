@@ -114,6 +114,19 @@ void CheckNode(const CRuleContext& context, const CTreeNode& node) {
     }
 }
 
+// `a = b` and `a.b = c`: no rule refuses these.
+bool IsPlainAssignment(const CTree& tree) {
+    constexpr uint64_t kWordsOfOthers =
+        kDebugNameBit | WordBits(EWord::kNoneValue, EWord::kAwait, EWord::kType);
+    const CTreeNode& root = tree.fRoot;
+    if (root.kind != ENodeKind::kExprStmt || root.child_count != 3 ||
+        tree.Line().MayHaveWords(kWordsOfOthers) || !HasTokenAt(tree, root, 1, kTokenId_EQUAL))
+        return false;
+    const CTreeNode& target = tree.Child(root, 0);
+    if (target.Is(ENodeKind::kNameLiteral)) return true;
+    return target.Is(ENodeKind::kAtomExpr) && HasTokenAt(tree, LastChild(tree, target), 0, kTokenId_DOT);
+}
+
 // A statement has no other of its kind within it, but expressions do.
 uint64_t KindsBelowRoot(const CTree& tree) {
     const bool is_statement = tree.fRoot.Is(ENodeKind::kStmt) && !tree.fRoot.IsLeaf();
@@ -122,11 +135,17 @@ uint64_t KindsBelowRoot(const CTree& tree) {
 
 }  // namespace
 
-void CheckLine(const CTree& tree, const CLanguage& language, const CLineSetting& setting,
-               CProblems& problems) {
-    const CRuleContext context{tree, language, problems};
-    if (language.version < kNeedsNoVersionCheck) CheckVersion(context);
-    CheckLiterals(tree.Line(), language, problems);
+bool MayBreakLineRule(const CTree& tree, const CLanguage& language) {
+    const uint64_t kinds = tree.Kinds() & kKindsWithRules;
+    const bool is_plain =
+        kinds == 0 || (kinds == CTree::BitOf(ENodeKind::kExprStmt) && IsPlainAssignment(tree));
+    return !is_plain || MayHaveBadLiteral(tree.Line()) || language.version < kNeedsNoVersionCheck;
+}
+
+void CheckLine(const CRuleContext& context, const CLineSetting& setting) {
+    const CTree& tree = context.tree;
+    if (context.language.version < kNeedsNoVersionCheck) CheckVersion(context);
+    CheckLiterals(tree.Line(), context.language, context.problems);
     if (tree.fIsEmpty || tree.fRoot.IsLeaf() || (tree.Kinds() & kKindsWithRules) == 0) return;
     if (setting.defers_annotations) CheckAnnotations(context);
     CheckNode(context, tree.fRoot);

@@ -11,7 +11,9 @@ struct CLineSetting {
     bool defers_annotations = false;  // they aren't evaluated with the statement that they are in
 };
 
-void CheckLine(const CTree& tree, const CLanguage& language, const CLineSetting& setting,
-               CProblems& problems);
+// False for most lines: nothing in them is what a rule looks at.
+bool MayBreakLineRule(const CTree& tree, const CLanguage& language);
+
+void CheckLine(const CRuleContext& context, const CLineSetting& setting);
 
 }  // namespace codeloom

@@ -95,8 +95,10 @@ void CheckStrings(const CRawLogical& line, const CLanguage& language, CProblems&
         }
         CheckEscapes(line, token, language, problems);
         if (!language.IsPython3()) continue;
-        if (HasFields(line.Text(token))) CheckFields(line, token, language, problems);
-        const bool is_bytes = IsBytesText(line.Text(token));
+        const std::string_view text = line.Text(token);
+        const bool has_prefix = ByteKind(text.front()) != EByteKind::kQuote;
+        if (has_prefix && HasFields(text)) CheckFields(line, token, language, problems);
+        const bool is_bytes = has_prefix && IsBytesText(text);
         if (is_bytes) CheckBytes(line, token, problems);
         if (before != nullptr && is_bytes != IsBytesText(line.Text(*before)))
             problems.push_back({ECode::kMixedBytesAndText,
@@ -109,7 +111,17 @@ void CheckStrings(const CRawLogical& line, const CLanguage& language, CProblems&
     }
 }
 
+constexpr size_t kMayNestDeeply = 400;
+
+// Words that may follow a number: as part of it, or as what may not.
+constexpr uint64_t kMayRunOn = WordBits(EWord::kOr, EWord::kAs, EWord::kAsync, EWord::kFrom);
+
 }  // namespace
+
+bool MayHaveBadLiteral(const CRawLogical& line) {
+    return line.may_have_special_strings || line.MayHaveWords(kMayRunOn) ||
+           line.tokens.size() > kMayNestDeeply;
+}
 
 void CheckEnd(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
     constexpr int kRefusesBackslash = 308;
@@ -122,13 +134,10 @@ void CheckEnd(const CRawLogical& line, const CLanguage& language, CProblems& pro
 }
 
 void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems) {
-    constexpr size_t kMayNestDeeply = 400;
     constexpr int kLimitsParentheses = 309;
     if (line.tokens.size() > kMayNestDeeply && language.version >= kLimitsParentheses)
         CheckParentheses(line, problems);
-    if (line.may_have_strings) CheckStrings(line, language, problems);
-    // Words that may follow a number: as part of it, or as what may not.
-    constexpr uint64_t kMayRunOn = WordBits(EWord::kOr, EWord::kAs, EWord::kAsync, EWord::kFrom);
+    if (line.may_have_special_strings) CheckStrings(line, language, problems);
     if (line.MayHaveWords(kMayRunOn)) CheckNumbers(line, language, problems);
 }
 

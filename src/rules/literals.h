@@ -6,6 +6,9 @@
 
 namespace codeloom {
 
+// False for most lines: their strings and numbers are plain, and their brackets few.
+bool MayHaveBadLiteral(const CRawLogical& line);
+
 // Requires: the line parses, so that neighbouring strings are one expression.
 void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems);
 

@@ -11,6 +11,12 @@ namespace codeloom {
 // A few names are searched one by one, more of them by hash.
 class CNameSet {
   public:
+    // Empties the set, whose storage is reused.
+    void Clear() {
+        _fNames.clear();
+        if (!_fMany.empty()) _fMany.clear();
+    }
+
     // False when the name was there.
     bool Add(std::string_view name) {
         if (Has(name)) return false;

@@ -185,14 +185,14 @@ void CheckDefaults(const CRuleContext& context, const CTreeNode& list) {
 }
 
 // Those in parentheses have names too.
-void CheckNames(const CRuleContext& context, const CTreeNode& parameters, CNameSet& names, int depth) {
+void CheckNames(const CRuleContext& context, const CTreeNode& parameters, int depth) {
     if (depth > CRuleContext::kMaxDepth) return;
     ForEachParameter(context.tree, parameters, [&](const CParameter& parameter) {
-        if (parameter.nested != nullptr) return CheckNames(context, *parameter.nested, names, depth + 1);
+        if (parameter.nested != nullptr) return CheckNames(context, *parameter.nested, depth + 1);
         if (parameter.name == nullptr) return;
         CheckBoundName(context, *parameter.name);
         const std::string_view name = context.tree.Text(*parameter.name);
-        if (!names.Add(name))
+        if (!context.names.Add(name))
             context.Report(ECode::kRepeatedParameter, *parameter.name,
                            Joined("duplicate argument '", name, "' in function definition"));
     });
@@ -201,8 +201,8 @@ void CheckNames(const CRuleContext& context, const CTreeNode& parameters, CNameS
 }  // namespace
 
 void CheckParameters(const CRuleContext& context, const CTreeNode& parameters) {
-    CNameSet names;
-    CheckNames(context, parameters, names, 0);
+    context.names.Clear();
+    CheckNames(context, parameters, 0);
     if (context.language.IsPython3()) return;
     const bool is_list = !parameters.Is(ENodeKind::kParameters);
     if (is_list || parameters.child_count > 2)

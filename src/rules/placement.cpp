@@ -26,10 +26,6 @@ constexpr int kMaxDepth = 400;
 constexpr std::string_view kOutOfExceptStar =
     "'break', 'continue' and 'return' cannot appear in an except* block";
 
-// Words without which a line has nothing that depends on its place.
-constexpr uint64_t kWordsOfInterest =
-    WordBits(EWord::kReturn, EWord::kYield, EWord::kAwait, EWord::kAsync, EWord::kBreak, EWord::kContinue,
-             EWord::kNonlocal, EWord::kFrom, EWord::kLazy);
 // Words that may be anywhere in an expression.
 constexpr uint64_t kWordsWithin = WordBits(EWord::kYield, EWord::kAwait, EWord::kAsync);
 
@@ -110,6 +106,7 @@ void CPlacement::Enter(EClause clause) {
 }
 
 void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const CBlockTracker& blocks) {
+    if (!MayBreak(logical)) return;
     const bool is_lazy = logical.tokens.front().word == EWord::kLazy;
     const bool is_future = tree != nullptr && !is_lazy && IsFutureImport(*tree, tree->fRoot);
     _fTree = tree;
@@ -123,7 +120,7 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
     if (tree == nullptr || tree->fIsEmpty || !logical.MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt())
         return;
     if (logical.MayHaveWords(WordBits(EWord::kLazy))) CheckLazyImports(*tree, blocks, _fProblems);
-    CPlacement place = PlacementIn(blocks.Blocks());
+    CPlacement place = _PlaceIn(blocks);
     // A body on the row of its header.
     const EClause header = blocks.Head().clause;
     if (header == EClause::kExceptStar || header == EClause::kFinally) place.Enter(header);
@@ -134,9 +131,16 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
 void CPlacementRules::CheckEmbedded(const CTree& tree, const CBlockTracker& blocks) {
     if (tree.fIsEmpty || !tree.Line().MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt()) return;
     _fTree = &tree;
-    _Visit(tree.fRoot, PlacementIn(blocks.Blocks()));
+    _Visit(tree.fRoot, _PlaceIn(blocks));
 }
 
+const CPlacement& CPlacementRules::_PlaceIn(const CBlockTracker& blocks) {
+    if (!_fIsPlaceKnown) _fPlace = PlacementIn(blocks.Blocks());
+    _fIsPlaceKnown = true;
+    return _fPlace;
+}
+
+// Of the blocks around a line only the innermost may be new.
 void CPlacementRules::_TrackFunctions(const std::vector<CBlock>& blocks) {
     const auto is_under_way = [&](const CStrictFunction& function) {
         return function.block_i < blocks.size() &&
@@ -146,13 +150,10 @@ void CPlacementRules::_TrackFunctions(const std::vector<CBlock>& blocks) {
         _EndFunction(_fFunctions.back());
         _fFunctions.pop_back();
     }
-    size_t block_i = _fFunctions.empty() ? 0 : _fFunctions.back().block_i + 1;
-    for (; block_i < blocks.size(); ++block_i) {
-        const EClause clause = blocks[block_i].clause;
-        const bool is_strict = (clause == EClause::kAsyncDef && _IsStrict(EScope::kAsyncFunction)) ||
-                               (clause == EClause::kDef && _IsStrict(EScope::kFunction));
-        if (is_strict) _fFunctions.push_back({block_i, blocks[block_i].header.start, {}, {}});
-    }
+    if (blocks.empty() || !_OpensStrict(blocks.back().clause)) return;
+    const size_t block_i = blocks.size() - 1;
+    if (_fFunctions.empty() || _fFunctions.back().block_i != block_i)
+        _fFunctions.push_back({block_i, blocks[block_i].header.start, {}, {}});
 }
 
 // Any generator before 3.3 (PEP 380).
@@ -369,6 +370,8 @@ void CPlacementRules::_VisitComprehension(const CTreeNode& node, const CPlacemen
 // Rules
 
 void CPlacementRules::_CheckReturn(const CTreeNode& node, const CPlacement& place) {
+    const bool leaves_any = place.left_by_return.except_star || place.left_by_return.finally;
+    if (place.scope == EScope::kFunction && !leaves_any && !_IsStrict(place.scope)) return;
     const CSpan span = SpanOf(*_fTree, node);
     if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'return' outside function");
     if (_CheckWayOut(place.left_by_return, span, "return")) return;

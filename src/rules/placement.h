@@ -52,7 +52,14 @@ class CPlacementRules {
 
     // Call for every line but comments, in order, once its block is known.
     void Enter(const CBlockTracker& blocks) {
-        if (blocks.HaveChanged()) _TrackFunctions(blocks.Blocks());
+        if (!blocks.HaveChanged()) return;
+        _fIsPlaceKnown = false;
+        if (!_fFunctions.empty() || _OpensStrict(blocks.Innermost().clause)) _TrackFunctions(blocks.Blocks());
+    }
+
+    // False for most lines: nothing in them depends on where they are.
+    bool MayBreak(const CRawLogical& part) const {
+        return part.MayHaveWords(kWordsOfInterest) || !_fIsPastFutures;
     }
 
     // Then call this; `tree` is null for one with a fault.
@@ -71,6 +78,11 @@ class CPlacementRules {
     void Finish() { _TrackFunctions({}); }
 
   private:
+    // Words without which a line has nothing that depends on its place.
+    static constexpr uint64_t kWordsOfInterest =
+        WordBits(EWord::kReturn, EWord::kYield, EWord::kAwait, EWord::kAsync, EWord::kBreak, EWord::kContinue,
+                 EWord::kNonlocal, EWord::kFrom, EWord::kLazy);
+
     // A function whose body is under way and must not both yield and return a value.
     struct CStrictFunction {
         size_t block_i;  // of its body among the blocks around a line
@@ -79,9 +91,15 @@ class CPlacementRules {
         CSpan first_return;  // of a value
     };
 
+    const CPlacement& _PlaceIn(const CBlockTracker& blocks);
     void _TrackFunctions(const std::vector<CBlock>& blocks);
     void _EndFunction(const CStrictFunction& function);
     bool _IsStrict(CPlacement::EScope scope) const;
+    bool _OpensStrict(EClause clause) const {
+        return (clause == EClause::kAsyncDef || clause == EClause::kDef) &&
+               _IsStrict(clause == EClause::kDef ? CPlacement::EScope::kFunction
+                                                 : CPlacement::EScope::kAsyncFunction);
+    }
     void _CheckFuture(const CTreeNode& statement, const CBlockTracker& blocks);
     void _CheckFeature(const CTreeNode& name);
     void _Visit(const CTreeNode& node, CPlacement place);
@@ -112,6 +130,8 @@ class CPlacementRules {
     CProblems& _fProblems;
     const CTree* _fTree = nullptr;
     std::vector<CStrictFunction> _fFunctions;  // by depth; only those whose body is under way
+    CPlacement _fPlace;                        // what the blocks around the line allow, once it is known
+    bool _fIsPlaceKnown = false;
     bool _fIsPastFutures = false;
     bool _fHasStatement = false;  // something came before
     bool _fHasFutures = false;    // an import from `__future__` did

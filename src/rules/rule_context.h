@@ -4,6 +4,7 @@
 #include <string>
 #include <string_view>
 
+#include "rules/name_set.h"
 #include "rules/problem.h"
 #include "syntax/language.h"
 #include "syntax/nodes.h"
@@ -17,6 +18,12 @@ struct CRuleContext {
     const CTree& tree;
     const CLanguage& language;
     CProblems& problems;
+    CNameSet& names;  // for a rule that compares names; it clears the set first
+
+    // False for most lines: no name in them is one that can't be bound, `__debug__` or the None of Python 2.
+    bool MayHaveUnbindableNames() const {
+        return tree.Line().MayHaveWords(kDebugNameBit | WordBits(EWord::kNoneValue));
+    }
 
     void Report(ECode code, const CTreeNode& node, std::string message, std::string hint = {}) const {
         const CSpan span = SpanOf(tree, node);

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <span>
+#include <vector>
 
 #include "text/token_type.h"
 #include "tokenizer/keywords.h"
@@ -39,17 +40,23 @@ constexpr auto kClauseNames = std::to_array<CClauseNames>({
     {"case", "'case' statement"},
 });
 
-bool IsSignificant(const CRawToken& token) {
-    return token.type != kTokenId_COMMENT && token.type != kTokenId_BACKSLASH;
-}
-
 // The tokens from `token_i` on, passing over comments and backslashes; null at the end.
 const CRawToken* NextSignificant(std::span<const CRawToken> tokens, size_t& token_i) {
     while (token_i < tokens.size()) {
         const CRawToken& token = tokens[token_i++];
-        if (IsSignificant(token)) return &token;
+        if (!IsPassedOver(token)) return &token;
     }
     return nullptr;
+}
+
+constexpr uint64_t kWordsOfClauses = WordBits(
+    EWord::kAsync, EWord::kCase, EWord::kClass, EWord::kDef, EWord::kElif, EWord::kElse, EWord::kExcept,
+    EWord::kFinally, EWord::kFor, EWord::kIf, EWord::kMatch, EWord::kTry, EWord::kWhile, EWord::kWith);
+
+bool EndsInColon(const std::vector<CRawToken>& tokens) {
+    for (auto token = tokens.rbegin(); token != tokens.rend(); ++token)
+        if (!IsPassedOver(*token)) return token->type == kTokenId_COLON;
+    return false;
 }
 
 EClause ClauseOfExcept(const CRawToken* next) {
@@ -128,6 +135,13 @@ bool MayBeAnnotation(std::span<const CRawToken> tokens, size_t token_i) {
 }  // namespace
 
 CStatementHead ReadStatementHead(const CRawLogical& logical) {
+    const CRawToken& beginning = logical.tokens.front();
+    const bool may_have_clause = (WordBits(beginning.word) & kWordsOfClauses) != 0 ||
+                                 beginning.type == kTokenId_AT || IsPassedOver(beginning);
+    if (!may_have_clause)
+        return {.start = logical.StartOf(beginning),
+                .end = logical.EndOf(beginning),
+                .ends_in_colon = EndsInColon(logical.tokens)};
     CStatementHead head;
     size_t token_i = 0;
     const CRawToken* const significant = NextSignificant(logical.tokens, token_i);
@@ -149,11 +163,7 @@ CStatementHead ReadStatementHead(const CRawLogical& logical) {
     if (head.clause == EClause::kCase) head.may_be_annotation = MayBeAnnotation(logical.tokens, token_i);
     if (head.clause == EClause::kWith || head.clause == EClause::kAsyncWith)
         head.with_item_count = CountWithItems(logical);
-    for (size_t last_i = logical.tokens.size(); last_i-- > 0;) {
-        if (!IsSignificant(logical.tokens[last_i])) continue;
-        head.ends_in_colon = logical.tokens[last_i].type == kTokenId_COLON;
-        break;
-    }
+    head.ends_in_colon = EndsInColon(logical.tokens);
     return head;
 }
 

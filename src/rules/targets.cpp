@@ -9,7 +9,6 @@ namespace codeloom {
 
 namespace {
 
-constexpr std::string_view kDebug = "__debug__";
 constexpr int kRefusesDeletedDebug = 310;
 constexpr uint32_t kMaxBeforeStar = 255;
 
@@ -37,12 +36,14 @@ class CTargetCheck {
 
     // False after a fault.
     bool Check(const CTreeNode& target, int depth = 0) const {
+        if (target.Is(ENodeKind::kNameLiteral)) return _CheckLeaf(target);
         if (depth > CRuleContext::kMaxDepth) return true;
         const EExpression kind = KindOfExpression(_fContext.tree, target);
         switch (kind) {
             case EExpression::kName:
             case EExpression::kAttribute:
-                return _CheckLeaf(*BoundLeaf(_fContext.tree, target, kind));
+                return !_fContext.MayHaveUnbindableNames() ||
+                       _CheckLeaf(*BoundLeaf(_fContext.tree, target, kind));
             case EExpression::kSubscript:
                 return true;
             case EExpression::kList:
@@ -59,14 +60,15 @@ class CTargetCheck {
     bool _IsDelete() const { return _fUse == ETargetUse::kDelete; }
 
     bool _CheckLeaf(const CTreeNode& name) const {
+        if (!_fContext.MayHaveUnbindableNames()) return true;
         if (IsNoneName(name)) {
             CheckBoundName(_fContext, name);
             return false;
         }
-        if (_fContext.tree.Text(name) != kDebug) return true;
+        if (_fContext.tree.Text(name) != kDebugName) return true;
         if (_IsDelete() && _fContext.language.version < kRefusesDeletedDebug) return true;
         _fContext.Report(ECode::kCannotBindName, name,
-                         Joined(_IsDelete() ? "cannot delete " : "cannot assign to ", kDebug));
+                         Joined(_IsDelete() ? "cannot delete " : "cannot assign to ", kDebugName));
         return false;
     }
 
@@ -150,7 +152,8 @@ void CheckTarget(const CRuleContext& context, const CTreeNode& target, ETargetUs
 }
 
 void CheckBoundName(const CRuleContext& context, const CTreeNode& name) {
-    if (context.tree.Text(name) == kDebug)
+    if (!context.MayHaveUnbindableNames()) return;
+    if (context.tree.Text(name) == kDebugName)
         context.Report(ECode::kCannotBindName, name, "cannot assign to __debug__");
     if (IsNoneName(name)) context.Report(ECode::kCannotBindName, name, "cannot assign to None");
 }
@@ -171,6 +174,7 @@ void CheckAssignment(const CRuleContext& context, const CTreeNode& statement) {
 }
 
 void CheckImportedNames(const CRuleContext& context, const CTreeNode& names) {
+    if (!context.MayHaveUnbindableNames()) return;
     ForEachImportedName(context.tree, names, [&](const CImportedName& imported) {
         CheckBoundName(context, imported.as_name != nullptr ? *imported.as_name : *imported.name);
     });

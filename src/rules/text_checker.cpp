@@ -48,30 +48,30 @@ void CTextChecker::Enter(const CRawLogical& logical) {
     _fFirstProblem = _fProblems.size();
 }
 
-void CTextChecker::Take(const CRawLogical& part, const CTree& tree) {
+void CTextChecker::_Check(const CRawLogical& part, const CTree& tree) {
     const CLineSetting setting = _Setting(tree);
-    if (!IsHint(part)) CheckLine(tree, _fLanguage, setting, _fProblems);
+    if (!IsHint(part)) CheckLine({tree, _fLanguage, _fProblems, _fNames}, setting);
     if (&part == _fLine) {
         _fAnnotations.clear();
         if (setting.defers_annotations && !part.embedded.empty()) _fAnnotations = AnnotationsWithFields(tree);
         _fPlacement.Check(part, &tree, _fBlocks);
         if (part.MayHaveWords(WordBits(EWord::kYield)) && !tree.HasKind(ENodeKind::kLambda))
             _fBlocks.TakeYield();
-        if (!tree.fIsEmpty && _fProblems.size() == _fFirstProblem)
-            if (const CTreeNode* const name = TakesAllCases(tree, tree.fRoot))
-                _fBlocks.TakeAllCases(SpanOf(tree, *name));
     } else {
         _fPlacement.CheckEmbedded(tree, _fBlocks);
         if (!_fAnnotations.empty()) _CheckField(part, tree);
     }
-    DropNested(_fProblems, _fFirstProblem);
+    if (_fProblems.size() != _fFirstProblem) return DropNested(_fProblems, _fFirstProblem);
+    if (&part != _fLine || tree.fIsEmpty || !tree.fRoot.Is(ENodeKind::kCase)) return;
+    if (const CTreeNode* const name = TakesAllCases(tree, tree.fRoot))
+        _fBlocks.TakeAllCases(SpanOf(tree, *name));
 }
 
 void CTextChecker::_CheckField(const CRawLogical& part, const CTree& tree) {
     const uint32_t start = part.StartOf(part.tokens.front());
     const auto holds = [&](const CSpan& span) { return span.start <= start && start < span.end; };
     if (std::any_of(_fAnnotations.begin(), _fAnnotations.end(), holds))
-        CheckFieldInAnnotation({tree, _fLanguage, _fProblems});
+        CheckFieldInAnnotation({tree, _fLanguage, _fProblems, _fNames});
 }
 
 CLineSetting CTextChecker::_Setting(const CTree& tree) const {

@@ -24,7 +24,10 @@ class CTextChecker final : public CTreeObserver {
 
     // Call for every line in order, before its analysis, which hands its trees over, and after that.
     void Enter(const CRawLogical& logical);
-    void Take(const CRawLogical& part, const CTree& tree) override;
+    void Take(const CRawLogical& part, const CTree& tree) override {
+        if (MayBreakLineRule(tree, _fLanguage) || _fPlacement.MayBreak(part) || !part.embedded.empty())
+            _Check(part, tree);
+    }
     void Leave(const CRawLogical& logical, bool has_fault);
 
     // Call once, after the last line.
@@ -33,6 +36,8 @@ class CTextChecker final : public CTreeObserver {
     const CBlockTracker& Blocks() const { return _fBlocks; }
 
   private:
+    // Apart, so that most lines pay for the question alone.
+    [[gnu::noinline]] void _Check(const CRawLogical& part, const CTree& tree);
     CLineSetting _Setting(const CTree& tree) const;
     void _CheckField(const CRawLogical& part, const CTree& tree);
 
@@ -40,6 +45,7 @@ class CTextChecker final : public CTreeObserver {
     CProblems& _fProblems;
     CBlockTracker _fBlocks;
     CPlacementRules _fPlacement;
+    CNameSet _fNames;                     // storage that stays
     const CRawLogical* _fLine = nullptr;  // under way
     size_t _fFirstProblem = 0;            // of what its trees show
     CSpan _fLastToken;                    // of the last line

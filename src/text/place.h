@@ -15,6 +15,7 @@ struct CPlace {
     size_t row_start = 0;
     int32_t row = 0;
     int32_t indent = 0;  // of the row, in columns; tabs go to the next multiple of eight
+    bool is_indented_by_spaces = true;
 
     int32_t Column() const { return static_cast<int32_t>(pos - row_start); }
 };
@@ -26,7 +27,9 @@ inline void SkipIndent(std::string_view text, CPlace& place) {
     const size_t start = place.pos;
     place.pos = SkipSpaces(text, start);
     auto indent = static_cast<int32_t>(place.pos - start);
+    place.is_indented_by_spaces = true;
     for (; place.pos < text.size() && IsBlank(text[place.pos]); ++place.pos) {
+        place.is_indented_by_spaces = false;
         switch (text[place.pos]) {
             case ' ':
                 ++indent;

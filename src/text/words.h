@@ -68,7 +68,11 @@ enum class EWord : uint8_t {
         kCount
 };
 
-static_assert(static_cast<size_t>(EWord::kCount) <= 64);
+// A name that no statement may bind, although it is no word of the language: in sets of words it has the last
+// bit.
+inline constexpr std::string_view kDebugName = "__debug__";
+inline constexpr uint64_t kDebugNameBit = uint64_t{1} << 63;
+static_assert(static_cast<size_t>(EWord::kCount) < 64);
 
 // A bit for each of the words.
 template <class... Words>

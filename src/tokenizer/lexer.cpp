@@ -64,7 +64,8 @@ CLexedToken CLexer::_LexString(size_t pos, const CStringStart& start, int depth)
     if (!found.is_closed) found = _FindPlainStringEnd(content, start);
     if (start.IsTriple() && depth == 0) found = _JudgeTriple(pos, start, found);
     const int16_t type = found.is_closed ? kTokenId_STRING : kTokenId_ERRORTOKEN;
-    return {found.end, type, EWord::kNone, found.may_span_rows, start.has_fields};
+    const bool is_special = start.prefix_length != 0 || found.has_escapes;
+    return {found.end, type, EWord::kNone, found.may_span_rows, start.has_fields, is_special};
 }
 
 // Inside another f-string a failure is no waste of its own: the outermost string fails with it and counts it.

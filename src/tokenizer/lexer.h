@@ -16,18 +16,20 @@ namespace codeloom {
 // As small as a register.
 struct CLexedToken {
     CLexedToken(size_t end_pos, int16_t token_type, EWord token_word = EWord::kNone, bool rows = false,
-                bool fields = false)
+                bool fields = false, bool special = true)
         : end(static_cast<uint32_t>(end_pos)),
           type(token_type),
           word(token_word),
           may_span_rows(rows),
-          has_fields(fields) {}
+          has_fields(fields),
+          is_special(special) {}
 
     uint32_t end;
     int16_t type;
     EWord word;
     bool may_span_rows : 1;
     bool has_fields : 1;  // an f-string or a t-string
+    bool is_special : 1;  // of a string: it has a prefix, or it may have a backslash
 };
 
 inline CRawToken MakeToken(size_t pos, CLexedToken lexed, CPosition position = {}) {

@@ -62,10 +62,13 @@ struct CLogicalFacts {
     bool in_async_def = false;  // lies in the body or the header of an `async def`
     bool first_in_def = false;  // is the first logical of a def's body
     bool is_method = false;     // is the header of a def right in the body of a class
+    // Begins its row, with nothing but spaces before it. Not known of an embedded logical.
+    bool is_indented_by_spaces = false;
     // What its tokens may be, so that most lines need no look at them. An embedded logical may have all.
     bool may_have_strings = true;
+    bool may_have_special_strings = true;  // with a prefix, a backslash or triple quotes
     bool may_have_comments = true;
-    uint64_t words = ~uint64_t{0};  // a bit for each
+    uint64_t words = ~uint64_t{0};  // a bit for each, and one for __debug__
 };
 
 // One logical line, or one expression embedded in a logical line.

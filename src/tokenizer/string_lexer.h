@@ -33,6 +33,7 @@ struct CStringEnd {
     size_t end = 0;  // after the closing quotes; without closing quotes the end of the row, or of the text
     bool is_closed = false;
     bool may_span_rows = false;
+    bool has_escapes = true;  // or may have
 };
 
 namespace string_lexer {
@@ -103,14 +104,15 @@ inline CStringEnd FindTripleEnd(std::string_view text, size_t start, char quote)
 }
 
 inline CStringEnd FindSingleEnd(std::string_view text, size_t pos, char quote) {
-    bool may_span_rows = false;
+    bool may_span_rows = false, has_escapes = false;
     for (;;) {
         pos = FindByte<kEndsPlainString, true>(text, pos);
-        if (pos >= text.size()) return {text.size(), false, may_span_rows};
+        if (pos >= text.size()) return {text.size(), false, may_span_rows, has_escapes};
         const char c = text[pos];
-        if (c == quote) return {pos + 1, true, may_span_rows};
-        if (IsRowEnd(c)) return {pos, false, may_span_rows};
+        if (c == quote) return {pos + 1, true, may_span_rows, has_escapes};
+        if (IsRowEnd(c)) return {pos, false, may_span_rows, has_escapes};
         if (c == '\\') {
+            has_escapes = true;
             may_span_rows |= RowEndLength(text, pos + 1) != 0;
             pos = SkipEscape(text, pos);
         } else {

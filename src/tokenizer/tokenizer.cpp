@@ -49,6 +49,7 @@ bool CTokenizer::NextLogical(CRawLogical& logical) {
 
     logical.first_row = _fPlace.row;
     logical.origin = {_fPlace.row, 0};
+    logical.is_indented_by_spaces = !is_mid_row && _fPlace.is_indented_by_spaces;
     if (text[_fPlace.pos] == '#') {
         _CollectComment(logical);
     } else {
@@ -56,6 +57,7 @@ bool CTokenizer::NextLogical(CRawLogical& logical) {
     }
     logical.words = _fFacts.words;
     logical.may_have_strings = _fFacts.has_strings;
+    logical.may_have_special_strings = _fFacts.has_special_strings;
     logical.may_have_comments = _fFacts.embedding.has_comments;
     _fScopes.Visit(logical, _fIndent, is_mid_row);
     if (_fFacts.embedding.Any()) _fEmbedded.Find(logical, _fFacts.embedding);
@@ -180,6 +182,8 @@ inline void CTokenizer::_AddName(CRawLogical& logical, std::string_view text) {
     const EWord word = WordOfPart(text, pos, end - pos);
     _Add(logical, end, kTokenId_NAME, word);
     _fFacts.words |= WordBits(word);
+    if (end - pos == kDebugName.size() && text[pos] == '_') [[unlikely]]
+        _fFacts.words |= kDebugNameBit;
     if (word == EWord::kLambda) [[unlikely]]
         _NoteLambda();
 }
@@ -205,6 +209,7 @@ void CTokenizer::_Note(size_t pos, CLexedToken token) {
     switch (token.type) {
         case kTokenId_STRING:
             _fFacts.has_strings = true;
+            _fFacts.has_special_strings |= token.is_special;
             _fFacts.embedding.has_strings |= _fFacts.has_hint_sign;
             _fFacts.embedding.has_fields |= token.has_fields;
             [[fallthrough]];

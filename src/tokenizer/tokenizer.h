@@ -28,6 +28,7 @@ struct CLineFacts {
     bool is_assignment = false;
     bool has_hint_sign = false;  // a ":" or "->"
     bool has_strings = false;
+    bool has_special_strings = false;
     uint64_t words = 0;  // a bit for each
 };
 
