@@ -9,6 +9,8 @@ from pathlib import Path
 
 import pytest
 
+from codeloom.cli.arguments import COMMANDS
+
 EXAMPLES = Path(__file__).parent.parent / "examples"
 
 
@@ -107,7 +109,13 @@ def test_version_and_help(run_cli):
         done = run_cli(*arguments)
         assert done.returncode == 0 and "examples:" in done.stdout
         assert ("--python" in done.stdout) == (len(arguments) == 2)
-        assert max(map(len, done.stdout.splitlines())) < 80
+
+
+@pytest.mark.parametrize("command", COMMANDS)
+def test_help_fits_a_terminal_of_80_columns(run_cli, command):
+    done = run_cli("help", command)
+    assert done.returncode == 0 and "examples:" in done.stdout
+    assert max(map(len, done.stdout.splitlines())) < 80
 
 
 class TestFiles:

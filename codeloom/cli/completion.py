@@ -41,9 +41,10 @@ class CompletionCommand(Command):
     """Prints a script for a shell."""
 
     NAME = "completion"
-    DESCRIPTION = "Print what completes commands and options in a shell, for the shell to read at its start."
+    DESCRIPTION = "Print a script that completes commands and options, for your shell to read when it starts."
     EXAMPLES = (
-        "codeloom completion bash > ~/.local/share/bash-completion/completions/codeloom",
+        "cd ~/.local/share/bash-completion/completions",
+        "codeloom completion bash > codeloom",
         "codeloom completion zsh >> ~/.zshrc",
         "codeloom completion fish > ~/.config/fish/completions/codeloom.fish",
     )

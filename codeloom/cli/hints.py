@@ -119,14 +119,16 @@ class HintsCommand(SourceCommand):
 
     NAME = "hints"
     DESCRIPTION = (
-        "Show each def with its arguments: their types from annotations or comments, their defaults, "
-        "and what `return` and `yield` are known to give. A def that isn't sound is shown with its fault; "
-        "other faults are for `codeloom check`. The exit status is 0 when all defs are sound, 1 when some "
-        "aren't, 2 on wrong use or when a file can't be read."
+        "List each def with its arguments: their types from annotations or comments, their defaults, and "
+        "what `return` and `yield` are known to give. A broken def is shown with its fault; `codeloom check` "
+        "reports the other faults. "
+        "The exit status is 0 if there is no problem, 1 if there are some, 2 for wrong use or a file "
+        "that can't be read."
     )
     EXAMPLES = (
         "codeloom hints src/a.py",
-        "codeloom hints --format json src | jq '.items[] | select(.return_hint == null).name'",
+        "codeloom hints --format json src |",
+        "    jq '.items[] | select(.return_hint == null).name'",
     )
     NEEDS_RECORDS = True
 

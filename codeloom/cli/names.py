@@ -17,15 +17,17 @@ class NamesCommand(SourceCommand):
 
     NAME = "names"
     DESCRIPTION = (
-        "Show what each logical line reads and binds, and what it says of these names. Lines that "
-        "say nothing of names are left out; a line that isn't sound is shown with its fault. "
-        "With --roles every appearance of a name is shown instead. The exit "
-        "status is 0 when all are sound, 1 when some aren't, 2 on wrong use or when a file can't be read."
+        "List what each logical line reads and binds, and what it says about these names. Lines without "
+        "names are left out; a broken line is shown with its fault. --roles lists every appearance of a "
+        "name instead. "
+        "The exit status is 0 if there is no problem, 1 if there are some, 2 for wrong use or a file "
+        "that can't be read."
     )
     EXAMPLES = (
         "codeloom names src/a.py",
         "codeloom names --unused --undefined src",
-        "codeloom names --format jsonl src | jq -r 'select(.kind == \"from\").payload' | sort | uniq -c",
+        "codeloom names --format jsonl src |",
+        "    jq -r 'select(.kind == \"from\").payload' | sort | uniq -c",
     )
     NEEDS_RECORDS = True
 
