@@ -14,7 +14,7 @@ HEADER = re.compile(r"(async +)?(def|class|if|elif|else|for|while|with|try|excep
 
 @dataclass(frozen=True)
 class Token:
-    """A token and where it stands in the text."""
+    """A token and where it is in the text."""
 
     text: str
     start: int
@@ -23,7 +23,7 @@ class Token:
 
 @dataclass(frozen=True)
 class Line:
-    """A logical line of an ASCII text; comments and backslashes are no tokens of it."""
+    """A logical line of an ASCII text; comments and backslashes aren't tokens of it."""
 
     source: str
     tokens: list[Token]
@@ -59,7 +59,7 @@ class Edit:
 
 
 def Lines(text: str, logicals: list[CLogicalLine]) -> list[Line]:
-    """The lines that begin their row; those behind a semicolon are left out."""
+    """The lines that begin their row; those after a semicolon are left out."""
     row_starts = [0, *(match.end() for match in re.finditer("\n", text))]
     lines = []
     for logical in logicals:

@@ -51,7 +51,7 @@ ODDLY_HOSTED_TEXTS = 0.1
 BIG_FILES = 0.002
 BIG_FILE_SIZE = 300_000
 
-# What the engine alone swallows: in its trees three dots are no expression, and what wants one refuses
+# What the engine alone swallows: in its trees three dots aren't an expression, and what wants one refuses
 # them; and a hint has arguments although the `def` has none.
 _SWALLOWED_BY_ENGINE = re.compile(
     r"CExpression.*logical tokens: .*\.\.\.|the def has no records of its arguments", re.DOTALL
@@ -142,7 +142,7 @@ class Fuzzer:
 
     @staticmethod
     def _LookAtNames(analysis: Analysis) -> None:
-        """Names stand in order, where they say, and each question about them has an answer."""
+        """Names are in order, where they say, and each question about them has an answer."""
         text_rows = RowTexts(analysis.text)
         last = (0, 0)
         for occurrence in analysis.occurrences:
@@ -163,7 +163,7 @@ class Fuzzer:
 
 
 def _Solid(text: str) -> list[str]:
-    """The characters that stand in tokens: no white space, no separators of statements."""
+    """The characters that are in tokens: no white space, no separators of statements."""
     return sorted(char for char in text if not char.isspace() and char not in ";\ufeff")
 
 

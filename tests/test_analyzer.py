@@ -58,7 +58,7 @@ class Failing(CPGenAnalyzerImpl):
 @pytest.mark.parametrize(
     ("text", "row", "offset"),
     [
-        ("x = (", 1, 6),  # behind the last token
+        ("x = (", 1, 6),  # after the last token
         (") = 1", 1, 1),
         ("x = = 1", 1, 5),
         ("f(a,\n  b,\n  c d)", 3, 5),
@@ -115,7 +115,7 @@ def test_the_outcome_of_a_walk(error, caplog):
     logged = [record.exc_info for record in caplog.records]
     assert len(logged) == (error is not None and not is_returned)
     if isinstance(error, KeyboardInterrupt):
-        assert logged[0][1] is error  # as it is, like all that is no Exception
+        assert logged[0][1] is error  # as it is, like all that isn't an Exception
     if isinstance(error, TypeError):
         assert str(logged[0][1]) == (
             "Could not analyze logical -- inner exception is TypeError('odd')\n  logical tokens: x = f ( 1 )"

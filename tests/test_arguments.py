@@ -23,7 +23,7 @@ from codeloom.treesift import (
 
 
 def Written(arguments):
-    """Records as one would write them; a value without a name stands behind "=" too."""
+    """Records as one would write them; a value without a name is after "=" too."""
     return [
         Written(argument)
         if isinstance(argument, list)

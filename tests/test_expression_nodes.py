@@ -27,7 +27,7 @@ def Keyword(text):
 
 
 def Chain(depth, cls, *first_children, last):
-    """A node in a node in a node, each behind the same first children."""
+    """A node in a node in a node, each after the same first children."""
     node = last
     for _ in range(depth):
         node = Node(cls, *first_children, node)

@@ -1,6 +1,6 @@
 """What each version of the language brought, one row for each form: accepted from there on, named before.
 
-A row is a statement, and behind two blanks and `#!` what is said of it to somebody who asks for the version
+A row is a statement, and after two blanks and `#!` what is said of it to somebody who asks for the version
 before.
 """
 

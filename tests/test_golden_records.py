@@ -1,6 +1,6 @@
 """What the engine says of the names of logical lines, against golden files in records/.
 
-Each logical line of a case stands there with its records beneath it in their order, those of arguments
+Each logical line of a case is there with its records beneath it in their order, those of arguments
 last, then its error, if it has one: row and column from 1, counted from the line's own first row and in
 UTF-8 bytes, and the message, for an expression within the line with its text. Where the language
 versions differ, each has its own records.
@@ -63,7 +63,7 @@ def Output(source):
 
 
 def Sections(outcomes):
-    """The rows of the outcomes, once where they are equal, otherwise each behind its version."""
+    """The rows of the outcomes, once where they are equal, otherwise each after its version."""
     if all(outcome == outcomes[0][1] for _, outcome in outcomes):
         return [f"    {row}" for row in outcomes[0][1]]
     rows = []

@@ -91,7 +91,7 @@ def test_depth():
 
 
 def test_what_a_signature_is_written_as():
-    """Defaults as they stand, hints in quotes by their value; a comment must fit the arguments."""
+    """Defaults as written, hints in quotes by their value; a comment must fit the arguments."""
     (f,) = Defs("def f(a=('==', '<'), b: \"Literal['\\\\n']\" = 'x'): pass")
     assert [argument.default.text for argument in f.arguments] == ["('==', '<')", "'x'"]
     assert f.arguments[1].hint == "Literal['\\n']"

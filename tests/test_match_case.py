@@ -143,7 +143,7 @@ def test_patterns_have_the_structure_that_the_interpreter_sees(pattern):
     try:
         tree = ast.parse(f"match x:\n case {pattern}: pass")
     except SyntaxError:
-        return  # such as a positional argument behind a named one
+        return  # such as a positional argument after a named one
     expected = tree.body[0].cases[0].pattern
     assert Form(Parse(f"case {pattern}:").GetPattern()) == ExpectedForm(expected)
 

@@ -47,7 +47,7 @@ def test_places(case, rewrite):
 
 
 def WithoutBlanks(rows, place):
-    """What stands in a range of the file."""
+    """What is in a range of the file."""
     if place.row == place.end_row:
         text = rows[place.row - 1][place.column - 1 : place.end_column - 1]
     else:

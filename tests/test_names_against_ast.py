@@ -90,7 +90,7 @@ class Facts(ast.NodeVisitor):
             self.VisitWithinTarget(target)
 
     def VisitWithinTarget(self, node, is_first=False):
-        """Of what a target is made of, the first name of a chain and what stands in `[...]` is read.
+        """Of what a target is made of, the first name of a chain and what is in `[...]` is read.
 
         A name by itself isn't, such as the argument in `f(a).b = 1`.
         """
@@ -186,7 +186,7 @@ class Facts(ast.NodeVisitor):
         self.VisitSuite(node)
 
     def VisitSuite(self, node):
-        # The suite of a definition isn't entered where it stands on the line of its header, but the fields
+        # The suite of a definition isn't entered where it is on the line of its header, but the fields
         # of its f-strings are lines of their own.
         for statement in node.body:
             if self.Line(statement) != self.Line(node):

@@ -1,6 +1,6 @@
 """Nodes as text, and what a host overrides.
 
-Golden files in texts/ hold expressions with their texts, each behind it the options that give it.
+Golden files in texts/ hold expressions with their texts, each followed by the options that give it.
 """
 
 from pathlib import Path
@@ -91,7 +91,7 @@ def test_odd_trailers():
     def Text(*tokens, **options):
         return FULL.TextForAtomPlusTrailers(x, [Node(CTrailer, *map(Leaf, tokens))], **options)
 
-    assert Text(".", "a") == b"x"  # no name behind the dot
+    assert Text(".", "a") == b"x"  # no name after the dot
     assert Text("(", "a", "b", ")") == b"x()"
     for tokens in ("{}", [None, "a"]):
         with pytest.raises(ValueError, match=r"^Bad trailer node$"):

@@ -1,6 +1,6 @@
 """CNodeWalker as a host sees it: its operations, its fields, its limits, and what odd hosts do to it.
 
-What it records of which line stands in the golden files of records/.
+What it records of which line is in the golden files of records/.
 """
 
 import itertools

@@ -96,7 +96,7 @@ def test_wrong_files_and_tables(tmp_path, load):
 
 
 def test_repetition_within_an_option(load):
-    """What repeats may stand first in brackets that may be left out."""
+    """What repeats may be first in brackets that may be left out."""
     parser = optpgen.CreateParser(load("a: NAME ['+'* '-']"), None)
     for text in ("x", "x -", "x + + -"):
         Feed(parser, Tokens(text))

@@ -8,7 +8,7 @@ from codeloom import Range, analyze, analyze_file
 
 
 def Found(text, python="3.12"):
-    """Each problem as "row:column", with its message where that is about a hint or what is no text."""
+    """Each problem as "row:column", with its message where that is about a hint or what isn't text."""
     return [
         f"{problem.range.row}:{problem.range.column}"
         + (f" {problem.message}" if problem.code in ("CL101", "CL601") else "")
@@ -78,7 +78,7 @@ SIDE_BY_SIDE = "type hint: expected an operator or the end of the hint before"
         # Of equal expressions the first is at fault.
         ("x = f'{a b} {a b}'", ["1:8"]),
         ("x = f'{a b}', '{a b}', f'{a b}'", ["1:8"]),
-        # The field of a format, and a field behind a sound one of the same text.
+        # The field of a format, and a field after a sound one of the same text.
         ("x = f'{a:{b c}}'", ["1:11"]),
         ("x = f'{é}' f'{é}' f'{é(}'", ["1:24"]),
         ("x: 'List[int' = 1", ["1:9 type hint: '[' was never closed"]),

@@ -20,7 +20,7 @@ from codeloom.reading.source import MOST_FAULTY_ROWS, source_from_bytes
         (b"\x0c\r# coding=ISO_8859-1-unix\r'\xe9'", "\x0c\r# coding=ISO_8859-1-unix\r'é'"),
         (b"# coding: utf-8-dos\r\n'\xc3\xa9'", "# coding: utf-8-dos\r\n'é'"),
         (b"# coding: shift_jis\n'\x93\xfa'", "# coding: shift_jis\n'日'"),
-        # Not a cookie: behind code, in the third row, in a string.
+        # Not a cookie: after code, in the third row, in a string.
         ("x = 1\n# coding: latin-1\n'é'".encode(), "x = 1\n# coding: latin-1\n'é'"),
         ("\n\n# coding: latin-1\n'é'".encode(), "\n\n# coding: latin-1\n'é'"),
         ("x = '# coding: latin-1 é'".encode(), "x = '# coding: latin-1 é'"),
@@ -47,7 +47,7 @@ def test_sound_files(data, text):
             [(2, 2, "'ascii' in row 1")],
         ),
         (b"# coding: cp1252\n'\x81'", "# coding: cp1252\n'\ufffd'", [(2, 2, "0x81")]),
-        # What follows from a wrong name is no fault of its own.
+        # What follows from a wrong name isn't a fault of its own.
         (b"# coding: klingon\n'\xff'", "# coding: klingon\n'\ufffd'", [(1, 11, "'klingon'")]),
         ("#é coding: rot13\n".encode(), "#é coding: rot13\n", [(1, 12, "'rot13'")]),
         (b"# coding: utf-16\n", "# coding: utf-16\n", [(1, 11, "'utf-16'")]),

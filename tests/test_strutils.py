@@ -133,7 +133,7 @@ def test_nothing_is_of_a_class_outside_the_buffer_or_malformed(module, name):
     assert not any(test(b"a1 ", pos, 3, *initial) for pos in (3, 4, -1, -(2**60), 2**60))
     malformed = [b"\xff", b"\xc3", b"\xa9", b"\xe2\x82", b"\xc0\xb1", b"\xf5\x80\x80\x80"]
     assert not any(test(utf8, 0, len(utf8), *initial) for utf8 in malformed)
-    assert not test("é".encode(), 0, 1, *initial)  # its second byte lies behind the end
+    assert not test("é".encode(), 0, 1, *initial)  # its second byte lies after the end
     with pytest.raises(ValueError, match="outside the buffer of 3 bytes"):
         test(b"a1 ", 0, 4, *initial)
     assert not test(b"a1 ", 0, -1, *initial) and not test(b"a1 ", 7, 7, *initial)

@@ -1,7 +1,7 @@
 """How texts are cut into logical lines, against golden files in tokens/.
 
 A row shows a logical line: the row of the text that it begins on, its type, and its tokens. `/` is before a
-token that stands on a later row than the one before it, and ERROR(...) around what is no token of the
+token that is on a later row than the one before it, and ERROR(...) around what isn't a token of the
 language. Beneath it stand the lines embedded in it, with the row and column where each begins.
 """
 
@@ -52,7 +52,7 @@ def Readable(text):
 
 
 def CheckPositions(text):
-    """Every token, of embedded lines too, stands where its position says."""
+    """Every token, of embedded lines too, is where its position says."""
     rows = text.encode().split(b"\n")
 
     def Check(token, row, column):

@@ -1,7 +1,7 @@
 """The trees of statements and the answers of their accessors, against golden files in trees/.
 
 A row of a tree shows a node: its class, the grammar state, the text of a leaf, the index of its first
-token. Beneath it, behind dots, stand the answers to what its class can be asked, and for brackets those of
+token. Beneath it, after dots, are the answers to what its class can be asked, and for brackets those of
 the functions, a node as its tokens; None, False, an empty list and the node itself aren't shown. An operation
 that takes an index is asked for one after another. Behind `---` stand the grammars; where both give the same
 tree it is there once. The files in trees/extended/ hold what the extended parser alone takes.

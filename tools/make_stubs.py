@@ -3,7 +3,7 @@
     python tools/make_stubs.py
 
 The native modules have stubs, and so have the modules that compute names of theirs while they are
-imported. All others are typed where they stand.
+imported. All others are typed where they are.
 """
 
 import ast
