@@ -260,3 +260,54 @@ def test_cancelled_requests(client):
         except Refused as refused:
             outcomes.append(refused.code)
     assert outcomes[2] == -32800 and outcomes[0] in ("answered", -32801)
+
+
+POSITIONED = (
+    "hover",
+    "definition",
+    "references",
+    "documentHighlight",
+    "prepareRename",
+    "rename",
+    "completion",
+)
+WHOLE = (
+    "documentSymbol",
+    "foldingRange",
+    "semanticTokens/full",
+    "diagnostic",
+    "codeAction",
+    "selectionRange",
+)
+
+
+def test_any_request_at_any_place(tmp_path, seed):
+    """Whatever the text is, a request gets an answer or a reason, and none fails within."""
+    chance = random.Random(seed)
+    folder = Path(__file__).parent
+    texts = [path.read_text("utf-8") for path in sorted(folder.glob("problems/*.problems"))]
+    sources = ["".join(f"{row[2:]}\n" for row in text.split("\n") if row[:2] == "  ") for text in texts]
+    with Client(tmp_path, capabilities=PULL) as client:
+        for number in range(40):
+            rows = chance.choice(sources).splitlines(keepends=True)
+            start = chance.randrange(max(len(rows) - 30, 1))
+            text = "".join(chance.sample(rows[start : start + 30], k=min(20, len(rows[start:]))))
+            document = client.open(text, f"r{number}.py")
+            last = len(RowTexts(text))
+            for _ in range(12):
+                row, column = chance.randrange(last), chance.randrange(30)
+                position = {"line": row, "character": column}
+                more = {
+                    "position": position,
+                    "positions": [position],
+                    "range": {"start": position, "end": {"line": last, "character": 0}},
+                    "newName": "renamed",
+                }
+                method = f"textDocument/{chance.choice(POSITIONED + WHOLE)}"
+                if method.endswith(("references", "codeAction")):
+                    more["context"] = {"includeDeclaration": True, "diagnostics": []}
+                try:
+                    client.request(method, {**document, **more})
+                except Refused as refused:
+                    assert refused.code == -32803, (seed, method, position, text, refused)
+        assert not client.errors
