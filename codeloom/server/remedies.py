@@ -11,7 +11,7 @@ from codeloom._analysis import Line, LineKind, Range
 from codeloom.cli.items import Finding
 from codeloom.server.blocks import line_at, line_index
 from codeloom.server.documents import OpenDocument
-from codeloom.server.pieces import CLOSER_OF, Piece, pieces_of
+from codeloom.server.pieces import CLOSER_OF, Piece, bracket_pairs, pieces_of
 
 Place = tuple[int, int]
 
@@ -82,7 +82,44 @@ def _replace(start: Place, end: Place, text: str) -> tuple[Range, str]:
     return Range(*start, *end), text
 
 
-# What is missing
+# What is missing or too much
+
+
+def _colon_for(patient: Patient) -> Iterator[Remedy]:
+    """A colon in the place of a word, or of the brace around a block, whose end has a row of its own."""
+    written = re.match(r"write ':' instead of '(.+?)'", patient.hint)
+    if written is None:
+        return
+    title = f"Write ':' instead of '{written[1]}'"
+    following = patient.after(patient.end)
+    has_colon = bool(following) and following[0].text == ":"
+    edit = _replace(_blanks_before(patient, patient.start), patient.end, "" if has_colon else ":")
+    yield Remedy(title, [edit])
+    rows = patient.document.rows
+    for row in range(patient.range.row, len(rows)):
+        if written[1] == "{" and rows[row].strip() == "}":
+            yield Remedy(title, [edit, _replace((row + 1, 1), (row + 1, len(rows[row]) + 1), "")])
+
+
+def _left_out(patient: Patient) -> Iterator[Remedy]:
+    following = [piece for piece in patient.after(patient.end) if piece.start[0] == patient.end[0]]
+    if "leave it out" in patient.hint and following:
+        title = f"Remove '{patient.text}'"
+        yield Remedy(title, [_replace(patient.start, following[0].start, "")])
+
+
+def _without_parentheses(patient: Patient) -> Iterator[Remedy]:
+    if "remove the parentheses" not in patient.hint:
+        return
+    for opening, closing in bracket_pairs(patient.code_pieces):
+        if opening.end == patient.start:
+            edits = [_replace(piece.start, piece.end, "") for piece in (opening, closing)]
+            yield Remedy("Remove the parentheses", edits)
+
+
+def _comment_sign(patient: Patient) -> Iterator[Remedy]:
+    if "comment with '#'" in patient.hint:
+        yield Remedy("Write '#'", [_replace(patient.start, patient.end, "#")])
 
 
 def _colon(patient: Patient) -> Iterator[Remedy]:
@@ -217,15 +254,22 @@ def _equal(patient: Patient) -> Iterator[Remedy]:
     if "'=='" in patient.hint:
         for sign in signs:
             yield Remedy("Replace '=' with '=='", [_replace(sign.start, sign.end, "==")])
+    if "'=' to give an argument" in patient.hint:
+        for sign in patient.after(patient.start):
+            if sign.text == ":":
+                blank = patient.between(sign.end, _next_start(patient.code_pieces, sign))
+                edits = [_replace(sign.start, (sign.end[0], sign.end[1] + len(blank)), "=")]
+                yield Remedy("Write '='", edits)
     if "':' between a key and its value" in patient.hint:
         for i in range(len(signs), 0, -1):
-            edits = [_replace(_blanks_before(patient, sign), sign.end, ":") for sign in signs[:i]]
+            edits = [_replace(_blanks_before(patient, sign.start), sign.end, ":") for sign in signs[:i]]
             yield Remedy("Replace '=' with ':'", edits)
 
 
-def _blanks_before(patient: Patient, piece: Piece) -> Place:
-    before = patient.before(piece.start)
-    return before[-1].end if before and before[-1].range.end_row == piece.range.row else piece.start
+def _blanks_before(patient: Patient, place: Place) -> Place:
+    """Where the blanks in front of a place begin."""
+    before = patient.before(place)
+    return before[-1].end if before and before[-1].range.end_row == place[0] else place
 
 
 _QUOTED = r"('+)(?P<text>.+?)\1"
@@ -344,10 +388,10 @@ def _except(patient: Patient) -> Iterator[Remedy]:
 
 
 def _else_if(patient: Patient) -> Iterator[Remedy]:
-    texts = [piece.text for piece in patient.code_pieces[:2]]
-    if texts == ["else", "if"]:
-        first, second = patient.code_pieces[:2]
-        yield Remedy("Write 'elif'", [_replace(first.start, second.end, "elif")])
+    first, *others = patient.code_pieces
+    if first.text == "else" and "elif" in patient.hint and others:
+        last = others[0] if others[0].text == "if" else first
+        yield Remedy("Write 'elif'", [_replace(first.start, last.end, "elif")])
 
 
 def _wrapped(patient: Patient) -> Iterator[Remedy]:
@@ -394,18 +438,20 @@ _BY_CODE: dict[str, Sequence[Callable[[Patient], Iterator[Remedy]]]] = {
     "CL203": (_unmatched,),
     "CL204": (_other_closer,),
     "CL211": (_comma,),
-    "CL212": (_else_if, _colon),
+    "CL212": (_else_if, _colon_for, _colon),
     "CL213": (_else,),
     "CL214": (_in,),
     "CL219": (_own_row,),
     "CL221": (_equal,),
     "CL223": (_as_written,),
-    "CL231": (_as_written,),
+    "CL231": (_as_written, _left_out),
     "CL232": (_as_written,),
+    "CL233": (_without_parentheses,),
+    "CL236": (_comment_sign,),
     "CL241": (_call,),
     "CL242": (_raise_or_repr,),
     "CL253": (_import_from,),
-    "CL263": (_colon,),
+    "CL263": (_colon, _equal),
     "CL264": (_wrapped,),
     "CL301": (_unindent,),
     "CL302": (_body,),
