@@ -15,7 +15,7 @@ Where a title ends in `@ 3.7`, the examples are written in that version of Pytho
 
 import re
 from functools import cache
-from importlib.resources import files
+from pathlib import Path
 from typing import NamedTuple
 
 from codeloom.reading.languages import NEWEST
@@ -50,7 +50,7 @@ class Explanation(NamedTuple):
 @cache
 def explanations() -> dict[str, Explanation]:
     """All explanations, by their codes and in their order."""
-    text = files("codeloom").joinpath("explanations.txt").read_text("utf-8")
+    text = Path(__file__).with_suffix(".txt").read_text("utf-8")
     return {found.code: found for found in map(_parsed, text.removeprefix("== ").split("\n== "))}
 
 

@@ -3,17 +3,23 @@
 A run loads the command that it runs and no other.
 """
 
+from __future__ import annotations
+
 import argparse
 import sys
 from collections.abc import Sequence
 from importlib import import_module
-from typing import NoReturn
 
 from codeloom.cli.command import Command
 from codeloom.cli.console import print_error
 from codeloom.cli.options import Options
 from codeloom.cli.project import nearest
+from codeloom.cli.terminal import terminal_width
 from codeloom.reading.languages import NEWEST, VERSIONS
+
+TYPE_CHECKING = False  # `typing` takes long to import
+if TYPE_CHECKING:
+    from typing import NoReturn
 
 # The module and the class of each command, and what it does.
 COMMANDS = {
@@ -116,6 +122,9 @@ class _Parser(argparse.ArgumentParser):
 
 class _HelpFormatter(argparse.RawDescriptionHelpFormatter):
     """Fills the description as a paragraph and leaves the examples as they are."""
+
+    def __init__(self, prog: str) -> None:
+        super().__init__(prog, width=terminal_width(80) - 2)
 
     def _fill_text(self, text: str, width: int, indent: str) -> str:
         if text.startswith("examples:"):

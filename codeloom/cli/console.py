@@ -1,15 +1,20 @@
 """What commands print: results on the output, failures on the standard error."""
 
+from __future__ import annotations
+
 import io
 import os
-import shutil
 import sys
 from collections.abc import Iterable, Sequence
 from enum import StrEnum
-from typing import TextIO
 
 from codeloom.cli.excerpt import Mark, excerpt, fits, printable, wrapped
 from codeloom.cli.source import printable_path
+from codeloom.cli.terminal import terminal_width
+
+TYPE_CHECKING = False  # `typing` takes long to import
+if TYPE_CHECKING:
+    from typing import TextIO
 
 _WIDTH_WITHOUT_TERMINAL = 100
 _LEAST_WIDTH = 20
@@ -42,7 +47,7 @@ class Console:
         self._stream = sys.stdout if stream is None else stream
         if isinstance(self._stream, io.TextIOWrapper):
             self._stream.reconfigure(errors="backslashreplace")
-        columns = shutil.get_terminal_size((_WIDTH_WITHOUT_TERMINAL, 0)).columns
+        columns = terminal_width(_WIDTH_WITHOUT_TERMINAL)
         self.width = max(columns - 4, _LEAST_WIDTH)
         self._columns = columns
         self._source_width = max(columns - _GUTTER, _LEAST_WIDTH)

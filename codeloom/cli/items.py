@@ -1,15 +1,19 @@
 """What commands show of a source, one item after another, in a form for each kind of reader."""
 
-import json
+from __future__ import annotations
+
 from abc import ABC, abstractmethod
 from collections.abc import Iterable, Iterator, Sequence
 from itertools import groupby
-from typing import Any, Literal
 
 from codeloom._analysis import Problem, Range
 from codeloom.cli.console import Colour, Console
 from codeloom.cli.excerpt import Mark, on_one_row, printable
 from codeloom.cli.source import Source
+
+TYPE_CHECKING = False  # `typing` takes long to import
+if TYPE_CHECKING:
+    from typing import Any, Literal
 
 _INDENT = "    "
 
@@ -31,7 +35,9 @@ class Item(ABC):
 
     def json(self) -> Iterator[str]:
         """The same as text, each on a single row."""
-        return map(json.dumps, self.fields())
+        from json import dumps
+
+        return map(dumps, self.fields())
 
 
 class Finding(Item):
@@ -57,7 +63,7 @@ class Finding(Item):
         self.fingerprint = ""
 
     @classmethod
-    def of(cls, source: Source, problem: Problem) -> "Finding":
+    def of(cls, source: Source, problem: Problem) -> Finding:
         """A problem of the analysis."""
         return cls(
             source,

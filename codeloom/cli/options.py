@@ -3,10 +3,11 @@
 The command line goes before the settings of the project, and these before the defaults.
 """
 
+from __future__ import annotations
+
 import argparse
 import os
 from collections.abc import Callable, Mapping, Sequence
-from typing import TYPE_CHECKING, Any
 
 from codeloom.cli.formats import FORMATS
 from codeloom.cli.project import Project, WrongUseError, checked_settings, nearest
@@ -14,7 +15,10 @@ from codeloom.reading.exclusion import DEFAULT_PATTERNS, Exclusion, is_pattern
 from codeloom.reading.files import StandardInput
 from codeloom.reading.languages import NEWEST, VERSIONS, oldest_admitted, version_named
 
+TYPE_CHECKING = False  # `typing` takes long to import
 if TYPE_CHECKING:
+    from typing import Any
+
     from codeloom.cli.command import Command
 
 COLOURS = ("auto", "always", "never")
@@ -23,7 +27,7 @@ COLOURS = ("auto", "always", "never")
 class Options:
     """All that a run may be asked, with the defaults."""
 
-    command: "type[Command]"
+    command: type[Command]
     paths: Sequence[str] = ()
     place: str | None = None
     code: str | None = None
@@ -170,14 +174,12 @@ def _add_selecting(parser: argparse.ArgumentParser) -> None:
     group.add_argument("--exit-zero", action="store_true", help="exit with 0 even if there are problems")
 
 
-def _add_running(group: "argparse._ArgumentGroup") -> None:
+def _add_running(group: argparse._ArgumentGroup) -> None:
     group.add_argument("--statistics", action="store_true", help="count the problems by code at the end")
     group.add_argument("--watch", action="store_true", help="run again whenever a file changes")
 
 
-def add_output_arguments(
-    parser: argparse.ArgumentParser, formats: Sequence[str]
-) -> "argparse._ArgumentGroup":
+def add_output_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]) -> argparse._ArgumentGroup:
     """Add what every command has that writes results."""
     group = parser.add_argument_group("output")
     group.add_argument(

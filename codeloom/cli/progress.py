@@ -1,30 +1,25 @@
 """How far a long run is, on a standard error that is a terminal."""
 
+from __future__ import annotations
+
 import sys
 import time
 from collections.abc import Callable
-from typing import Protocol
 
 from codeloom.cli.console import Console
 from codeloom.cli.tally import Tally
+
+TYPE_CHECKING = False  # rich is imported when there is something to show
+if TYPE_CHECKING:
+    from codeloom.cli.rich_output import Bar
 
 # Seconds before a run counts as long, and between two updates.
 _PATIENCE = 1.0
 _INTERVAL = 0.1
 
 
-class ProgressRow(Protocol):
-    """A row that is written over again and again, and gone when there is something else to show."""
-
-    def show(self, tally: Tally) -> None:
-        """Write how much is done."""
-
-    def clear(self) -> None:
-        """Take the row away."""
-
-
 class PlainRow:
-    """Counts of files and problems; `total` is the number of files."""
+    """Counts of files and problems, written over again and again; `total` is the number of files."""
 
     def __init__(self, total: int) -> None:
         self._total = total
@@ -50,10 +45,10 @@ class Progress:
         self._count_files = count_files
         self._is_wanted = is_wanted and sys.stderr is not None and sys.stderr.isatty()
         self._next = time.monotonic() + _PATIENCE
-        self._row: ProgressRow | None = None
+        self._row: PlainRow | Bar | None = None
         self._is_shown = False
 
-    def __enter__(self) -> "Progress":
+    def __enter__(self) -> Progress:
         return self
 
     def __exit__(self, *_: object) -> None:
@@ -77,7 +72,7 @@ class Progress:
         self._is_shown = False
 
 
-def _row_for(total: int) -> ProgressRow:
+def _row_for(total: int) -> PlainRow | Bar:
     try:
         from codeloom.cli.rich_output import Bar
     except ModuleNotFoundError:

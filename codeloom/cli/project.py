@@ -4,9 +4,14 @@ Settings are the table `tool.codeloom` of a pyproject.toml, or all of a codeloom
 folder hold, from the one that the files lie in upwards, as far as the repository goes.
 """
 
+from __future__ import annotations
+
 import os
 from collections.abc import Callable, Iterator, Mapping, Sequence
-from typing import Any
+
+TYPE_CHECKING = False  # `typing` takes long to import
+if TYPE_CHECKING:
+    from typing import Any
 
 _OWN_FILE = "codeloom.toml"
 _PROJECT_FILE = "pyproject.toml"

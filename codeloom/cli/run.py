@@ -1,9 +1,10 @@
 """One run over files: which are read, which of their problems count, and where it is written."""
 
+from __future__ import annotations
+
 import sys
 from collections.abc import Callable, Iterator, Sequence
 from contextlib import contextmanager
-from typing import TYPE_CHECKING
 
 from codeloom._face import analyze, analyze_plain_files, processor_count
 from codeloom.cli.command import ExitStatus
@@ -26,8 +27,8 @@ from codeloom.reading.files import (
     left_out_by_force,
     read_file,
 )
-from codeloom.reading.notebooks import read_notebook
 
+TYPE_CHECKING = False  # `typing` takes long to import
 if TYPE_CHECKING:
     from codeloom.cli.filters.changes import Changes
 
@@ -157,7 +158,11 @@ def read_source(path: str, options: Options, version: str) -> Source:
     else:
         data = sys.stdin.buffer.read()
         name = options.stdin_filename or STDIN_NAME
-    notebook = read_notebook(data, name) if name.lower().endswith(NOTEBOOK_SUFFIX) else None
+    notebook = None
+    if name.lower().endswith(NOTEBOOK_SUFFIX):
+        from codeloom.reading.notebooks import read_notebook  # it loads a parser of JSON
+
+        notebook = read_notebook(data, name)
     text = data if notebook is None else notebook.text
     analysis = analyze(text, path=name, python=version, false_hints=options.false_hints)
     return Source(name, analysis, notebook)
@@ -186,7 +191,7 @@ def print_facts(options: Options) -> None:
     say(f"threads: {options.jobs or processor_count()}")
 
 
-def _filters_of(options: Options) -> tuple[list[Filter], "Changes | None"]:
+def _filters_of(options: Options) -> tuple[list[Filter], Changes | None]:
     filters: list[Filter] = [not_ignored_by_comments]
     changes = None
     if options.select or options.ignore:

@@ -1,14 +1,20 @@
 """A file as a run has read it: what it says, and how its places are named."""
 
+from __future__ import annotations
+
 import os
 from bisect import bisect_right
 from functools import cached_property
-from typing import Any
 
 from codeloom._analysis import Analysis, Problem, Range
 from codeloom.cli.excerpt import printable
-from codeloom.reading.notebooks import Notebook
 from codeloom.rows import RowTexts
+
+TYPE_CHECKING = False  # `typing` takes long to import
+if TYPE_CHECKING:
+    from typing import Any
+
+    from codeloom.reading.notebooks import Notebook
 
 # What a cell of a notebook may do and a module may not.
 _NOTEBOOK_FORMS = ("'await' outside function", "'async ", "asynchronous comprehension")

@@ -9,7 +9,6 @@ from collections.abc import Sequence
 from codeloom.cli.items import Finding
 from codeloom.cli.project import nearest
 from codeloom.cli.source import Source
-from codeloom.explanations import explanations
 
 _SELECTOR = re.compile(r"CL[0-9]{0,3}|ALL")
 _COMMENT = re.compile(r"#\s*codeloom:\s*ignore\b(?:\s*\[(?P<codes>[^\]#]*)\])?", re.IGNORECASE)
@@ -18,6 +17,8 @@ _COMMENT_MARK = "codeloom:"
 
 def selectors_of(text: str) -> list[str]:
     """The selectors in a text, parted by commas or blanks; ValueError for what fits no code."""
+    from codeloom.explanations import explanations  # only where codes are named
+
     known = explanations()
     selectors = re.split(r"[,\s]+", text.strip().upper())
     for selector in selectors:

@@ -1,8 +1,8 @@
 """The forms in which a run is written, one a file; `FORMATS` lists them."""
 
 from importlib import import_module
-from typing import TYPE_CHECKING
 
+TYPE_CHECKING = False  # `typing` takes long to import
 if TYPE_CHECKING:
     from codeloom.cli.formats.base import Format
 
