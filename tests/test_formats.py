@@ -55,6 +55,7 @@ class TestJson:
         [
             ("check", ".", "absent.py"),
             ("names", "."),
+            ("names", "--records", "."),
             ("hints", "."),
             ("tree", "sub/sound.py"),
             ("tree", "-c", "x = [f'{a b}', )"),
@@ -129,6 +130,8 @@ def test_concise(written, run_cli):
         "./n.ipynb:cell 2:2:5:",
     ]
     rows = run_cli("names", "--format", "concise", "sub").stdout.splitlines()
+    assert rows[0] == "sub/sound.py:1:8: import os in module"
+    rows = run_cli("names", "--records", "--format", "concise", "sub").stdout.splitlines()
     assert rows[0] == "sub/sound.py:1:8: set os"
     rows = run_cli("hints", "--format", "concise", "sub").stdout.splitlines()
     assert rows == ["sub/sound.py:4:1: def f(a, *b): a int = 1; returns str; gives os"]

@@ -1,4 +1,4 @@
-"""`codeloom names` and the library below it: what is said of each line, and where the names stand."""
+"""`codeloom names` and the library below it: what is said of each line, and where the names are."""
 
 import json
 from pathlib import Path
@@ -15,7 +15,7 @@ FOLDER = Path(__file__).parent / "names"
 @pytest.mark.parametrize("case", Cases(FOLDER, ".words"))
 def test_in_words(case, rewrite, run_cli, write_files):
     write_files({"f.py": case.source})
-    done = run_cli("names", "--python", "3.12", "f.py")
+    done = run_cli("names", "--records", "--python", "3.12", "f.py")
     Check(case, f"---\n{done.stdout.rstrip()}", rewrite)
     assert (done.stderr, done.returncode) == ("", 1)
 
@@ -78,7 +78,7 @@ def Items(done):
 
 def test_rows_of_json(run_cli, write_files):
     write_files({"f.py": "def é(a=1): pass\nx = )\n"})
-    done = run_cli("names", "--format", "jsonl", "f.py")
+    done = run_cli("names", "--records", "--format", "jsonl", "f.py")
     *records, problem = Items(done)
     keys = ["path", "row", "column", "end_row", "end_column", "name", "kind", "payload", "scope"]
     assert [[record[key] for key in keys] for record in records] == [
@@ -94,19 +94,20 @@ LIMIT = "the line is nested too deep for a full walk: names further in have no r
 
 def test_limits_leave_the_rows_alone(run_cli):
     text = f"x = f(y, {'[' * 50}{']' * 50})\nz = 1".encode()
-    done = run_cli("names", "--format", "jsonl", "-", stdin=text)
+    done = run_cli("names", "--records", "--format", "jsonl", "-", stdin=text)
     items = Items(done)
     assert [item["name"] for item in items if item["type"] == "record"] == ["x", "x", "z", "z"]
     assert [(item["row"], item["message"]) for item in items if item["type"] == "limit"] == [(1, LIMIT)]
-    in_words = run_cli("names", "-", stdin=text)
+    in_words = run_cli("names", "--records", "-", stdin=text)
     assert in_words.stdout.count(f"    partly   {LIMIT[:60]}") == 1
     assert (in_words.stderr + done.stderr, done.returncode, in_words.returncode) == ("", 0, 0)
 
 
 def test_what_looks_like_a_hint(run_cli, write_files):
     write_files({"f.py": "x = 1  # type: ignore[code]\n"})
-    assert "'code'" not in str(Items(run_cli("names", "--format", "jsonl", "f.py")))
-    assert "get" in str(Items(run_cli("names", "--format", "jsonl", "--false-hints", "f.py")))
+    command = ["names", "--records", "--format", "jsonl", "f.py"]
+    assert "'code'" not in str(Items(run_cli(*command)))
+    assert "get" in str(Items(run_cli(*command, "--false-hints")))
 
 
 def test_other_encodings_versions_and_what_cannot_be_read(run_cli, write_files):
@@ -118,7 +119,7 @@ def test_other_encodings_versions_and_what_cannot_be_read(run_cli, write_files):
         }
     )
     assert analyze_file(folder / "latin.py").records[0].name == "é"
-    assert "reads    x" in run_cli("names", "--python", "2.7", "two.py").stdout
+    assert "7  x  read  module, undefined" in run_cli("names", "--python", "2.7", "two.py").stdout
     done = run_cli("names", "bad.py", "missing.py")
     assert "byte 0xFF can't be read" in done.stdout and "bad.py:2:1: y" in done.stdout
     assert "can't read missing.py" in done.stderr and done.returncode == 2
@@ -142,9 +143,24 @@ def test_unused_and_undefined(run_cli, write_files):
     assert done.returncode == 1
 
 
-def test_roles(run_cli, write_files):
+@pytest.mark.parametrize("case", Cases(FOLDER, ".occurrences"))
+def test_occurrences_line_by_line(case, rewrite, run_cli, write_files):
+    write_files({"f.py": case.source})
+    done = run_cli("names", "--python", "3.12", "f.py")
+    Check(case, f"---\n{done.stdout.rstrip()}", rewrite)
+    assert done.stderr == ""
+
+
+def test_records_are_a_choice_of_their_own(run_cli, write_files):
+    write_files({"f.py": "x"})
+    done = run_cli("names", "--records", "--unused", "f.py")
+    assert (done.returncode, done.stdout) == (2, "")
+    assert done.stderr == "codeloom: --records doesn't go with --unused and --undefined\n"
+
+
+def test_occurrences_in_other_formats(run_cli, write_files):
     write_files({"f.py": "import os\ndef f(a):\n    a.b(len(os), c=d)\n"})
-    done = run_cli("names", "--roles", "f.py")
+    done = run_cli("names", "--format", "concise", "f.py")
     assert [row.partition(": ")[2] for row in done.stdout.splitlines()] == [
         "import os in module",
         "bind f in module",
@@ -156,7 +172,7 @@ def test_roles(run_cli, write_files):
         "keyword c in function f",
         "read d (unknown) in function f",
     ]
-    items = json.loads(run_cli("names", "--roles", "--format", "json", "f.py").stdout)["items"]
+    items = json.loads(run_cli("names", "--format", "json", "f.py").stdout)["items"]
     assert items[6] == {
         "type": "occurrence",
         "path": "f.py",

@@ -84,4 +84,4 @@ def test_the_command(run_cli, write_files):
         "a/n.ipynb:cell 2:3:1: CL321 'return' outside function",
     ]
     done = run_cli("names", "--stdin-filename", "n.ipynb", "-", stdin=Made("!ls", "x = 1"))
-    assert done.stdout == "n.ipynb:cell 2:1:1: x = 1\n    binds    x = 1\n"
+    assert done.stdout == "n.ipynb:cell 2:1:1: x = 1\n    1  x  bind  module\n"

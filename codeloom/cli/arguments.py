@@ -24,7 +24,7 @@ if TYPE_CHECKING:
 # The module and the class of each command, and what it does.
 COMMANDS = {
     "check": ("check", "CheckCommand", "report what is broken, with the place of each fault"),
-    "names": ("names", "NamesCommand", "list what each line reads and binds"),
+    "names": ("names", "NamesCommand", "list every name: what it does there, and its scope"),
     "hints": ("hints", "HintsCommand", "list each def with the types of its arguments and results"),
     "tree": ("tree", "TreeCommand", "print the syntax tree of a line"),
     "serve": ("serve", "ServeCommand", "serve an editor by the language server protocol"),

@@ -1,13 +1,14 @@
-"""`codeloom names`: what each logical line reads and binds, and what it says of these names."""
+"""`codeloom names`: every appearance of a name, or what each logical line says of names."""
 
 import argparse
-from collections.abc import Iterator
+from collections import deque
+from collections.abc import Iterable, Iterator
 
-from codeloom._analysis import Occurrence, Range
+from codeloom._analysis import Line, Occurrence, Range
 from codeloom.cli.command import ExitStatus
 from codeloom.cli.items import Finding, Item
 from codeloom.cli.names_items import LimitItem, LineNames
-from codeloom.cli.options import Options
+from codeloom.cli.options import Options, WrongUseError
 from codeloom.cli.source import Source
 from codeloom.cli.source_command import SourceCommand
 
@@ -17,16 +18,16 @@ class NamesCommand(SourceCommand):
 
     NAME = "names"
     DESCRIPTION = (
-        "List what each logical line reads and binds, and what it says about these names. Lines without "
-        "names are left out; a broken line is shown with its fault. --roles lists every appearance of a "
-        "name instead. "
+        "Show every appearance of a name, line by line: what the name does there, and the scope that binds "
+        "it. With --records what each line says of names instead: what it reads, binds and calls, and what a "
+        "name stands for. A broken line is shown with its fault. "
         "The exit status is 0 if there is no problem, 1 if there are some, 2 for wrong use or a file "
         "that can't be read."
     )
     EXAMPLES = (
         "codeloom names src/a.py",
         "codeloom names --unused --undefined src",
-        "codeloom names --format jsonl src |",
+        "codeloom names --records --format jsonl src |",
         "    jq -r 'select(.kind == \"from\").payload' | sort | uniq -c",
     )
     NEEDS_RECORDS = True
@@ -36,9 +37,7 @@ class NamesCommand(SourceCommand):
         """Add the command's own arguments."""
         group = parser.add_argument_group("which names")
         group.add_argument(
-            "--roles",
-            action="store_true",
-            help="every appearance of a name, what it does there and its scope",
+            "--records", action="store_true", help="the records of each logical line, not its occurrences"
         )
         group.add_argument(
             "--unused", action="store_true", help="imports and local names that nothing in the file reads"
@@ -53,17 +52,20 @@ class NamesCommand(SourceCommand):
     def run(self, options: Options) -> ExitStatus:
         """Show the lines, or the appearances of names that are asked for."""
         self._options = options
-        self._shows_occurrences = options.roles or options.unused or options.undefined
-        self.NEEDS_RECORDS = not self._shows_occurrences
+        self._shows_findings = options.unused or options.undefined
+        if options.records and self._shows_findings:
+            raise WrongUseError("--records doesn't go with --unused and --undefined")
+        self.NEEDS_RECORDS = options.records
         return super().run(options)
 
     def items(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
         """What is to be shown and the problems, in the order of the file."""
-        return (
-            self._occurrences(source, findings) if self._shows_occurrences else self._lines(source, findings)
-        )
+        if self._shows_findings:
+            return self._findings(source, findings)
+        made = self._lines if self._options.records else self._occurrences
+        return made(source, findings)
 
-    def _occurrences(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
+    def _findings(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
         from codeloom.cli.occurrence_items import OccurrenceItem
 
         analysis, options = source.analysis, self._options
@@ -74,29 +76,42 @@ class NamesCommand(SourceCommand):
         }
         for finding, occurrences in about.items():
             found += [(each.range, OccurrenceItem(source, each, finding)) for each in occurrences]
-        if options.roles:
-            found += [(each.range, OccurrenceItem(source, each)) for each in analysis.occurrences]
         found.sort(key=lambda placed: (placed[0].row, placed[0].column))
         return (item for _, item in found)
 
+    def _occurrences(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
+        from codeloom.cli.occurrence_items import LineOccurrences
+
+        for line, before in _with_findings(source.analysis.lines, findings):
+            yield from before
+            if line is not None and len(line.occurrences):
+                yield LineOccurrences(source, line)
+
     def _lines(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
         limits = {limit.line: limit for limit in source.analysis.limits}
-        waiting = iter(findings)
-        finding = next(waiting, None)
-        for line in source.analysis.lines:
-            place = line.range
-            while finding is not None and _starts_before_end(finding.range, place):
-                yield finding
-                finding = next(waiting, None)
+        for line, before in _with_findings(source.analysis.lines, findings):
+            yield from before
+            if line is None:
+                continue
             records = list(line.records)
             limit = limits.get(line) if limits else None
             if records or limit is not None:
                 yield LineNames(source, line, records)
             if limit is not None:
                 yield LimitItem(source, limit)
-        if finding is not None:
-            yield finding
-        yield from waiting
+
+
+def _with_findings(
+    lines: Iterable[Line], findings: Iterable[Finding]
+) -> Iterator[tuple[Line | None, list[Finding]]]:
+    """Each line with the findings up to its end, and what comes after the last one with None."""
+    waiting = deque(findings)
+    for line in lines:
+        before = []
+        while waiting and _starts_before_end(waiting[0].range, line.range):
+            before.append(waiting.popleft())
+        yield line, before
+    yield None, list(waiting)
 
 
 def _starts_before_end(place: Range, line: Range) -> bool:

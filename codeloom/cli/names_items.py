@@ -16,6 +16,15 @@ _LABEL_WIDTH = 9
 _CUT = "..."
 
 
+def show_head(console: Console, source: Source, line: Line) -> None:
+    """Print a line's place and first row."""
+    first_row, _, more = line.text.partition("\n")
+    text = _shortened(
+        printable(first_row.rstrip()) + (f" {_CUT}" if more else ""), console.width - _LABEL_WIDTH
+    )
+    console.print_row(f"{console.coloured(Colour.BOLD, source.label(line.range))} {text}")
+
+
 class LineNames(Item):
     """A line that says something of names."""
 
@@ -26,10 +35,7 @@ class LineNames(Item):
 
     def show(self, console: Console) -> None:
         """The line's place and first row, and what it does with names below."""
-        room = console.width - _LABEL_WIDTH
-        first_row, _, more = self._line.text.partition("\n")
-        text = _shortened(printable(first_row.rstrip()) + (f" {_CUT}" if more else ""), room)
-        console.print_row(f"{console.coloured(Colour.BOLD, self._source.label(self._line.range))} {text}")
+        show_head(console, self._source, self._line)
         for label, rows in statements(self._records):
             _show_statement(console, label, rows)
 

@@ -3,11 +3,48 @@
 from collections.abc import Iterator
 from typing import Any
 
-from codeloom._analysis import Occurrence, Scope
+from codeloom._analysis import Line, Occurrence, Resolution, Scope
 from codeloom.cli.console import Colour, Console
 from codeloom.cli.excerpt import printable
 from codeloom.cli.items import Item
+from codeloom.cli.names_items import show_head
 from codeloom.cli.source import Source
+
+_INDENT = "    "
+_UNBOUND = {
+    Resolution.BUILTIN: "builtin",
+    Resolution.PERHAPS: "perhaps bound",
+    Resolution.UNKNOWN: "undefined",
+}
+
+
+class LineOccurrences(Item):
+    """The appearances of names on a line."""
+
+    def __init__(self, source: Source, line: Line) -> None:
+        self._source = source
+        self._line = line
+        self._items = [OccurrenceItem(source, occurrence) for occurrence in line.occurrences]
+
+    def show(self, console: Console) -> None:
+        """The line's place and first row, and a table of its names below."""
+        show_head(console, self._source, self._line)
+        cells = [item.cells() for item in self._items]
+        widths = [max(len(row[i]) for row in cells) for i in range(3)]
+        for row in cells:
+            place, name, role = (f"{cell:<{width}}" for cell, width in zip(row, widths, strict=False))
+            role = console.coloured(Colour.CYAN, role)
+            console.print_row(f"{_INDENT}{place}  {name}  {role}  {row[3]}")
+
+    def rows(self) -> Iterator[str]:
+        """A row for each."""
+        for item in self._items:
+            yield from item.rows()
+
+    def fields(self) -> Iterator[dict[str, Any]]:
+        """An object for each."""
+        for item in self._items:
+            yield from item.fields()
 
 
 class OccurrenceItem(Item):
@@ -41,6 +78,20 @@ class OccurrenceItem(Item):
             "resolution": resolution and resolution.value,
             "home": title(occurrence.home) if occurrence.home else None,
         }
+
+    def cells(self) -> tuple[str, str, str, str]:
+        """Place in its line, name, role, and where the name is bound, for a table."""
+        occurrence = self._occurrence
+        place, line = occurrence.range, occurrence.line.range
+        _, row = self._source.cell_and_row(place.row)
+        shown = str(place.column) if place.row == line.row else f"{row}:{place.column}"
+        scope, home = occurrence.scope, occurrence.home
+        where = title(scope)
+        if home is not None and home != scope:
+            where = f"{where}, of {title(home)}"
+        elif occurrence.resolution in _UNBOUND:
+            where = f"{where}, {_UNBOUND[occurrence.resolution]}"
+        return shown, printable(occurrence.name), occurrence.role.value, printable(where)
 
     def _text(self) -> str:
         occurrence = self._occurrence

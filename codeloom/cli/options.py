@@ -32,7 +32,7 @@ class Options:
     place: str | None = None
     code: str | None = None
     shell: str = ""
-    roles: bool = False
+    records: bool = False
     unused: bool = False
     undefined: bool = False
     codes: Sequence[str] = ()
