@@ -62,6 +62,17 @@ class Options:
     verbose: bool = False
     watch: bool = False
 
+    tables: Sequence[str] | None = None  # all
+    resume: bool = False
+    dedup: bool = False
+    git: bool = False
+    path_column: str = "path"
+    content_column: str = "content"
+    python_column: str = "python"
+    max_bytes: int = 10
+    max_seconds: float = 10.0
+    part_size: float = 16.0
+
     project: Project
 
     def __init__(self, given: Mapping[str, Any]) -> None:
@@ -109,7 +120,9 @@ def add_source_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
         "(default: the current folder)",
     )
     _add_reading(parser)
-    _add_finding(parser)
+    add_finding_arguments(parser).add_argument(
+        "--show-files", action="store_true", help="list the files that would be read, and exit"
+    )
     _add_selecting(parser)
     _add_running(add_output_arguments(parser, formats))
 
@@ -124,16 +137,17 @@ def _add_reading(parser: argparse.ArgumentParser) -> None:
     )
     parser.add_argument(
         "--jobs",
-        type=_as_argument(_count),
+        type=as_argument(count),
         metavar="N",
         help="number of threads (default: one per processor)",
     )
     parser.add_argument("--config", metavar="FILE", help="read the settings from this file")
 
 
-def _add_finding(parser: argparse.ArgumentParser) -> None:
+def add_finding_arguments(parser: argparse.ArgumentParser) -> argparse._ArgumentGroup:
+    """Add what says which files are read."""
     group = parser.add_argument_group("which files")
-    patterns: dict[str, Any] = {"type": _as_argument(_patterns), "action": "extend", "metavar": "PATTERN"}
+    patterns: dict[str, Any] = {"type": as_argument(_patterns), "action": "extend", "metavar": "PATTERN"}
     group.add_argument(
         "--exclude",
         **patterns,
@@ -147,14 +161,12 @@ def _add_finding(parser: argparse.ArgumentParser) -> None:
     group.add_argument(
         "--no-gitignore", dest="gitignore", action="store_false", help="read what .gitignore files list"
     )
-    group.add_argument(
-        "--show-files", action="store_true", help="list the files that would be read, and exit"
-    )
+    return group
 
 
 def _add_selecting(parser: argparse.ArgumentParser) -> None:
     group = parser.add_argument_group("which problems")
-    codes: dict[str, Any] = {"type": _as_argument(_selectors), "action": "extend", "metavar": "CODES"}
+    codes: dict[str, Any] = {"type": as_argument(_selectors), "action": "extend", "metavar": "CODES"}
     group.add_argument(
         "--select", **codes, help="report only these codes, such as CL301, or CL3 for all that begin so"
     )
@@ -185,7 +197,7 @@ def add_output_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
     group.add_argument(
         "--format",
         choices=formats,
-        type=_as_argument(lambda name: _one_of(name, formats)),
+        type=as_argument(lambda name: _one_of(name, formats)),
         metavar="FORMAT",
         help=f"{', '.join(formats[:-1])} or {formats[-1]} (default: text)",
     )
@@ -193,7 +205,7 @@ def add_output_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
     group.add_argument(
         "--color",
         choices=COLOURS,
-        type=_as_argument(lambda name: _one_of(name, COLOURS)),
+        type=as_argument(lambda name: _one_of(name, COLOURS)),
         metavar="WHEN",
         help="auto, always or never (default: auto, which heeds NO_COLOR and FORCE_COLOR)",
     )
@@ -208,7 +220,7 @@ def add_python_argument(parser: argparse.ArgumentParser) -> None:
     """Add `python` and `stdin_filename`."""
     parser.add_argument(
         "--python",
-        type=_as_argument(version_named),
+        type=as_argument(version_named),
         metavar="VERSION",
         help=f"the version of Python that the source is for: {VERSIONS[0]}, or {VERSIONS[1]} to {NEWEST}, "
         f"written 3.12, py312 or 3 (default: the oldest that the project's requires-python allows, "
@@ -217,7 +229,7 @@ def add_python_argument(parser: argparse.ArgumentParser) -> None:
     parser.add_argument("--stdin-filename", metavar="FILE", help="report the standard input under this name")
 
 
-def _as_argument(read: Callable[[str], Any]) -> Callable[[str], Any]:
+def as_argument(read: Callable[[str], Any]) -> Callable[[str], Any]:
     """A reader of settings as the standard library's parser of arguments wants it."""
 
     def read_argument(text: str) -> Any:
@@ -262,7 +274,8 @@ def _flag(value: object) -> bool:
     return value
 
 
-def _count(value: object) -> int:
+def count(value: object) -> int:
+    """A number from 1."""
     if isinstance(value, bool) or not isinstance(value, int | str):
         raise TypeError("it must be a number")
     try:
@@ -285,7 +298,7 @@ def _one_of(value: object, names: Sequence[str]) -> str:
 _READERS: Mapping[str, Callable[[Any], Any]] = {
     "python": lambda value: version_named(_text(value)),
     "false-hints": _flag,
-    "jobs": _count,
+    "jobs": count,
     "exclude": _patterns,
     "extend-exclude": _patterns,
     "force-exclude": _flag,
@@ -299,4 +312,13 @@ _READERS: Mapping[str, Callable[[Any], Any]] = {
     "statistics": _flag,
 }
 
-__all__ = ["Options", "WrongUseError", "add_output_arguments", "add_python_argument", "add_source_arguments"]
+__all__ = [
+    "Options",
+    "WrongUseError",
+    "add_finding_arguments",
+    "add_output_arguments",
+    "add_python_argument",
+    "add_source_arguments",
+    "as_argument",
+    "count",
+]

@@ -16,6 +16,9 @@ TABLES = tuple(name for name, _, _ in table_kinds())
 MOST_BYTES = 10_000_000
 MOST_SECONDS = 10.0
 
+# Why a source has no rows: a state of the table `files`, and the reason.
+Mark = tuple[str, str]
+
 
 def analyze_batch(
     batch: Any,
@@ -49,15 +52,21 @@ def analyze_batch(
     """
     if isinstance(tables, str):
         raise TypeError("tables must be an iterable of names, not a single one")
-    wanted = list(dict.fromkeys(tables))
-    for name in wanted:
-        if name not in TABLES:
-            raise ValueError(f"no table is called {name!r}; there are {', '.join(TABLES)}")
+    wanted = checked_tables(tables)
     version_number(python)
     sources = SourceBatch(batch, path_column, content_column, python_column)
     for i in range(len(sources)):
-        _take(sources, i, python, max_bytes)
+        take(sources, i, sources.digest(i, sha256), python, max_bytes)
     return sources.analyze(wanted, false_hints, max_seconds)
+
+
+def checked_tables(names: Iterable[str]) -> list[str]:
+    """Each name once; ValueError for a name that no table has."""
+    wanted = list(dict.fromkeys(names))
+    for name in wanted:
+        if name not in TABLES:
+            raise ValueError(f"no table is called {name!r}; there are {', '.join(TABLES)}")
+    return wanted
 
 
 def file_id_of(path: str, digest: str | None) -> int:
@@ -66,10 +75,11 @@ def file_id_of(path: str, digest: str | None) -> int:
     return int.from_bytes(sha256(identity).digest()[:8], "little", signed=True)
 
 
-def _take(sources: SourceBatch, i: int, python: str, max_bytes: int) -> None:
-    """Say how a source is to be read."""
+def take(
+    sources: SourceBatch, i: int, digest: str | None, python: str, max_bytes: int, mark: Mark | None = None
+) -> None:
+    """Say how a source is to be read. One with a mark has no content."""
     path = sources.path(i) or ""
-    digest = sources.digest(i, sha256)
     named = sources.python(i) or python
     version = _known_version(named)
     sources.take(
@@ -77,13 +87,18 @@ def _take(sources: SourceBatch, i: int, python: str, max_bytes: int) -> None:
     )
     size = sources.size(i)
     if size is None:
-        sources.mark("missing", "there is no content")
+        sources.mark(*(mark or ("missing", "there is no content")))
     elif version is None:
         sources.mark("unknown version", f"the version {named!r} of Python isn't known")
     elif size > max_bytes:
-        sources.mark("too big", f"{size:,} bytes are more than the limit of {max_bytes:,}")
+        sources.mark("too big", too_big(size, max_bytes))
     elif not sources.is_plain(i):
         _decode(sources, i)
+
+
+def too_big(size: int, max_bytes: int) -> str:
+    """The reason why a source of this size isn't analysed."""
+    return f"{size:,} bytes are more than the limit of {max_bytes:,}"
 
 
 @cache

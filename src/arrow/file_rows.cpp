@@ -16,8 +16,8 @@ const TColumns<CFileRow>& FileColumns() {
             .Add<&CFileRow::python>("python", "The version of Python that it was read as.")
             .Add<&CFileRow::state>("state",
                                    "`ok`; `unreadable` where some of it can't be decoded and was "
-                                   "replaced; `too big`, `too slow`, `missing` and `unknown "
-                                   "version` for what has no rows in other tables.")
+                                   "replaced; `too big`, `too slow`, `missing`, `unknown version` or "
+                                   "`duplicate` for what has no rows in other tables.")
             .Add<&CFileRow::reason>("reason", "Why it isn't `ok`, in words; null otherwise.")
             .Add<&CFileRow::rows>("rows",
                                   "How many rows its text has; null where it wasn't analysed, as are "

@@ -5,12 +5,20 @@
 
 namespace codeloom {
 
-enum class EFileState : uint8_t { kOk, kUnreadable, kTooBig, kTooSlow, kMissing, kUnknownVersion };
+enum class EFileState : uint8_t {
+    kOk,
+    kUnreadable,
+    kTooBig,
+    kTooSlow,
+    kMissing,
+    kUnknownVersion,
+    kDuplicate
+};
 
 template <>
 struct TKindWords<EFileState> : CWordsFromFirst {
     static constexpr auto kWords = std::to_array<std::string_view>(
-        {"ok", "unreadable", "too big", "too slow", "missing", "unknown version"});
+        {"ok", "unreadable", "too big", "too slow", "missing", "unknown version", "duplicate"});
 };
 
 struct CFileRow {
