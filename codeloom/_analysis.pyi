@@ -1262,6 +1262,36 @@ class Analysis:
         One of the tables of docs/tables.md, such as "lines", whole; ValueError when there is none of that name.
         """
 
+class DocumentText:
+    """
+    For `codeloom.Document`: a text that changes, in pieces that keep what they say.
+    """
+
+    def __init__(self, text: str, path: str, python: str, version: int, false_hints: bool, encoding: str) -> None:
+        ...
+
+    @property
+    def text(self) -> str:
+        """The text as it is now."""
+
+    @property
+    def analysis(self) -> Analysis | None:
+        """What the text says; None for a text with NUL or lone surrogates."""
+
+    @property
+    def end(self) -> tuple[int, int]:
+        """The row and the column after the last character."""
+
+    def column_of(self, row: int, column: int) -> int:
+        """
+        A column in characters as one of the document. ValueError for an unknown place.
+        """
+
+    def edit(self, start: tuple[int, int], end: tuple[int, int], new_text: str) -> tuple[Range, Range]:
+        """
+        Put a text in the place of a range. The range before, and that of the new text.
+        """
+
 def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, with_records: bool) -> list[Analysis | None]:
     """
     For `codeloom.analyze_paths`: what each file says, with its problems worked out, and with `with_records` its records.

@@ -1,16 +1,14 @@
 """The text of an editor that changes, with what it says after each edit."""
 
 import os
-import re
-from bisect import bisect_right
 from collections import Counter
 from collections.abc import Callable, Hashable, Iterable
 from functools import cached_property
 from operator import attrgetter
 
-from codeloom._analysis import Analysis, Line, Occurrence, Problem, Range, Scope
-from codeloom._face import analyze
-from codeloom.reading.languages import NEWEST
+from codeloom._analysis import Analysis, DocumentText, Line, Occurrence, Problem, Range, Scope
+from codeloom._face import analyze, path_text
+from codeloom.reading.languages import NEWEST, version_number
 
 TYPE_CHECKING = False  # `typing` takes longer to import than this module
 if TYPE_CHECKING:
@@ -22,7 +20,6 @@ if TYPE_CHECKING:
 # From 1, and what columns count is said where a position is taken.
 Position = tuple[int, int]
 
-_ROW_END = re.compile(r"\r\n|\r|\n")
 _ENCODINGS = ("utf-8", "utf-16", "utf-32")
 _SAID_OF_SYMBOL = attrgetter(
     "name",
@@ -56,21 +53,23 @@ class Document:
             raise TypeError(f"encoding must be a str, not {type(encoding).__name__}")
         if encoding not in _ENCODINGS:
             raise ValueError(f"encoding must be one of {', '.join(_ENCODINGS)}, not {encoding!r}")
+        if not isinstance(false_hints, bool):
+            raise TypeError(f"false_hints must be a bool, not {type(false_hints).__name__}")
         self._encoding: Encoding = encoding
         self._false_hints = false_hints
-        self._text = source
-        self._row_starts = _row_starts(source)
-        self._analysis = analyze(source, path=path, python=python, false_hints=false_hints)
+        self._path, self._python = path_text(path), python
+        self._text = DocumentText(source, self._path, python, version_number(python), false_hints, encoding)
+        self._analysis = self._text.analysis or self._analyzed()
 
     @property
     def path(self) -> str:
         """The name that problems bear."""
-        return self._analysis.path
+        return self._path
 
     @property
     def python(self) -> str:
         """The version of Python that the text is written in."""
-        return self._analysis.python
+        return self._python
 
     @property
     def encoding(self) -> "Encoding":
@@ -80,7 +79,7 @@ class Document:
     @property
     def text(self) -> str:
         """The text as it is now."""
-        return self._text
+        return self._text.text
 
     @property
     def analysis(self) -> Analysis:
@@ -90,15 +89,14 @@ class Document:
     @property
     def end(self) -> Position:
         """The position after the last character."""
-        return len(self._row_starts), self._units(self._row_text(len(self._row_starts))) + 1
+        return self._text.end
 
     def position(self, row: int, column: int) -> Position:
         """A place of the analysis, with the column in what this document counts.
 
         ValueError for a place that the text doesn't have.
         """
-        offset = self._offset_in_row((row, column), "column", characters=True)
-        return row, self._units(self._row_text(row)[: offset - self._row_starts[row - 1]]) + 1
+        return row, self._text.column_of(row, column)
 
     def edit(self, start: Position, end: Position, new_text: str) -> "Change":
         """Put `new_text` in the place of what is from `start` up to `end`, and say what that changes.
@@ -108,60 +106,18 @@ class Document:
         """
         if not isinstance(new_text, str):
             raise TypeError(f"new_text must be a str, not {type(new_text).__name__}")
-        first = self._offset_in_row(_checked(start, "start"), "start")
-        last = self._offset_in_row(_checked(end, "end"), "end")
-        if last < first:
-            raise ValueError(f"end {end} is before start {start}")
-        before, gone = self._analysis, self._range(first, last)
-        text = self._text[:first] + new_text + self._text[last:]
-        self._analysis = analyze(text, path=before.path, python=before.python, false_hints=self._false_hints)
-        self._text = text
-        self._row_starts = _row_starts(text)
-        return Change(before, self._analysis, gone, self._range(first, first + len(new_text)))
+        start, end = _checked(start, "start"), _checked(end, "end")
+        before = self._analysis
+        gone, come = self._text.edit(start, end, new_text)
+        self._analysis = self._text.analysis or self._analyzed()
+        return Change(before, self._analysis, gone, come)
+
+    def _analyzed(self) -> Analysis:
+        """What a text says that has to be mended before."""
+        return analyze(self.text, path=self._path, python=self._python, false_hints=self._false_hints)
 
     def __repr__(self) -> str:
         return f"<Document {self.path!r}>"
-
-    def _offset_in_row(self, position: Position, name: str, characters: bool = False) -> int:
-        """The index of the character at a position, which the argument `name` gives."""
-        row, column = position
-        if not 1 <= row <= len(self._row_starts):
-            raise ValueError(f"{name} {position}: there is no row {row}, but {len(self._row_starts)}")
-        text = self._row_text(row)
-        count = column - 1 if characters else self._characters(text, column - 1)
-        if column < 1 or count > len(text):
-            raise ValueError(f"{name} {position}: row {row} ends at column {self._units(text) + 1}")
-        if count < 0:
-            raise ValueError(f"{name} {position} is within a character")
-        return self._row_starts[row - 1] + count
-
-    def _row_text(self, row: int) -> str:
-        end = self._row_starts[row] if row < len(self._row_starts) else len(self._text)
-        return self._text[self._row_starts[row - 1] : end].rstrip("\r\n")
-
-    def _range(self, first: int, last: int) -> Range:
-        return Range(*self._place(first), *self._place(last))
-
-    def _place(self, offset: int) -> Position:
-        row = bisect_right(self._row_starts, offset)
-        return row, offset - self._row_starts[row - 1] + 1
-
-    def _units(self, text: str) -> int:
-        if self._encoding == "utf-32" or text.isascii():
-            return len(text)
-        if self._encoding == "utf-16":
-            return len(text) + sum(character > "\uffff" for character in text)
-        return len(text.encode("utf-8", "surrogatepass"))
-
-    def _characters(self, text: str, units: int) -> int:
-        """How many characters of `text` have so many units; more than it has for more, -1 within one."""
-        if self._encoding == "utf-32" or text.isascii():
-            return units
-        count = 0
-        while units > 0 and count < len(text):
-            units -= self._units(text[count])
-            count += 1
-        return count + units if units >= 0 else -1
 
 
 class Change:
@@ -291,10 +247,6 @@ def _said_of_scope(scope: Scope) -> Hashable:
     parent = scope.parent
     around = (parent.kind, parent.name) if parent else None
     return scope.kind, scope.name, around, frozenset(map(_SAID_OF_SYMBOL, scope.symbols))
-
-
-def _row_starts(text: str) -> list[int]:
-    return [0, *(match.end() for match in _ROW_END.finditer(text))]
 
 
 def _checked(position: object, name: str) -> Position:

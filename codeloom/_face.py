@@ -38,7 +38,7 @@ def analyze(
     _check_flag("false_hints", false_hints)
     return Analysis(
         text.utf8,
-        _path_text(path),
+        path_text(path),
         python,
         version_number(python),
         false_hints,
@@ -54,7 +54,7 @@ def analyze_file(
 
     Of a notebook it is the text of its code cells; `read_notebook` gives the cell of each row.
     """
-    name = _path_text(path)
+    name = path_text(path)
     version_number(python)
     data = read_file(name)
     is_notebook = name.lower().endswith(NOTEBOOK_SUFFIX)
@@ -67,7 +67,7 @@ def read_notebook(path: str | os.PathLike[str]) -> "Notebook":
 
     Its `text` is what `analyze` takes, and its `place(row)` gives the cell and the row there, from 1.
     """
-    name = _path_text(path)
+    name = path_text(path)
     return _notebook(read_file(name), name)
 
 
@@ -102,7 +102,7 @@ def analyze_paths(
         raise TypeError("paths must be an iterable of paths, not a single one")
     if not isinstance(paths, Iterable):
         raise TypeError(f"paths must be an iterable of paths, not {type(paths).__name__}")
-    names = [_path_text(path) for path in paths]
+    names = [path_text(path) for path in paths]
     _check_flag("false_hints", false_hints)
     _check_flag("records", records)
     if on_error is not None and not callable(on_error):
@@ -164,7 +164,7 @@ def _check_flag(name: str, value: object) -> None:
         raise TypeError(f"{name} must be a bool, not {type(value).__name__}")
 
 
-def _path_text(path: str | os.PathLike[str]) -> str:
+def path_text(path: str | os.PathLike[str]) -> str:
     try:
         return os.fsdecode(path)
     except TypeError:

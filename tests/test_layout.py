@@ -20,6 +20,7 @@ STEPS = [
     ["signatures"],
     ["causes"],
     ["file"],
+    ["document"],
     ["arrow"],
     ["host"],
     ["neighbours", "strutils", "_fastaccess", "symbolinfo"],

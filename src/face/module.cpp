@@ -1,6 +1,7 @@
 // The entry of codeloom._analysis, which the package's face is made of.
 #include <nanobind/nanobind.h>
 
+#include "face/bind_document.h"
 #include "face/bind_face.h"
 #include "face/file_batch.h"
 #include "face/names.h"
@@ -10,6 +11,7 @@
 CODELOOM_MODULE(_analysis, module) {
     nanobind::set_leak_warnings(false);
     codeloom::BindFace(module);
+    codeloom::BindDocument(module);
     codeloom::BindFileBatch(module);
     codeloom::BindNames(module);
     codeloom::BindTrees(module);

@@ -40,6 +40,22 @@ CSourceFile::CSourceFile(CPlainFile file, nb::str path, nb::str python, const CF
     (settings.wants_records ? _fWithRecords : _fQuick) = std::move(analysis);
 }
 
+CSourceFile::CSourceFile(CPlainFile text, nb::str path, nb::str python, const CFileSettings& settings,
+                         std::shared_ptr<const CPieces> pieces, std::vector<uint32_t> row_starts)
+    : _fFile(std::move(text)),
+      _fText(_fFile.Text()),
+      _fPath(std::move(path)),
+      _fPython(std::move(python)),
+      _fSettings(settings),
+      _fPieces(std::move(pieces)),
+      _fRows(std::make_unique<const CRowIndex>(_fText, std::move(row_starts))) {}
+
+CFileAnalysis CSourceFile::_Analyze(const CFileSettings& settings) const {
+    if (_fPieces && !settings.wants_records && !settings.wants_names)
+        if (std::optional<CFileAnalysis> analysis = _fPieces->Analysis(Text())) return std::move(*analysis);
+    return AnalyzeFile(Text(), settings, _fUnreadable);
+}
+
 nb::bytes CSourceFile::Utf8() const {
     return _fUtf8.is_valid() ? nb::borrow<nb::bytes>(_fUtf8) : BytesFromUtf8(_fText);
 }
@@ -54,7 +70,7 @@ const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>
     std::unique_ptr<const CFileAnalysis> made;
     {
         const nb::gil_scoped_release released;
-        made = std::make_unique<const CFileAnalysis>(AnalyzeFile(Text(), settings, _fUnreadable));
+        made = std::make_unique<const CFileAnalysis>(_Analyze(settings));
     }
     if (!kept) kept = std::move(made);  // another thread may have been faster
     return *kept;

@@ -13,6 +13,7 @@
 
 #include <nanobind/nanobind.h>
 
+#include "document/pieces.h"
 #include "face/plain_file.h"
 #include "file/file_analyzer.h"
 #include "file/row_index.h"
@@ -34,6 +35,9 @@ class CSourceFile {
     // For a file that was read natively, with the result of a pass that was made as the settings say.
     CSourceFile(CPlainFile file, nb::str path, nb::str python, const CFileSettings& settings,
                 std::unique_ptr<const CFileAnalysis> analysis);
+    // For a text of a document, in its pieces, with the beginnings of its rows.
+    CSourceFile(CPlainFile text, nb::str path, nb::str python, const CFileSettings& settings,
+                std::shared_ptr<const CPieces> pieces, std::vector<uint32_t> row_starts);
 
     std::string_view Text() const { return _fText; }
     nb::bytes Utf8() const;
@@ -69,6 +73,7 @@ class CSourceFile {
 
   private:
     static nb::object _Named(const CNameTable& names, std::vector<nb::object>& made, uint32_t number);
+    CFileAnalysis _Analyze(const CFileSettings& settings) const;
     const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
                                    bool wants_names = false) const;
 
@@ -79,6 +84,7 @@ class CSourceFile {
     nb::str _fPython;
     CFileSettings _fSettings;
     CUnreadable _fUnreadable;
+    std::shared_ptr<const CPieces> _fPieces;               // of a document, else null
     mutable std::unique_ptr<const CFileAnalysis> _fQuick;  // without records
     mutable std::unique_ptr<const CFileAnalysis> _fWithRecords;
     mutable std::unique_ptr<const CFileAnalysis> _fWithNames;

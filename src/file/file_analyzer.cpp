@@ -5,6 +5,7 @@
 #include <optional>
 
 #include "causes/causes.h"
+#include "file/file_part.h"
 #include "file/follow_ups.h"
 #include "file/method_hints.h"
 #include "line/line_length.h"
@@ -14,6 +15,7 @@
 #include "scopes/name_collector.h"
 #include "scopes/scope_builder.h"
 #include "signatures/signature_finder.h"
+#include "tokenizer/quote_context.h"
 #include "tokenizer/tokenizer.h"
 #include "typing/false_hints.h"
 
@@ -40,21 +42,54 @@ bool ImportsPrintFunction(const CRawLogical& logical) {
     return false;
 }
 
-// One analysis of one text.
+const CUnreadable kAllReadable;
+
+class CEndAt final : public CPartEnd {
+  public:
+    explicit CEndAt(uint32_t end) : _fEnd(end) {}
+    bool EndsAt(uint32_t start, const CPartState&, size_t) override { return start == _fEnd; }
+
+  private:
+    uint32_t _fEnd;
+};
+
+// One analysis of one text, or of a part of one.
 class CFileAnalyzer final : CTreeObserver {
   public:
     // With `wants_all_names` the rules for declarations see the names of the whole text, else those of the
     // blocks that hold a declaration.
     CFileAnalyzer(std::string_view text, const CFileSettings& settings, const CUnreadable& unreadable,
                   bool wants_all_names)
+        : CFileAnalyzer(text, settings, unreadable, text, false, wants_all_names, _fOwnLiteralNames) {}
+
+    // For a part: with `declares_names` the rules for declarations see its names.
+    CFileAnalyzer(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
+                  bool declares_names)
+        : CFileAnalyzer(text, settings, kAllReadable, {}, declares_names, declares_names, literal_names) {}
+
+    CFileAnalysis Run();
+    CFilePart RunPart(uint32_t start, const CPartState& state, CPartEnd& part_end);
+
+    // True after a run that saw too few names for the declarations that are there.
+    bool NeedsAllNames() const { return _fNeedsAllNames; }
+
+    // True after a part that has lines with a word that declares names.
+    bool HasDeclaringWords() const { return _fHasDeclaringWords; }
+
+  private:
+    // Names may be declared where `declared_text` says so, or anyhow.
+    CFileAnalyzer(std::string_view text, const CFileSettings& settings, const CUnreadable& unreadable,
+                  std::string_view declared_text, bool declares_names, bool wants_all_names,
+                  CLiteralNames& literal_names)
         : _fText(text),
           _fSettings(settings),
           _fUnreadable(unreadable),
           _fLength(text.size()),
-          _fFalseHints(text),
+          _fOwnLiteralNames(text),
+          _fFalseHints(text, literal_names),
           _fChecker(LanguageOf(settings.version), _fResult.problems),
-          _fDeclarations(text),
-          _fMayDeclareNames(!_fDeclarations.IsEmpty()),
+          _fDeclarations(declared_text),
+          _fMayDeclareNames(declares_names || !_fDeclarations.IsEmpty()),
           _fWantsAllNames(settings.wants_names || wants_all_names),
           _fSignatures(_fResult.signatures) {
         if (settings.names) _fResult.records.names = settings.names;
@@ -65,12 +100,6 @@ class CFileAnalyzer final : CTreeObserver {
         _SetLanguage(LanguageOf(settings.version));
     }
 
-    CFileAnalysis Run();
-
-    // True after a run that saw too few names for the declarations that are there.
-    bool NeedsAllNames() const { return _fNeedsAllNames; }
-
-  private:
     void Take(const CRawLogical& part, const CTree& tree) override;
     void TakeHint(const CTree& tree, const CTreeNode& node, uint32_t shift) override;
     bool WantsHints() const override { return _fSettings.wants_names; }
@@ -79,13 +108,19 @@ class CFileAnalyzer final : CTreeObserver {
     void _SetLanguage(const CLanguage& language);
     void _MakeRoom();
     void _GiveRoomBack();
-    void _AnalyzeLine(const CRawLogical& logical);
-    void _Enter(const CRawLogical& logical);
+    void _TakePrintFunction();
+    void _BeginLine(const CRawLogical& logical);
+    void _AnalyzeBegunLine(const CRawLogical& logical);
+    bool _EndsBefore(const CRawLogical& logical, CPartEnd& part_end);
+    CFilePart _EndPart(const CLexer& lexer, uint32_t end, uint32_t looked_at);
+    CPartState _State() const { return {_fChecker.State(), _fHasPrintFunction}; }
+    void _BeginNames(const CRawLogical& logical);
     void _Leave(const CRawLogical& logical, bool has_fault);
     CLineResult _Analyze(const CRawLogical& logical);
     void _FindOutWhetherToCollect(const CRawLogical& logical);
     void _FinishNames();
     void _AddUnreadable();
+    void _PlaceFaults();
     void _AddFault(const CRawLogical& logical, const CFault& fault);
     void _AddProblem(ECode code, uint32_t start, uint32_t end, std::string message);
     bool _IsUnreadable(const CLine& line) const;
@@ -94,8 +129,10 @@ class CFileAnalyzer final : CTreeObserver {
     const CFileSettings& _fSettings;
     const CUnreadable& _fUnreadable;
     CLengthLimits _fLength;
+    CLiteralNames _fOwnLiteralNames;
     CFalseHints _fFalseHints;
     const CLanguage* _fLanguage = nullptr;
+    bool _fHasPrintFunction = false;
     std::optional<CLineAnalyzer> _fAnalyzer;
     std::optional<CCauses> _fCauses;  // made for the first fault
     CFollowUps _fFollowUps;
@@ -105,7 +142,12 @@ class CFileAnalyzer final : CTreeObserver {
     const bool _fMayDeclareNames;
     const bool _fWantsAllNames;
     bool _fNeedsAllNames = false;
-    bool _fIsCollecting = false;  // names of the line under way
+    bool _fHasDeclaringWords = false;
+    bool _fIsFileTooLong = false;
+    bool _fIsPart = false;
+    uint32_t _fPartStart = 0;
+    std::vector<CLineFault> _fFaults;  // of a part
+    bool _fIsCollecting = false;       // names of the line under way
     std::optional<CNameCollector> _fNames;
     const CRawLogical* _fLine = nullptr;  // under way, where names are wanted
     CSignatureFinder _fSignatures;
@@ -116,7 +158,8 @@ CFileAnalysis CFileAnalyzer::Run() {
     CTokenizer tokenizer(_fText);
     CRawLogical logical;
     while (tokenizer.NextLogical(logical)) {
-        _AnalyzeLine(logical);
+        _BeginLine(logical);
+        _AnalyzeBegunLine(logical);
         if (_IsOutOfTime()) [[unlikely]] {
             CFileAnalysis cut;
             cut.is_cut = true;
@@ -128,9 +171,70 @@ CFileAnalysis CFileAnalyzer::Run() {
     if (_fNames) _FinishNames();
     _AddUnreadable();
     _GiveRoomBack();
-    std::stable_sort(_fResult.problems.begin(), _fResult.problems.end(),
-                     [](const CProblem& one, const CProblem& other) { return one.start < other.start; });
+    SortByPlace(_fResult.problems);
     return std::move(_fResult);
+}
+
+// Parts of a text
+
+CFilePart CFileAnalyzer::RunPart(uint32_t start, const CPartState& state, CPartEnd& part_end) {
+    _fIsPart = true;
+    _fPartStart = start;
+    _fChecker.Resume(state.check);
+    if (state.has_print_function) _TakePrintFunction();
+    CTokenizer tokenizer(_fText, start);
+    CRawLogical logical;
+    for (bool is_fresh = false; tokenizer.NextLogical(logical); is_fresh = tokenizer.IsFresh()) {
+        _BeginLine(logical);
+        if (is_fresh && _EndsBefore(logical, part_end)) {
+            _fResult.lines.CutTo(_fResult.lines.size() - 1);
+            return _EndPart(tokenizer.Lexer(), logical.StartOf(logical.tokens.front()),
+                            logical.EndOf(logical.tokens.back()));
+        }
+        _AnalyzeBegunLine(logical);
+    }
+    _fChecker.Finish();
+    const auto size = static_cast<uint32_t>(_fText.size());
+    return _EndPart(tokenizer.Lexer(), size, size);
+}
+
+// Only before a line that is judged by itself. One that begins with a string may be judged by what is before
+// it, where its quotes are in doubt; a comment after a `def` may be the hint of that.
+bool CFileAnalyzer::_EndsBefore(const CRawLogical& logical, CPartEnd& part_end) {
+    const CRawToken& first = logical.tokens.front();
+    const size_t line_count = _fResult.lines.size() - 1;
+    if (first.position.col != 0 || (first.type != kTokenId_NAME && first.type != kTokenId_AT)) return false;
+    if (line_count == 0 || _fResult.lines[line_count - 1].type == ELogicalType::kFunctionDef) return false;
+    if (!_fChecker.Blocks().BeginsAnew()) return false;
+    const uint32_t start = logical.StartOf(first);
+    const bool has_problem = std::any_of(_fResult.problems.begin(), _fResult.problems.end(),
+                                         [&](const CProblem& problem) { return problem.end > start; });
+    return !has_problem && part_end.EndsAt(start, _State(), line_count);
+}
+
+CFilePart CFileAnalyzer::_EndPart(const CLexer& lexer, uint32_t end, uint32_t looked_at) {
+    _fNeedsAllNames = _fNames && DeclaresInModule(_fResult.names);
+    CFilePart part;
+    _PlaceFaults();
+    const size_t count = _fResult.problems.size();
+    if (_fNames) _FinishNames();
+    const auto first_late = _fResult.problems.begin() + static_cast<ptrdiff_t>(count);
+    part.late_problems.assign(std::make_move_iterator(first_late),
+                              std::make_move_iterator(_fResult.problems.end()));
+    _fResult.problems.resize(count);
+    part.faults = std::move(_fFaults);
+    part.end = end;
+    part.state = _State();
+    const size_t next =
+        SkipToNextRow(_fText, FindRowEnd(_fText, std::max<size_t>(looked_at, lexer.LookedAt())));
+    part.looked_at = static_cast<uint32_t>(std::min(FindRowEnd(_fText, next) + 2, _fText.size()));
+    part.scanned_in_vain = lexer.ScannedInVain();
+    part.repeated_text = _fLength.RepeatedText();
+    part.has_asked_for_literals = _fFalseHints.HasAskedForLiterals();
+    part.needs_whole_text =
+        _fNeedsAllNames || _fIsFileTooLong || (_fPartStart > 0 && _fChecker.Blocks().MayHaveReopened());
+    part.analysis = std::move(_fResult);
+    return part;
 }
 
 // Storage that grew bit by bit would be copied more than once.
@@ -161,6 +265,17 @@ bool CFileAnalyzer::_IsOutOfTime() const {
            _fSettings.time_limit->IsOver();
 }
 
+// Rules take back problems of theirs, so the places of others among them are only known at the end.
+void CFileAnalyzer::_PlaceFaults() {
+    size_t problem_i = 0;
+    for (CLineFault& fault : _fFaults) {
+        const CProblems& problems = _fResult.problems;
+        while (problems[problem_i].start != fault.start || problems[problem_i].code != fault.code)
+            ++problem_i;
+        fault.problem_i = problem_i++;
+    }
+}
+
 // What the rules see, those see who look for names.
 
 void CFileAnalyzer::Take(const CRawLogical& part, const CTree& tree) {
@@ -173,8 +288,8 @@ void CFileAnalyzer::TakeHint(const CTree& tree, const CTreeNode& node, uint32_t 
     if (_fIsCollecting) _fNames->TakeHint(tree, node, shift);
 }
 
-void CFileAnalyzer::_Enter(const CRawLogical& logical) {
-    _fChecker.Enter(logical);
+void CFileAnalyzer::_BeginNames(const CRawLogical& logical) {
+    _fHasDeclaringWords |= logical.MayHaveWords(WordBits(EWord::kGlobal, EWord::kNonlocal));
     if (_fNames) _FindOutWhetherToCollect(logical);
     if (_fIsCollecting) _fNames->BeginLine(logical, _fChecker.Blocks());
     if (!_fSettings.wants_names) return;
@@ -202,24 +317,33 @@ void CFileAnalyzer::_Leave(const CRawLogical& logical, bool has_fault) {
     if (_fSettings.wants_names) _fSignatures.EndLine(has_fault);
 }
 
+void CFileAnalyzer::_TakePrintFunction() {
+    _fHasPrintFunction = true;
+    _SetLanguage(LanguageOf(_fSettings.version, true));
+}
+
 void CFileAnalyzer::_SetLanguage(const CLanguage& language) {
     _fLanguage = &language;
     _fAnalyzer.emplace(language);
     _fCauses.reset();
 }
 
-void CFileAnalyzer::_AnalyzeLine(const CRawLogical& logical) {
+void CFileAnalyzer::_BeginLine(const CRawLogical& logical) {
     assert(!logical.tokens.empty());
     const auto first_record = static_cast<uint32_t>(_fResult.records.records.size());
     const CLine line = {logical.StartOf(logical.tokens.front()), logical.EndOf(logical.tokens.back()),
                         first_record, logical.type};
     _fResult.lines.push_back(line);
-    if (_fSettings.version < 300 && ImportsPrintFunction(logical))
-        _SetLanguage(LanguageOf(_fSettings.version, true));
+    _fChecker.Enter(logical);
+}
 
-    _Enter(logical);
+void CFileAnalyzer::_AnalyzeBegunLine(const CRawLogical& logical) {
+    const CLine line = _fResult.lines.back();
+    if (_fSettings.version < 300 && ImportsPrintFunction(logical)) _TakePrintFunction();
+    _BeginNames(logical);
     if (const ETooLong too_long = _fLength.Take(logical); too_long != ETooLong::kNot) [[unlikely]] {
         _Leave(logical, true);
+        _fIsFileTooLong |= too_long == ETooLong::kRepeatedTextOfFile;
         const CRawToken& first = logical.tokens.front();
         return _AddProblem(ECode::kLineTooLong, logical.StartOf(first), logical.EndOf(first),
                            CLengthLimits::Message(too_long, logical));
@@ -249,6 +373,12 @@ CLineResult CFileAnalyzer::_Analyze(const CRawLogical& logical) {
 void CFileAnalyzer::_AddFault(const CRawLogical& logical, const CFault& fault) {
     if (!_fCauses) _fCauses.emplace(*_fLanguage);
     CProblem problem = _fCauses->Of(fault, logical);
+    if (_fIsPart) {
+        _fFaults.push_back({problem.start, problem.code, 0, logical});
+        _fFaults.back().line.embedded.clear();
+        _fResult.problems.push_back(std::move(problem));
+        return;
+    }
     if (!_fFollowUps.Take(problem, logical, _fResult.problems))
         _fResult.problems.push_back(std::move(problem));
 }
@@ -307,6 +437,22 @@ CFileAnalysis AnalyzeFile(std::string_view text, const CFileSettings& settings,
     CFileAnalysis analysis = analyzer.Run();
     if (!analyzer.NeedsAllNames()) return analysis;
     return CFileAnalyzer(text, settings, unreadable, true).Run();
+}
+
+CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
+                      uint32_t start, const CPartState& state, CPartEnd& part_end) {
+    CFileSettings quick = settings;
+    quick.wants_records = quick.wants_names = false;
+    CFileAnalyzer analyzer(text, quick, literal_names, false);
+    CFilePart part = analyzer.RunPart(start, state, part_end);
+    if (!analyzer.HasDeclaringWords()) return part;
+    CEndAt same_end(part.end);
+    return CFileAnalyzer(text, quick, literal_names, true).RunPart(start, state, same_end);
+}
+
+bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text) {
+    return scanned_in_vain < CLexer::MostScannedInVain(text_size) &&
+           repeated_text <= CLengthLimits::MostRepeatedText(text_size);
 }
 
 }  // namespace codeloom

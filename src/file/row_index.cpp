@@ -37,11 +37,20 @@ CRowIndex::CRowIndex(std::string_view text) : _fText(text) {
         _fStarts.push_back(static_cast<uint32_t>(pos));
     }
     _fStarts.shrink_to_fit();
-    if (IsAscii(text)) return;
+    _CountBlocks();
+}
+
+CRowIndex::CRowIndex(std::string_view text, std::vector<uint32_t> starts)
+    : _fText(text), _fStarts(std::move(starts)) {
+    _CountBlocks();
+}
+
+void CRowIndex::_CountBlocks() {
+    if (IsAscii(_fText)) return;
     uint32_t before = 0;
-    for (size_t pos = 0; pos < text.size(); pos += kBlock) {
+    for (size_t pos = 0; pos < _fText.size(); pos += kBlock) {
         _fBeforeBlocks.push_back(before);
-        before += CountCharacters(text.substr(pos, kBlock));
+        before += CountCharacters(_fText.substr(pos, kBlock));
     }
     _fBeforeBlocks.push_back(before);
 }

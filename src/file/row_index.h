@@ -28,6 +28,8 @@ struct CRange {
 class CRowIndex {
   public:
     explicit CRowIndex(std::string_view text);
+    // The same where the beginnings of the rows are known.
+    CRowIndex(std::string_view text, std::vector<uint32_t> starts);
 
     uint32_t Count() const { return static_cast<uint32_t>(_fStarts.size()); }
 
@@ -43,6 +45,7 @@ class CRowIndex {
     uint32_t Start(uint32_t row) const { return _fStarts[row]; }
 
   private:
+    void _CountBlocks();
     uint32_t _RowOf(uint32_t offset) const;
     uint32_t _CharactersBefore(uint32_t offset) const;
 

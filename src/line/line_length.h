@@ -29,7 +29,13 @@ class CLengthLimits {
     static constexpr size_t kMostRepeatedTextPerByte = 20;
 
     explicit CLengthLimits(size_t file_size)
-        : _fRepeatedTextLeft(kMostRepeatedText + file_size * kMostRepeatedTextPerByte) {}
+        : _fMostRepeatedText(MostRepeatedText(file_size)), _fRepeatedTextLeft(_fMostRepeatedText) {}
+
+    // What the lines have repeated so far, and what those of a file may.
+    size_t RepeatedText() const { return _fMostRepeatedText - _fRepeatedTextLeft; }
+    static constexpr size_t MostRepeatedText(size_t file_size) {
+        return kMostRepeatedText + file_size * kMostRepeatedTextPerByte;
+    }
 
     // Whether `line` is too long, the expressions within it included. Otherwise what its records repeat
     // counts from now on.
@@ -45,6 +51,7 @@ class CLengthLimits {
 
     ETooLong _Measure(const CRawLogical& line);
 
+    size_t _fMostRepeatedText;
     size_t _fRepeatedTextLeft;
 };
 

@@ -196,6 +196,7 @@ void CBlockTracker::_PlaceDeeper(const CIndent& indent) {
 // A block that no header opens: that of the same depth which was left last, since a line between may have
 // lost its indentation, or an unknown one.
 void CBlockTracker::_OpenOdd(const CIndent& indent) {
+    _fMayHaveReopened = true;
     CBlock& top = _Top();
     top.may_follow_anything = true;
     const int32_t header_depth = top.indent.column;
@@ -349,6 +350,8 @@ void CBlockTracker::Leave(bool has_fault) {
         _fPreviousHasFault |= has_fault;
         return;
     }
+    if (block.bare_except_end != 0 && !IsContinuation(_fHead.clause))
+        block.bare_except_start = block.bare_except_end = 0;
     if (_fHead.clause != EClause::kSimple) _NoteClause(block);
     block.is_first = block.is_empty;
     block.is_empty = false;
@@ -455,10 +458,32 @@ bool CBlockTracker::IsInDoubt() const {
     });
 }
 
+bool CBlockTracker::BeginsAnew() const {
+    const EClause before = _fBlocks.front().previous.clause;
+    return _fBlocks.size() == 1 && !_fIsMidRow && !_fHasPlaceProblem && !IsContinuation(_fHead.clause) &&
+           _fHead.clause != EClause::kCase && before != EClause::kTry && before != EClause::kDecorator;
+}
+
+CModuleState CBlockTracker::State() const {
+    CModuleState state{_fBlocks.front(), _fHasTooMany, _fHasTooManyFrames};
+    state.module.previous = {};
+    state.module.bare_except_start = state.module.bare_except_end = 0;
+    state.module.takes_all = {};
+    return state;
+}
+
+void CBlockTracker::Resume(const CModuleState& state) {
+    _fBlocks = {state.module};
+    _fAreInDoubt = state.module.is_in_doubt;
+    _fHasTooMany = state.has_too_many;
+    _fHasTooManyFrames = state.has_too_many_frames;
+}
+
 // A header that was moved out of its block is what statements in it were blamed for.
 void CBlockTracker::_DropPlacementSince(uint32_t start) {
-    while (!_fProblems.empty() && IsPlacement(_fProblems.back().code) && _fProblems.back().start >= start)
-        _fProblems.pop_back();
+    std::erase_if(_fProblems, [start](const CProblem& problem) {
+        return IsPlacement(problem.code) && problem.start >= start;
+    });
 }
 
 CProblem& CBlockTracker::_Report(ECode code, uint32_t start, uint32_t end, std::string message) {

@@ -54,6 +54,17 @@ struct CBlock {
     bool has_yield = false;  // of a function's
     CSpan full_header;       // of a function's: the one within that leaves no frame; empty for none
     uint32_t frame_count = 0;  // of the function's blocks that the interpreter keeps a frame for, here
+
+    bool operator==(const CBlock&) const = default;
+};
+
+// What is left of the blocks where a statement of the module begins anew: no place in the text.
+struct CModuleState {
+    CBlock module = {};
+    bool has_too_many = false;
+    bool has_too_many_frames = false;
+
+    bool operator==(const CModuleState&) const = default;
 };
 
 class CBlockTracker {
@@ -90,6 +101,15 @@ class CBlockTracker {
 
     // Nothing can be said about what is around the line: a fault has put it there, or has lost a header.
     bool IsInDoubt() const;
+
+    // The line that was entered last begins a statement of the module, and no line before it matters from
+    // now on but for what State says, and for the blocks that it may reopen.
+    bool BeginsAnew() const;
+    CModuleState State() const;
+    // Goes on from there, at a line that begins anew.
+    void Resume(const CModuleState& state);
+    // Some line may have reopened any block that was closed before.
+    bool MayHaveReopened() const { return _fMayHaveReopened; }
 
   private:
     static constexpr size_t kMostIndents = 100;  // of the interpreter
@@ -135,6 +155,7 @@ class CBlockTracker {
     bool _fAreInDoubt = false;  // at least one of them
     bool _fHasTooMany = false;
     bool _fHasTooManyFrames = false;
+    bool _fMayHaveReopened = false;
 };
 
 }  // namespace codeloom

@@ -113,10 +113,11 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
     if (is_future) {
         _CheckFuture(tree->fRoot, blocks);
     } else if (tree != nullptr) {
-        const bool may_be_docstring = !_fHasStatement || (!_fLanguage.IsPython3() && _fHasFutures);
-        _fIsPastFutures |= !may_be_docstring || !IsDocstring(logical, _fLanguage);
+        const bool may_be_docstring =
+            !_fBeginning.has_statement || (!_fLanguage.IsPython3() && _fBeginning.has_futures);
+        _fBeginning.is_past_futures |= !may_be_docstring || !IsDocstring(logical, _fLanguage);
     }
-    _fHasStatement = true;
+    _fBeginning.has_statement = true;
     if (tree == nullptr || tree->fIsEmpty || !logical.MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt())
         return;
     if (logical.MayHaveWords(WordBits(EWord::kLazy))) CheckLazyImports(*tree, blocks, _fProblems);
@@ -179,7 +180,7 @@ void CPlacementRules::_EndFunction(const CStrictFunction& function) {
 // Imports of features come first in a file, after its docstring.
 void CPlacementRules::_CheckFuture(const CTreeNode& statement, const CBlockTracker& blocks) {
     const CTree& tree = *_fTree;
-    if (_fIsPastFutures || blocks.Depth() > 0) {
+    if (_fBeginning.is_past_futures || blocks.Depth() > 0) {
         const CSpan span = SpanOf(tree, statement);
         _fProblems.push_back({ECode::kFutureNotFirst,
                               span.start,
@@ -189,7 +190,7 @@ void CPlacementRules::_CheckFuture(const CTreeNode& statement, const CBlockTrack
                               {}});
         return;
     }
-    _fHasFutures = true;
+    _fBeginning.has_futures = true;
     if (const CTreeNode* const star = StarOfFromImport(tree, statement)) return _CheckFeature(*star);
     ForEachImportedName(tree, NamesOfFromImport(tree, statement),
                         [&](const CImportedName& imported) { _CheckFeature(*imported.name); });
@@ -200,7 +201,7 @@ void CPlacementRules::_CheckFeature(const CTreeNode& name) {
     const auto feature = std::find_if(kFeatures.begin(), kFeatures.end(),
                                       [&](const CFeature& candidate) { return candidate.name == text; });
     if (feature != kFeatures.end() && feature->version <= _fLanguage.version) {
-        _fHasFutureAnnotations |= text == "annotations";
+        _fBeginning.has_future_annotations |= text == "annotations";
         return;
     }
     const CSpan span = SpanOf(*_fTree, name);

@@ -45,6 +45,16 @@ struct CPlacement {
     void Enter(EClause clause);
 };
 
+// What came before a line, as far as it matters for all that follow.
+struct CBeginning {
+    bool is_past_futures = false;
+    bool has_statement = false;
+    bool has_futures = false;  // an import from `__future__` came
+    bool has_future_annotations = false;
+
+    bool operator==(const CBeginning&) const = default;
+};
+
 class CPlacementRules {
   public:
     CPlacementRules(const CLanguage& language, CProblems& problems)
@@ -59,7 +69,7 @@ class CPlacementRules {
 
     // False for most lines: nothing in them depends on where they are.
     bool MayBreak(const CRawLogical& part) const {
-        return part.MayHaveWords(kWordsOfInterest) || !_fIsPastFutures;
+        return part.MayHaveWords(kWordsOfInterest) || !_fBeginning.is_past_futures;
     }
 
     // Then call this; `tree` is null for one with a fault.
@@ -71,11 +81,15 @@ class CPlacementRules {
     // Annotations aren't evaluated where they are: since 3.14 (PEP 649), or by `from __future__` (PEP 563),
     // where they are judged since 3.10.
     bool DefersAnnotations() const {
-        return _fLanguage.version >= 314 || (_fHasFutureAnnotations && _fLanguage.version >= 310);
+        return _fLanguage.version >= 314 || (_fBeginning.has_future_annotations && _fLanguage.version >= 310);
     }
 
     // Call once, after the last line.
     void Finish() { _TrackFunctions({}); }
+
+    // What to go on from in the module, where no function is under way.
+    const CBeginning& Beginning() const { return _fBeginning; }
+    void Resume(const CBeginning& beginning) { _fBeginning = beginning; }
 
   private:
     // Words without which a line has nothing that depends on its place.
@@ -132,10 +146,7 @@ class CPlacementRules {
     std::vector<CStrictFunction> _fFunctions;  // by depth; only those whose body is under way
     CPlacement _fPlace;                        // what the blocks around the line allow, once it is known
     bool _fIsPlaceKnown = false;
-    bool _fIsPastFutures = false;
-    bool _fHasStatement = false;  // something came before
-    bool _fHasFutures = false;    // an import from `__future__` did
-    bool _fHasFutureAnnotations = false;
+    CBeginning _fBeginning;
 };
 
 }  // namespace codeloom

@@ -6,6 +6,7 @@
 // One mark for a fault: what follows from a fault already marked isn't a problem of its own.
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
 #include <string>
 #include <vector>
@@ -32,5 +33,11 @@ struct CProblem {
 };
 
 using CProblems = std::vector<CProblem>;
+
+inline void SortByPlace(CProblems& problems) {
+    const auto is_before = [](const CProblem& one, const CProblem& other) { return one.start < other.start; };
+    if (!std::is_sorted(problems.begin(), problems.end(), is_before))
+        std::stable_sort(problems.begin(), problems.end(), is_before);
+}
 
 }  // namespace codeloom

@@ -41,6 +41,7 @@ struct CStatementHead {
     uint32_t with_item_count = 0;
 
     bool IsHeader() const { return clause > EClause::kDecorator; }
+    bool operator==(const CStatementHead&) const = default;
 };
 
 // Requires: `logical` isn't a comment.

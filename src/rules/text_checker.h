@@ -13,6 +13,14 @@
 
 namespace codeloom {
 
+// What of the lines before matters where a statement of the module begins anew.
+struct CCheckState {
+    CModuleState blocks = {};
+    CBeginning beginning = {};
+
+    bool operator==(const CCheckState&) const = default;
+};
+
 class CTextChecker final : public CTreeObserver {
   public:
     // Both must outlive the checker.
@@ -34,6 +42,13 @@ class CTextChecker final : public CTreeObserver {
     void Finish();
 
     const CBlockTracker& Blocks() const { return _fBlocks; }
+
+    // As it was before the line that was entered last, which begins anew; and to go on from there.
+    CCheckState State() const { return {_fBlocks.State(), _fPlacement.Beginning()}; }
+    void Resume(const CCheckState& state) {
+        _fBlocks.Resume(state.blocks);
+        _fPlacement.Resume(state.beginning);
+    }
 
   private:
     // Apart, so that most lines pay for the question alone.

@@ -11,6 +11,8 @@ namespace codeloom {
 struct CSpan {
     uint32_t start = 0;
     uint32_t end = 0;
+
+    bool operator==(const CSpan&) const = default;
 };
 
 inline bool IsToken(const CTreeNode& node, int16_t token_type) {

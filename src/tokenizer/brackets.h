@@ -44,6 +44,9 @@ class CBrackets {
         for (const COpenBracket& bracket : _fOpen) _fUnclosed.push_back(bracket.pos);
     }
 
+    // It is known of no bracket at `pos` or further on that it will never be closed.
+    bool KnowsNothingFrom(size_t pos) const { return _fUnclosed.empty() || _fUnclosed.back() < pos; }
+
   private:
     struct COpenBracket {
         size_t pos;

@@ -21,9 +21,13 @@ constexpr size_t kLeastWaste = 4096;
 
 CLexer::CLexer(std::string_view text)
     : _fText(text),
-      _fWasteLeft(text.size() * kWastePerByte + kLeastWaste),
+      _fWasteLeft(MostScannedInVain(text.size())),
       _fDoubtLeft(_fWasteLeft),
       _fNoTripleFrom{text.size(), text.size()} {}
+
+size_t CLexer::MostScannedInVain(size_t text_size) {
+    return text_size * kWastePerByte + kLeastWaste;
+}
 
 CLexedToken CLexer::Lex(size_t pos, int depth) {
     switch (ByteKind(_fText[pos])) {
@@ -73,6 +77,7 @@ CStringEnd CLexer::_FindFieldStringEnd(size_t pos, const CStringStart& start, in
     if (_fWasteLeft == 0) return {pos, false};
     CFstringScanner scanner(*this, nullptr, depth);
     const CStringEnd found = scanner.Scan(pos, start);
+    NoteLook(found.end);
     if (!found.is_closed && depth == 0) _fWasteLeft -= std::min(_fWasteLeft, found.end - pos + 1);
     return found;
 }
@@ -82,6 +87,7 @@ CStringEnd CLexer::_FindPlainStringEnd(size_t pos, const CStringStart& start) {
     size_t& no_triple_from = _fNoTripleFrom[start.quote == '"'];
     if (pos >= no_triple_from) return {_fText.size(), false, true};
     const CStringEnd found = FindStringEnd(_fText, pos, start.quote, true);
+    NoteLook(found.end);
     if (!found.is_closed) no_triple_from = pos;
     return found;
 }

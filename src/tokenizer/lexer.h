@@ -1,6 +1,7 @@
 // One token at a place of the text.
 #pragma once
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <cstdint>
@@ -49,6 +50,17 @@ class CLexer {
     // around it.
     CLexedToken Lex(size_t pos, int depth = 0);
 
+    // How far the text has been looked at, apart from the rows of tokens that were asked for: for the ends of
+    // strings, and where brackets and quotes can't be trusted.
+    size_t LookedAt() const { return _fLookedAt; }
+    void NoteLook(size_t end) { _fLookedAt = std::max(_fLookedAt, end); }
+
+    // The bytes that were scanned in vain, and those that may be before the rest is taken as it stands.
+    size_t ScannedInVain() const {
+        return MostScannedInVain(_fText.size()) - std::min(_fWasteLeft, _fDoubtLeft);
+    }
+    static size_t MostScannedInVain(size_t text_size);
+
   private:
     CLexedToken _LexNameOrString(size_t pos, int depth);
     CLexedToken _LexString(size_t pos, const CStringStart& start, int depth);
@@ -65,6 +77,7 @@ class CLexer {
     // Likewise for doubts about triple quotes.
     size_t _fDoubtLeft;
     bool _fDoubts = true;  // not while a doubt is looked into
+    size_t _fLookedAt = 0;
     // From where on no triple quotes are left, for each of the two quotes.
     std::array<size_t, 2> _fNoTripleFrom;
 };

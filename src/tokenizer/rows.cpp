@@ -12,7 +12,10 @@ bool CRowReader::Next(CTokenRow& row) {
     const std::string_view text = _fLexer.Text();
     _fPlace.pos = SkipBlanks(text, _fPlace.pos);
     if (SkipRowEnd(text, _fPlace)) SkipBlankRows(text, _fPlace);
-    if (_fPlace.pos >= text.size()) return false;
+    if (_fPlace.pos >= text.size()) {
+        _fLexer.NoteLook(text.size());
+        return false;
+    }
 
     const size_t pos = _fPlace.pos;
     row.start = _fPlace.row_start;
@@ -25,6 +28,7 @@ bool CRowReader::Next(CTokenRow& row) {
     while (_fPlace.pos < text.size() && !IsRowEnd(text[_fPlace.pos])) _ReadToken(row);
     row.text = text.substr(pos, _fPlace.pos - pos);
     row.end = _fPlace.pos + RowEndLength(text, _fPlace.pos);
+    _fLexer.NoteLook(row.end);
     return true;
 }
 

@@ -33,10 +33,11 @@ CRowToken LastRowToken(const CRawLogical& logical) {
 
 }  // namespace
 
-CTokenizer::CTokenizer(std::string_view text) : _fLexer(text), _fEmbedded(text) {
+CTokenizer::CTokenizer(std::string_view text, size_t start) : _fLexer(text), _fEmbedded(text) {
     if (text.size() > kMaxTextSize)
         throw std::length_error("a source text must be shorter than 2 GB; split it into several texts");
-    if (text.starts_with(kByteOrderMark)) _fPlace.pos = _fPlace.row_start = kByteOrderMark.size();
+    if (start == 0 && text.starts_with(kByteOrderMark)) start = kByteOrderMark.size();
+    _fPlace.pos = _fPlace.row_start = start;
 }
 
 bool CTokenizer::NextLogical(CRawLogical& logical) {
@@ -89,6 +90,7 @@ void CTokenizer::_CollectStatement(CRawLogical& logical) {
     const CPlace start = _fPlace;
     _fIsCompound = false;
     if (!_CollectTokens(logical, kUpToEnd)) {
+        _fLexer.NoteLook(_fPlace.pos);
         _fBrackets.RememberUnclosed();
         _fPlace = start;
         _Restart(logical);

@@ -36,10 +36,21 @@ class CTokenizer {
   public:
     // `text` must outlive the tokenizer and every logical it gave. std::length_error for one of more than
     // kMaxTextSize bytes.
-    explicit CTokenizer(std::string_view text);
+    explicit CTokenizer(std::string_view text) : CTokenizer(text, 0) {}
+
+    // The same from `start` on, the beginning of a row without indentation before which IsFresh.
+    CTokenizer(std::string_view text, size_t start);
 
     // The next logical line into `logical`, whose storage is reused; false at the end of the text.
     bool NextLogical(CRawLogical& logical);
+
+    // What comes next doesn't depend on what was before, but for the definitions around it: it begins a row,
+    // and nothing is known of it yet.
+    bool IsFresh() const {
+        return !_fMidRow && _fQuotesKnownUpTo <= _fPlace.pos && _fBrackets.KnowsNothingFrom(_fPlace.pos);
+    }
+
+    const CLexer& Lexer() const { return _fLexer; }
 
   private:
     // Tokens are collected up to the end of the logical line, or, when its brackets are known not to be

@@ -104,7 +104,8 @@ bool CFalseHints::IsFalseInQuotes(const CRawLogical& quoted) {
 
 // The byte at `pos` is within a `Literal` under another name.
 bool CFalseHints::_IsInLiteral(uint32_t pos) {
-    const std::unordered_set<std::string_view>& names = _LiteralNames();
+    _fHasAskedForLiterals = true;
+    const std::unordered_set<std::string_view>& names = _fLiteralNames.Get();
     return !names.empty() && names.contains(_NameBeforeBracketAt(pos));
 }
 
@@ -123,9 +124,9 @@ std::string_view CFalseHints::_NameBeforeBracketAt(uint32_t pos) {
     return _fOpenNames.empty() ? std::string_view() : _fOpenNames.back();
 }
 
-const std::unordered_set<std::string_view>& CFalseHints::_LiteralNames() {
-    if (_fLiteralNames) return *_fLiteralNames;
-    std::unordered_set<std::string_view>& names = _fLiteralNames.emplace();
+const std::unordered_set<std::string_view>& CLiteralNames::Get() {
+    if (_fNames) return *_fNames;
+    std::unordered_set<std::string_view>& names = _fNames.emplace();
     for (size_t pos = _fText.find(kLiteral); pos != std::string_view::npos;
          pos = _fText.find(kLiteral, pos)) {
         const bool is_word = !EndsInWord(_fText.substr(0, pos));

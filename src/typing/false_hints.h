@@ -19,10 +19,34 @@
 
 namespace codeloom {
 
+// The names that a file imports `Literal` under, beside its own; found out when they are first asked for.
+class CLiteralNames {
+  public:
+    // `file_text` must outlive it.
+    explicit CLiteralNames(std::string_view file_text) : _fText(file_text) {}
+
+    const std::unordered_set<std::string_view>& Get();
+
+  private:
+    std::string_view _fText;
+    std::optional<std::unordered_set<std::string_view>> _fNames;
+};
+
 class CFalseHints {
   public:
     // `file_text` must outlive it.
-    explicit CFalseHints(std::string_view file_text) : _fText(file_text) {}
+    explicit CFalseHints(std::string_view file_text)
+        : _fText(file_text), _fOwnLiteralNames(file_text), _fLiteralNames(_fOwnLiteralNames) {}
+
+    // For a part of a file, whose parts share the names.
+    CFalseHints(std::string_view file_text, CLiteralNames& literal_names)
+        : _fText(file_text), _fOwnLiteralNames({}), _fLiteralNames(literal_names) {}
+
+    CFalseHints(const CFalseHints&) = delete;
+    CFalseHints& operator=(const CFalseHints&) = delete;
+
+    // The names for `Literal` have mattered.
+    bool HasAskedForLiterals() const { return _fHasAskedForLiterals; }
 
     // The questions below are about `line` from now on. It costs nothing until one is asked.
     void BeginLine(const CRawLogical& line);
@@ -40,11 +64,11 @@ class CFalseHints {
     bool _TakesNothing() const;
     bool _IsInLiteral(uint32_t pos);
     std::string_view _NameBeforeBracketAt(uint32_t pos);
-    const std::unordered_set<std::string_view>& _LiteralNames();
 
     std::string_view _fText;
-    std::optional<std::unordered_set<std::string_view>>
-        _fLiteralNames;  // beside its own; none until it matters
+    CLiteralNames _fOwnLiteralNames;
+    CLiteralNames& _fLiteralNames;
+    bool _fHasAskedForLiterals = false;
     const CRawLogical* _fLine = nullptr;
     // The tokens that were passed, and what is before each bracket that is open after them.
     size_t _fPassedCount = 0;

@@ -1,0 +1,69 @@
+// The text of a document as the host sees it.
+#include "face/bind_document.h"
+
+#include <nanobind/nanobind.h>
+#include <nanobind/stl/pair.h>
+#include <nanobind/stl/string_view.h>
+
+#include "face/bind_items.h"
+#include "face/document.h"
+#include "host/text.h"
+
+namespace nb = nanobind;
+using namespace nb::literals;
+
+namespace codeloom {
+
+namespace {
+
+EUnit UnitOf(std::string_view encoding) {
+    if (encoding == "utf-8") return EUnit::kByte;
+    return encoding == "utf-16" ? EUnit::kUtf16 : EUnit::kCharacter;
+}
+
+}  // namespace
+
+void BindDocument(nb::module_& module) {
+    nb::class_<CDocument> document(
+        module, "DocumentText",
+        "For `codeloom.Document`: a text that changes, in pieces that keep what they say.");
+    document.def(
+        "__init__",
+        [](CDocument* self, nb::str text, nb::str path, nb::str python, int version, bool false_hints,
+           std::string_view encoding) {
+            CFileSettings settings;
+            settings.version = version;
+            settings.false_hints = false_hints;
+            new (self)
+                CDocument(std::move(text), std::move(path), std::move(python), settings, UnitOf(encoding));
+        },
+        "text"_a, "path"_a, "python"_a, "version"_a, "false_hints"_a, "encoding"_a);
+    document.def_prop_ro(
+        "text", [](const CDocument& self) { return TextFromUtf8(self.Text()); },
+        nb::sig("def text(self) -> str"), "The text as it is now.");
+    document.def_prop_ro(
+        "analysis",
+        [](const CDocument& self) -> nb::object {
+            return self.File() ? nb::cast(CAnalysis{self.File()}) : nb::none();
+        },
+        nb::sig("def analysis(self) -> Analysis | None"),
+        "What the text says; None for a text with NUL or lone surrogates.");
+    document.def_prop_ro(
+        "end", [](const CDocument& self) { return std::pair(self.End().row, self.End().column); },
+        "The row and the column after the last character.");
+    document.def(
+        "column_of",
+        [](const CDocument& self, int64_t row, int64_t column) { return self.ColumnOf({row, column}); },
+        "row"_a, "column"_a,
+        "A column in characters as one of the document. ValueError for an unknown place.");
+    document.def(
+        "edit",
+        [](CDocument& self, std::pair<int64_t, int64_t> start, std::pair<int64_t, int64_t> end,
+           nb::str new_text) {
+            return self.Edit({start.first, start.second}, {end.first, end.second}, std::move(new_text));
+        },
+        "start"_a, "end"_a, "new_text"_a,
+        "Put a text in the place of a range. The range before, and that of the new text.");
+}
+
+}  // namespace codeloom

@@ -1,0 +1,51 @@
+// The text of codeloom.Document.
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <utility>
+
+#include "document/pieces.h"
+#include "document/row_starts.h"
+#include "face/source_file.h"
+
+namespace codeloom {
+
+// For one thread at a time. A text that can't be analysed as it is, since it holds NUL or lone surrogates, is
+// edited here all the same.
+class CDocument {
+  public:
+    // Raises ValueError for a text that is too long.
+    CDocument(nb::str text, nb::str path, nb::str python, const CFileSettings& settings, EUnit unit);
+
+    std::string_view Text() const { return _fFile ? _fFile->Text() : _fUnreadable; }
+    // What the text says; null for one that can't be analysed as it is.
+    const CSourceFilePtr& File() const { return _fFile; }
+
+    // Puts a text in the place of a range, and gives the range before, and that of what is there now. Raises
+    // ValueError, naming the argument, for a place that the text doesn't have; the text then stays as it is.
+    std::pair<CRange, CRange> Edit(const CRowColumn& start, const CRowColumn& end, nb::str new_text);
+
+    // After the last character.
+    CRowColumn End() const;
+    // The column of a place that is counted in characters, in what the document counts.
+    int64_t ColumnOf(const CRowColumn& place) const;
+
+  private:
+    uint32_t _OffsetOf(const char* argument, const CRowColumn& place, EUnit unit) const;
+    CRange _RangeOf(uint32_t start, uint32_t end) const;
+    void _Take(CPlainFile text, const CTextEdit& edit);
+
+    nb::str _fPath;
+    nb::str _fPython;
+    CFileSettings _fSettings;
+    EUnit _fUnit;
+    CSourceFilePtr _fFile;
+    std::string _fUnreadable;  // the text, where there is no file
+    std::shared_ptr<const CPieces> _fPieces;
+    CRowStarts _fRows;
+};
+
+}  // namespace codeloom

@@ -1,0 +1,66 @@
+// A part of a text, from one statement of the module to a later one, so that the rest needn't be analysed
+// anew when the part changes.
+#pragma once
+
+#include <cstdint>
+#include <string_view>
+
+#include "file/file_analysis.h"
+#include "rules/text_checker.h"
+#include "typing/false_hints.h"
+
+namespace codeloom {
+
+// All that matters of the text before a part.
+struct CPartState {
+    CCheckState check;
+    bool has_print_function = false;
+
+    bool operator==(const CPartState&) const = default;
+};
+
+// Says where a part ends.
+class CPartEnd {
+  public:
+    // The part may end after `line_count` lines, before the line that begins at `start`.
+    virtual bool EndsAt(uint32_t start, const CPartState& state, size_t line_count) = 0;
+
+  protected:
+    ~CPartEnd() = default;
+};
+
+// A line with a fault, which may follow from one in another part.
+struct CLineFault {
+    uint32_t start = 0;  // of its problem
+    ECode code = ECode::kInvalidSyntax;
+    size_t problem_i = 0;
+    CRawLogical line = {};
+};
+
+// Places are those in the text.
+struct CFilePart {
+    CFileAnalysis analysis;  // its problems are in the order in which they were found
+    std::vector<CLineFault> faults;
+    CProblems late_problems;  // those of declarations, after all others
+    uint32_t end = 0;
+    CPartState state;  // after it
+    // What it says depends on the text up to here: on the line after it, and a row more.
+    uint32_t looked_at = 0;
+    // Shares of what a whole text may have.
+    size_t scanned_in_vain = 0;
+    size_t repeated_text = 0;
+    bool has_asked_for_literals = false;  // which the whole text says
+    // What it says depends on more of the text before than its state: only an analysis of the whole text is
+    // right.
+    bool needs_whole_text = false;
+};
+
+// Requires: as for AnalyzeFile, and `start` is zero or where another part has ended, with its state. Settings
+// that ask for records or names aren't regarded.
+CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
+                      uint32_t start, const CPartState& state, CPartEnd& part_end);
+
+// The parts of a text, whose shares come to these sums, say together what AnalyzeFile says.
+bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text);
+
+}  // namespace codeloom
