@@ -165,7 +165,7 @@ class CLogicalLine:
     @property
     def fOrigin(self) -> tuple[typing.Any, ...]:
         """
-        Where position (0, 0) stands in the file, as (row, column in UTF-8 bytes), both from zero. Columns of row 0 count from it, columns of later rows from the start of the file's row.
+        Where position (0, 0) is in the file, as (row, column in UTF-8 bytes), both from zero. Columns of row 0 count from it, columns of later rows from the start of the file's row.
         """
 
     @property
@@ -201,7 +201,7 @@ class CLogicalLine:
 def GetLogicalsFromText(text: str) -> list[typing.Any]:
     """
     The logical lines of a source text, a list of CLogicalLine. It never fails on what the text says:
-    what isn't Python becomes tokens that the parser refuses, on the line where it stands.
+    what isn't Python becomes tokens that the parser refuses, on the line where it is.
     """
 
 class ParseError(Exception):
@@ -244,7 +244,7 @@ class ParserGenerator:
     ParserGenerator(grammar_file, tok_number2name, op_text2number): the path of a grammar text in pgen
     notation, a dict from token type (int) to its name (str), and one from operator text (str) to token
     type. The first rule is the start symbol. Raises OSError when the file can't be read, and ValueError
-    with file, row and reason when it is no grammar.
+    with file, row and reason when it isn't a grammar.
     """
 
     def __init__(self, grammar_file: object, tok_number2name: dict[typing.Any, typing.Any], op_text2number: dict[typing.Any, typing.Any]) -> None:
@@ -371,7 +371,7 @@ def AdjustUtf8Pos(utf8_ptr: bytes | str, pos: int, diff: int, end_pos: int) -> i
     """
     The byte offset of the character that lies `diff` characters after (before, if negative) the one
     that byte `pos` is part of; -1 or `end_pos` when it isn't in the buffer. A `pos` outside the
-    buffer is no part of a character, and each byte between it and the buffer counts as one.
+    buffer isn't part of a character, and each byte between it and the buffer counts as one.
     ValueError when `end_pos` lies outside the buffer.
     """
 
@@ -402,8 +402,8 @@ def IsAlnumAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int) -> bool:
 def IsIdentifierCharAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int, initial: bool) -> bool:
     """
     True when the character at byte `pos` could be part of a name, its first character if `initial`;
-    False when `pos` isn't in the buffer. Beyond ASCII, a character that is no name on its own and no
-    digit is refused. ValueError when `end_pos` lies outside the buffer.
+    False when `pos` isn't in the buffer. Beyond ASCII, a character that is neither a name on its own nor
+    a digit is refused. ValueError when `end_pos` lies outside the buffer.
     """
 
 def PtrFindByte(ptr: bytes | str, length: int, c: int | bytes | str, start: int) -> int:
@@ -415,7 +415,7 @@ def PtrFindByte(ptr: bytes | str, length: int, c: int | bytes | str, start: int)
 def BytesFindByte(b: bytes, c: int | bytes | str, start: int=0) -> int:
     """
     The offset of the first byte `c` in b[start:]; -1 when there is none. ValueError unless
-    0 <= start < len(b), TypeError when `b` is no byte string.
+    0 <= start < len(b), TypeError when `b` isn't a byte string.
     """
 
 def AsUtf8(text: bytes | str) -> bytes:
@@ -469,7 +469,7 @@ class CNonNestedSearch:
         """
         Search the UTF-8 bytes start..end of a byte or text string for `to_find_bytes`. Anything
         else, None included, leaves the search idle. Returns 0. TypeError for a subclass of either
-        or when `to_find_bytes` is no byte string, AssertionError when `start` or `end` lies outside
+        or when `to_find_bytes` isn't a byte string, AssertionError when `start` or `end` lies outside
         the text.
         """
 
@@ -483,7 +483,7 @@ class CNonNestedSearch:
 
 def _FindStringEndNonNested(search: CNonNestedSearch, quote_i: int) -> int:
     """
-    The byte index after the string literal whose opening quote stands at `quote_i` of the text
+    The byte index after the string literal whose opening quote is at `quote_i` of the text
     searched. An unterminated one ends with its row, with triple quotes at the end of the search.
     IndexError when `quote_i` lies outside the text searched.
     """
@@ -537,8 +537,8 @@ class CStringTokenizer:
     """
     The tokens of a piece of Python text, one after the other.
 
-    CStringTokenizer(utf8) stands on the first token of a byte or text string; comments and blanks, row
-    ends among them, are no tokens.
+    CStringTokenizer(utf8) is on the first token of a byte or text string; comments and blanks, row
+    ends among them, aren't tokens.
     """
 
     def __init__(self, utf8: bytes | str) -> None:

@@ -151,7 +151,7 @@ def AdjustUtf8Pos(utf8_ptr: bytes | str, pos: int, diff: int, end_pos: int) -> i
     """
     The byte offset of the character that lies `diff` characters after (before, if negative) the one
     that byte `pos` is part of; -1 or `end_pos` when it isn't in the buffer. A `pos` outside the
-    buffer is no part of a character, and each byte between it and the buffer counts as one.
+    buffer isn't part of a character, and each byte between it and the buffer counts as one.
     ValueError when `end_pos` lies outside the buffer.
     """
 
@@ -182,8 +182,8 @@ def IsAlnumAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int) -> bool:
 def IsIdentifierCharAtUtf8Pos(utf8_ptr: bytes | str, pos: int, end_pos: int, initial: bool) -> bool:
     """
     True when the character at byte `pos` could be part of a name, its first character if `initial`;
-    False when `pos` isn't in the buffer. Beyond ASCII, a character that is no name on its own and no
-    digit is refused. ValueError when `end_pos` lies outside the buffer.
+    False when `pos` isn't in the buffer. Beyond ASCII, a character that is neither a name on its own nor
+    a digit is refused. ValueError when `end_pos` lies outside the buffer.
     """
 
 def PtrFindByte(ptr: bytes | str, length: int, c: int | bytes | str, start: int) -> int:
@@ -195,7 +195,7 @@ def PtrFindByte(ptr: bytes | str, length: int, c: int | bytes | str, start: int)
 def BytesFindByte(b: bytes, c: int | bytes | str, start: int=0) -> int:
     """
     The offset of the first byte `c` in b[start:]; -1 when there is none. ValueError unless
-    0 <= start < len(b), TypeError when `b` is no byte string.
+    0 <= start < len(b), TypeError when `b` isn't a byte string.
     """
 
 def InitNonNestedStruct(structure: CNonNestedSearch, search_ptr: bytes | str | None, to_find_bytes: bytes, start: int, end: int) -> int:
@@ -395,7 +395,7 @@ class CExpression(CNode):
 
     def GetSubExprCount(self) -> int:
         """
-        The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a comprehension that stands without its brackets.
+        The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a comprehension that is without its brackets.
         """
 
 class CIfElseExpression(CExpression):
@@ -486,14 +486,14 @@ class CTestListStarExpr(CExpression):
 
     def GetSubExprCount(self) -> int:
         """
-        The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a comprehension that stands without its brackets.
+        The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a comprehension that is without its brackets.
         """
 
     def IsTuple(self) -> bool:
         """True for a comma list; False for a comprehension."""
 
     def IsGenExpr(self) -> bool:
-        """True for a comprehension, which stands here without its brackets."""
+        """True for a comprehension, which is here without its brackets."""
     kSupportedRules: list[typing.Any] = ...
 
 class CAtomExpr(CExpression):
@@ -638,7 +638,7 @@ class CAtom(CExpression):
 
     def GetSubExprCount(self) -> int:
         """
-        The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a comprehension that stands without its brackets.
+        The number of sub-expressions of a comma list: 0 for a plain expression, 1 for a comprehension that is without its brackets.
         """
 
     def GetInitialBracket(self) -> str | None:
@@ -697,7 +697,7 @@ class CStringLiteral(CExpression):
 
     def GetStringContents(self) -> str | None:
         """
-        The source between the quotes, escapes as they stand; up to the end of an unterminated literal.
+        The source between the quotes, escapes as written; up to the end of an unterminated literal.
         """
 
     def GetStringValue(self) -> typing.Any:
@@ -738,7 +738,7 @@ def GetTokenEndIndex(node: CNode) -> int:
 
 def GetDefiningArgInfoList(node: CNode | None) -> list[CArgInfo]:
     """
-    A new list of CArgInfo, one for each parameter of a definition: `node` is its parameter list, with or without brackets, or a lone parameter. A parameter that is a tuple of names (Python 2) is a list of the same kind. AssertionError for a child that is no parameter.
+    A new list of CArgInfo, one for each parameter of a definition: `node` is its parameter list, with or without brackets, or a lone parameter. A parameter that is a tuple of names (Python 2) is a list of the same kind. AssertionError for a child that isn't a parameter.
     """
 
 def GetUsedArgInfoList(node: CNode | None) -> list[CArgInfo]:
@@ -803,7 +803,7 @@ class CFromImportStmt(CNode):
 
     def GetFromString(self) -> str | None:
         """
-        The module after `from`, with its dots; None when nothing stands between `from` and `import`.
+        The module after `from`, with its dots; None when nothing is between `from` and `import`.
         """
 
     def GetImportStar(self) -> bool:
@@ -827,7 +827,7 @@ class CSingleUsedArgumentNode(CNode):
         """"*" or "**"; None without such."""
 
     def GetName(self) -> CNode | None:
-        """What stands before `=`; None when there is no `=`."""
+        """What is before `=`; None when there is no `=`."""
 
     def GetValue(self) -> CNode | None:
         """The value after `=`; the node itself when there is no `=`."""
@@ -836,7 +836,7 @@ class CSingleUsedArgumentNode(CNode):
         """True for a comprehension without brackets of its own."""
 
     def GetNameAssigned(self) -> CNode | None:
-        """What stands before `:=`; None when there is no `:=`."""
+        """What is before `:=`; None when there is no `:=`."""
 
     def GetNamedRightHandExpression(self) -> CNode | None:
         """The value after `:=`; None when there is no `:=`."""
@@ -1019,7 +1019,9 @@ class CWithStmt(CStmt):
         ...
 
     def GetWithItems(self) -> list[CWithItem]:
-        """A new list of the items with `as`; those without are no CWithItem."""
+        """
+        A new list of the items with `as`; those without one aren't CWithItems.
+        """
 
 class CPassStmt(CStmt):
     """Pass statement."""
@@ -1252,7 +1254,7 @@ class CNodeToTextConverterImpl(CNodeToTextConverter):
     """Turns nodes into short texts, as names are recorded."""
 
     def __init__(self, include_bracket_text: bool=False, include_string_contents: bool=False, include_arg_text: bool=False) -> None:
-        """Whether what stands in brackets, in strings and in calls is shown."""
+        """Whether what is in brackets, in strings and in calls is shown."""
 
     @property
     def _fIncludeArgText(self) -> bool:
@@ -1417,7 +1419,7 @@ class CPGenParserImpl(CPGenAnalyzer):
 
     def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
-        A `with` whose items stand in parentheses, with `i` the index of `with`; None when they don't.
+        A `with` whose items are in parentheses, with `i` the index of `with`; None when they aren't.
         """
 
     def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
@@ -1654,12 +1656,12 @@ class CNodeWalker:
 
     def _TypeEquivForNode(self, node: CNode, extra_trailer: bytes | None=None) -> bytes | None:
         """
-        What a value stands for, as a record; None when that can't be told. `extra_trailer`, bytes, follows it where a part of the value is meant.
+        What a value stands for, as a record; None when that isn't known. `extra_trailer`, bytes, follows it where a part of the value is meant.
         """
 
     def _TypeEquivForOperatorExpression(self, op_expr: COperatorExpression) -> bytes | None:
         """
-        An operator expression with each operand replaced by what it stands for; None when one of them can't be told.
+        An operator expression with each operand replaced by what it stands for; None when one of them isn't known.
         """
 
     def _VisitNamedExpr(self, node: CNode) -> None:
@@ -1956,7 +1958,7 @@ class CExtendedParser(CPGenParserImpl):
 
     def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
-        A `with` whose items stand in parentheses, with `i` the index of `with`; None when they don't.
+        A `with` whose items are in parentheses, with `i` the index of `with`; None when they aren't.
         """
 
     def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
