@@ -1,11 +1,14 @@
 """The language server over the wire: how a session goes, texts that change, diagnostics, odd messages."""
 
 import random
+import subprocess
+import sys
 from pathlib import Path
 
 import pytest
 from language_client import PULL, Client, Refused, range_of, shown
 from lsprotocol import types
+from run_python import RunPython
 
 import codeloom
 from codeloom.rows import ROW_END, RowTexts
@@ -260,6 +263,27 @@ def test_cancelled_requests(client):
         except Refused as refused:
             outcomes.append(refused.code)
     assert outcomes[2] == -32800 and outcomes[0] in ("answered", -32801)
+
+
+def test_only_the_protocol_is_on_the_standard_output():
+    code = """
+import os
+from codeloom.server.transport import standard_streams
+print("before")
+with standard_streams() as (_, own):
+    print("printed")
+    os.write(1, b"written")
+    os.write(own, b"protocol\\n")
+print("after")
+"""
+    assert RunPython(code) == "before\nprotocol\nafter\n"
+
+
+def test_without_the_extra():
+    code = "import sys; sys.modules['pygls'] = None; from codeloom.cli import main; sys.exit(main(['serve']))"
+    done = subprocess.run([sys.executable, "-P", "-c", code], capture_output=True, text=True)
+    assert (done.returncode, done.stdout) == (2, "")
+    assert done.stderr == "codeloom: serve needs the extra lsp: pip install 'codeloom[lsp]'\n"
 
 
 POSITIONED = (

@@ -35,6 +35,7 @@ class OpenDocument(PlacedText):
         self.path = to_fs_path(item.uri) or item.uri
         self.version = item.version
         self.patience = Patience()
+        self._revision = 0
         self.take(settings)
 
     def take(self, settings: Settings) -> None:
@@ -99,18 +100,18 @@ class OpenDocument(PlacedText):
         """The name at a position, or that ends there."""
         return self.analysis.occurrence_at(*self.place(position))
 
-    async def slices(self, items: Sequence[Item]) -> AsyncIterator[Sequence[Item]]:
-        """The items in slices, between which other messages are handled.
+    async def slices(self, items: Sequence[Item], size: int = _SLICE) -> AsyncIterator[Sequence[Item]]:
+        """The items in slices of a size, between which other messages are handled.
 
         JsonRpcContentModified when one of them has changed the text: the answer would be wrong.
         """
-        analysis = self.analysis
-        for first in range(0, len(items), _SLICE):
+        revision = self._revision
+        for first in range(0, len(items), size):
             if first:
                 await asyncio.sleep(0)
-                if self.analysis is not analysis:
+                if self._revision != revision:
                     raise JsonRpcContentModified("the text has changed meanwhile")
-            yield items[first : first + _SLICE]
+            yield items[first : first + size]
 
     def _edge(self, position: types.Position) -> Place:
         """A position from zero in characters; after the end of a row is its end."""
@@ -127,6 +128,7 @@ class OpenDocument(PlacedText):
         return self.rows.between((start[0] - 1, start[1] - 1), (end[0] - 1, end[1] - 1))
 
     def _forget(self) -> None:
+        self._revision += 1
         self.__dict__.pop("findings", None)
 
 

@@ -26,16 +26,16 @@ def register(server: "Server") -> None:
     """Answer what asks for fixes."""
 
     @server.feature(types.TEXT_DOCUMENT_CODE_ACTION, types.CodeActionOptions([types.CodeActionKind.QuickFix]))
-    def code_action(params: types.CodeActionParams) -> list[types.CodeAction]:
+    async def code_action(params: types.CodeActionParams) -> list[types.CodeAction]:
         wanted = params.context.only
         if wanted is not None and not any(_covers(kind, types.CodeActionKind.QuickFix) for kind in wanted):
             return []
         document = server.documents[params.text_document.uri]
-        return [
-            _action(document, finding, remedy)
-            for finding in _findings_in(document, params.range)
-            for remedy in sound_remedies(document, finding)
-        ]
+        actions = []
+        async for findings in document.slices(_findings_in(document, params.range), 1):
+            for finding in findings:
+                actions += [_action(document, finding, one) for one in sound_remedies(document, finding)]
+        return actions
 
 
 def sound_remedies(document: OpenDocument, finding: Finding) -> Iterator[Remedy]:
