@@ -29,6 +29,10 @@ CIndent MeasureIndent(std::string_view blanks) {
     return indent;
 }
 
+bool HasTabs(const CIndent& indent) {
+    return indent.column != indent.alt_column;
+}
+
 std::string Quoted(std::string_view keyword) {
     return std::string("'").append(keyword).append("'");
 }
@@ -39,6 +43,13 @@ bool IsHandler(EClause clause) {
 
 bool IsLoop(EClause clause) {
     return clause == EClause::kFor || clause == EClause::kAsyncFor || clause == EClause::kWhile;
+}
+
+// What is on its later rows may be lines of their own.
+bool SpansRows(const CRawLogical& logical) {
+    const uint32_t start = logical.StartOf(logical.tokens.front());
+    const uint32_t end = logical.EndOf(logical.tokens.back());
+    return logical.file_text.substr(start, end - start).find('\n') != std::string_view::npos;
 }
 
 // A clause that goes on with a statement before it.
@@ -175,6 +186,7 @@ void CBlockTracker::_Place(const CIndent& indent) {
         top.lacks_block = true;
         top.lacking_clause = top.previous.clause;
         top.is_depth_in_doubt |= top.is_first;
+        top.has_mixed_tabs |= HasTabs(top.indent);
     }
     if (indent.column > top.indent.column) return _PlaceDeeper(indent);
     if (indent.column < top.indent.column) return _PlaceOut(indent);
@@ -241,6 +253,7 @@ void CBlockTracker::_PlaceOut(const CIndent& indent) {
                 "unindent does not match any outer indentation level");
     }
     _fHasPlaceProblem = true;
+    inner.has_mixed_tabs |= HasTabs(inner.indent);
     inner.odd_column = indent.column;
     inner.header_depth = std::min(inner.header_depth, indent.column);
     inner.may_follow_anything = true;
@@ -254,10 +267,8 @@ void CBlockTracker::_Open(const CIndent& indent, EClause clause, bool is_unknown
     block.clause = clause;
     block.is_unknown = is_unknown;
     block.header = outer.previous;
-    const bool is_scope =
-        clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass;
-    block.frame_count = is_scope ? clause == EClause::kAsyncDef && _fLanguage.version >= 313
-                                 : outer.frame_count + _FramesOf(block.header);
+    block.frame_count = IsScope(clause) ? clause == EClause::kAsyncDef && _fLanguage.version >= 313
+                                        : outer.frame_count + _FramesOf(block.header);
     block.has_mixed_tabs = outer.has_mixed_tabs;
     block.is_depth_in_doubt = _fPreviousHasFault || outer.lacks_block;
     _fHaveChanged = true;
@@ -336,12 +347,17 @@ void CBlockTracker::_NoteClause(CBlock& block) const {
     }
 }
 
-void CBlockTracker::Leave(bool has_fault) {
+void CBlockTracker::Leave(const CRawLogical& logical, bool has_fault) {
     CBlock& block = _Top();
+    const bool is_broken = has_fault;
     if (!has_fault && !_fHasPlaceProblem && _MayBreakClause(block)) has_fault = _BreaksClause(block);
     if (has_fault || _fHasPlaceProblem) {
-        for (CBlock& around : _fBlocks) around.may_follow_anything = around.is_in_doubt = true;
-        _fAreInDoubt = true;
+        const bool may_be_moved = !is_broken || _fHasPlaceProblem || SpansRows(logical);
+        for (CBlock& around : _fBlocks) {
+            around.may_follow_anything = true;
+            around.is_in_doubt |= may_be_moved;
+        }
+        _fAreInDoubt |= may_be_moved;
     } else if (_fAreInDoubt && IsDefinition(_fHead.clause)) {
         for (CBlock& around : _fBlocks) around.is_in_doubt = false;
         _fAreInDoubt = false;

@@ -84,7 +84,7 @@ class CBlockTracker {
     void TakeYield();
 
     // Takes note of the line that was entered last: whether it has a fault of its own.
-    void Leave(bool has_fault);
+    void Leave(const CRawLogical& logical, bool has_fault);
 
     // Call once, after the last line. What is missing at the end is reported at its last token.
     void Finish(const CSpan& last_token);

@@ -32,10 +32,6 @@ std::string_view WhatForbidsLazyImport(EClause clause) {
     }
 }
 
-bool IsScope(EClause clause) {
-    return clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass;
-}
-
 // The outermost function or class counts, or else the innermost block. `header` is that of the line.
 std::string_view WhatForbidsLazyImport(const std::vector<CBlock>& blocks, EClause header) {
     std::string_view found;

@@ -4,6 +4,7 @@
 #include <array>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "rules/fields.h"
 #include "rules/lazy_imports.h"
@@ -110,6 +111,7 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
     const bool is_lazy = logical.tokens.front().word == EWord::kLazy;
     const bool is_future = tree != nullptr && !is_lazy && IsFutureImport(*tree, tree->fRoot);
     _fTree = tree;
+    _fBlocks = &blocks.Blocks();
     if (is_future) {
         _CheckFuture(tree->fRoot, blocks);
     } else if (tree != nullptr) {
@@ -132,6 +134,7 @@ void CPlacementRules::Check(const CRawLogical& logical, const CTree* tree, const
 void CPlacementRules::CheckEmbedded(const CTree& tree, const CBlockTracker& blocks) {
     if (tree.fIsEmpty || !tree.Line().MayHaveWords(kWordsOfInterest) || blocks.IsInDoubt()) return;
     _fTree = &tree;
+    _fBlocks = &blocks.Blocks();
     _Visit(tree.fRoot, _PlaceIn(blocks));
 }
 
@@ -280,7 +283,7 @@ void CPlacementRules::_VisitAsync(const CTreeNode& node, const CPlacement& place
         const std::string_view what = statement.Is(ENodeKind::kFor) ? "async for" : "async with";
         std::string message = "'";
         message.append(what).append("' outside async function");
-        _Report(ECode::kOutsideAsyncFunction, span, std::move(message));
+        _ReportMisplaced(ECode::kOutsideAsyncFunction, span, std::move(message));
     }
     _Visit(statement, place);
 }
@@ -374,7 +377,8 @@ void CPlacementRules::_CheckReturn(const CTreeNode& node, const CPlacement& plac
     const bool leaves_any = place.left_by_return.except_star || place.left_by_return.finally;
     if (place.scope == EScope::kFunction && !leaves_any && !_IsStrict(place.scope)) return;
     const CSpan span = SpanOf(*_fTree, node);
-    if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'return' outside function");
+    if (!place.IsInFunction())
+        return _ReportMisplaced(ECode::kOutsideFunction, span, "'return' outside function");
     if (_CheckWayOut(place.left_by_return, span, "return")) return;
     const bool has_value = !node.IsLeaf();
     if (has_value && _IsStrict(place.scope) && !_fFunctions.empty() &&
@@ -388,7 +392,8 @@ void CPlacementRules::_CheckYield(const CTreeNode& node, const CPlacement& place
     const bool is_in_own_scope =
         place.comprehension != EComprehension::kNone && _fLanguage.version < kRefusesInComprehension;
     if (is_in_own_scope && _fLanguage.IsPython3()) return;
-    if (!place.IsInFunction()) return _Report(ECode::kOutsideFunction, span, "'yield' outside function");
+    if (!place.IsInFunction())
+        return _ReportMisplaced(ECode::kOutsideFunction, span, "'yield' outside function");
     if (!_IsStrict(place.scope) || place.comprehension == EComprehension::kGenerator) return;
     if (IsAsyncScope(place.scope) && !node.IsLeaf() && IsYieldFrom(*_fTree, node))
         return _Report(ECode::kYieldFromInAsync, span, "'yield from' inside async function");
@@ -419,8 +424,8 @@ void CPlacementRules::_CheckKeyword(const CTreeNode& leaf, const CPlacement& pla
 void CPlacementRules::_CheckAwait(const CTreeNode& leaf, const CPlacement& place) {
     if (place.comprehension != EComprehension::kNone) return _ReportAsyncDisplay(place);
     if (!IsAsyncScope(place.scope))
-        _Report(place.IsInFunction() ? ECode::kOutsideAsyncFunction : ECode::kOutsideFunction,
-                SpanOf(*_fTree, leaf), Outside("await", place));
+        _ReportMisplaced(place.IsInFunction() ? ECode::kOutsideAsyncFunction : ECode::kOutsideFunction,
+                         SpanOf(*_fTree, leaf), Outside("await", place));
 }
 
 void CPlacementRules::_CheckJump(const CTreeNode& leaf, const CPlacement& place) {
@@ -430,8 +435,8 @@ void CPlacementRules::_CheckJump(const CTreeNode& leaf, const CPlacement& place)
     if (!place.in_loop && place.left_by_jump.except_star)
         return _Report(ECode::kJumpOutOfExceptStar, span, std::string(kOutOfExceptStar));
     if (!place.in_loop)
-        return _Report(ECode::kOutsideLoop, span,
-                       is_break ? "'break' outside loop" : "'continue' not properly in loop");
+        return _ReportMisplaced(ECode::kOutsideLoop, span,
+                                is_break ? "'break' outside loop" : "'continue' not properly in loop");
     constexpr int kAllowsContinueInFinally = 308;
     if (!is_break && place.left_by_jump.finally && _fLanguage.version < kAllowsContinueInFinally)
         _Report(ECode::kContinueInFinally, span, "'continue' not supported inside 'finally' clause");
@@ -465,8 +470,22 @@ bool CPlacementRules::_CheckWayOut(const CPlacement::CLeft& left, const CSpan& s
 
 void CPlacementRules::_ReportAsyncDisplay(const CPlacement& place) {
     if (place.blamed != nullptr)
-        _Report(ECode::kOutsideAsyncFunction, SpanOf(*_fTree, *place.blamed),
-                "asynchronous comprehension outside of an asynchronous function");
+        _ReportMisplaced(ECode::kOutsideAsyncFunction, SpanOf(*_fTree, *place.blamed),
+                         "asynchronous comprehension outside of an asynchronous function");
+}
+
+// What one fault has moved or left out is reported once: in a block, and in a function that lacks its
+// `async`.
+void CPlacementRules::_ReportMisplaced(ECode code, const CSpan& span, std::string message) {
+    if (code == ECode::kOutsideAsyncFunction) {
+        const auto scope = std::find_if(_fBlocks->rbegin(), _fBlocks->rend(),
+                                        [](const CBlock& block) { return IsScope(block.clause); });
+        const bool is_function = scope != _fBlocks->rend() && scope->clause == EClause::kDef;
+        if (is_function && std::exchange(_fPlainFunction, scope->header.start) == scope->header.start) return;
+    } else if (std::exchange(_fMisplaced, code) == code) {
+        return;
+    }
+    _Report(code, span, std::move(message));
 }
 
 void CPlacementRules::_Report(ECode code, const CSpan& span, std::string message) {

@@ -64,7 +64,9 @@ class CPlacementRules {
     void Enter(const CBlockTracker& blocks) {
         if (!blocks.HaveChanged()) return;
         _fIsPlaceKnown = false;
-        if (!_fFunctions.empty() || _OpensStrict(blocks.Innermost().clause)) _TrackFunctions(blocks.Blocks());
+        const EClause innermost = blocks.Innermost().clause;
+        if (_fMisplaced != ECode::kOutsideFunction || IsScope(innermost)) _fMisplaced = ECode::kInvalidSyntax;
+        if (!_fFunctions.empty() || _OpensStrict(innermost)) _TrackFunctions(blocks.Blocks());
     }
 
     // False for most lines: nothing in them depends on where they are.
@@ -139,6 +141,7 @@ class CPlacementRules {
     bool _CheckWayOut(const CPlacement::CLeft& left, const CSpan& span, std::string_view word);
     void _ReportAsyncDisplay(const CPlacement& place);
     void _Report(ECode code, const CSpan& span, std::string message);
+    void _ReportMisplaced(ECode code, const CSpan& span, std::string message);
 
     const CLanguage& _fLanguage;
     CProblems& _fProblems;
@@ -147,6 +150,9 @@ class CPlacementRules {
     CPlacement _fPlace;                        // what the blocks around the line allow, once it is known
     bool _fIsPlaceKnown = false;
     CBeginning _fBeginning;
+    const std::vector<CBlock>* _fBlocks = nullptr;  // around the line
+    ECode _fMisplaced = ECode::kInvalidSyntax;      // reported in the block under way
+    uint32_t _fPlainFunction = UINT32_MAX;          // the header of one that was to be asynchronous
 };
 
 }  // namespace codeloom

@@ -32,6 +32,11 @@ enum class EClause : uint8_t {
     kCase,
 };
 
+// Names in its block are its own.
+constexpr bool IsScope(EClause clause) {
+    return clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass;
+}
+
 struct CStatementHead {
     EClause clause = EClause::kSimple;
     uint32_t start = 0;  // bytes of the first token

@@ -89,7 +89,7 @@ void CTextChecker::Leave(const CRawLogical& logical, bool has_fault) {
     } else {
         CheckEnd(logical, _fLanguage, _fProblems);
     }
-    _fBlocks.Leave(has_fault);
+    _fBlocks.Leave(logical, has_fault);
 }
 
 void CTextChecker::Finish() {
