@@ -60,7 +60,8 @@ void BindKinds(nb::module_& module) {
                          gScopeKinds);
     MakeEnum<EResolution>(module, "Resolution",
                           "Where a name is bound: in a scope of the text, nowhere in it as a builtin, "
-                          "perhaps by `import *` or on a line with a fault, or nowhere that can be seen.",
+                          "perhaps (by `import *`, `exec` or `globals()`, or on a line with a fault), or "
+                          "nowhere that can be seen.",
                           gResolutions);
 }
 

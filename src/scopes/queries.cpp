@@ -1,6 +1,7 @@
 #include "scopes/queries.h"
 
 #include <algorithm>
+#include <array>
 #include <unordered_set>
 
 #include "scopes/builtin_names.h"
@@ -23,6 +24,14 @@ bool NeedsBinding(ERole role) {
     return role == ERole::kRead || role == ERole::kAugment || role == ERole::kDelete;
 }
 
+// What follows `globals` on its row.
+bool IsOnlyRead(std::string_view rest) {
+    constexpr std::array<std::string_view, 5> kReaders = {"().get(", "().keys(", "().items(", "().values(",
+                                                          "().copy("};
+    return !rest.starts_with("()") ||
+           std::ranges::any_of(kReaders, [&](std::string_view reader) { return rest.starts_with(reader); });
+}
+
 bool IsUse(ERole role) {
     return role == ERole::kRead || role == ERole::kDelete;
 }
@@ -39,21 +48,35 @@ EResolution CNameQueries::Resolution(uint32_t occurrence_i) const {
     if (IsBuiltinName(name, _fVersion)) return EResolution::kBuiltin;
     if (IsNameOfClassBody(name) && _fNames.scopes.scopes[symbol.scope].kind == EScopeKind::kClass)
         return EResolution::kBuiltin;
-    return _IsLost(home.name) || _HasStarImport() ? EResolution::kPerhaps : EResolution::kUnknown;
+    return _IsLost(home.name) || _MayBindAnyName() ? EResolution::kPerhaps : EResolution::kUnknown;
 }
 
 bool CNameQueries::_IsLost(uint32_t name) const {
     return std::binary_search(_fNames.lost_names.begin(), _fNames.lost_names.end(), name);
 }
 
-// In Python 2 a function may have one too.
-bool CNameQueries::_HasStarImport() const {
-    if (!_fHasStarImport) {
+// By `import *`, which a function of Python 2 may have too, or as `globals().update(a)`, `exec(a)` and
+// `enum.global_enum(a)` do.
+bool CNameQueries::_MayBindAnyName() const {
+    if (!_fMayBindAnyName) {
         const TPlainArray<CScope>& scopes = _fNames.scopes.scopes;
-        _fHasStarImport = std::any_of(scopes.begin(), scopes.end(),
-                                      [](const CScope& scope) { return scope.has_star_import; });
+        const TPlainArray<COccurrence>& items = _fNames.occurrences.items;
+        _fMayBindAnyName = std::any_of(scopes.begin(), scopes.end(),
+                                       [](const CScope& scope) { return scope.has_star_import; }) ||
+                           std::any_of(items.begin(), items.end(), [&](const COccurrence& occurrence) {
+                               return _BindsUnseen(occurrence);
+                           });
     }
-    return *_fHasStarImport;
+    return *_fMayBindAnyName;
+}
+
+bool CNameQueries::_BindsUnseen(const COccurrence& occurrence) const {
+    const std::string_view name = _fNames.occurrences.Name(occurrence);
+    // Members of an enumeration become global names.
+    if (name == "global_enum" || name == "_convert_") return true;
+    if (occurrence.role != ERole::kRead) return false;
+    const std::string_view rest = _fText.substr(occurrence.end);
+    return name == "exec" ? rest.starts_with('(') : name == "globals" && !IsOnlyRead(rest);
 }
 
 uint32_t CNameQueries::OccurrenceAt(uint32_t offset) const {
@@ -104,10 +127,16 @@ CNameQueries::CUses CNameQueries::_Uses() const {
         const uint32_t home = HomeOf(i);
         if (home == kNoIndex) continue;
         if (IsUse(items[i].role)) uses.is_used[home] = true;
-        if (IsBinding(items[i].role) && _fNames.occurrences.Name(items[i]) == "__all__")
+        if (_fNames.occurrences.Name(items[i]) == "__all__" && (IsBinding(items[i].role) || _IsExtended(i)))
             _AddExported(uses, i);
     }
     return uses;
+}
+
+// `__all__.extend(['a'])`
+bool CNameQueries::_IsExtended(uint32_t occurrence_i) const {
+    const std::string_view rest = _fText.substr(_fNames.occurrences.items[occurrence_i].end);
+    return rest.starts_with(".extend(") || rest.starts_with(".append(");
 }
 
 // The strings after `__all__` on its line.

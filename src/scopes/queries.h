@@ -54,7 +54,9 @@ class CNameQueries {
     struct CUses;
 
     bool _IsLost(uint32_t name) const;
-    bool _HasStarImport() const;
+    bool _MayBindAnyName() const;
+    bool _BindsUnseen(const COccurrence& occurrence) const;
+    bool _IsExtended(uint32_t occurrence_i) const;
     CUses _Uses() const;
     void _AddExported(CUses& uses, uint32_t occurrence_i) const;
     bool _MayBeUnused(uint32_t occurrence_i, const CUses& uses, bool with_parameters) const;
@@ -63,7 +65,7 @@ class CNameQueries {
     const CTextNames& _fNames;
     const std::string_view _fText;
     const int _fVersion;
-    mutable std::optional<bool> _fHasStarImport;  // known when it was first asked for
+    mutable std::optional<bool> _fMayBindAnyName;  // known when it was first asked for
 };
 
 }  // namespace codeloom
