@@ -1,0 +1,119 @@
+"""`codeloom query`: a question in SQL about an index."""
+
+from __future__ import annotations
+
+import argparse
+import csv
+import io
+import json
+from itertools import chain, islice
+from numbers import Number
+from typing import TYPE_CHECKING, Any
+
+from codeloom.cli.command import Command, ExitStatus
+from codeloom.cli.console import Console
+from codeloom.cli.excerpt import printable
+from codeloom.cli.options import Options, WrongUseError
+
+if TYPE_CHECKING:
+    from collections.abc import Iterable, Sequence
+
+    from codeloom.corpus.query import Answer
+
+_FORMATS = ("text", "csv", "jsonl")
+# The rows of a table for people are as wide as the widest of so many, and a cell isn't wider than this.
+_ROWS_MEASURED = 1000
+_MOST_WIDTH = 80
+
+
+class QueryCommand(Command):
+    """Prints the answer."""
+
+    NAME = "query"
+    DESCRIPTION = (
+        "Ask about an index in SQL, with a view for each of its tables, and print the answer. It needs the "
+        "extra query: pip install 'codeloom[query]'."
+    )
+    EXAMPLES = (
+        'codeloom query "SELECT code, count(*) FROM problems GROUP BY code" index',
+        'codeloom query --format csv "SELECT path, state FROM files" index',
+    )
+    FORMATS = _FORMATS
+
+    @classmethod
+    def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
+        """Add the question, the index and the format."""
+        parser.add_argument("sql", metavar="SQL", help="one or more statements; the answer is the last one's")
+        parser.add_argument("index", metavar="DIR", help="what codeloom index has written")
+        parser.add_argument(
+            "--format", choices=_FORMATS, metavar="FORMAT", help="text, csv or jsonl (default: text)"
+        )
+
+    def run(self, options: Options) -> ExitStatus:
+        """Ask, and print; WrongUseError for what is no index and for SQL that can't be run."""
+        try:
+            from codeloom.corpus.query import QueryError, query
+            from codeloom.corpus.store import StoreError
+        except ModuleNotFoundError as error:
+            if (error.name or "").partition(".")[0] != "duckdb":
+                raise
+            raise WrongUseError("query needs the extra query: pip install 'codeloom[query]'") from None
+        try:
+            _print(query(options.sql, options.index), options.format, Console())
+        except (StoreError, QueryError) as error:
+            raise WrongUseError(str(error)) from None
+        return ExitStatus.SOUND
+
+
+def _print(answer: Answer, style: str, console: Console) -> None:
+    if style == "jsonl":
+        for row in answer.rows:
+            fields = dict(zip(answer.columns, row, strict=True))
+            console.print_row(json.dumps(fields, ensure_ascii=False, default=str))
+    elif style == "csv":
+        for cells in chain([answer.columns] if answer.columns else [], answer.rows):
+            console.write(_csv_row(cells))
+    else:
+        _print_table(answer, console)
+
+
+def _csv_row(cells: Iterable[Any]) -> str:
+    stream = io.StringIO()
+    csv.writer(stream, lineterminator="\n").writerow(cells)
+    return stream.getvalue()
+
+
+def _print_table(answer: Answer, console: Console) -> None:
+    """In columns; numbers go to the right."""
+    measured = list(islice(answer.rows, _ROWS_MEASURED))
+    widths = [
+        min(max(len(_shown(row[i])) for row in [answer.columns, *measured]), _MOST_WIDTH)
+        for i in range(len(answer.columns))
+    ]
+    are_numbers = [
+        all(row[i] is None or isinstance(row[i], Number) for row in measured)
+        for i in range(len(answer.columns))
+    ]
+    if answer.columns:
+        console.print_row(_table_row(answer.columns, widths, are_numbers))
+        console.print_row("  ".join("-" * width for width in widths))
+    for row in chain(measured, answer.rows):
+        console.print_row(_table_row(row, widths, are_numbers))
+
+
+def _table_row(cells: Sequence[Any], widths: Sequence[int], are_numbers: Sequence[bool]) -> str:
+    shown = []
+    for cell, width, is_number in zip(cells, widths, are_numbers, strict=True):
+        text = _shown(cell)
+        if len(text) > width:
+            text = text[: width - 3] + "..."
+        shown.append(text.rjust(width) if is_number else text.ljust(width))
+    return "  ".join(shown).rstrip()
+
+
+def _shown(cell: Any) -> str:
+    if cell is None:
+        return ""
+    if isinstance(cell, float):
+        return f"{cell:.6g}"
+    return printable(str(cell))
