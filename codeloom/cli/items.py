@@ -78,8 +78,7 @@ class Finding(Item):
     @property
     def source_row(self) -> str:
         """The text of the row in which it begins."""
-        rows = self.source.rows
-        return rows[self.range.row - 1] if self.range.row <= len(rows) else ""
+        return self.source.row_text(self.range.row)
 
     def show(self, console: Console) -> None:
         """The problem alone."""
@@ -154,7 +153,7 @@ def _show_rows(findings: list[Finding], console: Console) -> None:
         if last is not None and row > last + 1:
             console.print_gap()
         last = row
-        text = source.rows[row - 1] if row <= len(source.rows) else ""
+        text = source.row_text(row)
         console.print_source(source.cell_and_row(row)[1], text, marks[row], "; ".join(texts.get(row, ())))
 
 

@@ -46,6 +46,14 @@ class Source:
         """The rows of the text, without their ends."""
         return RowTexts(self.analysis.text)
 
+    def row_text(self, row: int) -> str:
+        """A row of the text; nothing for one after the last."""
+        return self.rows[row - 1] if row <= len(self.rows) else ""
+
+    def holds(self, text: str) -> bool:
+        """False when a text is nowhere in the source."""
+        return text in self.analysis.text
+
     def cell_and_row(self, row: int) -> tuple[int | None, int]:
         """The cell of a notebook, or None, and the row in it; for a row of the analysis."""
         return (None, row) if self._notebook is None else self._notebook.place(row)
@@ -80,17 +88,14 @@ class Source:
     def line_rows(self, row: int) -> tuple[int, int]:
         """The first and the last row of the logical lines that lie on a row."""
         first = last = row
-        i = bisect_right(self._line_rows, (row, 1 << 32))
-        for start, end in self._line_rows[max(i - 2, 0) : i]:  # one may end on it and another begin
-            if end >= row:
-                first, last = min(first, start), max(last, end)
+        lines = self.analysis.lines
+        for i in range(bisect_right(lines, row, key=lambda line: line.range.row) - 1, -1, -1):
+            place = lines[i].range
+            if place.end_row >= row:
+                first, last = min(first, place.row), max(last, place.end_row)
+            if place.row < row:  # one may end on the row and others begin
+                break
         return first, last
-
-    @cached_property
-    def _line_rows(self) -> list[tuple[int, int]]:
-        """The rows of all lines that have more than one."""
-        ranges = (line.range for line in self.analysis.lines)
-        return [(place.row, place.end_row) for place in ranges if place.end_row > place.row]
 
     def _is_for_notebooks(self, problem: Problem) -> bool:
         return problem.message.startswith(_NOTEBOOK_FORMS) and not problem.source_row[:1].isspace()

@@ -27,6 +27,22 @@ Item = TypeVar("Item")
 _SLICE = 256
 
 
+class _OpenSource(Source):
+    """A source whose rows are at hand."""
+
+    def __init__(self, path: str, analysis: Analysis, rows: Rows) -> None:
+        super().__init__(path, analysis)
+        self._open_rows = rows
+
+    def row_text(self, row: int) -> str:
+        """As the base class does, without splitting the text."""
+        return self._open_rows[row - 1] if row <= len(self._open_rows) else ""
+
+    def holds(self, text: str) -> bool:
+        """Whether it does is looked up on the rows of problems alone, which are few."""
+        return True
+
+
 class OpenDocument(PlacedText):
     """One text. Places of the protocol count from zero in the client's units."""
 
@@ -54,7 +70,7 @@ class OpenDocument(PlacedText):
     @cached_property
     def findings(self) -> Sequence[Finding]:
         """The problems that settings and comments let through."""
-        return self.settings.passed(Source(self.path, self.analysis))
+        return self.settings.passed(_OpenSource(self.path, self.analysis, self.rows))
 
     @property
     def told(self) -> Sequence[Finding]:

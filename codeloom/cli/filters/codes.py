@@ -49,7 +49,7 @@ def not_ignored_by_comments(source: Source, findings: Sequence[Finding]) -> Sequ
 
     The comment ignores all codes when it names none.
     """
-    if _COMMENT_MARK not in source.analysis.text:
+    if not source.holds(_COMMENT_MARK):
         return findings
     return [finding for finding in findings if not _is_ignored(source, finding)]
 
@@ -57,7 +57,7 @@ def not_ignored_by_comments(source: Source, findings: Sequence[Finding]) -> Sequ
 def _is_ignored(source: Source, finding: Finding) -> bool:
     row = finding.range.row
     for number in {row, source.line_rows(row)[1]}:
-        text = source.rows[number - 1] if number <= len(source.rows) else ""
+        text = source.row_text(number)
         for comment in _COMMENT.finditer(text):
             codes = comment["codes"]
             if codes is None or _best_fit(finding.code, re.split(r"[,\s]+", codes.strip().upper())) >= 0:
