@@ -195,3 +195,14 @@ def test_deep_trees(run_cli, tree_format):
     assert done.returncode == 1  # the interpreter takes fewer parentheses; the tree is there nevertheless
     assert "Traceback" not in done.stderr
     assert done.stdout.count("CAtom") == depth
+
+
+def test_options_that_it_shares(write_files, run_cli):
+    """The version is that of the project that the file is in."""
+    write_files({"old/pyproject.toml": "[project]\nrequires-python = '>=3.8'\n", "old/a.py": "\nmatch x:\n"})
+    done = run_cli("tree", "old/a.py:2", "--exit-zero")
+    assert done.returncode == 0 and "CL701 `match` needs Python 3.10" in done.stdout
+    prose = ("-c", "def f(a: 'the first of them'): pass")
+    assert run_cli("tree", *prose).returncode == 0
+    assert "CL601" in run_cli("tree", "--false-hints", *prose).stdout
+    assert run_cli("tree", "-v", "-c", "x").stderr.startswith("codeloom: settings: none\n")

@@ -80,7 +80,7 @@ class Options:
     def __init__(self, given: Mapping[str, Any]) -> None:
         """From what the command line gives; WrongUseError where it or a setting is wrong."""
         named = [path for path in given.get("paths", ()) if path != StandardInput.NAME]
-        named += [given[name] for name in ("stdin_filename",) if name in given]
+        named += [given[name] for name in ("stdin_filename", "place") if name in given]
         self.project = Project(named or ["."], given.get("config"))
         for name, value in checked_settings(self.project, _READERS):
             setattr(self, name.replace("-", "_"), value)
@@ -121,29 +121,12 @@ def add_source_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
         help="a file; a folder, for all Python files and notebooks in it; or - for the standard input "
         "(default: the current folder)",
     )
-    _add_reading(parser)
+    add_reading_arguments(parser)
     add_finding_arguments(parser).add_argument(
         "--show-files", action="store_true", help="list the files that would be read, and exit"
     )
     _add_selecting(parser)
     _add_running(add_output_arguments(parser, formats))
-
-
-def _add_reading(parser: argparse.ArgumentParser) -> None:
-    add_python_argument(parser)
-    parser.add_argument(
-        "--false-hints",
-        action="store_true",
-        help="treat everything that looks like a type hint as one: also prose after `# type:`, "
-        "codes after `# type: ignore` and sentences in quoted annotations",
-    )
-    parser.add_argument(
-        "--jobs",
-        type=as_argument(count),
-        metavar="N",
-        help="number of threads (default: one per processor)",
-    )
-    parser.add_argument("--config", metavar="FILE", help="read the settings from this file")
 
 
 def add_finding_arguments(parser: argparse.ArgumentParser) -> argparse._ArgumentGroup:
@@ -185,10 +168,16 @@ def _add_selecting(parser: argparse.ArgumentParser) -> None:
         metavar="REVISION",
         help="report only problems on lines changed since this git revision, such as HEAD or main",
     )
-    group.add_argument("--exit-zero", action="store_true", help="exit with 0 even if there are problems")
+    add_exit_zero_argument(group)
 
 
 def _add_running(group: argparse._ArgumentGroup) -> None:
+    group.add_argument(
+        "--jobs",
+        type=as_argument(count),
+        metavar="N",
+        help="number of threads (default: one per processor)",
+    )
     group.add_argument("--statistics", action="store_true", help="count the problems by code at the end")
     group.add_argument("--watch", action="store_true", help="run again whenever a file changes")
 
@@ -218,6 +207,18 @@ def add_output_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
     return group
 
 
+def add_reading_arguments(parser: argparse.ArgumentParser) -> None:
+    """Add what every command has that shows something of source."""
+    add_python_argument(parser)
+    parser.add_argument(
+        "--false-hints",
+        action="store_true",
+        help="treat everything that looks like a type hint as one: also prose after `# type:`, "
+        "codes after `# type: ignore` and sentences in quoted annotations",
+    )
+    parser.add_argument("--config", metavar="FILE", help="read the settings from this file")
+
+
 def add_python_argument(parser: argparse.ArgumentParser) -> None:
     """Add `python` and `stdin_filename`."""
     parser.add_argument(
@@ -229,6 +230,11 @@ def add_python_argument(parser: argparse.ArgumentParser) -> None:
         f"or {NEWEST})",
     )
     parser.add_argument("--stdin-filename", metavar="FILE", help="report the standard input under this name")
+
+
+def add_exit_zero_argument(parser: argparse._ActionsContainer) -> None:
+    """Add `exit_zero`."""
+    parser.add_argument("--exit-zero", action="store_true", help="exit with 0 even if there are problems")
 
 
 def as_argument(read: Callable[[str], Any]) -> Callable[[str], Any]:
@@ -317,9 +323,11 @@ _READERS: Mapping[str, Callable[[Any], Any]] = {
 __all__ = [
     "Options",
     "WrongUseError",
+    "add_exit_zero_argument",
     "add_finding_arguments",
     "add_output_arguments",
     "add_python_argument",
+    "add_reading_arguments",
     "add_source_arguments",
     "as_argument",
     "count",

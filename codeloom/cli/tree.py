@@ -10,7 +10,7 @@ from codeloom._face import analyze
 from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Console
 from codeloom.cli.formats import FOR_TREES, format_named
-from codeloom.cli.options import Options, add_output_arguments, add_python_argument
+from codeloom.cli.options import Options, add_exit_zero_argument, add_output_arguments, add_reading_arguments
 from codeloom.cli.project import WrongUseError
 from codeloom.cli.run import as_named, opened_console, print_facts, read_source
 from codeloom.cli.source import Source, printable_path
@@ -51,8 +51,8 @@ class TreeCommand(Command):
             "input",
         )
         what.add_argument("-c", dest="code", metavar="CODE", help="the line itself, or several")
-        add_python_argument(parser)
-        add_output_arguments(parser, cls.FORMATS)
+        add_reading_arguments(parser)
+        add_exit_zero_argument(add_output_arguments(parser, cls.FORMATS))
 
     def run(self, options: Options) -> ExitStatus:
         """Print the trees of the code, of the row or of the file."""
@@ -62,7 +62,7 @@ class TreeCommand(Command):
             print_facts(options)
         with opened_console(options) as console:
             if options.code is not None:
-                analysis = analyze(options.code, python=options.version)
+                analysis = analyze(options.code, python=options.version, false_hints=options.false_hints)
                 return _print(Source(analysis.path, analysis), options, None, console)
             path, row = _path_and_row(options.place or "")
             if os.path.isdir(path):

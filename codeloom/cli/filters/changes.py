@@ -90,5 +90,6 @@ def _git(folder: str, *arguments: str) -> bytes:
     except OSError as error:
         raise ValueError(f"git can't be run: {error.strerror}") from None
     if done.returncode != 0:
-        raise ValueError(done.stderr.decode(errors="replace").strip().partition("\n")[0])
+        said = done.stderr.decode(errors="replace").strip().partition("\n")[0]
+        raise ValueError(f"git: {said.removeprefix('fatal: ')}")
     return done.stdout
