@@ -41,7 +41,7 @@ class IndexCommand(Command):
         "codeloom index --git . -o index               # what git tracks",
         "codeloom index *.tar.gz wheels/*.whl -o index # archives are read in place",
         "codeloom index sources.parquet --content-column text -o index",
-        "codeloom index --resume src -o index          # go on after the machine went down",
+        "codeloom index --resume src -o index          # go on after an interruption",
     )
 
     @classmethod
