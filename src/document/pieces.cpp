@@ -4,6 +4,8 @@
 #include <iterator>
 
 #include "file/follow_ups.h"
+#include "scopes/join_names.h"
+#include "signatures/join_signatures.h"
 
 namespace codeloom {
 
@@ -46,7 +48,6 @@ class CJoinedProblems {
     std::string_view _fText;
     CProblems _fProblems;
     CProblems _fLate;
-    CProblems _fFaults;
     CFollowUps _fFollowUps;
 };
 
@@ -55,10 +56,8 @@ void CJoinedProblems::Add(const CPiece& piece, uint32_t start) {
     for (size_t i = 0; i < piece.problems.size(); ++i) {
         CProblem problem = piece.problems[i];
         Move(problem, start);
-        if (fault != piece.faults.end() && fault->problem_i == i) {
-            if (_FollowsFromOther(problem, fault++->line, start)) continue;
-            _fFaults.push_back(problem);
-        }
+        const bool is_fault = fault != piece.faults.end() && fault->problem_i == i;
+        if (is_fault && _FollowsFromOther(problem, fault++->line, start)) continue;
         _fProblems.push_back(std::move(problem));
     }
     for (const CProblem& problem : piece.late_problems) Move(_fLate.emplace_back(problem), start);
@@ -67,7 +66,7 @@ void CJoinedProblems::Add(const CPiece& piece, uint32_t start) {
 bool CJoinedProblems::_FollowsFromOther(const CProblem& problem, CRawLogical line, uint32_t start) {
     Move(line, start);
     line.file_text = _fText;
-    return _fFollowUps.Take(problem, line, _fFaults);
+    return _fFollowUps.Take(problem, line, _fProblems);
 }
 
 CProblems CJoinedProblems::Take() {
@@ -99,6 +98,29 @@ CPiecePtr MakePiece(CFilePart part, uint32_t start, const CPartState& state) {
     piece->has_asked_for_literals = part.has_asked_for_literals;
     piece->needs_whole_text = part.needs_whole_text;
     return piece;
+}
+
+// What a part says of names, with places counted from `start`.
+std::unique_ptr<const CPieceNames> MakeNames(CFilePart part, uint32_t start) {
+    auto made = std::make_unique<CPieceNames>();
+    made->names = std::move(part.analysis.names);
+    COccurrences& found = made->names.occurrences;
+    for (COccurrence& item : found.items) {
+        item.start -= start;
+        item.end -= start;
+        if (item.object_start == item.object_end) continue;
+        item.object_start -= start;
+        item.object_end -= start;
+    }
+    for (CInnerScope& scope : found.scopes) {
+        scope.start -= start;
+        scope.end -= start;
+    }
+    for (CLineNames& line : made->names.lines)
+        if (line.end != 0) line.end -= start;
+    made->names.scopes = {};
+    CSignatureJoiner(made->signatures).Append(part.analysis.signatures, -start, 0);
+    return made;
 }
 
 }  // namespace
@@ -209,6 +231,7 @@ CPieces::CLiteralTexts CPieceWork::_Literals() {
 }
 
 CPieces::CPieces(std::string_view text, const CFileSettings& settings) : _fSettings(settings) {
+    _fSettings.names = std::make_shared<CNameTable>();
     CPieceWork(text, *this).MakeAll();
 }
 
@@ -218,7 +241,7 @@ CPieces CPieces::Edited(std::string_view text, const CTextEdit& edit) const {
     return made;
 }
 
-std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text) const {
+std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text, bool wants_names) const {
     std::optional<CFileAnalysis> analysis(std::in_place);
     size_t line_count = 0, scanned_in_vain = 0, repeated_text = 0;
     for (const CPiecePtr& piece : _fPieces) line_count += piece->lines.size();
@@ -239,7 +262,26 @@ std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text) const {
     }
     if (!MayBeInParts(start, scanned_in_vain, repeated_text)) return {};
     analysis->problems = problems.Take();
+    if (wants_names) _JoinNames(text, *analysis);
     return analysis;
+}
+
+void CPieces::_JoinNames(std::string_view text, CFileAnalysis& analysis) const {
+    CLiteralNames literal_names(text);
+    std::vector<CNamePart> parts;
+    CSignatureJoiner signatures(analysis.signatures);
+    uint32_t start = 0, first_line = 0;
+    for (const CPiecePtr& piece : _fPieces) {
+        const uint32_t end = start + piece->length;
+        if (!piece->names)
+            piece->names = MakeNames(
+                AnalyzeNamesOfPart(text, _fSettings, literal_names, start, end, piece->state), start);
+        parts.push_back({&piece->names->names, start});
+        signatures.Append(piece->names->signatures, start, first_line);
+        first_line += static_cast<uint32_t>(piece->lines.size());
+        start = end;
+    }
+    analysis.names = JoinNames(parts, _fSettings.names);
 }
 
 }  // namespace codeloom

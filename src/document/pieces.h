@@ -17,6 +17,12 @@
 
 namespace codeloom {
 
+// What a piece says of names, its places counted as those of the piece.
+struct CPieceNames {
+    CTextNames names;
+    CSignatures signatures;
+};
+
 // A part of a text, wherever it is: all places are counted from its beginning.
 struct CPiece {
     uint32_t length = 0;
@@ -31,6 +37,7 @@ struct CPiece {
     size_t repeated_text = 0;
     bool has_asked_for_literals = false;
     bool needs_whole_text = false;
+    mutable std::unique_ptr<const CPieceNames> names;  // once they have been asked for
 };
 
 using CPiecePtr = std::shared_ptr<const CPiece>;
@@ -44,7 +51,8 @@ struct CTextEdit {
     uint32_t NewEnd() const { return start + new_length; }
 };
 
-// A text in pieces. Copies share what is the same in them, and nothing in them changes.
+// A text in pieces. Copies share what is the same in them, and nothing in them changes. Names of all that
+// share are in one table, so they are for one thread at a time.
 class CPieces {
   public:
     // Requires: `text` is UTF-8 that can be read, and not longer than kMaxTextSize; the version is known.
@@ -54,9 +62,9 @@ class CPieces {
     // Those of the text that an edit has made of the one of these pieces.
     CPieces Edited(std::string_view text, const CTextEdit& edit) const;
 
-    // The same as AnalyzeFile says of the text, without records and names; none where the text is one of the
-    // rare ones that must be analysed as a whole.
-    std::optional<CFileAnalysis> Analysis(std::string_view text) const;
+    // The same as AnalyzeFile says of the text, without records; none where the text is one of the rare ones
+    // that must be analysed as a whole.
+    std::optional<CFileAnalysis> Analysis(std::string_view text, bool wants_names) const;
 
     size_t Count() const { return _fPieces.size(); }
 
@@ -65,6 +73,8 @@ class CPieces {
     using CLiteralTexts = std::set<std::string, std::less<>>;
 
     explicit CPieces(const CFileSettings& settings) : _fSettings(settings) {}
+
+    void _JoinNames(std::string_view text, CFileAnalysis& analysis) const;
 
     CFileSettings _fSettings;
     std::vector<CPiecePtr> _fPieces;

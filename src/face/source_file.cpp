@@ -50,10 +50,11 @@ CSourceFile::CSourceFile(CPlainFile text, nb::str path, nb::str python, const CF
       _fPieces(std::move(pieces)),
       _fRows(std::make_unique<const CRowIndex>(_fText, std::move(row_starts))) {}
 
-CFileAnalysis CSourceFile::_Analyze(const CFileSettings& settings) const {
-    if (_fPieces && !settings.wants_records && !settings.wants_names)
-        if (std::optional<CFileAnalysis> analysis = _fPieces->Analysis(Text())) return std::move(*analysis);
-    return AnalyzeFile(Text(), settings, _fUnreadable);
+// What the pieces of a document say, which they all share: the interpreter's lock is kept.
+std::unique_ptr<const CFileAnalysis> CSourceFile::_FromPieces(bool wants_names) const {
+    std::optional<CFileAnalysis> analysis = _fPieces->Analysis(Text(), wants_names);
+    if (!analysis) return nullptr;
+    return std::make_unique<const CFileAnalysis>(std::move(*analysis));
 }
 
 nb::bytes CSourceFile::Utf8() const {
@@ -63,6 +64,7 @@ nb::bytes CSourceFile::Utf8() const {
 const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
                                             bool wants_names) const {
     if (kept) return *kept;
+    if (_fPieces && !wants_records && (kept = _FromPieces(wants_names))) return *kept;
     CFileSettings settings = _fSettings;
     settings.wants_records = wants_records;
     settings.wants_names = wants_names;
@@ -70,7 +72,7 @@ const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>
     std::unique_ptr<const CFileAnalysis> made;
     {
         const nb::gil_scoped_release released;
-        made = std::make_unique<const CFileAnalysis>(_Analyze(settings));
+        made = std::make_unique<const CFileAnalysis>(AnalyzeFile(Text(), settings, _fUnreadable));
     }
     if (!kept) kept = std::move(made);  // another thread may have been faster
     return *kept;

@@ -73,7 +73,7 @@ class CSourceFile {
 
   private:
     static nb::object _Named(const CNameTable& names, std::vector<nb::object>& made, uint32_t number);
-    CFileAnalysis _Analyze(const CFileSettings& settings) const;
+    std::unique_ptr<const CFileAnalysis> _FromPieces(bool wants_names) const;
     const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
                                    bool wants_names = false) const;
 

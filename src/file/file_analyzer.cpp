@@ -42,6 +42,14 @@ bool ImportsPrintFunction(const CRawLogical& logical) {
     return false;
 }
 
+// A declaration, or an import from the future.
+bool HasTellingName(const CRawLogical& logical) {
+    if (logical.MayHaveWords(WordBits(EWord::kGlobal, EWord::kNonlocal))) return true;
+    return logical.type == ELogicalType::kFromImport &&
+           std::any_of(logical.tokens.begin(), logical.tokens.end(),
+                       [&](const CRawToken& token) { return logical.Text(token) == "__future__"; });
+}
+
 const CUnreadable kAllReadable;
 
 class CEndAt final : public CPartEnd {
@@ -73,8 +81,8 @@ class CFileAnalyzer final : CTreeObserver {
     // True after a run that saw too few names for the declarations that are there.
     bool NeedsAllNames() const { return _fNeedsAllNames; }
 
-    // True after a part that has lines with a word that declares names.
-    bool HasDeclaringWords() const { return _fHasDeclaringWords; }
+    // True after a part whose names matter: one declares some, or says how annotations are read.
+    bool HasTellingNames() const { return _fHasTellingNames; }
 
   private:
     // Names may be declared where `declared_text` says so, or anyhow.
@@ -113,7 +121,10 @@ class CFileAnalyzer final : CTreeObserver {
     void _AnalyzeBegunLine(const CRawLogical& logical);
     bool _EndsBefore(const CRawLogical& logical, CPartEnd& part_end);
     CFilePart _EndPart(const CLexer& lexer, uint32_t end, uint32_t looked_at);
-    CPartState _State() const { return {_fChecker.State(), _fHasPrintFunction}; }
+    CPartState _State() const {
+        return {_fChecker.State(), _fHasPrintFunction,
+                _fNames ? _fNames->DefersAnnotations() : _fDefersAnnotations};
+    }
     void _BeginNames(const CRawLogical& logical);
     void _Leave(const CRawLogical& logical, bool has_fault);
     CLineResult _Analyze(const CRawLogical& logical);
@@ -142,7 +153,8 @@ class CFileAnalyzer final : CTreeObserver {
     const bool _fMayDeclareNames;
     const bool _fWantsAllNames;
     bool _fNeedsAllNames = false;
-    bool _fHasDeclaringWords = false;
+    bool _fHasTellingNames = false;
+    bool _fDefersAnnotations = false;  // before the part
     bool _fIsFileTooLong = false;
     bool _fIsPart = false;
     uint32_t _fPartStart = 0;
@@ -182,6 +194,8 @@ CFilePart CFileAnalyzer::RunPart(uint32_t start, const CPartState& state, CPartE
     _fPartStart = start;
     _fChecker.Resume(state.check);
     if (state.has_print_function) _TakePrintFunction();
+    _fDefersAnnotations = state.defers_annotations;
+    if (_fNames) _fNames->SetDefersAnnotations(state.defers_annotations);
     CTokenizer tokenizer(_fText, start);
     CRawLogical logical;
     for (bool is_fresh = false; tokenizer.NextLogical(logical); is_fresh = tokenizer.IsFresh()) {
@@ -289,7 +303,7 @@ void CFileAnalyzer::TakeHint(const CTree& tree, const CTreeNode& node, uint32_t 
 }
 
 void CFileAnalyzer::_BeginNames(const CRawLogical& logical) {
-    _fHasDeclaringWords |= logical.MayHaveWords(WordBits(EWord::kGlobal, EWord::kNonlocal));
+    if (_fIsPart) _fHasTellingNames |= HasTellingName(logical);
     if (_fNames) _FindOutWhetherToCollect(logical);
     if (_fIsCollecting) _fNames->BeginLine(logical, _fChecker.Blocks());
     if (!_fSettings.wants_names) return;
@@ -445,9 +459,19 @@ CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLit
     quick.wants_records = quick.wants_names = false;
     CFileAnalyzer analyzer(text, quick, literal_names, false);
     CFilePart part = analyzer.RunPart(start, state, part_end);
-    if (!analyzer.HasDeclaringWords()) return part;
+    if (!analyzer.HasTellingNames()) return part;
     CEndAt same_end(part.end);
     return CFileAnalyzer(text, quick, literal_names, true).RunPart(start, state, same_end);
+}
+
+CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& settings,
+                             CLiteralNames& literal_names, uint32_t start, uint32_t end,
+                             const CPartState& state) {
+    CFileSettings with_names = settings;
+    with_names.wants_records = false;
+    with_names.wants_names = true;
+    CEndAt same_end(end);
+    return CFileAnalyzer(text, with_names, literal_names, true).RunPart(start, state, same_end);
 }
 
 bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text) {

@@ -15,6 +15,7 @@ namespace codeloom {
 struct CPartState {
     CCheckState check;
     bool has_print_function = false;
+    bool defers_annotations = false;
 
     bool operator==(const CPartState&) const = default;
 };
@@ -59,6 +60,11 @@ struct CFilePart {
 // that ask for records or names aren't regarded.
 CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
                       uint32_t start, const CPartState& state, CPartEnd& part_end);
+
+// The same up to a known end, with names, signatures and hints besides.
+CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& settings,
+                             CLiteralNames& literal_names, uint32_t start, uint32_t end,
+                             const CPartState& state);
 
 // The parts of a text, whose shares come to these sums, say together what AnalyzeFile says.
 bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text);
