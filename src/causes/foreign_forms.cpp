@@ -66,13 +66,43 @@ CCause NotIs(const CFaultyLine& line) {
                         "write 'is not' instead of 'not is'");
 }
 
-// `x = 5:`
-CCause ColonAfterStatement(const CFaultyLine& line) {
+// `x = 5:`, `pass x`
+CCause AfterStatement(const CFaultyLine& line) {
     const int i = line.At();
-    if (!line.Is(i, kTokenId_COLON) || i + 1 != line.Count() || line.IsInBrackets(i)) return {};
-    if (!line.IsSoundWith({i, 1, {}})) return {};
-    return line.Problem(ECode::kSideBySide, i, i, "expected the end of the statement before ':'",
-                        "only the header of a block ends with ':'");
+    const bool is_colon = line.Is(i, kTokenId_COLON) && !line.IsInBrackets(i) && line.EndsOperand(i - 1);
+    const bool is_last = i + 1 == line.Count();
+    const bool is_whole =
+        i - 1 == line.StatementStart(i) &&
+        (line.Is(i - 1, EWord::kPass) || line.Is(i - 1, EWord::kBreak) || line.Is(i - 1, EWord::kContinue));
+    if (!is_whole && !(is_colon && (line.IsSoundWith({i, 1, {}}) || !is_last))) return {};
+    return line.Problem(ECode::kSideBySide, i, i,
+                        Joined("expected the end of the statement before ", Quoted(line.Text(i))),
+                        is_colon && is_last ? "only the header of a block ends with ':'" : "");
+}
+
+// `f(a; b)`
+CCause SemicolonForComma(const CFaultyLine& line) {
+    const int i = line.At();
+    if (!line.Is(i, kTokenId_SEMI) || !line.IsSoundWith({i, 1, {kTokenId_COMMA}})) return {};
+    return line.Problem(ECode::kMissingComma, i, i, "invalid syntax. Perhaps you forgot a comma?",
+                        "write ',' instead of ';'");
+}
+
+// `[a for a in b if c else d]`
+CCause ElseOfCondition(const CFaultyLine& line) {
+    const int i = line.At();
+    if (!line.Is(i, EWord::kElse) || line.FindBack(line.OpenerBefore(i) + 1, i, EWord::kFor) < 0) return {};
+    return line.Problem(ECode::kInvalidSyntax, i, i, "the condition of a comprehension has no 'else'",
+                        "write 'a if b else c' before 'for'");
+}
+
+// `a[1:2:3:4]`
+CCause LongSlice(const CFaultyLine& line) {
+    const int i = line.At();
+    const int opener_i = line.OpenerBefore(i);
+    const bool is_index = line.Is(opener_i, kTokenId_LSQB) && line.FollowsOperand(opener_i);
+    if (!is_index || !line.Is(i, kTokenId_COLON)) return {};
+    return line.Problem(ECode::kInvalidSyntax, i, i, "a slice has three parts at most");
 }
 
 // `global x = 5`

@@ -37,6 +37,10 @@ CCause FromImportFault(const CFaultyLine& line, int start) {
 CCause ImportFault(const CFaultyLine& line) {
     const int i = line.At();
     const int start = line.StatementStart(i);
+    const bool imports = line.Is(start, EWord::kFrom) || line.Is(start, EWord::kImport);
+    if (imports && line.Is(i, kTokenId_MINUS) && line.IsName(i - 1))
+        return line.Problem(ECode::kMissingName, i - 1, i + 1, "a name can't have a '-'",
+                            "a module to import has a plain name");
     if (line.Is(start, EWord::kFrom)) return FromImportFault(line, start);
     if (!line.Is(start, EWord::kImport)) return {};
     if (line.Is(i, EWord::kFrom) && i > start + 1)

@@ -11,6 +11,14 @@ bool IsComparison(int type) {
            type == kTokenId_GREATER;
 }
 
+// `=<`, whose second sign is at `i`.
+CCause SwappedAt(const CFaultyLine& line, int i) {
+    return line.Problem(
+        ECode::kForeignSign, i - 1, i,
+        Joined(Quoted(Joined(line.Text(i - 1), line.Text(i))), " isn't an operator in Python"),
+        Joined("write ", Quoted(Joined(line.Text(i), line.Text(i - 1)))));
+}
+
 }  // namespace
 
 CCause NotAfterOperator(const CFaultyLine& line) {
@@ -37,6 +45,9 @@ CCause Increment(const CFaultyLine& line) {
 CCause SplitOperator(const CFaultyLine& line) {
     const int i = line.At();
     if (i == 0) return {};
+    const bool is_before = line.Is(i, kTokenId_EQUAL) && line.IsAdjacent(i + 1) &&
+                           (line.Is(i + 1, kTokenId_LESS) || line.Is(i + 1, kTokenId_GREATER));
+    if (is_before) return SwappedAt(line, i + 1);
     const std::string together = Joined(line.Text(i - 1), line.Text(i));
     if (line.Is(i, kTokenId_EQUAL) && !line.IsAdjacent(i) && !IsOpenerType(line.Type(i - 1)) &&
         !line.Is(i - 1, kTokenId_COLON)) {
@@ -47,11 +58,7 @@ CCause SplitOperator(const CFaultyLine& line) {
     }
     if (!line.Is(i - 1, kTokenId_EQUAL) || !line.IsAdjacent(i)) return {};
     const bool is_swapped = line.Is(i, kTokenId_LESS) || line.Is(i, kTokenId_GREATER);
-    if (!is_swapped) return {};
-    const std::string meant = Joined(line.Text(i), line.Text(i - 1));
-    return line.Problem(ECode::kForeignSign, i - 1, i,
-                        Joined(Quoted(together), " isn't an operator in Python"),
-                        Joined("write ", Quoted(meant)));
+    return is_swapped ? SwappedAt(line, i) : CCause();
 }
 
 }  // namespace codeloom

@@ -167,6 +167,12 @@ CCause ParameterFault(const CFaultyLine& line) {
     for (const CParameterList& list : {ListOfLambda(line), ListOfDef(line)})
         if (is_in(list))
             if (CCause cause = CParameterReader(line, list).Read()) return cause;
+    const int i = line.At();
+    const CParameterList list = ListOfDef(line);
+    if (is_in(list) && line.Is(i, kTokenId_DOT) && line.OpenerBefore(i) == list.start - 1 &&
+        line.ItemStart(i) == i - 1)
+        return line.Problem(ECode::kMissingName, i - 1, i + 1, "a parameter is a plain name",
+                            "assign to an attribute in the body");
     return {};
 }
 

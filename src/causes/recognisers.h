@@ -22,7 +22,10 @@ CCause NewObject(const CFaultyLine& line);
 CCause ThenForColon(const CFaultyLine& line);
 CCause CountingLoop(const CFaultyLine& line);
 CCause NotIs(const CFaultyLine& line);
-CCause ColonAfterStatement(const CFaultyLine& line);
+CCause AfterStatement(const CFaultyLine& line);
+CCause SemicolonForComma(const CFaultyLine& line);
+CCause ElseOfCondition(const CFaultyLine& line);
+CCause LongSlice(const CFaultyLine& line);
 CCause DeclaresAndAssigns(const CFaultyLine& line);
 
 // What is in braces in an f-string.

@@ -19,6 +19,13 @@ CCause ForeignSign(const CFaultyLine& line, int i) {
         return line.Problem(ECode::kForeignSign, i - 1, i,
                             Joined(Quoted(Joined(line.Text(i - 1), "=")), " isn't an operator in Python"),
                             Joined("write ", Quoted(line.Text(i - 1)), ", or 'is' for the same object"));
+    if (line.Is(i, kTokenId_COLONEQUAL) && line.Is(i + 1, kTokenId_EQUAL) && line.IsAdjacent(i + 1))
+        return line.Problem(ECode::kForeignSign, i, i + 1, "':==' isn't an operator in Python",
+                            "write '==' or ':='");
+    if (line.Is(i, EWord::kArrow) && line.EndsOperand(i - 1) && line.BeginsOperand(i + 1) &&
+        !line.IsKeyword(0))
+        return line.Problem(ECode::kForeignSign, i, i, "'->' isn't an operator in Python",
+                            "write '.' for an attribute");
     if (line.Is(i, EWord::kLessGreater) && line.Language().IsPython3())
         return line.Problem(ECode::kForeignSign, i, i, "'<>' ended with Python 2", "write '!='");
     return {};

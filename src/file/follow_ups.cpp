@@ -13,6 +13,17 @@ bool IsSaid(const CProblem& problem, const CProblems& reported) {
     });
 }
 
+//   def f()    lacks its ':'
+//   {          is written instead of it, on a row of its own
+bool IsBraceOfHeader(const CRawLogical& line, const CProblems& reported) {
+    if (line.tokens.front().type != kTokenId_LBRACE || reported.empty()) return false;
+    const CProblem& last = reported.back();
+    const uint32_t start = line.StartOf(line.tokens.front());
+    if (last.code != ECode::kMissingColon || last.end > start) return false;
+    const std::string_view between = line.file_text.substr(last.end, start - last.end);
+    return between.find_first_not_of(" \t\r\n") == std::string_view::npos;
+}
+
 char QuoteAt(std::string_view text, uint32_t start) {
     const size_t quote_pos = text.find_first_of("'\"", start);
     return quote_pos == std::string_view::npos ? '\0' : text[quote_pos];
@@ -41,6 +52,7 @@ bool CFollowUps::Take(const CProblem& problem, const CRawLogical& line, CProblem
         default:
             break;
     }
+    follows |= IsBraceOfHeader(line, reported);
     _NoteOpen(line);
     return follows;
 }
