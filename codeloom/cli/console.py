@@ -59,6 +59,10 @@ class Console:
         """True when a person looks at the output as it is written."""
         return self._stream is not None and self._stream.isatty()
 
+    def room_after(self, text: str) -> int:
+        """The columns of a row that a text and a blank leave."""
+        return max(self._columns - len(text) - 1, _LEAST_WIDTH)
+
     def use_utf8(self) -> None:
         """Write UTF-8 whatever the terminal takes, for programs that expect it."""
         if isinstance(self._stream, io.TextIOWrapper):

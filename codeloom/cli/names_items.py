@@ -19,10 +19,12 @@ _CUT = "..."
 def show_head(console: Console, source: Source, line: Line) -> None:
     """Print a line's place and first row."""
     first_row, _, more = line.text.partition("\n")
-    text = _shortened(
-        printable(first_row.rstrip()) + (f" {_CUT}" if more else ""), console.width - _LABEL_WIDTH
-    )
-    console.print_row(f"{console.coloured(Colour.BOLD, source.label(line.range))} {text}")
+    label = source.label(line.range)
+    room = console.width - _LABEL_WIDTH
+    if console.is_terminal:  # where a row that is too long would wrap
+        room = min(room, console.room_after(label))
+    text = _shortened(printable(first_row.rstrip()) + (f" {_CUT}" if more else ""), room)
+    console.print_row(f"{console.coloured(Colour.BOLD, label)} {text}")
 
 
 class LineNames(Item):
