@@ -14,7 +14,7 @@ const TColumns<CProblemRow>& CProblemSource::Columns() {
             .Add<&CProblemRow::line>("line", "The index of its line; null in a text without lines.")
             .AddRange<&CProblemRow::range>("", "The row of what it is about, from 1.")
             .Add<&CProblemRow::message>("message", "What is wrong, in words.")
-            .Add<&CProblemRow::hint>("hint", "What may have been meant; null where that can't be told.");
+            .Add<&CProblemRow::hint>("hint", "What may have been meant; null where that isn't known.");
     return columns;
 }
 
@@ -66,7 +66,7 @@ const TColumns<CRecordRow>& CRecordSource::Columns() {
                                            "The name is an argument or a type parameter of "
                                            "the definition on its line.")
             .AddRange<&CRecordRow::range>("",
-                                          "The row of the name, from 1; null where it stands nowhere, as "
+                                          "The row of the name, from 1; null where it has no place, as "
                                           "are the next three.");
     return columns;
 }

@@ -13,7 +13,7 @@ const TColumns<COccurrenceRow>& COccurrenceSource::Columns() {
             .Add<&COccurrenceRow::name>("name", "The name as written; `*` for what `import *` binds.")
             .Add<&COccurrenceRow::role>("role", "What the name does there.")
             .AddRange<&COccurrenceRow::range>("", "Its row, from 1.")
-            .Add<&COccurrenceRow::scope>("scope", "The index of the scope that it stands in.")
+            .Add<&COccurrenceRow::scope>("scope", "The index of the scope that it is in.")
             .Add<&COccurrenceRow::resolution>("resolution",
                                               "Where its name is bound; null for what belongs "
                                               "to no scope, such as an attribute.")
@@ -21,9 +21,9 @@ const TColumns<COccurrenceRow>& COccurrenceSource::Columns() {
                                         "The index of the scope that binds its name; null where none "
                                         "of the text is known to.")
             .Add<&COccurrenceRow::is_definition>("is_definition", "It is the name of a `def` or a `class`.")
-            .Add<&COccurrenceRow::in_f_string>("in_f_string", "It stands in a field of an f-string.")
-            .Add<&COccurrenceRow::in_quotes>("in_quotes", "It stands in a hint in quotes.")
-            .Add<&COccurrenceRow::in_comment>("in_comment", "It stands in a hint in a comment.")
+            .Add<&COccurrenceRow::in_f_string>("in_f_string", "It is in a field of an f-string.")
+            .Add<&COccurrenceRow::in_quotes>("in_quotes", "It is in a hint in quotes.")
+            .Add<&COccurrenceRow::in_comment>("in_comment", "It is in a hint in a comment.")
             .AddRange<&COccurrenceRow::object>("object_",
                                                "Of an attribute, the row of what it hangs on; null for all "
                                                "else, as are the next three.");

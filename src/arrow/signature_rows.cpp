@@ -29,7 +29,7 @@ const TColumns<CSignatureRow>& CSignatureSource::Columns() {
             .Add<&CSignatureRow::name>("name", "The function's name.")
             .AddRange<&CSignatureRow::range>("", "The row of the name, from 1.")
             .Add<&CSignatureRow::is_async>("is_async", "It is an `async def`.")
-            .Add<&CSignatureRow::is_method>("is_method", "It stands right in the body of a class.")
+            .Add<&CSignatureRow::is_method>("is_method", "It is right in the body of a class.")
             .Add<&CSignatureRow::parameters>("parameters", "How many parameters it has.")
             .Add<&CSignatureRow::return_hint>("return_hint",
                                               "The hint of what it gives back; null without "
@@ -94,7 +94,7 @@ const TColumns<CHintRow>& CHintSource::Columns() {
                                   "back, that of the function.")
             .Add<&CHintRow::text>("text", "The hint as written, quotes included.")
             .AddRange<&CHintRow::range>("", "Its row, from 1.")
-            .Add<&CHintRow::in_comment>("in_comment", "It stands in a comment.");
+            .Add<&CHintRow::in_comment>("in_comment", "It is in a comment.");
     return columns;
 }
 
