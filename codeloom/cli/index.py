@@ -21,10 +21,12 @@ from codeloom.corpus.batch import MOST_BYTES, MOST_SECONDS, TABLES, checked_tabl
 from codeloom.reading.files import find_files
 
 if TYPE_CHECKING:
-    from codeloom.corpus.index import Counts, Indexer
+    from codeloom.corpus.index import Counts, Indexer, Pool
     from codeloom.corpus.sources import Entry, Finder
+    from codeloom.corpus.store import WritableStore
 
 _MEGABYTE = 1_000_000
+_ENGINES = ("threads", "ray")
 
 
 class IndexCommand(Command):
@@ -75,6 +77,17 @@ class IndexCommand(Command):
             metavar="N",
             help="number of threads (default: one per processor)",
         )
+        parser.add_argument(
+            "--engine",
+            choices=_ENGINES,
+            metavar="NAME",
+            help="threads of this machine, or ray for workers of a cluster (default: threads)",
+        )
+        parser.add_argument(
+            "--address",
+            metavar="ADDRESS",
+            help="of a running cluster of Ray, or auto (default: one that is started for this run)",
+        )
         parser.add_argument("--config", metavar="FILE", help="read the settings from this file")
         add_python_argument(parser)
         _add_limits(parser)
@@ -89,7 +102,7 @@ class IndexCommand(Command):
     def run(self, options: Options) -> ExitStatus:
         """Bring the index up to date; WrongUseError where it can't be one."""
         try:
-            from codeloom.corpus.index import Indexer, PartWriter, settings_of
+            from codeloom.corpus.index import Indexer, settings_of
             from codeloom.corpus.store import StoreError, WritableStore
         except ModuleNotFoundError as error:
             if (error.name or "").partition(".")[0] != "pyarrow":
@@ -108,10 +121,29 @@ class IndexCommand(Command):
         except StoreError as error:
             raise WrongUseError(str(error)) from None
         with store:
-            jobs = options.jobs or processor_count()
-            part_bytes = int(options.part_size * _MEGABYTE)
-            indexer = Indexer(store, PartWriter(store), jobs=jobs, part_bytes=part_bytes)
-            return _Run(options, indexer).run()
+            pool = _pool(options, store)
+            try:
+                indexer = Indexer(store, pool, part_bytes=int(options.part_size * _MEGABYTE))
+                return _Run(options, indexer).run()
+            finally:
+                pool.close()
+
+
+def _pool(options: Options, store: "WritableStore") -> "Pool":
+    if options.engine == "threads":
+        from codeloom.corpus.index import Threads
+
+        return Threads(store, options.jobs or processor_count())
+    try:
+        from codeloom.corpus.ray_pool import RayPool
+    except ModuleNotFoundError as error:
+        if (error.name or "").partition(".")[0] != "ray":
+            raise
+        raise WrongUseError("the engine ray needs the extra ray: pip install 'codeloom[ray]'") from None
+    try:
+        return RayPool(store, options.address, options.jobs)
+    except ConnectionError as error:
+        raise WrongUseError(f"there is no cluster of Ray at {options.address}: {error}") from None
 
 
 class _Run:

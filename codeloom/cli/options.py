@@ -72,6 +72,8 @@ class Options:
     max_bytes: int = 10
     max_seconds: float = 10.0
     part_size: float = 16.0
+    engine: str = "threads"
+    address: str | None = None
     sql: str = ""
     index: str = ""
 

@@ -1,15 +1,16 @@
 """Making an index: sources in, Parquet files in a folder out.
 
 Sources are read and hashed one after the other; what the index doesn't hold yet is gathered into parts,
-which threads analyse and write. A part counts when its files are on the disk, in the order of the sources.
+which a pool of workers analyses and writes. A part counts when its files are on the disk, in the order of
+the sources.
 """
 
 import os
 from collections import deque
-from collections.abc import Iterable, Iterator, Sequence
-from concurrent.futures import Future, ThreadPoolExecutor
+from collections.abc import Callable, Iterable, Iterator, Sequence
+from concurrent.futures import ThreadPoolExecutor
 from hashlib import sha256
-from typing import Any
+from typing import Any, Protocol
 
 import pyarrow
 import pyarrow.compute
@@ -35,6 +36,10 @@ _SMALL = ("column", "end_column", "object_column", "object_end_column")
 _ENCODINGS = {**dict.fromkeys(_GROWING, "DELTA_BINARY_PACKED"), **dict.fromkeys(_SMALL, "BYTE_STREAM_SPLIT")}
 
 
+# Of an index; what it holds is in `settings_of`.
+Settings = dict[str, Any]
+
+
 class Counts:
     """What became of the sources of a run."""
 
@@ -57,69 +62,100 @@ class Hashed:
         self.file_id = file_id_of(entry.path, self.digest)
 
 
-class PartWriter:
-    """Analyses sources as the settings of an index say, and writes a part; threads share it."""
+def write_tables(settings: Settings, sources: Sequence[Hashed], sink_of: Callable[[str], Any]) -> list[str]:
+    """Analyse sources as the settings of an index say, and write each table to the sink for its name.
 
-    def __init__(self, store: WritableStore) -> None:
-        self._store = store
-
-    def write(self, part: int, sources: Sequence[Hashed]) -> None:
-        """Write the tables of a part to their temporary paths, and have them on the disk."""
-        with PartFiles(self._store, part) as files:
-            for batch in _batches(sources):
-                for name, table in self._analyzed(batch).items():
-                    files.add(name, pyarrow.table(table))
-
-    def _analyzed(self, sources: Sequence[Hashed]) -> dict[str, Any]:
-        batch = pyarrow.record_batch(
-            {
-                "path": [one.entry.path for one in sources],
-                "content": pyarrow.array([one.entry.content for one in sources], _CONTENT),
-                "python": pyarrow.array([one.entry.python for one in sources], pyarrow.string()),
-            }
-        )
-        settings = self._store.settings
-        native = SourceBatch(batch, "path", "content", "python")
-        for i, one in enumerate(sources):
-            take(native, i, one.digest, settings["python"], settings["max_bytes"], one.entry.mark)
-        return native.analyze(settings["tables"], settings["false_hints"], settings["max_seconds"])
+    A sink is a path or a stream of pyarrow. Gives the names.
+    """
+    with _Writers(sink_of) as writers:
+        for batch in _batches(sources):
+            for name, table in _analyzed(settings, batch).items():
+                writers.add(name, pyarrow.table(table))
+        return writers.names
 
 
-class PartFiles:
+def _analyzed(settings: Settings, sources: Sequence[Hashed]) -> dict[str, Any]:
+    batch = pyarrow.record_batch(
+        {
+            "path": [one.entry.path for one in sources],
+            "content": pyarrow.array([one.entry.content for one in sources], _CONTENT),
+            "python": pyarrow.array([one.entry.python for one in sources], pyarrow.string()),
+        }
+    )
+    native = SourceBatch(batch, "path", "content", "python")
+    for i, one in enumerate(sources):
+        take(native, i, one.digest, settings["python"], settings["max_bytes"], one.entry.mark)
+    return native.analyze(settings["tables"], settings["false_hints"], settings["max_seconds"])
+
+
+class _Writers:
     """The Parquet files of a part while they are written."""
 
-    def __init__(self, store: WritableStore, part: int) -> None:
-        self._store = store
-        self._part = part
+    def __init__(self, sink_of: Callable[[str], Any]) -> None:
+        self._sink_of = sink_of
         self._writers: dict[str, pyarrow.parquet.ParquetWriter] = {}
 
-    def __enter__(self) -> "PartFiles":
+    def __enter__(self) -> "_Writers":
         return self
 
-    def __exit__(self, kind: object, *_: object) -> None:
+    def __exit__(self, *_: object) -> None:
         for writer in self._writers.values():
             writer.close()
-        if kind is None:
-            for name in self._writers:
-                _synchronise(self._store.temporary_path(name, self._part))
+
+    @property
+    def names(self) -> list[str]:
+        return list(self._writers)
 
     def add(self, name: str, table: pyarrow.Table) -> None:
         """Add rows of a table as a row group."""
         if name not in self._writers:
-            self._writers[name] = _writer(self._store.temporary_path(name, self._part), name, table.schema)
+            self._writers[name] = _writer(self._sink_of(name), name, table.schema)
         self._writers[name].write_table(table, row_group_size=max(len(table), 1))
+
+
+class Pool(Protocol):
+    """What analyses parts, several at a time."""
+
+    jobs: int
+
+    def submit(self, part: int, sources: Sequence[Hashed]) -> Callable[[], None]:
+        """Begin with a part. The call that is given returns when its files are on the disk, at their
+        temporary paths."""
+
+    def close(self) -> None:
+        """Begin no more parts."""
+
+
+class Threads:
+    """Threads of this process."""
+
+    def __init__(self, store: WritableStore, jobs: int) -> None:
+        self.jobs = jobs
+        self._store = store
+        self._pool = ThreadPoolExecutor(jobs, "codeloom")
+
+    def submit(self, part: int, sources: Sequence[Hashed]) -> Callable[[], None]:
+        """As the protocol says."""
+        return self._pool.submit(self._write, part, sources).result
+
+    def close(self) -> None:
+        """As the protocol says."""
+        self._pool.shutdown(cancel_futures=True)
+
+    def _write(self, part: int, sources: Sequence[Hashed]) -> None:
+        for name in write_tables(
+            self._store.settings, sources, lambda name: self._store.temporary_path(name, part)
+        ):
+            self._store.synchronise(name, part)
 
 
 class Indexer:
     """Brings an index to what the sources are now."""
 
-    def __init__(
-        self, store: WritableStore, writer: PartWriter, *, jobs: int, part_bytes: int = PART_BYTES
-    ) -> None:
+    def __init__(self, store: WritableStore, pool: Pool, *, part_bytes: int = PART_BYTES) -> None:
         self.counts = Counts()
         self._store = store
-        self._writer = writer
-        self._jobs = jobs
+        self._pool = pool
         self._part_bytes = part_bytes
         self._removes_duplicates = store.settings["dedup"]
         # Of each file that the index holds the part, twice, and one more for a duplicate.
@@ -133,25 +169,20 @@ class Indexer:
     def run(self, entries: Iterable[Entry]) -> Iterator[Counts]:
         """Index the sources, and give the counts again and again."""
         self._store.begin_run()
-        pending: deque[tuple[int, Future[None]]] = deque()
-        pool = ThreadPoolExecutor(self._jobs, "codeloom")
-        try:
-            for sources in self._parts(entries):
-                part = self._store.next_part()
-                pending.append((part, pool.submit(self._writer.write, part, sources)))
-                while len(pending) > self._jobs:
-                    self._commit(*pending.popleft())
-                yield self.counts
-            while pending:
+        pending: deque[tuple[int, Callable[[], None]]] = deque()
+        for sources in self._parts(entries):
+            part = self._store.next_part()
+            pending.append((part, self._pool.submit(part, sources)))
+            while len(pending) > self._pool.jobs:
                 self._commit(*pending.popleft())
-                yield self.counts
-        finally:
-            pool.shutdown(cancel_futures=True)
+            yield self.counts
+        while pending:
+            self._commit(*pending.popleft())
+            yield self.counts
         self._drop_what_is_gone()
         if not self._store.parts:  # each table is there, if with no rows
             part = self._store.next_part()
-            self._writer.write(part, [])
-            self._store.commit(part)
+            self._commit(part, self._pool.submit(part, []))
         self._store.finish(self.counts.files)
         yield self.counts
 
@@ -166,8 +197,8 @@ class Indexer:
                     self._gone.setdefault(self._known[file_id] >> 1, []).append(file_id)
                 self._known[file_id] = part * 2 + (state == "duplicate")
 
-    def _commit(self, part: int, written: "Future[None]") -> None:
-        written.result()
+    def _commit(self, part: int, wait: Callable[[], None]) -> None:
+        wait()
         self._store.commit(part)
 
     def _parts(self, entries: Iterable[Entry]) -> Iterator[list[Hashed]]:
@@ -227,7 +258,7 @@ class Indexer:
     def _copy(self, old: int, part: int, gone: pyarrow.Array) -> bool:
         """Copy a part without some files; false when no file is left, and then nothing is there."""
         has_rows = False
-        with PartFiles(self._store, part) as files:
+        with _Writers(lambda name: self._store.temporary_path(name, part)) as writers:
             for name in self._store.tables:
                 with pyarrow.parquet.ParquetFile(self._store.path_of(name, old)) as file:
                     for group in range(file.num_row_groups):
@@ -235,16 +266,18 @@ class Indexer:
                         is_gone = pyarrow.compute.is_in(table["file_id"], value_set=gone)
                         table = table.filter(pyarrow.compute.invert(is_gone))
                         has_rows |= name == "files" and len(table) > 0
-                        files.add(name, table)
-        if not has_rows:
-            for name in self._store.tables:
+                        writers.add(name, table)
+        for name in self._store.tables:
+            if has_rows:
+                self._store.synchronise(name, part)
+            else:
                 os.remove(self._store.temporary_path(name, part))
         return has_rows
 
 
 def settings_of(
     python: str, tables: Iterable[str], *, false_hints: bool, dedup: bool, max_bytes: int, max_seconds: float
-) -> dict[str, Any]:
+) -> Settings:
     """What all runs over an index must have in common, so that their rows are of one kind."""
     return {
         "codeloom": __version__,
@@ -269,11 +302,11 @@ def _batches(sources: Sequence[Hashed]) -> Iterator[Sequence[Hashed]]:
     yield sources[start:]
 
 
-def _writer(path: str, name: str, schema: pyarrow.Schema) -> pyarrow.parquet.ParquetWriter:
+def _writer(sink: Any, name: str, schema: pyarrow.Schema) -> pyarrow.parquet.ParquetWriter:
     encodings = {name: encoding for name, encoding in _ENCODINGS.items() if name in schema.names}
     facts = {"codeloom.table": name, "codeloom.version": __version__, "codeloom.schema": "1"}
     return pyarrow.parquet.ParquetWriter(
-        path,
+        sink,
         schema.with_metadata(facts),
         compression="zstd",
         compression_level=3,
@@ -281,11 +314,3 @@ def _writer(path: str, name: str, schema: pyarrow.Schema) -> pyarrow.parquet.Par
         column_encoding=encodings,
         write_statistics=["file_id"],
     )
-
-
-def _synchronise(path: str) -> None:
-    descriptor = os.open(path, os.O_RDONLY)
-    try:
-        os.fsync(descriptor)
-    finally:
-        os.close(descriptor)

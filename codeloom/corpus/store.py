@@ -125,6 +125,10 @@ class WritableStore(Store):
         """Where to write a part of a table before it is committed."""
         return self.path_of(table, part) + _TEMPORARY
 
+    def synchronise(self, table: str, part: int) -> None:
+        """Have what was written of a part on the disk."""
+        _synchronise(self.temporary_path(table, part), os.O_RDONLY)
+
     def commit(self, part: int | None, replaces: Iterable[int] = ()) -> None:
         """Make a part count whose files are written, synchronised, at their temporary paths.
 
@@ -196,9 +200,9 @@ def _locked(folder: str) -> int:
     return descriptor
 
 
-def _synchronise(folder: str) -> None:
-    """Have the names in a folder on the disk."""
-    descriptor = os.open(folder, os.O_RDONLY | os.O_DIRECTORY)
+def _synchronise(path: str, flags: int = os.O_RDONLY | os.O_DIRECTORY) -> None:
+    """Have a file, or the names in a folder, on the disk."""
+    descriptor = os.open(path, flags)
     try:
         os.fsync(descriptor)
     finally:
