@@ -15,6 +15,7 @@ import sys
 from pathlib import Path
 
 import pytest
+from test_layout import STEPS
 
 import codeloom
 
@@ -113,3 +114,13 @@ def test_every_page_is_in_the_site_and_names_the_newest_version():
     assert [path.name for path in ROOT.glob("docs/*.md") if f"- {path.name}\n" not in site] == []
     for page in ("README.md", "docs/index.md", "docs/versions.md"):
         assert f"from {codeloom.VERSIONS[0]} to {codeloom.NEWEST}" in (ROOT / page).read_text(), page
+
+
+def test_the_table_of_stages_names_what_is_there():
+    page = (ROOT / "docs/architecture.md").read_text()
+    for path in re.findall(r"`((?:src|codeloom)/[\w/.]+)`", page):
+        assert (ROOT / path).exists(), path
+    for name in re.findall(r"`(test_\w+)`", page):
+        assert (ROOT / f"tests/{name}.py").exists(), name
+    for (folder,) in STEPS[: STEPS.index(["host"])]:
+        assert f"`src/{folder}`" in page, folder
