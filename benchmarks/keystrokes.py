@@ -32,7 +32,7 @@ PASTED = "".join(
 PASTES = 10
 
 # A server that takes longer than this for all of a replay is asked for no more.
-MOST_SECONDS = 40.0
+MOST_SECONDS = 20.0
 
 Place = tuple[int, int]
 
@@ -105,7 +105,7 @@ def seconds_on_wire(peer: Peer, text: str, folder: Path) -> list[float]:
         wire.open(text)
         return _seconds(text, lambda edit: wire.edit(*edit))
     except (SilentError, EOFError, RuntimeError) as error:
-        print(f"{peer.name}: {error or 'no answer in time'}", file=sys.stderr)
+        print(f"{peer.name}: {str(error) or 'no answer in time'}", file=sys.stderr)
         return []
     finally:
         wire.close()

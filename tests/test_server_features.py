@@ -140,6 +140,9 @@ def test_rename(client):
         with pytest.raises(Refused, match=message) as error:
             Ask(client, "rename", marked, newName=name)
         assert error.value.code == -32803
+    client.open("x = 1\nf(\n  x x)\nreturn x\n", "broken.py")
+    with pytest.raises(Refused, match="row 2 names 'x' and has a fault"):
+        client.request("textDocument/rename", {**client.at(3, 7, "broken.py"), "newName": "z"})
     source = "from m import a as b\n\ndef f(b):\n    return b\nprint(b)\n"
     client.open(source, "as.py")
     edit = client.request("textDocument/rename", {**client.at(4, 6, "as.py"), "newName": "e"})

@@ -10,6 +10,7 @@ from pygls.exceptions import JsonRpcException
 
 from codeloom._analysis import Analysis, Occurrence, Resolution, Role
 from codeloom.reading.languages import language_of
+from codeloom.server.blocks import line_at
 from codeloom.server.documents import OpenDocument
 
 if TYPE_CHECKING:
@@ -90,8 +91,11 @@ def _check_faults(document: OpenDocument, occurrence: Occurrence) -> None:
     assert home is not None
     first, last = (home.range.row, home.range.end_row) if home.parent is not None else (1, len(document.rows))
     for problem in document.analysis.problems:
-        row = problem.range.row
-        if first <= row <= last and _holds_word(document.rows[row - 1], occurrence.name):
+        line = line_at(document.analysis, (problem.range.row, problem.range.column))
+        if line is None or line.occurrences:  # its names are known
+            continue
+        row = line.range.row
+        if row <= last and line.range.end_row >= first and _holds_word(line.text, occurrence.name):
             raise RenameRefusedError(f"row {row} names {occurrence.name!r} and has a fault: mend it first")
 
 
