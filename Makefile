@@ -1,6 +1,6 @@
 # make run     set up what is missing, build, and check the examples and the interpreter's own library
 # make test    set up what is missing, build, and run all tests
-# The rest: docs, lint, tidy, format, asan, leaks, fuzz, bench, bench-short, clean.
+# The rest: docs, package, lint, tidy, format, asan, leaks, fuzz, bench, bench-short, clean.
 
 # Another host has an environment of its own: make test PYTHON=python3.13
 PYTHON ?= python3.11
@@ -12,7 +12,7 @@ SOURCES   := $(shell find src resources codeloom -type f -not -name '*.pyc') CMa
 CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
 STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
 
-.PHONY: run test ray docs lint tidy format asan asan-short leaks fuzz bench bench-short build clean
+.PHONY: run test ray docs package lint tidy format asan asan-short leaks fuzz bench bench-short build clean
 
 build: $(STAMP)
 
@@ -39,6 +39,11 @@ test: build
 docs: $(VENV)/.tools
 	$(BIN)/pip install --quiet --group docs
 	$(BIN)/mkdocs build --quiet --strict
+
+# An sdist, a wheel made from it, and all that checks them; then the wheel in a fresh environment without a compiler.
+package: $(VENV)/.tools
+	$(BIN)/pip install --quiet --group package
+	sh tools/try_package.sh $(abspath $(BIN)) build/package
 
 lint: build
 	$(BIN)/clang-format --dry-run --Werror $(CXX_FILES)
