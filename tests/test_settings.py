@@ -188,23 +188,6 @@ class TestExclusion:
         )
 
 
-def test_completion(run_cli, tmp_path):
-    import subprocess
-
-    script = tmp_path / "bash"
-    script.write_text(run_cli("completion", "bash").stdout)
-    probe = (
-        f'source {script}; complete_words() {{ COMP_WORDS=(codeloom "$@"); COMP_CWORD=$#; _codeloom; '
-        'echo "${COMPREPLY[@]}"; }; complete_words ch; complete_words check --fo; '
-        "complete_words check --format js; complete_words names --format s"
-    )
-    done = subprocess.run(["bash", "-c", probe], capture_output=True, text=True)
-    assert done.stdout.splitlines() == ["check", "--force-exclude --format", "json jsonl", ""], done.stderr
-    assert "#compdef codeloom" in run_cli("completion", "zsh").stdout
-    fish = run_cli("completion", "fish").stdout
-    assert "-l format -x -a 'text concise" in fish and "-f -a check" in fish
-
-
 def test_colours(write_files, run_cli, cli_environment):
     write_files({"a.py": ")\n"})
     assert "\033[" not in run_cli("check", "a.py").stdout

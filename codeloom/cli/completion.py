@@ -1,7 +1,8 @@
 """`codeloom completion`: what completes commands and options in a shell."""
 
 import argparse
-from collections.abc import Iterator
+from collections.abc import Iterable, Iterator
+from shlex import quote
 
 from codeloom.cli.arguments import COMMANDS, command_named, parser_of
 from codeloom.cli.command import Command, ExitStatus
@@ -27,13 +28,39 @@ _codeloom() {{
             [[ $current == -* ]] || words=
         fi
     fi
-    mapfile -t COMPREPLY < <(compgen -W "$words" -- "$current")
+    COMPREPLY=($(compgen -W "$words" -- "$current"))  # the words hold no blanks
 }}
 complete -o default -o bashdefault -F _codeloom codeloom
 """
+# Read at the start of a shell, or put into a folder of functions, where it is run at the first use.
 _ZSH = """\
 #compdef codeloom
-autoload -U +X bashcompinit && bashcompinit
+_codeloom() {{
+    local -a commands
+    commands=(
+{commands}
+    )
+    if (( CURRENT == 2 )); then
+        _describe command commands
+        return
+    fi
+    case "${{words[2]}} ${{words[CURRENT - 1]}}" in
+{choices}
+    esac
+    if [[ ${{words[CURRENT]}} != -* ]]; then
+        _files
+        return
+    fi
+    case "${{words[2]}}" in
+{options}
+    esac
+}}
+if [[ ${{funcstack[1]}} == _codeloom ]]; then
+    _codeloom "$@"
+else
+    (( $+functions[compdef] )) || {{ autoload -U compinit && compinit; }}
+    compdef _codeloom codeloom
+fi
 """
 
 
@@ -65,18 +92,45 @@ def script_for(shell: str) -> str:
     """The script that a shell reads."""
     if shell == "fish":
         return "".join(f"{row}\n" for row in _fish_rows())
-    return (_ZSH if shell == "zsh" else "") + _BASH.format(
+    if shell == "zsh":
+        return _ZSH.format(
+            commands=_rows(8, (quote(f"{name}:{help}") for name, (*_, help) in COMMANDS.items())),
+            choices=_cases(8, _choices(), "compadd -- {}; return"),
+            options=_cases(8, _options(), "compadd -- {}"),
+        )
+    return _BASH.format(
         commands=" ".join(COMMANDS),
-        choices="\n".join(
-            f'            "{command} {name}") words="{" ".join(map(str, action.choices))}" ;;'
-            for command, action in _actions()
-            if action.choices
-            for name in action.option_strings or ("completion",)
-        ),
-        options="\n".join(
-            f'                {command}) words="{" ".join(_options_of(command))}" ;;' for command in COMMANDS
-        ),
+        choices=_cases(12, _choices(), 'words="{}"'),
+        options=_cases(16, _options(), 'words="{}"'),
     )
+
+
+def _cases(indent: int, words: Iterable[tuple[str, Iterable[object]]], action: str) -> str:
+    """Branches of a `case`: what is before the cursor, and what to do with the words that fit there."""
+    return _rows(
+        indent, (f'"{before}") {action.format(" ".join(map(str, fitting)))} ;;' for before, fitting in words)
+    )
+
+
+def _rows(indent: int, rows: Iterable[str]) -> str:
+    return "\n".join(" " * indent + row for row in rows)
+
+
+def _choices() -> Iterator[tuple[str, Iterable[object]]]:
+    """A command with one of its options, or with itself for an argument, and what may follow."""
+    for command, action in _actions():
+        if action.choices:
+            for name in action.option_strings or (command,):
+                yield f"{command} {name}", action.choices
+
+
+def _options() -> Iterator[tuple[str, Iterable[object]]]:
+    """Each command and its options."""
+    for command in COMMANDS:
+        yield (
+            command,
+            [option for name, action in _actions() if name == command for option in action.option_strings],
+        )
 
 
 def _fish_rows() -> Iterator[str]:
@@ -96,12 +150,6 @@ def _fish_rows() -> Iterator[str]:
 
 def _quoted(text: str) -> str:
     return "'" + text.replace("\\", "\\\\").replace("'", "\\'") + "'"
-
-
-def _options_of(command: str) -> Iterator[str]:
-    for name, action in _actions():
-        if name == command:
-            yield from action.option_strings
 
 
 def _actions() -> Iterator[tuple[str, argparse.Action]]:
