@@ -10,11 +10,10 @@ change, so that a newer table takes all that an older one took.
 import pathlib
 import sys
 from collections.abc import Iterator
+from importlib import import_module
+from importlib.util import find_spec
 
-try:
-    import unicodedata2 as unicodedata
-except ImportError:
-    import unicodedata  # type: ignore[no-redef]
+unicodedata = import_module("unicodedata2" if find_spec("unicodedata2") else "unicodedata")
 
 TARGET = pathlib.Path(__file__).parent.parent / "src/text/character_name_bits.h"
 BIT_COUNT = 1 << 19

@@ -144,8 +144,8 @@ std::optional<CProblem> CauseWithin(const CSpan& place, const CRawLogical& line,
                                     CLineProbe& probe) {
     if (faulty.LineType() == ELogicalType::kStringifiedTypeHint) return CauseOfSyntax(faulty);
     for (const CRawLogical& part : line.embedded) {
-        const bool is_meant =
-            part.type == ELogicalType::kCommentedTypeHint && part.EndOf(part.tokens.back()) >= place.start;
+        const bool is_meant = part.type == ELogicalType::kCommentedTypeHint && !part.tokens.empty() &&
+                              part.EndOf(part.tokens.back()) >= place.start;
         if (!is_meant) continue;
         const CRawLogical side = SideOfArrow(part, place.start);
         const int token_i = side.tokens.empty() ? CLineProbe::kSound : probe.FaultWith(side, false, {});

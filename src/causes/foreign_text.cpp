@@ -72,6 +72,7 @@ CCause ShellCommand(const CFaultyLine& line) {
 
 CCause Markup(const CFaultyLine& line) {
     const std::string_view row = FirstRow(line);
+    if (row.empty()) return {};
     if (row.starts_with("```"))
         return line.ProblemAt(ECode::kForeignText, line.Token(0).start, line.Token(0).start + 3,
                               "'```' belongs to Markdown, not to Python", "remove the rows of the fence");

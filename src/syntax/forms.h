@@ -32,7 +32,8 @@ inline constexpr CForm kCommaAfterStars{"a comma after starred parameters", 306}
 inline constexpr CForm kEmptyTarget{"`()` as a target", 306};
 inline constexpr CForm kVariableAnnotation{"an annotation of a variable", 306};
 inline constexpr CForm kWalrus{"`:=`", 308};
-inline constexpr CForm kStarInResult{"a starred expression without parentheses after `return` or `yield`", 308};
+inline constexpr CForm kStarInResult{"a starred expression without parentheses after `return` or `yield`",
+                                     308};
 inline constexpr CForm kAnnotatedTuple{"an annotated assignment of a bare tuple or `yield`", 308};
 inline constexpr CForm kSignOfField{"`=` at the end of a field of an f-string", 308};
 inline constexpr CForm kPositionalOnly{"`/` among parameters", 308};
