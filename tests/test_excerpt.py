@@ -23,7 +23,7 @@ def At(column):
         ("\uff45 )", 3, "\uff45 )", "   ^"),
         ("e\u0301 )", 4, "e\u0301 )", "  ^"),
         ("🙂 )", 3, "🙂 )", "   ^"),
-        ("\x1b[2J\u202e)\x0c\0", 6, "\ufffd[2J\ufffd)\ufffd\ufffd", "     ^"),
+        ("\x1b[2J\u202e)\x0c\0", 6, "\ufffd[2J\ufffd) \ufffd", "     ^"),
     ],
 )
 def test_rows_that_fit(row, column, shown, caret):

@@ -60,6 +60,19 @@ def test_what_is_no_notebook(data, tmp_path):
         assert raised.value.filename == str(path)
 
 
+def test_an_indented_cell_is_as_one_that_is_not(run_cli, write_files):
+    cells = Made(
+        "\n  x = 1\n  if x:\n    y = )\n", "    %time\n    for i in x:\n        pass\n", "if x:\n  y = 1\n"
+    )
+    write_files({"n.ipynb": cells})
+    assert run_cli("check", "n.ipynb").stdout.splitlines() == [
+        "n.ipynb:cell 1:4:9: CL203 unmatched ')'",
+        "    4 |     y = )",
+        "      |         ^",
+        "1 problem in 1 of 1 file, 8 logical lines",
+    ]
+
+
 @pytest.mark.parametrize("end", ["f(1", "y = [1,\n  2\n", "def g(a", "z = {'a': (", "if f(:\n    pass"])
 def test_what_a_cell_leaves_open_ends_with_it(end):
     notebook = Notebook(Made(f"x = 1\n{end}", "total = 1\nprint(total)\n"))

@@ -90,7 +90,10 @@ def _cells(chars: str, encoding: str) -> Iterator[tuple[str, int]]:
     """Each character as it is printed, and how many columns of the terminal it takes."""
     col = 0
     for char in chars:
-        cell = " " * (_TAB_WIDTH - col % _TAB_WIDTH) if char == "\t" else printable(char)
+        if char == "\t":
+            cell = " " * (_TAB_WIDTH - col % _TAB_WIDTH)
+        else:
+            cell = " " if char == "\f" else printable(char)
         cell = cell.encode(encoding, "backslashreplace").decode(encoding)
         cell_width = sum(map(_width_of, cell))
         yield cell, cell_width

@@ -22,6 +22,7 @@ _PIECE = re.compile(
     re.DOTALL,
 )
 _ROW_END = re.compile(r"\r\n|\r")
+_FIRST_BLANKS = re.compile(r"\s*^(?P<blanks>[ \t]+)\S", re.MULTILINE)
 # A row that can't be within parentheses, so that what a cell leaves open ends with the cell.
 _END_OF_OPEN_CELL = "pass\n"
 
@@ -42,7 +43,7 @@ class Notebook:
         texts = []
         row = 1
         for number, source in cells if self.is_python else ():
-            text = _without_magic(source)
+            text = _at_depth_zero(_without_magic(source))
             self._cells.append(number)
             self._first_rows.append(row)
             texts.append(text)
@@ -125,6 +126,18 @@ def _without_magic(source: str) -> str:
         pieces.append(_passed_over(match) if match else text[start:end])
         start = end
     return "".join(pieces)
+
+
+def _at_depth_zero(text: str) -> str:
+    """A cell whose first statement is indented, as if it weren't: notebooks run such a cell.
+
+    A form feed, with which indentation begins anew, keeps the columns.
+    """
+    match = _FIRST_BLANKS.match(text)
+    if match is None:
+        return text
+    blanks = match["blanks"]
+    return re.sub(f"^{blanks}(?=.)", f"{blanks[:-1]}\f", text, flags=re.MULTILINE)
 
 
 def _end_of_statement(text: str, start: int) -> int | None:
