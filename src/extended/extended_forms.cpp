@@ -6,53 +6,12 @@
 #include "host/text.h"
 #include "parse/syntax_error.h"
 #include "text/token_type.h"
-#include "tree/child_list.h"
-#include "tree/expression_nodes.h"
 
 namespace codeloom {
 
 namespace {
 
 constexpr int kVersionsOfMajor = 100;  // 3.12 is 312
-
-template <class Class>
-Py_ssize_t FindOfClass(const CNode& node) {
-    for (Py_ssize_t i = 0; i < ListedCount(node); ++i)
-        if (node.TryChild<Class>(i)) return i;
-    return -1;
-}
-
-template <Py_ssize_t child_i>
-Py_ssize_t Always(const CNode&) {
-    return child_i;
-}
-
-template <Py_ssize_t child_i, class Class>
-Py_ssize_t IfOfClass(const CNode& node) {
-    return node.TryChild<Class>(child_i) ? child_i : -1;
-}
-
-Py_ssize_t FindSlash(const CNode& node) {
-    for (Py_ssize_t i = 0; i < ListedCount(node); ++i)
-        if (node.IsToken(i, "/")) return i;
-    return -1;
-}
-
-Py_ssize_t FindNamedArgument(const CNode& node) {
-    return node.IsToken(1, ":=") ? 1 : -1;
-}
-
-// In a set of one; the `:=` of `(x := 1)` has its brackets.
-Py_ssize_t FindInBraces(const CNode& node) {
-    return node.IsToken(0, "{") ? IfOfClass<1, CNamedExpr>(node) : -1;
-}
-
-// A comma list that holds a starred expression.
-template <Py_ssize_t child_i>
-Py_ssize_t FindStarInList(const CNode& node) {
-    const CTestListStarExpr* const list = node.TryChild<CTestListStarExpr>(child_i);
-    return list && FindOfClass<CStarExpression>(*list) != -1 ? child_i : -1;
-}
 
 int VersionOf(nb::handle version_triple) {
     if (!nb::isinstance<nb::tuple>(version_triple) || TupleSize(version_triple) < 2) return INT32_MAX;
@@ -64,27 +23,6 @@ int VersionOf(nb::handle version_triple) {
 }
 
 }  // namespace
-
-const std::vector<CExtendedForms::CNodeForm>& CExtendedForms::_NodeForms() {
-    static const std::vector<CNodeForm> node_forms = {
-        {"annassign", forms::kVariableAnnotation, Always<0>},
-        {"namedexpr_test", forms::kWalrus, Always<1>},
-        {"argument", forms::kWalrus, FindNamedArgument},
-        {"typedargslist", forms::kPositionalOnly, FindSlash},
-        {"varargslist", forms::kPositionalOnly, FindSlash},
-        {"return_stmt", forms::kStarInResult, FindStarInList<1>},
-        {"yield_expr", forms::kStarInResult, FindStarInList<1>},
-        {"for_stmt", forms::kStarInFor, FindStarInList<3>},
-        {"trailer", forms::kWalrusInSubscript, IfOfClass<1, CNamedExpr>},
-        {"subscriptlist", forms::kWalrusInSubscript, FindOfClass<CNamedExpr>},
-        {"atom", forms::kWalrusInSet, FindInBraces},
-        {"dictorsetmaker", forms::kWalrusInSet, FindOfClass<CNamedExpr>},
-        {"star_test", forms::kStarInSubscript, Always<0>},
-        {"fpdef", forms::kStarredAnnotation, IfOfClass<2, CStarExpression>},
-        {"except_clause", forms::kBareExcept, IfOfClass<1, CTestListStarExpr>},
-    };
-    return node_forms;
-}
 
 void CExtendedForms::SetVersion(nb::handle version_triple) {
     _fVersion = VersionOf(version_triple);
@@ -113,8 +51,8 @@ void CExtendedForms::NoteNode(int type, const CNode& node) {
     }
     if (node.fChildren.IsNone()) return;
     const CNodeForm& node_form = *_fNodeForm[static_cast<size_t>(type)];
-    const Py_ssize_t child_i = node_form.find(node);
-    if (child_i >= 0) Note(node_form.form, node.ChildAt(child_i).fContext);
+    const Py_ssize_t child_i = node_form.find(CHostedFormNode(node));
+    if (child_i >= 0) Note(*node_form.form, node.ChildAt(child_i).fContext);
 }
 
 void CExtendedForms::Note(const CForm& form, nb::handle context) {

@@ -9,20 +9,42 @@
 #include <nanobind/nanobind.h>
 
 #include "neighbours/logicalline/logical_line.h"
-#include "syntax/forms.h"
+#include "syntax/rule_forms.h"
+#include "tree/child_list.h"
+#include "tree/expression_nodes.h"
 #include "tree/node.h"
 
 namespace codeloom {
 
+// A node as the table of forms asks for it.
+class CHostedFormNode {
+  public:
+    explicit CHostedFormNode(const CNode& node) : _fNode(node) {}
+
+    int32_t Count() const { return static_cast<int32_t>(ListedCount(_fNode)); }
+    bool HasSign(int32_t i, const CFormSign& sign) const { return _fNode.IsToken(i, sign.text); }
+    template <EFormPart part>
+    bool Has(int32_t i) const {
+        return _TryPart<part>(i) != nullptr;
+    }
+    template <EFormPart part>
+    CHostedFormNode Part(int32_t i) const {
+        return CHostedFormNode(*_TryPart<part>(i));
+    }
+
+  private:
+    template <EFormPart part>
+    const CNode* _TryPart(int32_t i) const {
+        if constexpr (part == EFormPart::kNamed) return _fNode.TryChild<CNamedExpr>(i);
+        if constexpr (part == EFormPart::kStar) return _fNode.TryChild<CStarExpression>(i);
+        if constexpr (part == EFormPart::kList) return _fNode.TryChild<CTestListStarExpr>(i);
+    }
+
+    const CNode& _fNode;
+};
+
 class CExtendedForms {
   public:
-    // A form that a node of one grammar state shows: the child at fault, or -1.
-    struct CNodeForm {
-        const char* state;
-        CForm form;
-        Py_ssize_t (*find)(const CNode& node);
-    };
-
     // Without a version of two integers at least, nothing is newer.
     void SetVersion(nb::handle version_triple);
 
@@ -51,7 +73,8 @@ class CExtendedForms {
     }
 
   private:
-    static const std::vector<CNodeForm>& _NodeForms();
+    using CNodeForm = TRuleForm<CHostedFormNode>;
+
     void _Watch(int type, const CNodeForm* form);
 
     int _fVersion = INT32_MAX;
@@ -63,8 +86,8 @@ class CExtendedForms {
 
 template <class NumberOfState>
 void CExtendedForms::WatchStates(NumberOfState number_of_state) {
-    for (const CNodeForm& form : _NodeForms())
-        if (form.form.version > _fVersion) _Watch(number_of_state(form.state), &form);
+    for (const CNodeForm& form : kRuleForms<CHostedFormNode>)
+        if (form.form->version > _fVersion) _Watch(number_of_state(form.rule), &form);
 }
 
 }  // namespace codeloom

@@ -9,7 +9,7 @@
 
 #include "grammar/parse_tables.h"
 #include "syntax/node_kinds.h"
-#include "syntax/rule_forms.h"
+#include "syntax/tree_forms.h"
 #include "text/words.h"
 
 namespace codeloom {

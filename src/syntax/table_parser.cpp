@@ -78,8 +78,9 @@ CParsed CTableParser::Finish(const CLeafClasses& classes, uint32_t tail) {
 
 void CTableParser::_NoteRule(const CTreeNode& node) {
     const CRuleForm& rule_form = *_fGrammar.FormOfRule(node.symbol);
-    if (const CTreeNode* const child = rule_form.find(*_fTree, node))
-        _fForms.Note(*rule_form.form, child->token);
+    const int32_t child_i = rule_form.find({*_fTree, node});
+    if (child_i >= 0)
+        _fForms.Note(*rule_form.form, _fTree->Child(node, static_cast<uint32_t>(child_i)).token);
 }
 
 void CTableParser::_NoteLiteral(const CTreeNode& leaf) {
