@@ -11,11 +11,13 @@
 
 int main(int count, char** arguments) {
     size_t problem_count = 0;
+    codeloom::CFileSettings settings;
+    settings.wants_records = false;
     for (int i = 1; i < count; ++i) {
         std::string text(std::filesystem::file_size(arguments[i]), '\0');
         std::ifstream(arguments[i], std::ios::binary)
             .read(text.data(), static_cast<std::streamsize>(text.size()));
-        problem_count += codeloom::AnalyzeFile(text, {.wants_records = false}, {}).problems.size();
+        problem_count += codeloom::AnalyzeFile(text, settings, {}).problems.size();
     }
     std::cout << problem_count << " problems\n";
 }
