@@ -171,6 +171,41 @@ print(sys.path == path)
     assert RunPython(code) == "[]\nTrue\n"
 
 
+def test_pgen_is_imported_when_somebody_looks():
+    code = """
+import sys, codeloom.treesift as treesift
+analyzer = treesift.CPGenAnalyzerImpl((3, 8, 0))
+print("pgen" in dir(treesift), any("pgen2.pgen" in name for name in sys.modules))
+print(treesift.pgen.grammar.opmap["<>"], treesift.pgen is vars(treesift)["pgen"])
+try:
+    treesift.pgenn
+except AttributeError as error:
+    print(error)
+"""
+    no_attribute = "module 'codeloom.treesift' has no attribute 'pgenn'"
+    assert RunPython(code) == f"True False\n29 True\n{no_attribute}\n"
+
+
+def test_operators_are_those_of_a_pgen_that_was_looked_at():
+    code = """
+import codeloom.treesift as treesift
+treesift.pgen.grammar.opmap = {}
+try:
+    treesift.CPGenParserImpl((3, 8, 0))
+except Exception as error:
+    print(type(error).__name__)
+"""
+    assert RunPython(code) == "ValueError\n"
+
+
+def test_our_operators_are_those_of_the_interpreter():
+    from lib2to3_of_host import pgen
+
+    from codeloom._standins import pgen as standin
+
+    assert standin.grammar.opmap == pgen.grammar.opmap
+
+
 # Stubs
 
 

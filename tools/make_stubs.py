@@ -103,6 +103,9 @@ def native_stub(module: ModuleType) -> str:
     generator = StubGen(module=module, include_private=True)
     generator.put(module)
     tree = _KnownBases().visit(_AnnotationsOnly().visit(ast.parse(generator.get())))
+    # With them, every name would be taken for one of the module.
+    hooks = ("__getattr__", "__dir__")
+    tree.body = [part for part in tree.body if getattr(part, "name", None) not in hooks]
     text = ast.unparse(tree) + "\n"
     needed = [name for name in ("collections.abc", "typing") if f"{name}." in text]
     return HEADER + "".join(f"import {name}\n" for name in needed) + text

@@ -43,11 +43,38 @@ void ImportNeighbour(nb::module_& module, const char* name,
     module.attr(name) = nb::module_::import_(full_name.c_str());
 }
 
+// The interpreter's pgen module is imported when somebody first looks at it: that takes as long as all the
+// rest.
+nb::object TakePgen(const nb::str& name) {
+    if (!nb::str("pgen").equal(name))
+        throw nb::attribute_error(
+            nb::str("module 'codeloom.treesift' has no attribute '{}'").format(name).c_str());
+    nb::object pgen = nb::module_::import_("codeloom._loading").attr("ImportPgen")();
+    HomeModule().attr("pgen") = pgen;
+    return pgen;
+}
+
+void OfferPgen(nb::module_& module) {
+    module.def(
+        "__getattr__", &TakePgen, "name"_a, nb::sig("def __getattr__(name: str) -> ModuleType"),
+        "The module `pgen`, which is imported when it is first asked for. Raises AttributeError for any "
+        "other name.");
+    module.def(
+        "__dir__",
+        [] {
+            const nb::dict globals = nb::borrow<nb::dict>(HomeModule().attr("__dict__"));
+            nb::list names(globals);
+            if (!globals.contains("pgen")) names.append("pgen");
+            return names;
+        },
+        nb::sig("def __dir__() -> list[str]"), "The names in the module, `pgen` among them.");
+}
+
 // Modules whose functions are looked up at the call, as globals that a host or a test can replace.
-void ImportModules(nb::module_& module, nb::handle loading) {
+void ImportModules(nb::module_& module) {
     for (const char* name : {"keyword", "re", "sys", "token", "os", "time"})
         module.attr(name) = nb::module_::import_(name);
-    module.attr("pgen") = loading.attr("ImportPgen")();
+    OfferPgen(module);
     ImportNeighbour(module, "_fastaccess", {"__TimeFunc"});
     ImportNeighbour(module, "strutils");
     RequireNames("config", {"GetTarnFilename"});
@@ -107,7 +134,7 @@ void Load(nb::module_& module) {
     RequireNames("codeloom.optpgen", {"NodeConverter"});
     ImportNames(module);
     DefinePrimitives(module);
-    ImportModules(module, loading);
+    ImportModules(module);
     SetConstants(module);
     BindClasses(module);
 }

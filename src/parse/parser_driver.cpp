@@ -34,7 +34,8 @@ nb::dict TokenNames() {
 
 // Operator texts to token types: the interpreter's table and three operators that it lacks.
 nb::object OperatorTypes() {
-    nb::object types = HomeModule().attr("pgen").attr("grammar").attr("opmap").attr("copy")();
+    const nb::module_ loading = nb::module_::import_("codeloom._loading");
+    nb::object types = loading.attr("OperatorTypes")(HomeModule()).attr("copy")();
     types["..."] = static_cast<int>(kTokenId_ELLIPSIS);
     types["->"] = static_cast<int>(kTokenId_RARROW);
     types[":="] = static_cast<int>(kTokenId_COLONEQUAL);
