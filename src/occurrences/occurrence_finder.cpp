@@ -101,7 +101,8 @@ void COccurrenceFinder::_VisitInner(const CTreeNode& node) {
 }
 
 void COccurrenceFinder::_VisitChildren(const CTreeNode& node) {
-    for (const CTreeNode& child : _fTree->Children(node)) _Visit(child);
+    for (const CTreeNode& child : _fTree->Children(node))
+        if (!child.IsLeaf() || child.Is(ENodeKind::kExpression)) _Visit(child);  // most leaves are signs
 }
 
 void COccurrenceFinder::_VisitIn(uint32_t scope, const CTreeNode& node) {
@@ -192,7 +193,7 @@ void COccurrenceFinder::_VisitArgument(const CTreeNode& node) {
 void COccurrenceFinder::_VisitChain(const CChain& chain, ERole last_role) {
     if (chain.trailers.empty()) return _VisitTarget(*chain.atom, last_role);
     _Visit(*chain.atom);
-    const CSpan atom = SpanOf(*_fTree, *chain.atom);
+    const CSpan atom = chain.atom->IsLeaf() ? SpanOfLeaf(*_fTree, *chain.atom) : SpanOf(*_fTree, *chain.atom);
     const uint32_t start = atom.start + _fShift;
     uint32_t end = atom.end + _fShift;
     for (const CTreeNode& trailer : chain.trailers) {

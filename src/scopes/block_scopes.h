@@ -14,8 +14,21 @@ class CBlockScopes {
     // A header that begins at the byte opens the scope. Call in the order of the file.
     void Add(uint32_t header_start, uint32_t scope) { _fHeaders.push_back({header_start, scope}); }
 
-    // That of the innermost block whose header opens one; the module's, zero, for all others.
-    uint32_t ScopeOf(const std::vector<CBlock>& blocks) {
+    // That of the innermost block whose header opens one; the module's, zero, for all others. Call for every
+    // line from one of the module on.
+    uint32_t ScopeOf(const CBlockTracker& tracker) {
+        const std::vector<CBlock>& blocks = tracker.Blocks();
+        if (&blocks.back() == blocks.data()) return _fScope = 0;
+        return tracker.HaveChanged() ? _fScope = _Find(blocks) : _fScope;
+    }
+
+  private:
+    struct CHeader {
+        uint32_t start;
+        uint32_t scope;
+    };
+
+    uint32_t _Find(const std::vector<CBlock>& blocks) {
         for (const CBlock* block = &blocks.back(); block != blocks.data(); --block) {
             const EClause clause = block->clause;
             if (clause != EClause::kDef && clause != EClause::kAsyncDef && clause != EClause::kClass)
@@ -24,12 +37,6 @@ class CBlockScopes {
         }
         return 0;
     }
-
-  private:
-    struct CHeader {
-        uint32_t start;
-        uint32_t scope;
-    };
 
     const CHeader* _Find(uint32_t start) {
         if (_fLast < _fHeaders.size() && _fHeaders[_fLast].start == start) return &_fHeaders[_fLast];
@@ -42,7 +49,8 @@ class CBlockScopes {
     }
 
     std::vector<CHeader> _fHeaders;
-    size_t _fLast = 0;  // what is asked for next is most often the same
+    uint32_t _fScope = 0;  // of the line before
+    size_t _fLast = 0;     // what is asked for next is most often the same
 };
 
 }  // namespace codeloom

@@ -17,8 +17,7 @@ bool OpensScope(EClause clause) {
 void CNameCollector::BeginLine(const CRawLogical& line, const CBlockTracker& blocks) {
     const COccurrences& found = _fNames.occurrences;
     _fNames.lines.push_back({static_cast<uint32_t>(found.items.size()),
-                             static_cast<uint32_t>(found.scopes.size()), _fBlocks.ScopeOf(blocks.Blocks()),
-                             0});
+                             static_cast<uint32_t>(found.scopes.size()), _fBlocks.ScopeOf(blocks), 0});
     _fFinder.BeginLine(line);
 }
 
@@ -27,7 +26,8 @@ void CNameCollector::EndLine(const CRawLogical& line, bool has_fault, const CBlo
     _fFinder.EndLine(has_fault);
     if (line.type == ELogicalType::kComment) return;
     _fNames.lines.back().end = line.EndOf(line.tokens.back());
-    _fNames.lines.back().is_in_doubt = _fMayDeclareNames && blocks.IsInDoubt();
+    const bool has_names = _fNames.lines.back().first_occurrence < _fNames.occurrences.items.size();
+    _fNames.lines.back().is_in_doubt = _fMayDeclareNames && has_names && blocks.IsInDoubt();
     const CStatementHead& head = blocks.Head();
     if (has_fault) {
         opened = OpensScope(head.clause) ? _AddLostScope(line, head) : 0;

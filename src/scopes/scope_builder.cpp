@@ -67,8 +67,8 @@ class CScopeBuilder {
     const uint32_t _fSuper;
     const uint32_t _fClassCell;
     const uint32_t _fStar;
-    // By name. The first is empty in a text without classes.
-    std::vector<uint8_t> _fIsPrivate;
+    // By name.
+    std::vector<uint8_t> _fIsPrivate;      // of those that lines hold; in a text without classes none is
     std::vector<uint8_t> _fIsBoundAround;  // in a scope that those within it see
 };
 
@@ -114,15 +114,15 @@ void CScopeBuilder::_AddScopes() {
 void CScopeBuilder::_NotePrivateNames() {
     const bool has_class = std::any_of(_fScopes.scopes.begin(), _fScopes.scopes.end(),
                                        [](const CScope& scope) { return scope.kind == EScopeKind::kClass; });
-    if (!has_class) return;
     const CNameTable& names = *_fNames.occurrences.names;
     _fIsPrivate.resize(names.Count());
+    if (!has_class) return;
     for (uint32_t name = 0; name < names.Count(); ++name) _fIsPrivate[name] = IsPrivate(names.Text(name));
 }
 
 // The name as the class around mangles it.
 inline uint32_t CScopeBuilder::_Mangled(uint32_t name, uint32_t scope) {
-    return name < _fIsPrivate.size() && _fIsPrivate[name] != 0 ? _MangledByClass(name, scope) : name;
+    return _fIsPrivate[name] != 0 ? _MangledByClass(name, scope) : name;
 }
 
 // Around the body of a class with type parameters, these alone are mangled: by that class.
@@ -148,13 +148,13 @@ uint32_t CScopeBuilder::_MangledBy(const CScope& named, uint32_t name) {
 void CScopeBuilder::_AddOccurrences() {
     const TPlainArray<COccurrence>& items = _fNames.occurrences.items;
     _fScopes.symbol_of.Resize(items.size(), kNoIndex);
+    uint32_t* const symbol_of = _fScopes.symbol_of.data();
     for (size_t line_i = 0; line_i < _fNames.lines.size(); ++line_i) {
         const CLineNames& line = _fNames.lines[line_i];
         const uint32_t end = _fNames.FirstOccurrence(line_i + 1);
         for (uint32_t i = line.first_occurrence; i < end; ++i) {
-            if (!IsScoped(items[i].role)) continue;
-            const uint32_t scope = _fNames.ScopeOf(line, items[i].scope);
-            _fScopes.symbol_of[i] = _Add(items[i], scope);
+            const COccurrence& item = items[i];
+            if (IsScoped(item.role)) symbol_of[i] = _Add(item, _fNames.ScopeOf(line, item.scope));
         }
     }
 }
