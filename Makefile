@@ -12,7 +12,7 @@ SOURCES   := $(shell find src resources codeloom -type f -not -name '*.pyc') CMa
 CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
 STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
 
-.PHONY: run test ray docs package lint tidy format asan asan-short leaks fuzz bench bench-short build clean
+.PHONY: run test engines docs package lint tidy format asan asan-short leaks fuzz bench bench-short build clean
 
 build: $(STAMP)
 
@@ -80,10 +80,10 @@ asan: $(ASAN)/.built
 asan-short: $(ASAN)/.built
 	$(ASAN_RUN) -m pytest -q -m 'not slow'
 
-# An index by a cluster of Ray, which is too large to be installed for all tests.
-ray: build
-	$(BIN)/pip install --quiet "ray>=2.40"
-	$(BIN)/pytest tests/ray_index.py
+# Engines for many machines, which are too large to be installed for all tests. Spark needs Java.
+engines: build
+	$(BIN)/pip install --quiet "ray>=2.40" "pyspark>=4" "dask[dataframe]>=2025.1"
+	$(BIN)/pytest tests/ray_index.py tests/engine_recipes.py
 
 leaks: build
 	$(BIN)/python tests/leaks.py

@@ -1,6 +1,6 @@
 """An index by a cluster of Ray with two workers, one of which is killed in the middle.
 
-Not among the other tests, since Ray is large: `make ray` installs and runs it.
+Not among the other tests, since Ray is large: `make engines` installs and runs it.
 """
 
 import os
