@@ -3,7 +3,7 @@ import collections.abc
 import typing
 from collections.abc import Sequence
 import enum
-from typing import Any, Literal, Self
+from typing import Literal, Self
 
 class RecordKind(enum.Enum):
     """What a record says of its name; docs/records.md lists all kinds."""
@@ -132,7 +132,7 @@ class ScopeKind(enum.Enum):
 
 class Resolution(enum.Enum):
     """
-    Where a name is bound: in a scope of the text, nowhere in it as a builtin, perhaps by `import *` or on a line with a fault, or nowhere that can be seen.
+    Where a name is bound: in a scope of the text, nowhere in it as a builtin, perhaps (by `import *`, `exec` or `globals()`, or on a line with a fault), or nowhere that can be seen.
     """
     SCOPE = 'scope'
     BUILTIN = 'builtin'
@@ -172,7 +172,7 @@ class Range:
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     def __copy__(self) -> Self:
@@ -196,7 +196,7 @@ class Problem:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -256,7 +256,7 @@ class Line:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -309,7 +309,7 @@ class Record:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -367,7 +367,7 @@ class Limit:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -422,10 +422,10 @@ class Problems(Sequence[Problem]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -467,10 +467,10 @@ class Lines(Sequence[Line]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -512,10 +512,10 @@ class Records(Sequence[Record]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -557,10 +557,10 @@ class Limits(Sequence[Limit]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -582,7 +582,7 @@ class Scope:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -699,7 +699,7 @@ class Occurrence:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -804,10 +804,10 @@ class Occurrences(Sequence[Occurrence]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -849,10 +849,10 @@ class Scopes(Sequence[Scope]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -874,7 +874,7 @@ class Hint:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -963,7 +963,7 @@ class Signature:
     def __deepcopy__(self, memo: object) -> Self:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     @property
@@ -1034,10 +1034,10 @@ class Hints(Sequence[Hint]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -1079,10 +1079,10 @@ class Signatures(Sequence[Signature]):
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The items as a table, for libraries that know the Arrow C stream interface; docs/tables.md lists its columns. No other schema is made on request.
         """
@@ -1103,7 +1103,7 @@ class Table:
     def __len__(self) -> int:
         ...
 
-    def __arrow_c_stream__(self, requested_schema: object=None) -> typing.Any:
+    def __arrow_c_stream__(self, requested_schema: object=None) -> object:
         """
         The table as a stream of one batch. No other schema is made on request.
         """
@@ -1140,7 +1140,7 @@ class SourceBatch:
     def content(self, i: int) -> bytes | None:
         ...
 
-    def digest(self, i: int, hash: Any) -> str | None:
+    def digest(self, i: int, hash: object) -> str | None:
         """
         The hash of the content by a function of hashlib, in hexadecimal digits.
         """
@@ -1203,7 +1203,7 @@ class Analysis:
     def __repr__(self) -> str:
         ...
 
-    def __reduce__(self) -> tuple[Any, ...]:
+    def __reduce__(self) -> tuple[object, ...]:
         ...
 
     def __copy__(self) -> Self:

@@ -1,7 +1,5 @@
 # Made by tools/make_stubs.py; don't edit.
-import typing
 from collections.abc import Iterable, Sized
-from typing import Any
 kTokenId_ENDMARKER: int = 0
 kTokenId_NAME: int = 1
 kTokenId_NUMBER: int = 2
@@ -68,7 +66,7 @@ def GetTokenType(token: object, unused: object | None=None) -> int:
     The token type, an integer, of a token text (text or byte string): 1 for a name, 54 for what is no token.
     """
 
-def FindMatchOrCaseType(toks: tuple[typing.Any, ...], first: int, end: int) -> typing.Any:
+def FindMatchOrCaseType(toks: tuple[object, ...], first: int, end: int) -> str:
     """
     The logical type of the tokens from `first` up to `end`: kMatch or kCase when they form
     the header of such a statement (PEP 634), kUnknown when the word is a name.
@@ -119,23 +117,23 @@ class CLogicalLine:
     utils.GetLogicalsFromText makes them from source text.
     """
 
-    def __init__(self, type: object, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...], first_line: int=0, exp_logicals: tuple[typing.Any, ...]=(), tok_types: object | None=None) -> None:
+    def __init__(self, type: object, toks: tuple[object, ...], positions: tuple[object, ...], first_line: int=0, exp_logicals: tuple[object, ...]=(), tok_types: object | None=None) -> None:
         ...
 
     @property
-    def fType(self) -> typing.Any:
+    def fType(self) -> str:
         """The logical type, one of the constants of logicalline."""
 
     @property
-    def fToks(self) -> typing.Any:
+    def fToks(self) -> tuple[str, ...]:
         """Tuple of token texts; None for a removed token."""
 
     @property
-    def fTokTypes(self) -> typing.Any:
+    def fTokTypes(self) -> tuple[int, ...]:
         """Tuple of token types, one for each token."""
 
     @property
-    def fPositions(self) -> typing.Any:
+    def fPositions(self) -> tuple[tuple[int, int], ...]:
         """
         Tuple of (row, column): row from zero from the first row, column in UTF-8 bytes from zero.
         """
@@ -153,17 +151,17 @@ class CLogicalLine:
         """Number of tokens."""
 
     @property
-    def fTypeEquivs(self) -> typing.Any:
+    def fTypeEquivs(self) -> list[tuple[bytes, bytes]] | None:
         """
         List of (name, equiv) pairs of byte strings in order of arrival; None when there is none.
         """
 
     @property
-    def fArgTypeEquivs(self) -> typing.Any:
+    def fArgTypeEquivs(self) -> list[tuple[bytes, bytes]] | None:
         """The same for the arguments of a definition."""
 
     @property
-    def fOrigin(self) -> tuple[typing.Any, ...]:
+    def fOrigin(self) -> tuple[int, int]:
         """
         Where position (0, 0) is in the file, as (row, column in UTF-8 bytes), both from zero. Columns of row 0 count from it, columns of later rows from the start of the file's row.
         """
@@ -195,10 +193,10 @@ class CLogicalLine:
         Drop all that analysis has recorded on this logical and on its embedded logicals.
         """
 
-    def GetExpLogicals(self) -> typing.Any:
+    def GetExpLogicals(self) -> tuple[CLogicalLine, ...]:
         """The embedded logicals, a tuple in source order."""
 
-def GetLogicalsFromText(text: str) -> list[typing.Any]:
+def GetLogicalsFromText(text: str) -> list[CLogicalLine]:
     """
     The logical lines of a source text, a list of CLogicalLine. It never fails on what the text says:
     what isn't Python becomes tokens that the parser refuses, on the line where it is.
@@ -213,10 +211,10 @@ class ParseError(Exception):
         where it wasn't a token that was refused.
     """
 
-    def __init__(self, msg: typing.Any, type: typing.Any, value: typing.Any, context: typing.Any):
+    def __init__(self, msg: object, type: object, value: object, context: object):
         ...
 
-    def __str__(self) -> typing.Any:
+    def __str__(self) -> str:
         ...
 
 class Grammar:
@@ -225,13 +223,13 @@ class Grammar:
     """
 
     @property
-    def symbol2number(self) -> typing.Any:
+    def symbol2number(self) -> dict[str, int]:
         """
         Rule names to rule numbers: 256 for the start symbol, then the other names in order.
         """
 
     @property
-    def number2symbol(self) -> typing.Any:
+    def number2symbol(self) -> dict[int, str]:
         """Rule numbers to rule names."""
 
     def __repr__(self) -> str:
@@ -247,7 +245,7 @@ class ParserGenerator:
     with file, row and reason when it isn't a grammar.
     """
 
-    def __init__(self, grammar_file: object, tok_number2name: dict[typing.Any, typing.Any], op_text2number: dict[typing.Any, typing.Any]) -> None:
+    def __init__(self, grammar_file: object, tok_number2name: dict[object, object], op_text2number: dict[object, object]) -> None:
         ...
 
     def make_grammar(self) -> Grammar | None:
@@ -264,7 +262,7 @@ class NodeConverter:
     def __init__(self) -> None:
         ...
 
-    def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
+    def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> object:
         """
         Make the node of a token or of a rule; what it returns is what the rule above gets as a child.
 
@@ -297,7 +295,7 @@ class Parser:
         refuses. Raises RuntimeError when no parse is going on.
         """
 
-    def finish(self) -> typing.Any:
+    def finish(self) -> object:
         """
         The root of the parse, which is handed over: the parser keeps nothing of it.
 
@@ -335,7 +333,7 @@ class ParserImpl(Parser):
         refuses. Raises RuntimeError when no parse is going on.
         """
 
-    def finish(self) -> typing.Any:
+    def finish(self) -> object:
         """
         The root of the parse, which is handed over: the parser keeps nothing of it.
 
@@ -572,7 +570,7 @@ def _RecordKinds() -> tuple[tuple[str, bytes, int, str, str, str, str, str], ...
     and the record that it yields.
     """
 
-def _SymbolConstants() -> dict[str, Any]:
+def _SymbolConstants() -> dict[str, object]:
     """The constants of the vocabulary by name."""
 
 class CKindFilter:

@@ -298,7 +298,7 @@ class CPGenAnalyzer(codeloom._neighbours.NodeConverter):
     def __init__(self) -> None:
         ...
 
-    def AnalyzeSingleLogical(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool, first_in_def: bool=False) -> typing.Any:
+    def AnalyzeSingleLogical(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool, first_in_def: bool=False) -> SyntaxError | None:
         """
         Analyze a single logical and return any exception (typically
                SyntaxError, but can be other errors). Note that exception is only
@@ -314,7 +314,7 @@ class CNodeClassInfo:
         ...
 
     @property
-    def fCls(self) -> typing.Any:
+    def fCls(self) -> type[CNode]:
         """The node class to make for this state."""
 
     @property
@@ -322,7 +322,7 @@ class CNodeClassInfo:
         """Grammar state number or token type."""
 
     @property
-    def fName(self) -> typing.Any:
+    def fName(self) -> str | None:
         """Name of the state, such as "funcdef" or "NAME"; may be None."""
 
     @property
@@ -336,15 +336,15 @@ class CNode:
         ...
 
     @property
-    def fChildren(self) -> typing.Any:
+    def fChildren(self) -> list[CNode] | None:
         """List of child nodes in source order; None for a leaf."""
 
     @property
-    def fText(self) -> typing.Any:
+    def fText(self) -> str | None:
         """Token text; None for a non-terminal."""
 
     @property
-    def fContext(self) -> typing.Any:
+    def fContext(self) -> object:
         """Token index of the node's (first) token."""
 
     @property
@@ -380,7 +380,7 @@ class CNode:
 
     def _DoesChildTextMatch(self, text: str) -> bool:
         """True when a direct child's text equals `text`."""
-    kSupportedRules: list[typing.Any] = []
+    kSupportedRules: list[str] = []
 
 class CExpression(CNode):
     """Base class for all expressions."""
@@ -403,7 +403,7 @@ class CIfElseExpression(CExpression):
 
     def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class COperatorExpression(CExpression):
     """op T, T op T, T op T op T expressions."""
@@ -423,7 +423,7 @@ class COperatorExpression(CExpression):
         """
         The operand at `term_index`; None past the end. For `not a` it is `a`, whatever the index.
         """
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CStarExpression(CExpression):
     """*n used as an expression."""
@@ -433,14 +433,14 @@ class CStarExpression(CExpression):
 
     def GetStarredExpression(self) -> CExpression | None:
         """The expression after the star."""
-    kSupportedRules: list[typing.Any] = ["star_expr: '*' expr"]
+    kSupportedRules: list[str] = ["star_expr: '*' expr"]
 
 class CDottedName(CExpression):
     """a.b.c in decorators and imports."""
 
     def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
-    kSupportedRules: list[typing.Any] = ["dotted_name: NAME ('.' NAME)*"]
+    kSupportedRules: list[str] = ["dotted_name: NAME ('.' NAME)*"]
 
 class CLambdaExpr(CExpression):
     """Lambda."""
@@ -471,7 +471,7 @@ class CYieldExpr(CExpression):
 
     def IsYieldFrom(self) -> bool:
         """True for `yield from`."""
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CTestListStarExpr(CExpression):
     """Comma lists of expressions."""
@@ -494,7 +494,7 @@ class CTestListStarExpr(CExpression):
 
     def IsGenExpr(self) -> bool:
         """True for a comprehension, which is here without its brackets."""
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CAtomExpr(CExpression):
     """[await] atom trailer*."""
@@ -512,7 +512,7 @@ class CAtomExpr(CExpression):
 
     def GetTrailers(self) -> list[CNode]:
         """The trailers after the atom, as a new list."""
-    kSupportedRules: list[typing.Any] = ['atom_expr: [AWAIT] atom trailer*']
+    kSupportedRules: list[str] = ['atom_expr: [AWAIT] atom trailer*']
 
 class CPower(CExpression):
     """Atom, trailers and exponent."""
@@ -528,7 +528,7 @@ class CPower(CExpression):
 
     def GetExponentNode(self) -> CNode | None:
         """The exponent; None without `**`."""
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CFactorExpr(CExpression):
     """Unary +, -, ~."""
@@ -550,7 +550,7 @@ class CNamedExpr(CExpression):
 
     def GetRightHandExpression(self) -> CNode | None:
         """The expression after `:=`."""
-    kSupportedRules: list[typing.Any] = ["namedexpr_test: test [':=' test]"]
+    kSupportedRules: list[str] = ["namedexpr_test: test [':=' test]"]
 
 class CBinaryOp(CNode):
     """Declared, with no rule and no state."""
@@ -569,7 +569,7 @@ class CYieldArg(CNode):
 
     def IsYieldFrom(self) -> bool:
         """True for `yield from`."""
-    kSupportedRules: list[typing.Any] = ["yield_arg: 'from' test | testlist"]
+    kSupportedRules: list[str] = ["yield_arg: 'from' test | testlist"]
 
 class CCompForNode(CNode):
     """
@@ -604,7 +604,7 @@ class CListmakerNode(CNode):
         """
         The item at index `i`; None past the end, and for a comprehension. TypeError when it isn't a CExpression.
         """
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CTrailer(CNode):
     """(), [] or .name after an atom."""
@@ -678,7 +678,7 @@ class CNumberLiteral(CExpression):
         True when the text holds a point or an `e`, be it the digit of a hexadecimal number.
         """
 
-    def GetNumericValue(self) -> typing.Any:
+    def GetNumericValue(self) -> object:
         """
         The value of a decimal number; None for other bases, and whatever else the host's int() and float() refuse.
         """
@@ -700,7 +700,7 @@ class CStringLiteral(CExpression):
         The source between the quotes, escapes as written; up to the end of an unterminated literal.
         """
 
-    def GetStringValue(self) -> typing.Any:
+    def GetStringValue(self) -> object:
         """The value of the literal; None for an f-string."""
 
 class CArgInfo:
@@ -761,7 +761,7 @@ class CAsName:
         ...
 
     @property
-    def as_name(self) -> typing.Any:
+    def as_name(self) -> object:
         """The name after `as`; None without one."""
 
     @as_name.setter
@@ -857,14 +857,14 @@ class CFunctionParameterDef(CNode):
 
     def GetTypeExpr(self) -> CNode | None:
         """The annotation; None when there is none."""
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CDefiningArglistNode(CNode):
     """Parameter list of a definition."""
 
     def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
-    kSupportedRules: list[typing.Any] = ["fplist: fpdef (',' fpdef)* [',']"]
+    kSupportedRules: list[str] = ["fplist: fpdef (',' fpdef)* [',']"]
 
 class CUsedArglistNode(CNode):
     """Argument list of a call."""
@@ -924,7 +924,7 @@ class CIfStmt(CStmt):
 
     def GetTestExpression(self) -> CExpression | None:
         """The condition of the first branch."""
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CMatchStmt(CStmt):
     """Match statement."""
@@ -962,7 +962,7 @@ class CDelStmt(CStmt):
         """
         A new list of the expressions that are deleted. One in brackets is a single expression.
         """
-    kSupportedRules: list[typing.Any] = ["del_stmt: 'del' exprlist"]
+    kSupportedRules: list[str] = ["del_stmt: 'del' exprlist"]
 
 class CGlobalStmt(CStmt):
     """Global statement."""
@@ -1040,7 +1040,7 @@ class CAnnotatedAssignNode(CNode):
 
     def GetPostEqualsTestExpr(self) -> CNode | None:
         """The value after `=`; None for a bare annotation."""
-    kSupportedRules: list[typing.Any] = ["annassign: ':' test ['=' test]"]
+    kSupportedRules: list[str] = ["annassign: ':' test ['=' test]"]
 
 class CExprStmt(CStmt):
     """Expression, assignment and annotated assignment."""
@@ -1106,14 +1106,14 @@ class CSingleDecorator(CNode):
 
     def GetUsedArgList(self) -> list[CArgInfo]:
         """A new list of CArgInfo, one for each argument; empty without any."""
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CMultipleDecorators(CNode):
     """A decorator list."""
 
     def __init__(self, cls_info: CNodeClassInfo | None=None) -> None:
         ...
-    kSupportedRules: list[typing.Any] = ['decorators: decorator+']
+    kSupportedRules: list[str] = ['decorators: decorator+']
 
 class CExceptClause(CNode):
     """Except clause."""
@@ -1126,7 +1126,7 @@ class CExceptClause(CNode):
 
     def GetTarget(self) -> CNode | None:
         """What the exception is bound to; None when it isn't."""
-    kSupportedRules: list[typing.Any] = ...
+    kSupportedRules: list[str] = ...
 
 class CTypeParameter(CNode):
     """
@@ -1185,11 +1185,11 @@ class CNodeFactory:
         ...
 
     @property
-    def _fOperatorStrToNumber(self) -> typing.Any:
+    def _fOperatorStrToNumber(self) -> object:
         """Operator text to token type."""
 
     @property
-    def _fClassInfoList(self) -> list[typing.Any]:
+    def _fClassInfoList(self) -> list[object]:
         """The class records by node type, as a new list."""
 
     def ConvertSingleNode(self, type: int, text: object | None, context: object | None, children: object | None) -> CNode | None:
@@ -1215,7 +1215,7 @@ class CNodeFactory:
     def DiscardNodes(self, node: object | None) -> None:
         """Give the tree under `node` back to the free lists."""
 
-    def RecursiveConvert(self, raw: tuple[typing.Any, ...]) -> CNode | None:
+    def RecursiveConvert(self, raw: tuple[object, ...]) -> CNode | None:
         """Convert a raw tree of (type, text, context, children) tuples."""
 
 def DropSimpleParens(node: CNode) -> CNode:
@@ -1283,7 +1283,7 @@ def FinishedWithNode(node: object | None) -> None:
 def NotCompiledFinishedWithNode(node: CNode) -> None:
     """The same as FinishedWithNode, for hosts."""
 
-def CreateSyntaxError(msg: object | None, logical: object, context: object | None, pos_info_in_tok: object | None=None) -> typing.Any:
+def CreateSyntaxError(msg: object | None, logical: object, context: object | None, pos_info_in_tok: object | None=None) -> SyntaxError:
     """
     Create a SyntaxError exception instance for an error occuring at the
        given token index of the logical
@@ -1302,12 +1302,12 @@ class CMatchCaseStatementParser:
         The index in [start, end) of the token text `tok` outside brackets; -1 when there is none.
         """
 
-    def _RemoveSkipToks(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> tuple[typing.Any, ...]:
+    def _RemoveSkipToks(self, toks: tuple[object, ...], positions: tuple[object, ...]) -> tuple[object, ...]:
         """
         The tokens without comments and line continuations, and their positions: a pair of tuples.
         """
 
-    def ParseMatchStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
+    def ParseMatchStmt(self, toks: tuple[object, ...], positions: tuple[object, ...]) -> CNode | None:
         """
         The CMatchStmt of a logical line, given as tuples of token texts and (row, column) positions; None when it is no `match` statement (PEP 634). ParseError on a bad subject.
         """
@@ -1315,7 +1315,7 @@ class CMatchCaseStatementParser:
     def _ParseMatchStmtImpl(self) -> CNode | None:
         """ParseMatchStmt for the tokens of the line under way."""
 
-    def ParseCaseStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
+    def ParseCaseStmt(self, toks: tuple[object, ...], positions: tuple[object, ...]) -> CNode | None:
         """
         The CCaseStmt of a logical line, given as tuples of token texts and (row, column) positions; None when it is no `case` statement (PEP 634). ParseError on a bad pattern, guard or body.
         """
@@ -1346,7 +1346,7 @@ class CMatchCaseStatementParser:
     def _NodeForMappingPattern(self, start_i: int, end_i: int) -> CNode | None:
         """The CSequencePatternNode of a mapping in braces."""
 
-    def _ParseExceptionAt(self, error_i: int) -> typing.Any:
+    def _ParseExceptionAt(self, error_i: int) -> Exception:
         """
         A ParseError at the token `error_i`, with the token's position as context; not raised here.
         """
@@ -1358,7 +1358,7 @@ class CPGenParserImpl(CPGenAnalyzer):
         ...
 
     @property
-    def _fVersionTriple(self) -> typing.Any:
+    def _fVersionTriple(self) -> object:
         """The Python version analysed, a tuple."""
 
     @property
@@ -1371,7 +1371,7 @@ class CPGenParserImpl(CPGenAnalyzer):
     def _fMatchCaseStatementParser(self) -> CMatchCaseStatementParser | None:
         """Parses `match` and `case` statements; a CMatchCaseStatementParser."""
 
-    def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
+    def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> object:
         """
         Make the node of a token or of a rule; what it returns is what the rule above gets as a child.
 
@@ -1381,7 +1381,7 @@ class CPGenParserImpl(CPGenAnalyzer):
         returns the tuple (type, value, context, children).
         """
 
-    def _BuildClsForStateList(self) -> list[typing.Any]:
+    def _BuildClsForStateList(self) -> list[object]:
         """
         The list that gives the node class for each token type and grammar state. Updates kClsForState.
         """
@@ -1398,57 +1398,57 @@ class CPGenParserImpl(CPGenAnalyzer):
     def ParseToksToNode(self, toks: object, in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """ParseToNode for a tuple of tokens and their positions."""
 
-    def _ParseToksToNodeImpl(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
+    def _ParseToksToNodeImpl(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """Parse by the grammar alone, without the special cases."""
 
-    def _FindNextNonSkipIndex(self, toks: tuple[typing.Any, ...], index: int) -> int:
+    def _FindNextNonSkipIndex(self, toks: tuple[object, ...], index: int) -> int:
         """
         The first index beyond `index` whose token is neither removed nor empty, comment or
         backslash; the token count when there is none.
         """
 
-    def _NonNestedFindTokenIndex(self, target: object, toks: tuple[typing.Any, ...], start: int, end: int) -> int:
+    def _NonNestedFindTokenIndex(self, target: object, toks: tuple[object, ...], start: int, end: int) -> int:
         """
         The index in [start, end) of the token `target` outside brackets; -1 when there is none.
         """
 
-    def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
+    def _ParseSpecialCases(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """
         The node of a statement that is parsed by hand; None for the ordinary road.
         """
 
-    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `with` whose items are in parentheses, with `i` the index of `with`; None when they aren't.
         """
 
-    def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseExceptStar(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.
         """
 
-    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of
         its keyword; None for the ordinary road.
         """
 
-    def _NodesForTypeParameters(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> list[typing.Any]:
+    def _NodesForTypeParameters(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> list[object]:
         """
         The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors`
         malformed parameters are dropped.
         """
 
-    def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:
+    def _CreateSingleTypeParameterNode(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:
         """The node of the one type parameter in [start, end), or None."""
 
     def _RaiseParseError(self, tok_i: object) -> None:
         """Raise a ParseError at a token index."""
 
-    def ParseTokenListToNode(self, toks: list[typing.Any], in_async_def: bool=False) -> CNode | None:
+    def ParseTokenListToNode(self, toks: list[object], in_async_def: bool=False) -> CNode | None:
         """ParseToNode for a list of token texts, without the special cases."""
 
-    def _AddTokenList(self, toks: list[typing.Any], tok_i: int) -> None:
+    def _AddTokenList(self, toks: list[object], tok_i: int) -> None:
         """Feed each token text to the parser, all with the context `tok_i`."""
 
     def _ShouldSkipSlash(self, tok_i: int, positions: tuple[tuple[int, int], ...] | None) -> bool:
@@ -1458,17 +1458,17 @@ class CPGenParserImpl(CPGenAnalyzer):
                after testing token is a slash.
         """
 
-    def GetTypeParameterNodes(self, toks: tuple[typing.Any, ...]) -> list[typing.Any]:
+    def GetTypeParameterNodes(self, toks: tuple[object, ...]) -> list[CNode]:
         """
         Get type parameters defined in toks. Tries to ignore parse errors
                and get all names if possible
         """
-    kClsForState: dict[typing.Any, typing.Any] = ...
+    kClsForState: dict[str, type[CNode]] = ...
 
 class CNodeWalker:
     """Records what a logical line does with names."""
 
-    def __init__(self, version_triple: tuple[typing.Any, ...]) -> None:
+    def __init__(self, version_triple: tuple[object, ...]) -> None:
         ...
 
     @property
@@ -1706,13 +1706,13 @@ class CDispatchWalker:
         """The logical being walked; None between walks."""
 
     @property
-    def _fDispatchDict(self) -> typing.Any:
+    def _fDispatchDict(self) -> object:
         """
         The dispatch dictionary: exact node class to a callable of (walker, node), or to False. A change counts from the next node on.
         """
 
     @property
-    def _fNodeStack(self) -> list[typing.Any]:
+    def _fNodeStack(self) -> list[object]:
         """The nodes from the root to the one now visited, as a new list."""
 
     def Walk(self, node: CNode | None, logical: codeloom._neighbours.CLogicalLine, first_in_def: bool) -> None:
@@ -1760,10 +1760,10 @@ class CTypeHintWalker(CDispatchWalker):
         Walk the tree. This can raise SyntaxError in cases where code parses but is rejected because it's ambiguous. ValueError while a walk is under way.
         """
 
-    def _VisitFuncdefStmt(self, node: CFuncdefStmt) -> typing.Any:
+    def _VisitFuncdefStmt(self, node: CFuncdefStmt) -> object:
         """Record the hints of a def's arguments and of what it returns."""
 
-    def _RewriteFuncdefCommentHint(self, hint: str) -> tuple[list[typing.Any], list[typing.Any]]:
+    def _RewriteFuncdefCommentHint(self, hint: str) -> tuple[list[object], list[object]]:
         """
         Rewrite the function hint in a comment so that it parses: the tokens of a `def` with dummy names, and for each the offset to report a syntax error at.
         """
@@ -1778,13 +1778,13 @@ class CTypeHintWalker(CDispatchWalker):
         Record the hint in a comment immediately after an argument and its comma.
         """
 
-    def _VisitForStmt(self, node: CForStmt) -> typing.Any:
+    def _VisitForStmt(self, node: CForStmt) -> object:
         """Record the comment hint of a `for` for its target."""
 
-    def _VisitWithStmt(self, node: CWithStmt) -> typing.Any:
+    def _VisitWithStmt(self, node: CWithStmt) -> object:
         """Record the comment hint of a `with` for the target of each item."""
 
-    def _VisitExprStmt(self, node: CExprStmt) -> typing.Any:
+    def _VisitExprStmt(self, node: CExprStmt) -> object:
         """Record the annotation or the comment hint of an assignment."""
 
     def _ProcessTarget(self, node: CNode, target: CNode | None) -> None:
@@ -1858,16 +1858,16 @@ class CPGenAnalyzerImpl(CPGenAnalyzer):
         The node of a logical's statement, or None. ParseError on a token that the grammar refuses.
         """
 
-    def ParseTokenListToNode(self, logical: list[typing.Any], in_async_def: bool=False) -> CNode | None:
+    def ParseTokenListToNode(self, logical: list[object], in_async_def: bool=False) -> CNode | None:
         """The same for a list of token texts, without the special cases."""
 
-    def GetTypeParameterNodes(self, toks: tuple[typing.Any, ...]) -> list[typing.Any]:
+    def GetTypeParameterNodes(self, toks: tuple[object, ...]) -> list[CNode]:
         """
         Get type parameters defined in toks. Tries to ignore parse errors
                and get all names if possible
         """
 
-    def AnalyzeSingleLogical(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool, first_in_def: bool=False) -> typing.Any:
+    def AnalyzeSingleLogical(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool, first_in_def: bool=False) -> SyntaxError | None:
         """
         Analyze a single logical and return any exception (typically
                SyntaxError, but can be other errors). Note that exception is only
@@ -1893,12 +1893,12 @@ class CExtendedMatchCaseParser(CMatchCaseStatementParser):
     def __init__(self, pgen_parser: CPGenParserImpl | None) -> None:
         ...
 
-    def _RemoveSkipToks(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> tuple[typing.Any, ...]:
+    def _RemoveSkipToks(self, toks: tuple[object, ...], positions: tuple[object, ...]) -> tuple[object, ...]:
         """
         The tokens without comments and line continuations, and their positions: a pair of tuples.
         """
 
-    def ParseMatchStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
+    def ParseMatchStmt(self, toks: tuple[object, ...], positions: tuple[object, ...]) -> CNode | None:
         """
         The CMatchStmt of a logical line, given as tuples of token texts and (row, column) positions; None when it is no `match` statement (PEP 634). ParseError on a bad subject.
         """
@@ -1906,7 +1906,7 @@ class CExtendedMatchCaseParser(CMatchCaseStatementParser):
     def _ParseMatchStmtImpl(self) -> CNode | None:
         """ParseMatchStmt for the tokens of the line under way."""
 
-    def ParseCaseStmt(self, toks: tuple[typing.Any, ...], positions: tuple[typing.Any, ...]) -> CNode | None:
+    def ParseCaseStmt(self, toks: tuple[object, ...], positions: tuple[object, ...]) -> CNode | None:
         """
         The CCaseStmt of a logical line, given as tuples of token texts and (row, column) positions; None when it is no `case` statement (PEP 634). ParseError on a bad pattern, guard or body.
         """
@@ -1927,7 +1927,7 @@ class CExtendedParser(CPGenParserImpl):
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: bool=True) -> None:
         ...
 
-    def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> typing.Any:
+    def convert(self, grammar: object | None, type: int, value: object | None, context: object | None, children: object | None) -> object:
         """
         Make the node of a token or of a rule; what it returns is what the rule above gets as a child.
 
@@ -1937,7 +1937,7 @@ class CExtendedParser(CPGenParserImpl):
         returns the tuple (type, value, context, children).
         """
 
-    def _BuildClsForStateList(self) -> list[typing.Any]:
+    def _BuildClsForStateList(self) -> list[object]:
         """
         The list that gives the node class for each token type and grammar state. Updates kClsForState.
         """
@@ -1948,37 +1948,37 @@ class CExtendedParser(CPGenParserImpl):
         refuses. Give it back with DiscardNode.
         """
 
-    def _ParseToksToNodeImpl(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
+    def _ParseToksToNodeImpl(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """Parse by the grammar alone, without the special cases."""
 
-    def _ParseSpecialCases(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
+    def _ParseSpecialCases(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None) -> CNode | None:
         """
         The node of a statement that is parsed by hand; None for the ordinary road.
         """
 
-    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseParenthesizedWith(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `with` whose items are in parentheses, with `i` the index of `with`; None when they aren't.
         """
 
-    def _ParseSpecialCaseExceptStar(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseExceptStar(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         An `except*` clause (PEP 654), with `i` the index of `except`; None for another `except`.
         """
 
-    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
+    def _ParseSpecialCaseWithTypeParameter(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, i: int) -> CNode | None:
         """
         A `type`, `def` or `class` statement with type parameters (PEP 695), with `i` the index of
         its keyword; None for the ordinary road.
         """
 
-    def _NodesForTypeParameters(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> list[typing.Any]:
+    def _NodesForTypeParameters(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> list[object]:
         """
         The CTypeParameter nodes between the brackets at `start` and `end`. Without `raise_errors`
         malformed parameters are dropped.
         """
 
-    def _CreateSingleTypeParameterNode(self, toks: tuple[typing.Any, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:
+    def _CreateSingleTypeParameterNode(self, toks: tuple[object, ...], in_async_def: bool, positions: tuple[tuple[int, int], ...] | None, start: int, end: int, raise_errors: bool) -> CNode | None:
         """The node of the one type parameter in [start, end), or None."""
 
 class CExtendedAnalyzer(CPGenAnalyzerImpl):
@@ -1987,7 +1987,7 @@ class CExtendedAnalyzer(CPGenAnalyzerImpl):
     def __init__(self, version_triple: object | None, grammar_file: object='Python-Grammar-3.14', keyword_seq: object | None=None, py3_grammar: bool=True, hint_grammar_file: object='Python-Grammar-3.14') -> None:
         ...
 
-    def AnalyzeSingleLogical(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool, first_in_def: bool=False) -> typing.Any:
+    def AnalyzeSingleLogical(self, logical: codeloom._neighbours.CLogicalLine, in_async_def: bool, first_in_def: bool=False) -> SyntaxError | None:
         """
         Analyze a single logical and return any exception (typically
                SyntaxError, but can be other errors). Note that exception is only

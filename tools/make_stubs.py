@@ -19,8 +19,34 @@ NATIVE_MODULES = ("_analysis", "_neighbours", "treesift")
 COMPUTING_MODULES = ("_fastaccess", "logicalline", "symbolinfo")
 HEADER = "# Made by tools/make_stubs.py; don't edit.\n"
 # What a container of the host holds where a signature doesn't say.
-UNTOLD = {"list": "typing.Any", "tuple": "typing.Any, ...", "dict": "typing.Any, typing.Any"}
-ANYTHING = ast.parse("typing.Any", mode="eval").body
+UNTOLD = {"list": "object", "tuple": "object, ...", "dict": "object, object"}
+# What comes out where a signature leaves it open, by the name of the member. Nothing is `Any`, since a
+# user's checker would check nothing that is made of it.
+KNOWN_RESULTS = {
+    "AnalyzeSingleLogical": "SyntaxError | None",
+    "CreateSyntaxError": "SyntaxError",
+    "FindMatchOrCaseType": "str",
+    "GetExpLogicals": "tuple[CLogicalLine, ...]",
+    "GetLogicalsFromText": "list[CLogicalLine]",
+    "GetTypeParameterNodes": "list[CNode]",
+    "__str__": "str",
+    "_ParseExceptionAt": "Exception",
+    "fArgTypeEquivs": "list[tuple[bytes, bytes]] | None",
+    "fChildren": "list[CNode] | None",
+    "fCls": "type[CNode]",
+    "fName": "str | None",
+    "fOrigin": "tuple[int, int]",
+    "fPositions": "tuple[tuple[int, int], ...]",
+    "fText": "str | None",
+    "fToks": "tuple[str, ...]",
+    "fTokTypes": "tuple[int, ...]",
+    "fType": "str",
+    "fTypeEquivs": "list[tuple[bytes, bytes]] | None",
+    "kClsForState": "dict[str, type[CNode]]",
+    "kSupportedRules": "list[str]",
+    "number2symbol": "dict[int, str]",
+    "symbol2number": "dict[str, int]",
+}
 
 
 class _ItemTypes(ast.NodeTransformer):
@@ -43,30 +69,44 @@ class _ItemTypes(ast.NodeTransformer):
 
 
 class _AnnotationsOnly(ast.NodeTransformer):
-    """Does so in annotations, and leaves it open what a host object that comes out can do."""
+    """Does so in annotations, and says of a host object that comes out what is known of it."""
 
     def visit_arg(self, node: ast.arg) -> ast.AST:
+        self.generic_visit(node)
         if node.arg != "self":
-            node.annotation = _ItemTypes().visit(node.annotation or ANYTHING)
+            node.annotation = _ItemTypes().visit(node.annotation or ast.Name("object"))
         return node
 
     def visit_AnnAssign(self, node: ast.AnnAssign) -> ast.AST | None:
         if ast.unparse(node.target) == "__class__":  # as every object has it
             return None
-        node.annotation = self._ResultType(node.annotation)
+        self.generic_visit(node)
+        node.annotation = self._ResultType(ast.unparse(node.target), node.annotation)
         return node
 
     def visit_FunctionDef(self, node: ast.FunctionDef) -> ast.AST:
         self.generic_visit(node)
-        if node.name != "__init__":
-            node.returns = self._ResultType(node.returns)
+        is_setter = bool(node.decorator_list) and ast.unparse(node.decorator_list[0]).endswith(".setter")
+        if node.name != "__init__" and not is_setter:
+            node.returns = self._ResultType(node.name, node.returns)
         return node
 
-    def _ResultType(self, node: ast.expr | None) -> ast.expr:
-        if node is None or ast.unparse(node) == "object":
-            return ANYTHING
-        known: ast.expr = _ItemTypes().visit(node)
+    def _ResultType(self, name: str, node: ast.expr | None) -> ast.expr:
+        said = "object" if node is None else ast.unparse(node)
+        if name in KNOWN_RESULTS and said in ("object", *UNTOLD):
+            return ast.parse(KNOWN_RESULTS[name], mode="eval").body
+        known: ast.expr = _ItemTypes().visit(node or ast.Name("object"))
         return known
+
+    def visit_Attribute(self, node: ast.Attribute) -> ast.AST:
+        return ast.Name("object") if ast.unparse(node) == "typing.Any" else node
+
+    def visit_Name(self, node: ast.Name) -> ast.AST:
+        return ast.Name("object") if node.id == "Any" else node
+
+    def visit_ImportFrom(self, node: ast.ImportFrom) -> ast.AST | None:
+        node.names = [alias for alias in node.names if alias.name != "Any"]
+        return node if node.names else None
 
 
 # What a sequence has without its class saying so, by the type of its items.
