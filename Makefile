@@ -1,6 +1,6 @@
 # make run     set up what is missing, build, and check the examples and the interpreter's own library
 # make test    set up what is missing, build, and run all tests
-# The rest: docs, package, lint, tidy, format, asan, leaks, fuzz, bench, bench-short, clean.
+# The rest: docs, package, lint, tidy, format, asan, leaks, fuzz, edits, bench, bench-short, clean.
 
 # Another host has an environment of its own: make test PYTHON=python3.13
 PYTHON ?= python3.11
@@ -12,7 +12,7 @@ SOURCES   := $(shell find src resources codeloom -type f -not -name '*.pyc') CMa
 CXX_FILES := $(shell find src tests -name '*.h' -o -name '*.cpp')
 STDLIB     = $(shell $(BIN)/python -c "import sysconfig; print(sysconfig.get_path('stdlib'))")
 
-.PHONY: run test engines docs package lint tidy format asan asan-short leaks fuzz bench bench-short build clean
+.PHONY: run test engines docs package lint tidy format asan asan-short leaks fuzz edits bench bench-short build clean
 
 build: $(STAMP)
 
@@ -90,6 +90,10 @@ leaks: build
 
 fuzz: build
 	$(BIN)/python tests/fuzz.py --seconds $(or $(SECONDS),60) $(SEED:%=--seed %)
+
+# A document against the analysis of its text, after each of so many edits.
+edits: build
+	$(BIN)/python tests/document_edits.py --edits $(or $(EDITS),100000) $(SEED:%=--seed %)
 
 bench: build
 	$(BIN)/pip install --quiet --group benchmark

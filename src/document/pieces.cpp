@@ -34,6 +34,25 @@ void Move(CRawLogical& line, uint32_t shift) {
     for (CRawToken& token : line.tokens) token.start += shift;
 }
 
+void Move(CStatementHead& head, uint32_t shift) {
+    if (head.start == head.end) return;
+    head.start += shift;
+    head.end += shift;
+}
+
+void Move(CBlock& block, uint32_t shift) {
+    Move(block.header, shift);
+    Move(block.previous, shift);
+    for (CSpan* const span : {&block.takes_all, &block.full_header}) {
+        if (span->start == span->end) continue;
+        span->start += shift;
+        span->end += shift;
+    }
+    if (block.bare_except_start == block.bare_except_end) return;
+    block.bare_except_start += shift;
+    block.bare_except_end += shift;
+}
+
 // The problems of pieces, one piece after the other, without those that follow from others.
 class CJoinedProblems {
   public:
@@ -96,6 +115,9 @@ CPiecePtr MakePiece(CFilePart part, uint32_t start, const CPartState& state) {
     piece->scanned_in_vain = part.scanned_in_vain;
     piece->repeated_text = part.repeated_text;
     piece->has_asked_for_literals = part.has_asked_for_literals;
+    piece->closed = std::move(part.closed);
+    for (CBlock& block : piece->closed) Move(block, -start);
+    piece->may_have_reopened = part.may_have_reopened;
     piece->needs_whole_text = part.needs_whole_text;
     return piece;
 }
@@ -140,6 +162,8 @@ class CPieceWork final : CPartEnd {
   private:
     bool EndsAt(uint32_t start, const CPartState& state, size_t line_count) override;
     uint32_t _AnalyzeFrom(uint32_t start, CPartState state);
+    CFilePart _AnalyzePart(uint32_t start, const CPartState& state);
+    std::vector<CBlock> _ClosedBefore() const;
     bool _IsSame() const;
     void _SkipOldBefore(uint32_t start);
     uint32_t _PlaceOfOld() const;
@@ -182,7 +206,8 @@ void CPieceWork::MakeFrom(const CPieces& old, const CTextEdit& edit) {
 bool CPieceWork::_IsSame() const {
     const CPiece& piece = *_fOld->_fPieces[_fOld_i];
     if (_fHasOtherLiterals && piece.has_asked_for_literals) return false;
-    return _fOldStart > _fEdit.end || _fOldStart + piece.looked_at < _fEdit.start;
+    return (_fOldStart > _fEdit.end && !piece.may_have_reopened) ||
+           _fOldStart + piece.looked_at < _fEdit.start;
 }
 
 // Makes pieces from `start` on up to the end of the text or to an old piece that is the same; gives its
@@ -190,7 +215,7 @@ bool CPieceWork::_IsSame() const {
 uint32_t CPieceWork::_AnalyzeFrom(uint32_t start, CPartState state) {
     _fHasMetOld = false;
     do {
-        CFilePart part = AnalyzePart(_fText, _fMade._fSettings, _fLiteralNames, start, state, *this);
+        CFilePart part = _AnalyzePart(start, state);
         const uint32_t end = part.end;
         CPartState next = part.state;
         _fMade._fPieces.push_back(MakePiece(std::move(part), start, state));
@@ -199,6 +224,34 @@ uint32_t CPieceWork::_AnalyzeFrom(uint32_t start, CPartState state) {
     } while (start < _fText.size() && !_fHasMetOld);
     if (!_fHasMetOld && _fOld != nullptr) _fOld_i = _fOld->_fPieces.size();
     return start;
+}
+
+// What was closed before matters for few pieces.
+CFilePart CPieceWork::_AnalyzePart(uint32_t start, const CPartState& state) {
+    const size_t old_i = _fOld_i;
+    const uint32_t old_start = _fOldStart;
+    CFilePart part = AnalyzePart(_fText, _fMade._fSettings, _fLiteralNames, start, state, {}, *this);
+    if (!part.may_have_reopened) return part;
+    _fOld_i = old_i;
+    _fOldStart = old_start;
+    _fHasMetOld = false;
+    return AnalyzePart(_fText, _fMade._fSettings, _fLiteralNames, start, state, _ClosedBefore(), *this);
+}
+
+// By depth the last block that the pieces so far have closed.
+std::vector<CBlock> CPieceWork::_ClosedBefore() const {
+    std::vector<CBlock> closed;
+    uint32_t start = 0;
+    for (const CPiecePtr& piece : _fMade._fPieces) {
+        if (closed.size() < piece->closed.size()) closed.resize(piece->closed.size());
+        for (size_t i = 0; i < piece->closed.size(); ++i) {
+            if (piece->closed[i].indent.column == 0) continue;
+            closed[i] = piece->closed[i];
+            Move(closed[i], start);
+        }
+        start += piece->length;
+    }
+    return closed;
 }
 
 bool CPieceWork::EndsAt(uint32_t start, const CPartState& state, size_t line_count) {
@@ -249,7 +302,7 @@ std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text, bool wants
     CJoinedProblems problems(text);
     uint32_t start = 0;
     for (const CPiecePtr& piece : _fPieces) {
-        if (piece->needs_whole_text) return {};
+        if (piece->needs_whole_text || (wants_names && piece->may_have_reopened)) return {};
         scanned_in_vain += piece->scanned_in_vain;
         repeated_text += piece->repeated_text;
         const auto first_line = static_cast<uint32_t>(analysis->lines.size());

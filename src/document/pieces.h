@@ -36,6 +36,8 @@ struct CPiece {
     size_t scanned_in_vain = 0;
     size_t repeated_text = 0;
     bool has_asked_for_literals = false;
+    std::vector<CBlock> closed;
+    bool may_have_reopened = false;
     bool needs_whole_text = false;
     mutable std::unique_ptr<const CPieceNames> names;  // once they have been asked for
 };

@@ -76,7 +76,8 @@ class CFileAnalyzer final : CTreeObserver {
         : CFileAnalyzer(text, settings, kAllReadable, {}, declares_names, declares_names, literal_names) {}
 
     CFileAnalysis Run();
-    CFilePart RunPart(uint32_t start, const CPartState& state, CPartEnd& part_end);
+    CFilePart RunPart(uint32_t start, const CPartState& state, std::vector<CBlock> closed,
+                      CPartEnd& part_end);
 
     // True after a run that saw too few names for the declarations that are there.
     bool NeedsAllNames() const { return _fNeedsAllNames; }
@@ -189,10 +190,11 @@ CFileAnalysis CFileAnalyzer::Run() {
 
 // Parts of a text
 
-CFilePart CFileAnalyzer::RunPart(uint32_t start, const CPartState& state, CPartEnd& part_end) {
+CFilePart CFileAnalyzer::RunPart(uint32_t start, const CPartState& state, std::vector<CBlock> closed,
+                                 CPartEnd& part_end) {
     _fIsPart = true;
     _fPartStart = start;
-    _fChecker.Resume(state.check);
+    _fChecker.Resume(state.check, std::move(closed));
     if (state.has_print_function) _TakePrintFunction();
     _fDefersAnnotations = state.defers_annotations;
     if (_fNames) _fNames->SetDefersAnnotations(state.defers_annotations);
@@ -245,8 +247,11 @@ CFilePart CFileAnalyzer::_EndPart(const CLexer& lexer, uint32_t end, uint32_t lo
     part.scanned_in_vain = lexer.ScannedInVain();
     part.repeated_text = _fLength.RepeatedText();
     part.has_asked_for_literals = _fFalseHints.HasAskedForLiterals();
-    part.needs_whole_text =
-        _fNeedsAllNames || _fIsFileTooLong || (_fPartStart > 0 && _fChecker.Blocks().MayHaveReopened());
+    const CBlockTracker& blocks = _fChecker.Blocks();
+    part.closed = blocks.Closed();
+    part.may_have_reopened = _fPartStart > 0 && blocks.MayHaveReopened();
+    part.needs_whole_text = _fNeedsAllNames || _fIsFileTooLong || blocks.TakenBackFrom() < _fPartStart ||
+                            (part.may_have_reopened && _fHasTellingNames);
     part.analysis = std::move(_fResult);
     return part;
 }
@@ -454,14 +459,15 @@ CFileAnalysis AnalyzeFile(std::string_view text, const CFileSettings& settings,
 }
 
 CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
-                      uint32_t start, const CPartState& state, CPartEnd& part_end) {
+                      uint32_t start, const CPartState& state, const std::vector<CBlock>& closed,
+                      CPartEnd& part_end) {
     CFileSettings quick = settings;
     quick.wants_records = quick.wants_names = false;
     CFileAnalyzer analyzer(text, quick, literal_names, false);
-    CFilePart part = analyzer.RunPart(start, state, part_end);
+    CFilePart part = analyzer.RunPart(start, state, closed, part_end);
     if (!analyzer.HasTellingNames()) return part;
     CEndAt same_end(part.end);
-    return CFileAnalyzer(text, quick, literal_names, true).RunPart(start, state, same_end);
+    return CFileAnalyzer(text, quick, literal_names, true).RunPart(start, state, closed, same_end);
 }
 
 CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& settings,
@@ -471,7 +477,7 @@ CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& setting
     with_names.wants_records = false;
     with_names.wants_names = true;
     CEndAt same_end(end);
-    return CFileAnalyzer(text, with_names, literal_names, true).RunPart(start, state, same_end);
+    return CFileAnalyzer(text, with_names, literal_names, true).RunPart(start, state, {}, same_end);
 }
 
 bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text) {

@@ -51,15 +51,19 @@ struct CFilePart {
     size_t scanned_in_vain = 0;
     size_t repeated_text = 0;
     bool has_asked_for_literals = false;  // which the whole text says
+    std::vector<CBlock> closed;           // blocks, as CBlockTracker gives them
+    bool may_have_reopened = false;       // a block, which may have been closed before
     // What it says depends on more of the text before than its state: only an analysis of the whole text is
     // right.
     bool needs_whole_text = false;
 };
 
 // Requires: as for AnalyzeFile, and `start` is zero or where another part has ended, with its state. Settings
-// that ask for records or names aren't regarded.
+// that ask for records or names aren't regarded. `closed` are the blocks that were closed before, with their
+// places in the text; they matter only for a part that may have reopened one.
 CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
-                      uint32_t start, const CPartState& state, CPartEnd& part_end);
+                      uint32_t start, const CPartState& state, const std::vector<CBlock>& closed,
+                      CPartEnd& part_end);
 
 // The same up to a known end, with names, signatures and hints besides.
 CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& settings,

@@ -212,10 +212,8 @@ void CBlockTracker::_OpenOdd(const CIndent& indent) {
     CBlock& top = _Top();
     top.may_follow_anything = true;
     const int32_t header_depth = top.indent.column;
-    const auto closed = std::find_if(_fClosed.rbegin(), _fClosed.rend(), [&](const CBlock& block) {
-        return block.indent.column == indent.column;
-    });
-    if (closed != _fClosed.rend() && indent.column > header_depth) {
+    const CBlock* const closed = _FindClosed(indent.column);
+    if (closed != nullptr && indent.column > header_depth) {
         CBlock reopened = *closed;
         reopened.may_follow_anything = true;
         reopened.is_unknown = true;
@@ -228,6 +226,16 @@ void CBlockTracker::_OpenOdd(const CIndent& indent) {
     _Open(indent, EClause::kSimple, true);
     _Top().header_depth = header_depth;
     _Top().has_mixed_tabs = true;  // which may be what is odd
+}
+
+const CBlock* CBlockTracker::_FindClosed(int32_t column) const {
+    for (size_t i = std::max(_fClosed.size(), _fClosedBefore.size()); i-- > 0;) {
+        const bool is_own = i < _fClosed.size() && _fClosed[i].indent.column != 0;
+        if (!is_own && i >= _fClosedBefore.size()) continue;
+        const CBlock& block = is_own ? _fClosed[i] : _fClosedBefore[i];
+        if (block.indent.column == column) return &block;
+    }
+    return nullptr;
 }
 
 void CBlockTracker::_PlaceOut(const CIndent& indent) {
@@ -488,7 +496,8 @@ CModuleState CBlockTracker::State() const {
     return state;
 }
 
-void CBlockTracker::Resume(const CModuleState& state) {
+void CBlockTracker::Resume(const CModuleState& state, std::vector<CBlock> closed) {
+    _fClosedBefore = std::move(closed);
     _fBlocks = {state.module};
     _fAreInDoubt = state.module.is_in_doubt;
     _fHasTooMany = state.has_too_many;
@@ -497,6 +506,7 @@ void CBlockTracker::Resume(const CModuleState& state) {
 
 // A header that was moved out of its block is what statements in it were blamed for.
 void CBlockTracker::_DropPlacementSince(uint32_t start) {
+    _fTakenBackFrom = std::min(_fTakenBackFrom, start);
     std::erase_if(_fProblems, [start](const CProblem& problem) {
         return IsPlacement(problem.code) && problem.start >= start;
     });

@@ -106,10 +106,14 @@ class CBlockTracker {
     // now on but for what State says, and for the blocks that it may reopen.
     bool BeginsAnew() const;
     CModuleState State() const;
-    // Goes on from there, at a line that begins anew.
-    void Resume(const CModuleState& state);
-    // Some line may have reopened any block that was closed before.
+    // Goes on from there, at a line that begins anew. `closed` are the blocks that were closed before.
+    void Resume(const CModuleState& state, std::vector<CBlock> closed);
+    // The blocks that were closed since, by depth of the stack the last one; at column 0 where there is none.
+    const std::vector<CBlock>& Closed() const { return _fClosed; }
+    // Some line has looked at what was closed, before too.
     bool MayHaveReopened() const { return _fMayHaveReopened; }
+    // Problems from this byte on were taken back.
+    uint32_t TakenBackFrom() const { return _fTakenBackFrom; }
 
   private:
     static constexpr size_t kMostIndents = 100;  // of the interpreter
@@ -121,6 +125,7 @@ class CBlockTracker {
     void _PlaceOut(const CIndent& indent);
     void _Open(const CIndent& indent, EClause clause, bool is_unknown);
     void _OpenOdd(const CIndent& indent);
+    const CBlock* _FindClosed(int32_t column) const;
     void _CloseTo(size_t count);
     void _ReportMissingBlock(uint32_t start, uint32_t end);
     bool _CheckTabs(const CIndent& indent);
@@ -143,9 +148,10 @@ class CBlockTracker {
     CProblems& _fProblems;
     std::string_view _fText;  // of the file
     std::vector<CBlock> _fBlocks;
-    std::vector<CBlock> _fClosed;  // by depth of the stack, the last block left there
-    CStatementHead _fHead;         // of the line entered last
-    CSpan _fTakesAll;              // in it
+    std::vector<CBlock> _fClosed;        // by depth of the stack, the last block left there
+    std::vector<CBlock> _fClosedBefore;  // the same before a part of the text
+    CStatementHead _fHead;               // of the line entered last
+    CSpan _fTakesAll;                    // in it
     bool _fHaveChanged = false;
     bool _fIsMidRow = false;
     bool _fHasPlaceProblem = false;
@@ -156,6 +162,7 @@ class CBlockTracker {
     bool _fHasTooMany = false;
     bool _fHasTooManyFrames = false;
     bool _fMayHaveReopened = false;
+    uint32_t _fTakenBackFrom = UINT32_MAX;
 };
 
 }  // namespace codeloom

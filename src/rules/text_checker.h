@@ -45,8 +45,8 @@ class CTextChecker final : public CTreeObserver {
 
     // As it was before the line that was entered last, which begins anew; and to go on from there.
     CCheckState State() const { return {_fBlocks.State(), _fPlacement.Beginning()}; }
-    void Resume(const CCheckState& state) {
-        _fBlocks.Resume(state.blocks);
+    void Resume(const CCheckState& state, std::vector<CBlock> closed) {
+        _fBlocks.Resume(state.blocks, std::move(closed));
         _fPlacement.Resume(state.beginning);
     }
 
