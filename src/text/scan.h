@@ -90,13 +90,28 @@ inline size_t SkipSpaces(std::string_view text, size_t pos) {
     return pos;
 }
 
+namespace scan {
+
+// Row ends are among the lowest bytes, which are rare in text. Not zero when one of the eight is that low;
+// only the lowest bit that is set is sure to be one.
+inline uint64_t LowBytes(uint64_t bytes) {
+    constexpr uint64_t kAfterRowEnds = ('\r' + 1) * kEachByte;
+    return (bytes - kAfterRowEnds) & ~bytes & kHighBits;
+}
+
+}  // namespace scan
+
+// The start of the row that holds `pos`.
+inline size_t RowStart(std::string_view text, size_t pos) {
+    while (pos >= scan::kStep && scan::LowBytes(scan::Load(text, pos - scan::kStep)) == 0) pos -= scan::kStep;
+    while (pos > 0 && !IsRowEnd(text[pos - 1])) --pos;
+    return pos;
+}
+
 // The end of the row that holds `pos`, its row end left out.
 inline size_t FindRowEnd(std::string_view text, size_t pos) {
-    // Row ends are among the lowest bytes, which are rare in text.
-    constexpr uint64_t kBehindRowEnds = ('\r' + 1) * scan::kEachByte;
     while (pos + scan::kStep <= text.size()) {
-        const uint64_t bytes = scan::Load(text, pos);
-        const uint64_t low = (bytes - kBehindRowEnds) & ~bytes & scan::kHighBits;
+        const uint64_t low = scan::LowBytes(scan::Load(text, pos));
         if (low == 0) {
             pos += scan::kStep;
             continue;

@@ -53,7 +53,7 @@ bool EndsBeforeString(std::string_view text) {
     const size_t last = SkipBack(text, end);
     if (last == 0) return false;
     const char c = text[last - 1];
-    const bool is_on_row = RowStart(text, last) == RowStart(text, end);
+    const bool is_on_row = FindRowEnd(text.substr(0, end), last) == end;
     if (c == ':') return is_on_row || EndsLikeHeader(text, last);
     if (std::string_view("([{,+%|&\\").find(c) != std::string_view::npos) return true;
     size_t word = last;

@@ -27,11 +27,6 @@ struct CTokenRow {
     bool IsWhole() const { return start != SIZE_MAX; }
 };
 
-inline size_t RowStart(std::string_view text, size_t pos) {
-    while (pos > 0 && !IsRowEnd(text[pos - 1])) --pos;
-    return pos;
-}
-
 // The indentation of the row that `pos` lies in.
 inline int32_t RowIndent(std::string_view text, size_t pos) {
     CPlace place{RowStart(text, pos), 0, 0, 0};
