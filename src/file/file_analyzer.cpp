@@ -102,7 +102,6 @@ class CFileAnalyzer final : CTreeObserver {
           _fWantsAllNames(settings.wants_names || wants_all_names),
           _fSignatures(_fResult.signatures) {
         if (settings.names) _fResult.records.names = settings.names;
-        if (settings.names) _fResult.records.names = settings.names;
         _fResult.names.occurrences.names = _fResult.records.names;
         if (settings.wants_names || _fMayDeclareNames)
             _fNames.emplace(LanguageOf(settings.version), _fMayDeclareNames, _fResult.names);
