@@ -108,9 +108,9 @@ bool CTokenizer::_CollectTokens(CRawLogical& logical, size_t forced_end) {
     _fBrackets.Clear();
     for (;;) {
         size_t pos = _fPlace.pos;
-        while (ByteAt(text, pos) == ' ') ++pos;
+        char c = ByteAt(text, pos);
+        while (c == ' ') c = ByteAt(text, ++pos);
         _fPlace.pos = pos;
-        const char c = ByteAt(text, pos);
         switch (ByteKind(c)) {
             case EByteKind::kNameStart:
                 _AddName(logical, text);
@@ -172,7 +172,7 @@ CTokenizer::EStep CTokenizer::_SkipRows(const CRawLogical& logical, size_t force
 inline void CTokenizer::_Add(CRawLogical& logical, size_t end, int16_t type, EWord word) {
     const auto start = static_cast<uint32_t>(_fPlace.pos);
     const CPosition position{_fPlace.row - logical.first_row, _fPlace.Column()};
-    logical.tokens.push_back({start, static_cast<uint32_t>(end) - start, position, type, word});
+    logical.tokens.emplace_back(start, static_cast<uint32_t>(end) - start, position, type, word);
     _fPlace.pos = end;
 }
 
