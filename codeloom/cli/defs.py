@@ -1,4 +1,4 @@
-"""What `codeloom hints` tells of a def: its arguments as they are written, and what its body gives back."""
+"""What `codeloom hints` says of a def: its arguments as they are written, and what its body gives back."""
 
 import ast
 from collections.abc import Iterator
@@ -54,7 +54,7 @@ class Def:
     """One def that is sound.
 
     `name` is that of the def after those of the classes and defs around it, `range` that of its header.
-    Where the parameters are nested too deep to be told, as only those of Python 2 can be, `arguments` is
+    Where the parameters are nested too deep to be shown, as only those of Python 2 can be, `arguments` is
     None.
     """
 

@@ -12,7 +12,7 @@ from codeloom.reading.source import source_from_bytes, source_from_text
 # The names of all tables but `files`, which is always there.
 TABLES = tuple(name for name, _, _ in table_kinds())
 
-# Larger files, and files that take longer, are told of in `files` alone.
+# Larger files, and files that take longer, are in `files` alone.
 MOST_BYTES = 10_000_000
 MOST_SECONDS = 10.0
 

@@ -1,4 +1,4 @@
-"""Problems as the client shows them: told by the server, or asked for by the client."""
+"""Problems as the client shows them: published by the server, or asked for by the client."""
 
 import asyncio
 from collections.abc import Sequence
@@ -31,7 +31,7 @@ def register(server: "Server") -> None:
     )
     def diagnostic(params: types.DocumentDiagnosticParams) -> types.DocumentDiagnosticReport:
         document = server.documents[params.text_document.uri]
-        items = diagnostics_of(document, server.publisher.told(document))
+        items = diagnostics_of(document, server.publisher.due(document))
         identity = result_id(items)
         if identity == params.previous_result_id:
             return types.RelatedUnchangedDocumentDiagnosticReport(identity)
@@ -39,7 +39,7 @@ def register(server: "Server") -> None:
 
 
 class Publisher:
-    """Tells clients that don't ask."""
+    """Publishes problems to clients that don't ask."""
 
     def __init__(self, server: "Server") -> None:
         self._server = server
@@ -56,23 +56,23 @@ class Publisher:
         return self._is_asked
 
     def show(self, document: OpenDocument) -> None:
-        """Tell the problems of a text."""
+        """Publish the problems of a text."""
         if not self.is_asked:
-            self.tell(document.uri, diagnostics_of(document, self.told(document)), document.version)
+            self.publish(document.uri, diagnostics_of(document, self.due(document)), document.version)
 
-    def told(self, document: OpenDocument) -> Sequence[Finding]:
-        """The problems that are told now; where others wait, they are told when nobody types any more."""
-        findings, told = document.findings, document.told
-        if len(told) == len(findings) or not self._can_wait():
+    def due(self, document: OpenDocument) -> Sequence[Finding]:
+        """The problems to show now; where others wait, they are shown when nobody types any more."""
+        findings, due = document.findings, document.due
+        if len(due) == len(findings) or not self._can_wait():
             return findings
         if (timer := self._timers.get(document.uri)) is not None:
             timer.cancel()
         loop = asyncio.get_running_loop()
         self._timers[document.uri] = loop.call_later(SECONDS, self.settle, document)
-        return told
+        return due
 
     def settle(self, document: OpenDocument) -> None:
-        """Tell what has waited: nobody types any more."""
+        """Show what has waited: nobody types any more."""
         if (timer := self._timers.pop(document.uri, None)) is None:
             return
         timer.cancel()
@@ -83,19 +83,19 @@ class Publisher:
             self.show(document)
 
     def _can_wait(self) -> bool:
-        """False for a client that asks, and can't be told to ask again."""
+        """False for a client that asks, and can't be made to ask again."""
         of_workspace = self._server.client_capabilities.workspace
         of_diagnostics = of_workspace.diagnostics if of_workspace is not None else None
         return not self.is_asked or bool(of_diagnostics is not None and of_diagnostics.refresh_support)
 
     def clear(self, document: OpenDocument) -> None:
-        """Tell that a text has none any more."""
+        """Take back the problems of a text."""
         if (timer := self._timers.pop(document.uri, None)) is not None:
             timer.cancel()
-        self.tell(document.uri, [])
+        self.publish(document.uri, [])
 
-    def tell(self, uri: str, items: Sequence[types.Diagnostic], version: int | None = None) -> None:
-        """Tell the diagnostics of any text."""
+    def publish(self, uri: str, items: Sequence[types.Diagnostic], version: int | None = None) -> None:
+        """Publish the diagnostics of any text, unless the client asks for them."""
         if self.is_asked:
             return
         self._server.text_document_publish_diagnostics(types.PublishDiagnosticsParams(uri, items, version))

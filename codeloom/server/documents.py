@@ -73,9 +73,9 @@ class OpenDocument(PlacedText):
         return self.settings.passed(_OpenSource(self.path, self.analysis, self.rows))
 
     @property
-    def told(self) -> Sequence[Finding]:
+    def due(self) -> Sequence[Finding]:
         """Those of the problems that don't wait for the end of the typing."""
-        return self.patience.told(self.findings, self.rows)
+        return self.patience.due(self.findings, self.rows)
 
     def edit(self, change: types.TextDocumentContentChangeEvent) -> None:
         """Change the text as the client has; JsonRpcInvalidParams for a place that it doesn't have."""

@@ -28,7 +28,7 @@ def register(server: "Server") -> None:
 
 
 class _Folds:
-    """The folds of a text, line by line; rows count from 1 until they are told."""
+    """The folds of a text, line by line; rows count from 1 until they are sent."""
 
     def __init__(self) -> None:
         self._found: list[tuple[int, int, types.FoldingRangeKind | None]] = []

@@ -1,4 +1,4 @@
-"""How a client's session begins, and what it tells of files and settings."""
+"""How a client's session begins, and what it reports of files and settings."""
 
 import os
 from typing import TYPE_CHECKING

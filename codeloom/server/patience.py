@@ -1,4 +1,4 @@
-"""What isn't told yet: problems elsewhere that are there only because somebody is in the middle of typing.
+"""What isn't shown yet: problems elsewhere that are there only because somebody is in the middle of typing.
 
 A header without its body, a bracket that is closed three rows further down, a text in triple quotes: while
 they are typed, rows above and beneath them are broken too. Such problems wait until the typing goes on
@@ -11,7 +11,7 @@ from collections.abc import Callable, Sequence
 from codeloom.cli.items import Finding
 from codeloom.server.rows import Place, Rows
 
-# How long nobody types until all is told.
+# How long nobody types until all is shown.
 SECONDS = 0.75
 
 _Key = tuple[str, str, str]
@@ -28,7 +28,7 @@ class Patience:
     def before_edit(
         self, start: Place, end: Place, findings: Callable[[], Sequence[Finding]], rows: Rows
     ) -> None:
-        """An edit follows; what is found now stays told when it begins a new piece of typing."""
+        """An edit follows; what is found now stays shown when it begins a new piece of typing."""
         if self._row is None or not start[0] <= self._row <= end[0]:
             self._known = Counter(_key(finding, rows) for finding in findings())
 
@@ -41,18 +41,18 @@ class Patience:
         """Nobody types any more."""
         self._row = None
 
-    def told(self, findings: Sequence[Finding], rows: Rows) -> Sequence[Finding]:
+    def due(self, findings: Sequence[Finding], rows: Rows) -> Sequence[Finding]:
         """The problems that don't wait."""
         if self._row is None or not findings:
             return findings
-        known, told = Counter(self._known), []
+        known, due = Counter(self._known), []
         for finding in findings:
             key = _key(finding, rows)
             is_typed = finding.range.row <= self._row + 1 <= finding.range.end_row
             if is_typed or known[key] > 0:
-                told.append(finding)
+                due.append(finding)
                 known[key] -= 1
-        return told
+        return due
 
 
 def _key(finding: Finding, rows: Rows) -> _Key:

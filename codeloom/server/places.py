@@ -8,7 +8,7 @@ from codeloom.server.units import Units
 
 
 class PlacedText:
-    """A text whose places are told to the client, which counts from zero in its own units."""
+    """A text whose places are sent to the client, which counts from zero in its own units."""
 
     def __init__(self, uri: str, rows: Rows, units: Units) -> None:
         self.uri = uri

@@ -72,7 +72,7 @@ class Protocol(LanguageServerProtocol):
             raise type(error)(f"the parameters of {method} aren't as the protocol says") from None
 
     def _refuse(self, message: Any, error: JsonRpcException) -> None:
-        """Tell the client: by an answer to what asks for one, else by a row in its log."""
+        """Report to the client: by an answer to what asks for one, else by a row in its log."""
         is_message = isinstance(message, dict) and not message.keys().isdisjoint(_MARKS)
         if not is_message or ("id" in message and "method" in message):
             answer = {"code": error.code, "message": error.message}

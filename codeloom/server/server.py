@@ -1,4 +1,4 @@
-"""The server: its documents, what it tells of by itself, and the features."""
+"""The server: its documents, what it reports by itself, and the features."""
 
 from collections.abc import Iterable
 from typing import Any
@@ -42,7 +42,7 @@ class Server(LanguageServer):
         """The client has opened a text."""
         document = self.documents.open(item)
         self.closed_files.opened(document)
-        self._tell_faults([document])
+        self._report_faults([document])
         self.publisher.show(document)
 
     def changed(self, params: types.DidChangeTextDocumentParams) -> None:
@@ -65,7 +65,7 @@ class Server(LanguageServer):
     def settings_changed(self) -> None:
         """A file of settings has changed, or may have."""
         self.documents.read_settings_anew()
-        self._tell_faults(self.documents)
+        self._report_faults(self.documents)
         self.closed_files.begin()
         for document in self.documents:
             self.publisher.show(document)
@@ -80,7 +80,7 @@ class Server(LanguageServer):
         """Write into the client's log."""
         self.window_log_message(types.LogMessageParams(kind, text))
 
-    def _tell_faults(self, documents: Iterable[OpenDocument]) -> None:
+    def _report_faults(self, documents: Iterable[OpenDocument]) -> None:
         """Show why settings aren't taken, each time once."""
         for fault in dict.fromkeys(document.settings.fault for document in documents):
             if fault is not None:

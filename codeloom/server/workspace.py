@@ -107,10 +107,10 @@ class ClosedFiles:
             task.add_done_callback(self._looks.discard)
 
     def opened(self, document: "OpenDocument") -> None:
-        """A file is open now, and the client is told of it as such."""
+        """A file is open now, and its problems are published as such."""
         known = self._by_path.pop(document.path, None)
         if known is not None and known.uri != document.uri and known.items:
-            self._server.publisher.tell(known.uri, [])
+            self._server.publisher.publish(known.uri, [])
 
     async def reports(self, known: Mapping[str, str]) -> list[types.WorkspaceDocumentDiagnosticReport]:
         """What has changed since the client has known of the files; waits until something has."""
@@ -194,7 +194,7 @@ class ClosedFiles:
             return
         self._by_path[path] = new
         if new.items or old is not None:
-            self._server.publisher.tell(new.uri, new.items)
+            self._server.publisher.publish(new.uri, new.items)
             waiting, self._waiting = self._waiting, []
             for change in waiting:
                 if not change.done():
@@ -212,7 +212,7 @@ def _some(found: "Iterator[str | OSError]") -> list[str | OSError]:
 
 
 def _watch(server: "Server") -> None:
-    """Ask the client to tell of files that change, if it can be asked."""
+    """Ask the client to report files that change, if it can be asked."""
     of_workspace = server.client_capabilities.workspace
     watching = of_workspace.did_change_watched_files if of_workspace is not None else None
     if watching is None or not watching.dynamic_registration:
