@@ -46,6 +46,14 @@ def records(sources: Iterable[bytes]) -> None:
         _ = analyze(source).records
 
 
+def occurrences(sources: Iterable[bytes]) -> None:
+    """Every appearance of a name, with its role, its place and its scope."""
+    from codeloom import analyze
+
+    for source in sources:
+        _ = analyze(source).occurrences
+
+
 def objects(sources: Iterable[bytes]) -> None:
     """The same, each record an object whose name, kind and place are looked at."""
     from codeloom import analyze
@@ -103,6 +111,7 @@ OURS: dict[str, Workload] = {
     "line by line": line_by_line,
     "problems": problems,
     "records": records,
+    "occurrences": occurrences,
     "objects": objects,
 }
 PEERS: dict[str, Workload] = {
