@@ -79,6 +79,18 @@ inline size_t SkipNameBytes(std::string_view text, size_t pos) {
     return FindByte<kContinuesName, false>(text, pos);
 }
 
+// The length of a name at `pos`, as far as it is ASCII, when it and the byte after it lie within the next
+// sixteen bytes, and these within the text; zero for all others.
+inline size_t ShortNameLength([[maybe_unused]] std::string_view text, [[maybe_unused]] size_t pos) {
+#ifdef __SSE2__
+    if (pos + scan::kWideStep <= text.size()) {
+        const unsigned others = ~scan::NameBytes(text.data() + pos) & 0xFFFFu;
+        if (others != 0) return static_cast<size_t>(std::countr_zero(others));
+    }
+#endif
+    return 0;
+}
+
 // The first position from `pos` on that isn't a space.
 inline size_t SkipSpaces(std::string_view text, size_t pos) {
     constexpr uint64_t kSpaces = ' ' * scan::kEachByte;

@@ -144,12 +144,18 @@ constexpr EWord WordOf(std::string_view text) {
     return words::kTable.Find(words::KeyOf(text));
 }
 
-// The same for a part of a text, which isn't empty.
+// The same for a part of a text, which isn't empty. Requires eight bytes from `pos` on.
+inline EWord WordInside(std::string_view text, size_t pos, size_t length) {
+    if (length > words::kLongest) return EWord::kNone;
+    const uint64_t key = scan::Load(text, pos) & (~uint64_t{0} >> (64 - 8 * length));
+    return words::kTable.Find(key);
+}
+
+// The same wherever it is.
 inline EWord WordOfPart(std::string_view text, size_t pos, size_t length) {
     if (length > words::kLongest) return EWord::kNone;
     if (pos + scan::kStep > text.size()) return WordOf(text.substr(pos, length));
-    const uint64_t key = scan::Load(text, pos) & (~uint64_t{0} >> (64 - 8 * length));
-    return words::kTable.Find(key);
+    return WordInside(text, pos, length);
 }
 
 static_assert(WordOf("while") == EWord::kWhile && WordOf("whale") == EWord::kNone);

@@ -178,13 +178,21 @@ inline void CTokenizer::_Add(CRawLogical& logical, size_t end, int16_t type, EWo
 
 inline void CTokenizer::_AddName(CRawLogical& logical, std::string_view text) {
     const size_t pos = _fPlace.pos;
+    if (const size_t length = ShortNameLength(text, pos); length != 0) [[likely]] {
+        if (HasTrait(text[pos + length], kMayContinueName)) [[unlikely]]
+            return _AddToken(logical);
+        return _AddWord(logical, length, WordInside(text, pos, length));
+    }
     const size_t end = SkipNameBytes(text, pos);
-    if (HasTrait(ByteAt(text, end), kMayContinueName)) [[unlikely]]
-        return _AddToken(logical);
-    const EWord word = WordOfPart(text, pos, end - pos);
-    _Add(logical, end, kTokenId_NAME, word);
+    if (HasTrait(ByteAt(text, end), kMayContinueName)) return _AddToken(logical);
+    _AddWord(logical, end - pos, WordOfPart(text, pos, end - pos));
+}
+
+inline void CTokenizer::_AddWord(CRawLogical& logical, size_t length, EWord word) {
+    const size_t pos = _fPlace.pos;
+    _Add(logical, pos + length, kTokenId_NAME, word);
     _fFacts.words |= WordBits(word);
-    if (end - pos == kDebugName.size() && text[pos] == '_') [[unlikely]]
+    if (length == kDebugName.size() && _fLexer.Text()[pos] == '_') [[unlikely]]
         _fFacts.words |= kDebugNameBit;
     if (word == EWord::kLambda) [[unlikely]]
         _NoteLambda();

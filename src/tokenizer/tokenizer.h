@@ -66,6 +66,7 @@ class CTokenizer {
     EStep _SkipRows(const CRawLogical& logical, size_t forced_end);
     void _Add(CRawLogical& logical, size_t end, int16_t type, EWord word);
     void _AddName(CRawLogical& logical, std::string_view text);
+    void _AddWord(CRawLogical& logical, size_t length, EWord word);
     void _AddOperator(CRawLogical& logical, std::string_view text);
     void _AddToken(CRawLogical& logical);
     void _Note(size_t pos, CLexedToken token);
