@@ -7,6 +7,7 @@
 
 #include "face/bind_items.h"
 #include "face/document.h"
+#include "face/settings.h"
 #include "host/text.h"
 
 namespace nb = nanobind;
@@ -31,11 +32,8 @@ void BindDocument(nb::module_& module) {
         "__init__",
         [](CDocument* self, nb::str text, nb::str path, nb::str python, int version, bool false_hints,
            std::string_view encoding) {
-            CFileSettings settings;
-            settings.version = version;
-            settings.false_hints = false_hints;
-            new (self)
-                CDocument(std::move(text), std::move(path), std::move(python), settings, UnitOf(encoding));
+            new (self) CDocument(std::move(text), std::move(path), std::move(python),
+                                 SettingsFor(version, false_hints), UnitOf(encoding));
         },
         "text"_a, "path"_a, "python"_a, "version"_a, "false_hints"_a, "encoding"_a);
     document.def_prop_ro(

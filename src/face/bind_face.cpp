@@ -12,8 +12,8 @@
 #include "face/bind_names.h"
 #include "face/items.h"
 #include "face/kinds.h"
+#include "face/settings.h"
 #include "face/source_batch.h"
-#include "host/errors.h"
 #include "host/refuse_new.h"
 #include "host/text.h"
 
@@ -26,11 +26,8 @@ namespace {
 
 CAnalysis MakeAnalysis(nb::bytes utf8, nb::str path, nb::str python, int version, bool false_hints,
                        nb::list faults, nb::list unreadable) {
-    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
-    CFileSettings settings;
-    settings.version = version;
-    settings.false_hints = false_hints;
-    return {std::make_shared<const CSourceFile>(std::move(utf8), std::move(path), std::move(python), settings,
+    return {std::make_shared<const CSourceFile>(std::move(utf8), std::move(path), std::move(python),
+                                                SettingsFor(version, false_hints),
                                                 UnreadableOf(faults, unreadable))};
 }
 

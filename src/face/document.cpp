@@ -10,10 +10,6 @@ namespace codeloom {
 
 namespace {
 
-bool CanBeAnalyzed(std::string_view text) {
-    return text.find('\0') == std::string_view::npos && IsUtf8(text);
-}
-
 CPlainFile Spliced(std::string_view before, std::string_view between, std::string_view after) {
     CPlainFile joined;
     joined.size = before.size() + between.size() + after.size();
@@ -38,7 +34,6 @@ CDocument::CDocument(nb::str text, nb::str path, nb::str python, const CFileSett
       _fSettings(settings),
       _fUnit(unit),
       _fRows(CUtf8(text)) {
-    _fSettings.wants_records = _fSettings.wants_names = false;
     CSourceFile::MakeLanguages(settings.version);
     const CUtf8 utf8(text);
     _Take(Spliced(utf8, {}, {}), {});
@@ -61,7 +56,7 @@ std::pair<CRange, CRange> CDocument::Edit(const CRowColumn& start, const CRowCol
 
 // The pieces of a text that couldn't be analysed are made anew for the next one.
 void CDocument::_Take(CPlainFile text, const CTextEdit& edit) {
-    if (!CanBeAnalyzed(text.Text())) {
+    if (!IsSourceText(text.Text())) {
         _fUnreadable = text.Text();
         _fFile.reset();
         _fPieces.reset();

@@ -9,8 +9,8 @@ namespace {
 
 // The member for each word, by its number. They live as long as the process.
 using CMembers = std::array<nb::handle, 256>;
-CMembers gRecordKinds, gLineKinds, gLimitKinds, gRoles, gScopeKinds, gResolutions, gParameterKinds,
-    gHintKinds;
+template <class Kind>
+CMembers gMembers;
 
 // "string expression" is STRING_EXPRESSION.
 std::string MemberName(std::string_view word) {
@@ -27,7 +27,7 @@ std::string MemberName(std::string_view word) {
 
 // An enum of the host whose values are the words of a kind.
 template <class Kind>
-void MakeEnum(nb::module_& module, const char* name, const char* documentation, CMembers& by_number) {
+void MakeEnum(nb::module_& module, const char* name, const char* documentation) {
     nb::list pairs;
     for (const std::string_view word : WordsOf<Kind>())
         pairs.append(nb::make_tuple(nb::str(MemberName(word).c_str()), nb::str(word.data(), word.size())));
@@ -36,65 +36,42 @@ void MakeEnum(nb::module_& module, const char* name, const char* documentation, 
     made.attr("__doc__") = documentation;
     size_t number = 0;
     for (const std::string_view word : WordsOf<Kind>())
-        by_number[number++] = nb::getattr(made, MemberName(word).c_str()).release();
+        gMembers<Kind>[number++] = nb::getattr(made, MemberName(word).c_str()).release();
     module.attr(name) = made;
-}
-
-template <class Kind>
-nb::object Member(const CMembers& members, Kind kind) {
-    return nb::borrow(members[NumberOf(kind)]);
 }
 
 }  // namespace
 
 void BindKinds(nb::module_& module) {
     MakeEnum<ERecordKind>(module, "RecordKind",
-                          "What a record says of its name; docs/records.md lists all kinds.", gRecordKinds);
-    MakeEnum<ELogicalType>(module, "LineKind", "What kind of statement a line holds or begins.", gLineKinds);
-    MakeEnum<ELimit>(module, "LimitKind", "Why a line has not all of its records.", gLimitKinds);
-    MakeEnum<EParameterKind>(module, "ParameterKind", "How arguments reach a parameter.", gParameterKinds);
-    MakeEnum<EHintKind>(module, "HintKind", "What a type hint is about.", gHintKinds);
-    MakeEnum<ERole>(module, "Role", "What a name does where it appears; docs/names.md tells of each.",
-                    gRoles);
-    MakeEnum<EScopeKind>(module, "ScopeKind", "What makes a scope; docs/names.md tells of each.",
-                         gScopeKinds);
+                          "What a record says of its name; docs/records.md lists all kinds.");
+    MakeEnum<ELogicalType>(module, "LineKind", "What kind of statement a line holds or begins.");
+    MakeEnum<ELimit>(module, "LimitKind", "Why a line has not all of its records.");
+    MakeEnum<EParameterKind>(module, "ParameterKind", "How arguments reach a parameter.");
+    MakeEnum<EHintKind>(module, "HintKind", "What a type hint is about.");
+    MakeEnum<ERole>(module, "Role", "What a name does where it appears; docs/names.md explains each.");
+    MakeEnum<EScopeKind>(module, "ScopeKind", "What makes a scope; docs/names.md explains each.");
     MakeEnum<EResolution>(module, "Resolution",
                           "Where a name is bound: in a scope of the text, nowhere in it as a builtin, "
                           "perhaps (by `import *`, `exec` or `globals()`, or on a line with a fault), or "
-                          "nowhere that can be seen.",
-                          gResolutions);
+                          "nowhere that can be seen.");
 }
 
-nb::object MemberOf(ERecordKind kind) {
-    return Member(gRecordKinds, kind);
+template <class Kind>
+nb::object MemberOf(Kind kind) {
+    return nb::borrow(gMembers<Kind>[NumberOf(kind)]);
 }
 
-nb::object MemberOf(ELogicalType type) {
-    return Member(gLineKinds, type);
-}
-
-nb::object MemberOf(ELimit limit) {
-    return Member(gLimitKinds, limit);
-}
-
-nb::object MemberOf(ERole role) {
-    return Member(gRoles, role);
-}
-
-nb::object MemberOf(EScopeKind kind) {
-    return Member(gScopeKinds, kind);
-}
-
-nb::object MemberOf(EParameterKind kind) {
-    return Member(gParameterKinds, kind);
-}
-
-nb::object MemberOf(EHintKind kind) {
-    return Member(gHintKinds, kind);
-}
+template nb::object MemberOf(ERecordKind);
+template nb::object MemberOf(ELogicalType);
+template nb::object MemberOf(ELimit);
+template nb::object MemberOf(ERole);
+template nb::object MemberOf(EScopeKind);
+template nb::object MemberOf(EParameterKind);
+template nb::object MemberOf(EHintKind);
 
 nb::object MemberOf(EResolution resolution) {
-    return resolution == EResolution::kNone ? nb::none() : Member(gResolutions, resolution);
+    return resolution == EResolution::kNone ? nb::none() : MemberOf<EResolution>(resolution);
 }
 
 }  // namespace codeloom

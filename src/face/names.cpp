@@ -5,6 +5,7 @@
 
 #include <nanobind/stl/vector.h>
 
+#include "face/settings.h"
 #include "file/file_analyzer.h"
 #include "host/errors.h"
 #include "host/text.h"
@@ -56,7 +57,7 @@ class CLineNames {
 };
 
 nb::list DumpNames(nb::str text, int version, bool has_print_function, bool with_records) {
-    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    CheckVersion(version);
     const CUtf8 utf8(text);
     CTokenizer tokenizer(utf8);
     CLineNames names(LanguageOf(version, has_print_function));
@@ -93,12 +94,9 @@ std::string ShownNames(const CTextNames& names) {
 }
 
 nb::tuple DumpJoinedNames(nb::str text, int version, const std::vector<uint32_t>& starts) {
-    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    CFileSettings settings = SettingsFor(version, false);
     const CUtf8 utf8(text);
     const std::string_view whole = utf8;
-    CFileSettings settings;
-    settings.version = version;
-    settings.wants_records = false;
     settings.wants_names = true;
     settings.names = std::make_shared<CNameTable>();
     std::vector<CFileAnalysis> analyses;

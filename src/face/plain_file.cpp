@@ -55,8 +55,7 @@ bool MayNameItsEncoding(std::string_view text) {
 }  // namespace
 
 bool IsPlainSource(std::string_view text) {
-    return !text.starts_with("\xEF\xBB\xBF") && !MayNameItsEncoding(text) &&
-           text.find('\0') == std::string_view::npos && IsUtf8(text);
+    return !text.starts_with("\xEF\xBB\xBF") && !MayNameItsEncoding(text) && IsSourceText(text);
 }
 
 std::optional<CPlainFile> ReadPlainFile(const char* path) {

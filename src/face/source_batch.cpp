@@ -7,6 +7,7 @@
 #include <nanobind/stl/vector.h>
 
 #include "arrow/batch.h"
+#include "face/settings.h"
 #include "host/errors.h"
 #include "host/text.h"
 #include "text/utf8.h"
@@ -151,13 +152,12 @@ nb::object CSourceBatch::Digest(size_t i, nb::handle hash) const {
 bool CSourceBatch::IsPlain(size_t i) const {
     const auto& content = _ContentAt(i);
     if (!content) return false;
-    if (!_fHoldsText) return IsPlainSource(*content);
-    return content->find('\0') == std::string_view::npos && IsUtf8(*content);
+    return _fHoldsText ? IsSourceText(*content) : IsPlainSource(*content);
 }
 
 void CSourceBatch::Take(size_t i, int64_t file_id, nb::str path, nb::object sha256, nb::str python,
                         int version) {
-    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    CheckVersion(version);
     _fFiles.push_back({.file_id = file_id,
                        .path = std::move(path),
                        .sha256 = std::move(sha256),

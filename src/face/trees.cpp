@@ -1,6 +1,6 @@
 #include "face/trees.h"
 
-#include "host/errors.h"
+#include "face/settings.h"
 #include "host/text.h"
 #include "syntax/forms.h"
 #include "syntax/line_parser.h"
@@ -23,7 +23,7 @@ nb::tuple TreeOf(CLineParser& parser, const CRawLogical& logical, bool in_async_
 }
 
 nb::list DumpTrees(nb::str text, int version, bool has_print_function) {
-    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
+    CheckVersion(version);
     const CUtf8 utf8(text);
     CTokenizer tokenizer(utf8);
     CLineParser parser(LanguageOf(version, has_print_function));
