@@ -98,7 +98,7 @@ class HintKind(enum.Enum):
     RETURN = 'return'
 
 class Role(enum.Enum):
-    """What a name does where it appears; docs/names.md tells of each."""
+    """What a name does where it appears; docs/names.md explains each."""
     READ = 'read'
     BIND = 'bind'
     AUGMENT = 'augment'
@@ -116,7 +116,7 @@ class Role(enum.Enum):
     ORIGIN = 'origin'
 
 class ScopeKind(enum.Enum):
-    """What makes a scope; docs/names.md tells of each."""
+    """What makes a scope; docs/names.md explains each."""
     MODULE = 'module'
     CLASS = 'class'
     FUNCTION = 'function'
@@ -1292,9 +1292,9 @@ class DocumentText:
         Put a text in the place of a range. The range before, and that of the new text.
         """
 
-def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, with_records: bool) -> list[Analysis | None]:
+def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, with_records: bool, with_names: bool) -> list[Analysis | None]:
     """
-    For `codeloom.analyze_paths`: what each file says, with its problems worked out, and with `with_records` its records.
+    For `codeloom.analyze_paths`: what each file says, with its problems worked out, with `with_records` its records, and with `with_names` its occurrences, scopes, signatures and hints.
 
     None for a file that can't be read or that has to be decoded: the Python layer reads these.
     """

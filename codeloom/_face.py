@@ -2,6 +2,7 @@
 
 import os
 from collections.abc import Callable, Iterable, Iterator
+from itertools import compress
 
 from codeloom._analysis import Analysis, analyze_files
 from codeloom.reading.ahead import read_ahead
@@ -139,15 +140,17 @@ def _without_errors(
 
 
 def analyze_plain_files(
-    names: list[str], *, python: str, false_hints: bool, records: bool
+    paths: list[str], *, python: str, false_hints: bool, records: bool = False, names: bool = False
 ) -> Iterator[Analysis | None]:
     """Each file analysed, all with one release of the interpreter's lock; None for what takes more to read.
 
-    These are notebooks, the standard input, what isn't plain UTF-8, and what can't be read.
+    With `records` and `names` what these are made of is worked out in the same pass. Notebooks, the
+    standard input, what isn't plain UTF-8 and what can't be read take more.
     """
-    plain = [name for name in names if _is_plain(name)]
-    found = iter(analyze_files(plain, python, version_number(python), false_hints, records))
-    return (next(found) if _is_plain(name) else None for name in names)
+    are_plain = [_is_plain(path) for path in paths]
+    plain = list(compress(paths, are_plain))
+    found = iter(analyze_files(plain, python, version_number(python), false_hints, records, names))
+    return (next(found) if is_plain else None for is_plain in are_plain)
 
 
 def _is_plain(name: str) -> bool:

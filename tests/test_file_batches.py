@@ -57,9 +57,9 @@ def test_what_cannot_be_read(folder):
     found = analyze_paths(named[:-1], on_error=errors.append)
     assert [os.path.basename(analysis.path) for analysis in found] == ["plain.py"]
     assert [os.path.basename(error.filename) for error in errors] == ["absent.py", "pipe.py", "link.py"]
-    assert analyze_files(list(map(str, named)), NEWEST, 315, False, False).count(None) == 5
+    assert analyze_files(list(map(str, named)), NEWEST, 315, False, False, False).count(None) == 5
     with pytest.raises(TypeError):
-        analyze_files([b"plain.py"], NEWEST, 315, False, False)
+        analyze_files([b"plain.py"], NEWEST, 315, False, False, False)
 
 
 def test_what_counts_as_utf8(tmp_path):
@@ -78,5 +78,5 @@ def test_what_counts_as_utf8(tmp_path):
             expected.append(False)
         else:
             expected.append(True)
-    found = analyze_files(paths, NEWEST, 315, False, False)
+    found = analyze_files(paths, NEWEST, 315, False, False, False)
     assert [analysis is not None for analysis in found] == expected

@@ -131,6 +131,7 @@ class HintsCommand(SourceCommand):
         "    jq '.items[] | select(.return_hint == null).name'",
     )
     NEEDS_RECORDS = True
+    NEEDS_NAMES = True
 
     def items(self, source: Source, findings: list[Finding]) -> Iterator[Item]:
         """The defs, and the problems of those that aren't sound."""

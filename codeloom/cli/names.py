@@ -30,7 +30,6 @@ class NamesCommand(SourceCommand):
         "codeloom names --records --format jsonl src |",
         "    jq -r 'select(.kind == \"from\").payload' | sort | uniq -c",
     )
-    NEEDS_RECORDS = True
 
     @classmethod
     def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
@@ -56,6 +55,7 @@ class NamesCommand(SourceCommand):
         if options.records and self._shows_findings:
             raise WrongUseError("--records doesn't go with --unused and --undefined")
         self.NEEDS_RECORDS = options.records
+        self.NEEDS_NAMES = not options.records
         return super().run(options)
 
     def items(self, source: Source, findings: list[Finding]) -> Iterator[Item]:

@@ -38,17 +38,17 @@ STDIN_NAME = "<stdin>"
 class Run:
     """What the options come to: files, filters, a format, counts."""
 
-    def __init__(self, options: Options, console: Console, *, with_records: bool) -> None:
+    def __init__(self, options: Options, console: Console, *, records: bool, names: bool) -> None:
         self.options = options
         self.console = console
         self.tally = Tally()
         self.format = format_named(options.format)(console, options.command.NAME)
-        self._with_records = with_records
+        self._needs_records, self._needs_names = records, names
         self._needs_fingerprints = self.format.NEEDS_FINGERPRINTS or options.baseline is not None
         self._filters, self._changes = _filters_of(options)
         self._version = options.version
         # What is printed on the terminal all the time shows well enough how far a run is.
-        is_wanted = not (with_records and console.is_terminal)
+        is_wanted = not ((records or names) and console.is_terminal)
         self._progress = Progress(console, self._count_files, is_wanted=is_wanted)
 
     def files(self) -> Iterator[str | OSError]:
@@ -83,7 +83,8 @@ class Run:
             paths,
             python=self._version,
             false_hints=self.options.false_hints,
-            records=self._with_records,
+            records=self._needs_records,
+            names=self._needs_names,
         )
         for path, analysis in zip(paths, analyses, strict=True):
             yield None if analysis is None else Source(path, analysis)
@@ -91,7 +92,12 @@ class Run:
     def _read(self, path: str) -> Source:
         source = read_source(path, self.options, self._version)
         analysis = source.analysis
-        _ = analysis.records if self._with_records else analysis.problems  # worked out in this thread
+        # Worked out now, in this thread.
+        if self._needs_records:
+            _ = analysis.records
+        if self._needs_names:
+            _ = analysis.occurrences
+        _ = analysis.problems
         return source
 
     def end(self) -> ExitStatus:

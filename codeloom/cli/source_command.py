@@ -23,8 +23,9 @@ class SourceCommand(Command):
     """Shows the items of each file as soon as it is read, one file after the other."""
 
     FORMATS: Sequence[str] = FOR_ALL_ITEMS
-    # True when the items are made of records, not of problems alone.
+    # True when the items are made of records; of occurrences, scopes or signatures.
     NEEDS_RECORDS = False
+    NEEDS_NAMES = False
 
     @classmethod
     def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
@@ -45,7 +46,7 @@ class SourceCommand(Command):
 
     def _run_once(self, options: Options) -> ExitStatus:
         with opened_console(options) as console:
-            run = Run(options, console, with_records=self.NEEDS_RECORDS)
+            run = Run(options, console, records=self.NEEDS_RECORDS, names=self.NEEDS_NAMES)
             if options.show_files:
                 return _show_files(run, console)
             run.format.begin()

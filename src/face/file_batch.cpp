@@ -6,7 +6,7 @@
 #include "face/bind_items.h"
 #include "face/items.h"
 #include "face/plain_file.h"
-#include "host/errors.h"
+#include "face/settings.h"
 
 using namespace nb::literals;
 
@@ -17,7 +17,7 @@ namespace {
 // What is found in one file; no file where the Python layer has to read it.
 struct CReadFile {
     std::optional<CPlainFile> file;
-    std::unique_ptr<const CFileAnalysis> analysis;
+    std::shared_ptr<const CFileAnalysis> analysis;
 };
 
 // The path as the system takes it; empty for one that it can't take.
@@ -36,7 +36,7 @@ CReadFile Read(const std::string& path, const CFileSettings& settings) {
     CReadFile read;
     if (!path.empty()) read.file = ReadPlainFile(path.c_str());
     if (read.file)
-        read.analysis = std::make_unique<const CFileAnalysis>(AnalyzeFile(read.file->Text(), settings, {}));
+        read.analysis = std::make_shared<const CFileAnalysis>(AnalyzeFile(read.file->Text(), settings, {}));
     return read;
 }
 
@@ -52,17 +52,15 @@ std::vector<CReadFile> ReadEach(const std::vector<std::string>& paths, const CFi
 nb::object AnalysisOf(CReadFile& read, const nb::str& path, const nb::str& python,
                       const CFileSettings& settings) {
     if (!read.file) return nb::none();
-    return NewObject<CAnalysis>(std::make_shared<const CSourceFile>(std::move(*read.file), path, python,
-                                                                    settings, std::move(read.analysis)));
+    return NewObject<CAnalysis>(
+        std::make_shared<const CSourceFile>(std::move(*read.file), path, python, settings, read.analysis));
 }
 
 nb::list AnalyzeFiles(const std::vector<nb::str>& paths, nb::str python, int version, bool false_hints,
-                      bool with_records) {
-    if (!IsKnownVersion(version)) RaiseHost(PyExc_ValueError, "unknown version of the language");
-    CFileSettings settings;
-    settings.version = version;
-    settings.false_hints = false_hints;
+                      bool with_records, bool with_names) {
+    CFileSettings settings = SettingsFor(version, false_hints);
     settings.wants_records = with_records;
+    settings.wants_names = with_names;
     std::vector<std::string> system_paths;
     system_paths.reserve(paths.size());
     for (const nb::str& path : paths) system_paths.push_back(SystemPath(path));
@@ -76,13 +74,15 @@ nb::list AnalyzeFiles(const std::vector<nb::str>& paths, nb::str python, int ver
 }  // namespace
 
 void BindFileBatch(nb::module_& module) {
-    module.def("analyze_files", &AnalyzeFiles, "paths"_a, "python"_a, "version"_a, "false_hints"_a,
-               "with_records"_a,
-               nb::sig("def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, "
-                       "with_records: bool) -> list[Analysis | None]"),
-               "For `codeloom.analyze_paths`: what each file says, with its problems worked out, and with "
-               "`with_records` its records.\n\n"
-               "None for a file that can't be read or that has to be decoded: the Python layer reads these.");
+    module.def(
+        "analyze_files", &AnalyzeFiles, "paths"_a, "python"_a, "version"_a, "false_hints"_a, "with_records"_a,
+        "with_names"_a,
+        nb::sig("def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, "
+                "with_records: bool, with_names: bool) -> list[Analysis | None]"),
+        "For `codeloom.analyze_paths`: what each file says, with its problems worked out, with "
+        "`with_records` its records, and with `with_names` its occurrences, scopes, signatures and hints."
+        "\n\n"
+        "None for a file that can't be read or that has to be decoded: the Python layer reads these.");
 }
 
 }  // namespace codeloom

@@ -31,13 +31,15 @@ CSourceFile::CSourceFile(nb::bytes utf8, nb::str path, nb::str python, const CFi
 }
 
 CSourceFile::CSourceFile(CPlainFile file, nb::str path, nb::str python, const CFileSettings& settings,
-                         std::unique_ptr<const CFileAnalysis> analysis)
+                         const std::shared_ptr<const CFileAnalysis>& analysis)
     : _fFile(std::move(file)),
       _fText(_fFile.Text()),
       _fPath(std::move(path)),
       _fPython(std::move(python)),
       _fSettings(settings) {
-    (settings.wants_records ? _fWithRecords : _fQuick) = std::move(analysis);
+    if (settings.wants_records) _fWithRecords = analysis;
+    if (settings.wants_names) _fWithNames = analysis;
+    if (!settings.wants_records && !settings.wants_names) _fQuick = analysis;
 }
 
 CSourceFile::CSourceFile(CPlainFile text, nb::str path, nb::str python, const CFileSettings& settings,
@@ -61,7 +63,7 @@ nb::bytes CSourceFile::Utf8() const {
     return _fUtf8.is_valid() ? nb::borrow<nb::bytes>(_fUtf8) : BytesFromUtf8(_fText);
 }
 
-const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
+const CFileAnalysis& CSourceFile::_Analyzed(std::shared_ptr<const CFileAnalysis>& kept, bool wants_records,
                                             bool wants_names) const {
     if (kept) return *kept;
     if (_fPieces && !wants_records && (kept = _FromPieces(wants_names))) return *kept;
@@ -69,10 +71,10 @@ const CFileAnalysis& CSourceFile::_Analyzed(std::unique_ptr<const CFileAnalysis>
     settings.wants_records = wants_records;
     settings.wants_names = wants_names;
     MakeLanguages(settings.version);
-    std::unique_ptr<const CFileAnalysis> made;
+    std::shared_ptr<const CFileAnalysis> made;
     {
         const nb::gil_scoped_release released;
-        made = std::make_unique<const CFileAnalysis>(AnalyzeFile(Text(), settings, _fUnreadable));
+        made = std::make_shared<const CFileAnalysis>(AnalyzeFile(Text(), settings, _fUnreadable));
     }
     if (!kept) kept = std::move(made);  // another thread may have been faster
     return *kept;

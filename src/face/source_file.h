@@ -34,7 +34,7 @@ class CSourceFile {
                 CUnreadable unreadable);
     // For a file that was read natively, with the result of a pass that was made as the settings say.
     CSourceFile(CPlainFile file, nb::str path, nb::str python, const CFileSettings& settings,
-                std::unique_ptr<const CFileAnalysis> analysis);
+                const std::shared_ptr<const CFileAnalysis>& analysis);
     // For a text of a document, in its pieces, with the beginnings of its rows.
     CSourceFile(CPlainFile text, nb::str path, nb::str python, const CFileSettings& settings,
                 std::shared_ptr<const CPieces> pieces, std::vector<uint32_t> row_starts);
@@ -74,7 +74,7 @@ class CSourceFile {
   private:
     static nb::object _Named(const CNameTable& names, std::vector<nb::object>& made, uint32_t number);
     std::unique_ptr<const CFileAnalysis> _FromPieces(bool wants_names) const;
-    const CFileAnalysis& _Analyzed(std::unique_ptr<const CFileAnalysis>& kept, bool wants_records,
+    const CFileAnalysis& _Analyzed(std::shared_ptr<const CFileAnalysis>& kept, bool wants_records,
                                    bool wants_names = false) const;
 
     nb::object _fUtf8;  // the text is in the host's bytes, or, if there are none,
@@ -84,10 +84,11 @@ class CSourceFile {
     nb::str _fPython;
     CFileSettings _fSettings;
     CUnreadable _fUnreadable;
-    std::shared_ptr<const CPieces> _fPieces;               // of a document, else null
-    mutable std::unique_ptr<const CFileAnalysis> _fQuick;  // without records
-    mutable std::unique_ptr<const CFileAnalysis> _fWithRecords;
-    mutable std::unique_ptr<const CFileAnalysis> _fWithNames;
+    std::shared_ptr<const CPieces> _fPieces;  // of a document, else null
+    // Results of passes; one that looked for both is kept as both.
+    mutable std::shared_ptr<const CFileAnalysis> _fQuick;  // with neither records nor names
+    mutable std::shared_ptr<const CFileAnalysis> _fWithRecords;
+    mutable std::shared_ptr<const CFileAnalysis> _fWithNames;
     mutable std::unique_ptr<const CRowIndex> _fRows;
     mutable nb::object _fHostText;
     // By number, made when they are asked for.
