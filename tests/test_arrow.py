@@ -1,15 +1,14 @@
 """Tables: what other libraries take over as it is, and what is in them."""
 
 import gc
-import importlib.util
 import threading
-from pathlib import Path
 
 import duckdb
 import pandas
 import polars
 import pyarrow
 import pytest
+from tools_of_project import tool_named
 
 from codeloom import Analysis, Range, analyze
 from codeloom._analysis import table_kinds
@@ -26,7 +25,6 @@ async def g(a=[1,
 if
 """
 
-ROOT = Path(__file__).parent.parent
 SEQUENCES = ("problems", "lines", "records", "limits", "occurrences", "scopes", "signatures", "hints")
 TABLES = [name for name, _, _ in table_kinds()]
 
@@ -223,10 +221,7 @@ class TestLifetime:
 
 
 def test_the_page_lists_all_columns():
-    path = ROOT / "tools/make_tables_page.py"
-    spec = importlib.util.spec_from_file_location("make_tables_page", path)
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("make_tables_page")
     assert tool.with_tables(tool.PAGE.read_text()) == tool.PAGE.read_text(), (
         "run: python tools/make_tables_page.py"
     )

@@ -6,7 +6,6 @@ text after it is what it prints. Blocks of a console hold commands after `$` wit
 """
 
 import ast
-import importlib.util
 import os
 import re
 import shutil
@@ -16,6 +15,7 @@ from pathlib import Path
 
 import pytest
 from test_layout import STEPS
+from tools_of_project import tool_named
 
 import codeloom
 
@@ -102,10 +102,7 @@ def test_links_lead_somewhere():
 
 
 def test_the_picture_is_what_the_command_prints():
-    path = ROOT / "tools/make_picture.py"
-    spec = importlib.util.spec_from_file_location("make_picture", path)
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("make_picture")
     assert tool.picture() == tool.PICTURE.read_text("utf-8"), "run: python tools/make_picture.py"
 
 

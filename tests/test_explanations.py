@@ -1,11 +1,11 @@
 """Each code has its explanation, and the examples do what they say."""
 
-import importlib.util
 import json
 import re
 from pathlib import Path
 
 import pytest
+from tools_of_project import tool_named
 
 from codeloom import analyze
 from codeloom.explanations import explanations
@@ -34,10 +34,7 @@ def test_examples(code):
 
 
 def test_the_page():
-    path = ROOT / "tools/make_codes_page.py"
-    spec = importlib.util.spec_from_file_location("make_codes_page", path)
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("make_codes_page")
     assert tool.PAGE.read_text("utf-8") == tool.page(), "run: python tools/make_codes_page.py"
 
 

@@ -1,6 +1,5 @@
 """The formats of the command line: each is valid, and says the same as the others."""
 
-import importlib.util
 import json
 import os
 import re
@@ -8,15 +7,14 @@ import subprocess
 import sys
 import xml.etree.ElementTree as ElementTree
 from importlib.resources import files
-from pathlib import Path
 
 import junitparser
 import pytest
 from jsonschema import Draft202012Validator
+from tools_of_project import tool_named
 
 from codeloom import __version__
 
-ROOT = Path(__file__).parent.parent
 SCHEMA = json.loads((files("codeloom.cli.formats") / "report-1.schema.json").read_text())
 NOTEBOOK = {
     "cells": [{"cell_type": "markdown", "source": "# x"}, {"cell_type": "code", "source": "a\nb = )"}]
@@ -111,10 +109,7 @@ class TestJson:
 
 
 def test_the_page_says_what_each_field_means():
-    path = ROOT / "tools/make_formats_page.py"
-    spec = importlib.util.spec_from_file_location("make_formats_page", path)
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("make_formats_page")
     page = tool.PAGE.read_text("utf-8")
     assert tool.with_tables(page) == page, "run: python tools/make_formats_page.py"
     objects = {name for name, definition in SCHEMA["$defs"].items() if "properties" in definition}

@@ -1,13 +1,13 @@
 """What the host sees of the engine, the order in which it loads, and how it fails to."""
 
 import ast
-import importlib.util
 import inspect
 import sys
 from pathlib import Path
 
 import pytest
 from run_python import RunInSubinterpreter, RunPython
+from tools_of_project import tool_named
 
 from codeloom import _fastaccess, _neighbours, logicalline, strutils, symbolinfo, treesift
 
@@ -237,10 +237,7 @@ def test_a_free_threaded_python_is_refused():
 @pytest.mark.skipif(sys.version_info >= (3, 12), reason="they are made with 3.11")
 def test_the_stubs_are_up_to_date():
     pytest.importorskip("nanobind")
-    path = ROOT / "tools/make_stubs.py"
-    spec = importlib.util.spec_from_file_location("make_stubs", path)
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("make_stubs")
     for file_name, text in tool.all_stubs().items():
         written = (ROOT / "codeloom" / file_name).read_text(encoding="utf-8")
         assert ast.dump(ast.parse(written)) == ast.dump(ast.parse(text)), (

@@ -1,13 +1,13 @@
 """`codeloom query`: what it prints, and what it says of a question that can't be answered."""
 
 import csv
-import importlib.util
 import io
 import json
 import os
 from pathlib import Path
 
 import pytest
+from tools_of_project import tool_named
 
 from codeloom.cli import main
 
@@ -69,9 +69,7 @@ def test_what_cannot_be_answered(capsys, index, tmp_path):
 
 
 def test_the_questions_of_the_page_can_be_asked(capsys, index):
-    spec = importlib.util.spec_from_file_location("answer_questions", ROOT / "tools/answer_questions.py")
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("answer_questions")
     questions = tool.questions()
     assert len(questions) == 10
     for sql in questions:

@@ -1,11 +1,9 @@
 """Records in their readable form, and back."""
 
-import importlib.util
-from pathlib import Path
-
 import pytest
 from hypothesis import given
 from hypothesis import strategies as st
+from tools_of_project import tool_named
 
 from codeloom import symbolinfo
 from codeloom.records import (
@@ -17,7 +15,6 @@ from codeloom.records import (
     kRecordKinds,
 )
 
-ROOT = Path(__file__).parent.parent
 KINDS = {kind.name: kind for kind in kRecordKinds}
 
 
@@ -93,10 +90,7 @@ def test_what_is_no_record_line_is_refused():
 
 
 def test_the_page_about_records_is_up_to_date():
-    path = ROOT / "tools/make_records_page.py"
-    spec = importlib.util.spec_from_file_location("make_records_page", path)
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("make_records_page")
     assert tool.with_tables(tool.PAGE.read_text()) == tool.PAGE.read_text(), (
         "run: python tools/make_records_page.py"
     )

@@ -1,14 +1,10 @@
 """What the language server answers: names, outlines, folds, completion, fixes."""
 
-import importlib.util
-from pathlib import Path
-
 import pytest
 from language_client import Client, Refused, apply, range_of, shown
+from tools_of_project import tool_named
 
 import codeloom
-
-ROOT = Path(__file__).parent.parent
 
 SOURCE = '''\
 import os.path
@@ -289,10 +285,7 @@ def test_completion(client):
 
 
 def Mistakes():
-    path = ROOT / "tools/make_mistakes_page.py"
-    spec = importlib.util.spec_from_file_location("make_mistakes_page", path)
-    tool = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(tool)
+    tool = tool_named("make_mistakes_page")
     return list(tool.mistakes())
 
 
