@@ -8,11 +8,13 @@ from typing import TYPE_CHECKING
 from codeloom._face import processor_count
 from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Console
+from codeloom.cli.extras import needing_extra
 from codeloom.cli.index_progress import IndexProgress
 from codeloom.cli.options import (
     Options,
     WrongUseError,
     add_finding_arguments,
+    add_jobs_argument,
     add_python_argument,
     as_argument,
     count,
@@ -71,12 +73,7 @@ class IndexCommand(Command):
             "--dedup", action="store_true", help="analyse only the first of files with the same content"
         )
         parser.add_argument("--false-hints", action="store_true", help="as in check")
-        parser.add_argument(
-            "--jobs",
-            type=as_argument(count),
-            metavar="N",
-            help="number of threads (default: one per processor)",
-        )
+        add_jobs_argument(parser)
         parser.add_argument(
             "--engine",
             choices=_ENGINES,
@@ -101,13 +98,9 @@ class IndexCommand(Command):
 
     def run(self, options: Options) -> ExitStatus:
         """Bring the index up to date; WrongUseError where it can't be one."""
-        try:
+        with needing_extra("index", "arrow", "pyarrow"):
             from codeloom.corpus.index import Indexer, settings_of
             from codeloom.corpus.store import StoreError, WritableStore
-        except ModuleNotFoundError as error:
-            if (error.name or "").partition(".")[0] != "pyarrow":
-                raise
-            raise WrongUseError("index needs the extra arrow: pip install 'codeloom[arrow]'") from None
         settings = settings_of(
             options.version,
             options.tables or TABLES,
@@ -134,12 +127,8 @@ def _pool(options: Options, store: "WritableStore") -> "Pool":
         from codeloom.corpus.index import Threads
 
         return Threads(store, options.jobs or processor_count())
-    try:
+    with needing_extra("the engine ray", "ray", "ray"):
         from codeloom.corpus.ray_pool import RayPool
-    except ModuleNotFoundError as error:
-        if (error.name or "").partition(".")[0] != "ray":
-            raise
-        raise WrongUseError("the engine ray needs the extra ray: pip install 'codeloom[ray]'") from None
     try:
         return RayPool(store, options.address, options.jobs)
     except ConnectionError as error:
@@ -221,13 +210,13 @@ def _add_limits(parser: argparse.ArgumentParser) -> None:
     )
     group.add_argument(
         "--max-seconds",
-        type=as_argument(_seconds),
+        type=as_argument(_positive),
         metavar="S",
         help=f"don't spend more on a file, in seconds of a processor (default: {MOST_SECONDS:g})",
     )
     group.add_argument(
         "--part-size",
-        type=as_argument(_seconds),
+        type=as_argument(_positive),
         metavar="MB",
         help="megabytes of source in a part, which is what a run loses at most when it is killed, for each "
         "thread (default: 16)",
@@ -238,7 +227,7 @@ def _table_names(text: str) -> list[str]:
     return checked_tables(name for name in text.split(",") if name)
 
 
-def _seconds(text: str) -> float:
+def _positive(text: str) -> float:
     value = float(text)
     if not value > 0:
         raise ValueError(f"it must be more than 0, not {text}")

@@ -1,12 +1,9 @@
 """How far an index is, on a standard error that is a terminal: files, their rate, and the time left."""
 
-import sys
 import time
 from collections.abc import Callable
 
-# Seconds before a run counts as long, and between two updates.
-_PATIENCE = 1.0
-_INTERVAL = 0.1
+from codeloom.cli.progress import Pace, write_over
 
 
 class IndexProgress:
@@ -18,30 +15,26 @@ class IndexProgress:
 
     def __init__(self, count_files: Callable[[], int | None], *, is_wanted: bool) -> None:
         self._count_files = count_files
-        self._is_wanted = is_wanted and sys.stderr is not None and sys.stderr.isatty()
+        self._pace = Pace(is_wanted=is_wanted)
         self._began = time.monotonic()
-        self._next = self._began + _PATIENCE
         self._total: int | None = None
         self._is_counted = False
         self._is_shown = False
 
     def show(self, files: int) -> None:
         """Write that so many files are done, unless something was said a moment ago."""
-        now = time.monotonic()
-        if not self._is_wanted or now < self._next:
+        if not self._pace.is_due():
             return
         if not self._is_counted:
             self._total = self._count_files()
             self._is_counted = True
-        self._next = now + _INTERVAL
-        row = progress_row(files, self._total, now - self._began)
-        print(f"\r\033[K{row}", end="", file=sys.stderr, flush=True)
+        write_over(progress_row(files, self._total, time.monotonic() - self._began))
         self._is_shown = True
 
     def clear(self) -> None:
         """Take the row away."""
         if self._is_shown:
-            print("\r\033[K", end="", file=sys.stderr, flush=True)
+            write_over("")
             self._is_shown = False
 
 

@@ -174,14 +174,19 @@ def _add_selecting(parser: argparse.ArgumentParser) -> None:
 
 
 def _add_running(group: argparse._ArgumentGroup) -> None:
+    add_jobs_argument(group)
+    group.add_argument("--statistics", action="store_true", help="count the problems by code at the end")
+    group.add_argument("--watch", action="store_true", help="run again whenever a file changes")
+
+
+def add_jobs_argument(group: argparse._ActionsContainer) -> None:
+    """Add how many threads there are."""
     group.add_argument(
         "--jobs",
         type=as_argument(count),
         metavar="N",
         help="number of threads (default: one per processor)",
     )
-    group.add_argument("--statistics", action="store_true", help="count the problems by code at the end")
-    group.add_argument("--watch", action="store_true", help="run again whenever a file changes")
 
 
 def add_output_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]) -> argparse._ArgumentGroup:

@@ -18,6 +18,26 @@ _PATIENCE = 1.0
 _INTERVAL = 0.1
 
 
+class Pace:
+    """When to show how far a run is: as soon as it is a long one, and then now and then."""
+
+    def __init__(self, *, is_wanted: bool) -> None:
+        self._is_wanted = is_wanted and sys.stderr is not None and sys.stderr.isatty()
+        self._next = time.monotonic() + _PATIENCE
+
+    def is_due(self) -> bool:
+        """True when it is time; not again for a moment then."""
+        if not self._is_wanted or time.monotonic() < self._next:
+            return False
+        self._next = time.monotonic() + _INTERVAL
+        return True
+
+
+def write_over(row: str) -> None:
+    """Write a row in the place of the one before; an empty one takes that away."""
+    print(f"\r\033[K{row}", end="", file=sys.stderr, flush=True)
+
+
 class PlainRow:
     """Counts of files and problems, written over again and again; `total` is the number of files."""
 
@@ -26,12 +46,11 @@ class PlainRow:
 
     def show(self, tally: Tally) -> None:
         """Write how much is done."""
-        row = f"{tally.files:,} of {self._total:,} files, {tally.problems:,} problems ..."
-        print(f"\r\033[K{row}", end="", file=sys.stderr, flush=True)
+        write_over(f"{tally.files:,} of {self._total:,} files, {tally.problems:,} problems ...")
 
     def clear(self) -> None:
         """Take the row away."""
-        print("\r\033[K", end="", file=sys.stderr, flush=True)
+        write_over("")
 
 
 class Progress:
@@ -43,8 +62,7 @@ class Progress:
     def __init__(self, console: Console, count_files: Callable[[], int], *, is_wanted: bool) -> None:
         self._console = console
         self._count_files = count_files
-        self._is_wanted = is_wanted and sys.stderr is not None and sys.stderr.isatty()
-        self._next = time.monotonic() + _PATIENCE
+        self._pace = Pace(is_wanted=is_wanted)
         self._row: PlainRow | Bar | None = None
         self._is_shown = False
 
@@ -56,11 +74,10 @@ class Progress:
 
     def show(self, tally: Tally) -> None:
         """Write how much is done, unless that was said a moment ago."""
-        if not self._is_wanted or time.monotonic() < self._next:
+        if not self._pace.is_due():
             return
         if self._row is None:
             self._row = _row_for(self._count_files())
-        self._next = time.monotonic() + _INTERVAL
         self._console.flush()
         self._row.show(tally)
         self._is_shown = True

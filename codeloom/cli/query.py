@@ -13,6 +13,7 @@ from typing import TYPE_CHECKING, Any
 from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Console
 from codeloom.cli.excerpt import printable
+from codeloom.cli.extras import needing_extra
 from codeloom.cli.options import Options, WrongUseError
 
 if TYPE_CHECKING:
@@ -51,13 +52,9 @@ class QueryCommand(Command):
 
     def run(self, options: Options) -> ExitStatus:
         """Ask, and print; WrongUseError for what is no index and for SQL that can't be run."""
-        try:
+        with needing_extra("query", "query", "duckdb"):
             from codeloom.corpus.query import QueryError, query
             from codeloom.corpus.store import StoreError
-        except ModuleNotFoundError as error:
-            if (error.name or "").partition(".")[0] != "duckdb":
-                raise
-            raise WrongUseError("query needs the extra query: pip install 'codeloom[query]'") from None
         try:
             _print(query(options.sql, options.index), options.format, Console())
         except (StoreError, QueryError) as error:

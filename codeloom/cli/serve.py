@@ -3,7 +3,8 @@
 import argparse
 
 from codeloom.cli.command import Command, ExitStatus
-from codeloom.cli.options import Options, WrongUseError
+from codeloom.cli.extras import needing_extra
+from codeloom.cli.options import Options
 
 
 class ServeCommand(Command):
@@ -25,10 +26,6 @@ class ServeCommand(Command):
 
     def run(self, options: Options) -> ExitStatus:
         """Serve until the client ends it."""
-        try:
+        with needing_extra("serve", "lsp", "pygls", "lsprotocol"):
             from codeloom.server.run import serve
-        except ModuleNotFoundError as error:
-            if (error.name or "").partition(".")[0] not in ("pygls", "lsprotocol"):
-                raise
-            raise WrongUseError("serve needs the extra lsp: pip install 'codeloom[lsp]'") from None
         return ExitStatus(serve())

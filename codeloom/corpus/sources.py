@@ -14,10 +14,9 @@ from typing import IO, Any
 
 from codeloom.corpus.batch import Mark, too_big
 from codeloom.reading.exclusion import Exclusion
-from codeloom.reading.files import NOTEBOOK_SUFFIX, find_files, read_file
+from codeloom.reading.files import NOTEBOOK_SUFFIX, SOURCE_SUFFIXES, find_files, read_file
 from codeloom.reading.notebooks import read_notebook
 
-_SUFFIXES = (".py", ".pyi", ".pyw", NOTEBOOK_SUFFIX)
 _TAR_SUFFIXES = (".tar", ".tar.gz", ".tgz", ".tar.bz2", ".tar.xz", ".tar.zst")
 _ZIP_SUFFIXES = (".zip", ".whl", ".egg")
 _PARQUET_SUFFIXES = (".parquet",)
@@ -142,7 +141,7 @@ class Finder:
     def _tar(self, path: str) -> Iterator[Entry]:
         with tarfile.open(path, "r|*") as archive:
             while (member := archive.next()) is not None:
-                if member.isfile() and member.name.lower().endswith(_SUFFIXES):
+                if member.isfile() and member.name.lower().endswith(SOURCE_SUFFIXES):
                     opened = partial(archive.extractfile, member)
                     yield self._member(f"{path}/{member.name}", member.size, opened)
                 archive.members = []  # type: ignore[attr-defined]  # all of them would be kept
@@ -150,7 +149,7 @@ class Finder:
     def _zip(self, path: str) -> Iterator[Entry]:
         with zipfile.ZipFile(path) as archive:
             for member in archive.infolist():
-                if member.is_dir() or not member.filename.lower().endswith(_SUFFIXES):
+                if member.is_dir() or not member.filename.lower().endswith(SOURCE_SUFFIXES):
                     continue
                 name = f"{path}/{member.filename}"
                 try:
@@ -216,5 +215,5 @@ def _tracked_by_git(folder: str) -> Iterator[str | OSError]:
         raise OSError(0, f"git lists no files: {reason}", folder) from None
     for name in sorted(set(filter(None, done.stdout.split(b"\0")))):
         path = os.path.join(folder, os.fsdecode(name))
-        if path.lower().endswith(_SUFFIXES) and os.path.lexists(path) and not os.path.isdir(path):
+        if path.lower().endswith(SOURCE_SUFFIXES) and os.path.lexists(path) and not os.path.isdir(path):
             yield path

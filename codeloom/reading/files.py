@@ -8,7 +8,8 @@ from collections.abc import Callable, Iterator, Sequence
 from codeloom.reading.exclusion import ENVIRONMENT, Cause, Exclusion, FolderExclusion
 
 NOTEBOOK_SUFFIX = ".ipynb"
-_SUFFIXES = (".py", ".pyi", ".pyw", NOTEBOOK_SUFFIX)
+MODULE_SUFFIXES = (".py", ".pyi", ".pyw")
+SOURCE_SUFFIXES = (*MODULE_SUFFIXES, NOTEBOOK_SUFFIX)
 _ENVIRONMENT_MARK = "pyvenv.cfg"
 
 # Where the open files of a process are: pipes there come from the shell.
@@ -158,7 +159,7 @@ class _FileFinder:
     def _path_of_interest(self, entry: os.DirEntry[str], exclusion: FolderExclusion) -> str | None:
         """The path of a folder, with a separator, or of a Python file; None for anything else."""
         is_folder = entry.is_dir(follow_symlinks=False)
-        if not is_folder and not entry.name.lower().endswith(_SUFFIXES):
+        if not is_folder and not entry.name.lower().endswith(SOURCE_SUFFIXES):
             return None
         cause = exclusion.cause(entry.name, is_folder)
         if cause is not None:

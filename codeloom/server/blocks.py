@@ -3,7 +3,7 @@
 from bisect import bisect_right
 from collections.abc import Iterator
 
-from codeloom._analysis import Analysis, Line, LineKind, Range, Scope, ScopeKind
+from codeloom._analysis import Analysis, Line, LineKind, Occurrence, Range, Scope, ScopeKind
 
 # A row and a column, both from 1.
 Place = tuple[int, int]
@@ -19,8 +19,8 @@ _IN_LINES = (
 )
 
 
-def start_of(item: Line | Scope) -> Place:
-    """Where a line or a scope begins."""
+def start_of(item: Line | Scope | Occurrence) -> Place:
+    """Where a line, a scope or an occurrence begins."""
     return item.range.row, item.range.column
 
 

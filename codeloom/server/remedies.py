@@ -169,7 +169,7 @@ def _comma(patient: Patient) -> Iterator[Remedy]:
 
 
 def _quote(patient: Patient) -> Iterator[Remedy]:
-    """The quote at the end of the row: in the place of another kind, before the closing brackets, or last."""
+    """The quote at the end of the row: in place of another kind, before the closing brackets, or last."""
     closed = re.match(r"close it with (\"+|'+)$", patient.hint)
     row, text = patient.range.row, patient.document.rows[patient.range.row - 1]
     if closed is not None:

@@ -58,7 +58,7 @@ class SettingsByFolder:
         self._known: dict[str, Settings] = {}
 
     def of_file(self, path: str | None) -> Settings:
-        """The settings for a file; the defaults for a text that is no file."""
+        """The settings for a file; the defaults for a text that is not a file."""
         if path is None:
             return Settings(None)
         return self.of_folder(os.path.dirname(os.path.abspath(path)))

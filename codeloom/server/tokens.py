@@ -2,6 +2,7 @@
 
 import builtins
 import itertools
+from bisect import bisect_left, bisect_right
 from collections.abc import Sequence
 from typing import TYPE_CHECKING
 from weakref import WeakKeyDictionary
@@ -9,6 +10,7 @@ from weakref import WeakKeyDictionary
 from lsprotocol import types
 
 from codeloom._analysis import Analysis, Occurrence, Resolution, Role, Scope, ScopeKind
+from codeloom.server.blocks import start_of
 from codeloom.server.documents import OpenDocument
 from codeloom.server.navigation import BINDINGS
 
@@ -94,15 +96,9 @@ class _Kept:
 
 
 def _within(document: OpenDocument, range: types.Range) -> Sequence[Occurrence]:
-    from bisect import bisect_left, bisect_right
-
     occurrences = document.analysis.occurrences
-    first = bisect_left(occurrences, document.place(range.start), key=_start)
-    return occurrences[first : bisect_right(occurrences, document.place(range.end), key=_start)]
-
-
-def _start(occurrence: Occurrence) -> tuple[int, int]:
-    return occurrence.range.row, occurrence.range.column
+    first = bisect_left(occurrences, document.place(range.start), key=start_of)
+    return occurrences[first : bisect_right(occurrences, document.place(range.end), key=start_of)]
 
 
 async def _tokens(document: OpenDocument, occurrences: Sequence[Occurrence]) -> list[int]:

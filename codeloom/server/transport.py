@@ -37,7 +37,7 @@ class Framing:
         self._length: int | None = None
 
     def feed(self, data: bytes) -> Iterator[Any]:
-        """The messages that are whole with these bytes; one that is no JSON as a ValueError."""
+        """The messages that are whole with these bytes; one that is not JSON as a ValueError."""
         self._buffer += data
         while self._length is not None or self._read_headers():
             assert self._length is not None

@@ -13,7 +13,7 @@ from pygls.uris import from_fs_path, to_fs_path
 
 from codeloom._face import analyze_file
 from codeloom.cli.source import Source
-from codeloom.reading.files import NOTEBOOK_SUFFIX, find_files
+from codeloom.reading.files import MODULE_SUFFIXES, NOTEBOOK_SUFFIX, find_files
 from codeloom.server.diagnostics import diagnostic_of, result_id
 from codeloom.server.places import PlacedText
 from codeloom.server.rows import Rows
@@ -27,7 +27,6 @@ Result = TypeVar("Result")
 
 # The client's option that turns it off.
 _OPTION = "workspaceDiagnostics"
-_SUFFIXES = (".py", ".pyi", ".pyw")
 _WATCHED = ("**/*.{py,pyi,pyw}", *(f"**/{name}" for name in SETTINGS_FILES), "**/.gitignore")
 
 # Nothing is begun until the client has said nothing for so many seconds.
@@ -100,7 +99,7 @@ class ClosedFiles:
 
     def look_at(self, paths: Iterable[str]) -> None:
         """Look at files that have changed or are no more."""
-        wanted = [path for path in paths if path.lower().endswith(_SUFFIXES)]
+        wanted = [path for path in paths if path.lower().endswith(MODULE_SUFFIXES)]
         if self._is_wanted and wanted:
             task = asyncio.ensure_future(self._look_at_some(wanted))
             self._looks.add(task)
