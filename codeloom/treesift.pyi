@@ -493,7 +493,7 @@ class CTestListStarExpr(CExpression):
         """True for a comma list; False for a comprehension."""
 
     def IsGenExpr(self) -> bool:
-        """True for a comprehension, which is here without its brackets."""
+        """True for a comprehension, which is here without its parentheses."""
     kSupportedRules: list[str] = ...
 
 class CAtomExpr(CExpression):
@@ -743,7 +743,7 @@ def GetDefiningArgInfoList(node: CNode | None) -> list[CArgInfo]:
 
 def GetUsedArgInfoList(node: CNode | None) -> list[CArgInfo]:
     """
-    A new list of CArgInfo, one for each argument of a call: `node` is its argument list, or a lone argument, whose prefix isn't told.
+    A new list of CArgInfo, one for each argument of a call: `node` is its argument list, or a lone argument, whose prefix isn't known.
     """
 
 class CAsName:
@@ -833,7 +833,7 @@ class CSingleUsedArgumentNode(CNode):
         """The value after `=`; the node itself when there is no `=`."""
 
     def IsUnparenthesizedGenExpr(self) -> bool:
-        """True for a comprehension without brackets of its own."""
+        """True for a comprehension without parentheses of its own."""
 
     def GetNameAssigned(self) -> CNode | None:
         """What is before `:=`; None when there is no `:=`."""
@@ -849,7 +849,7 @@ class CFunctionParameterDef(CNode):
 
     def GetNestedListNode(self) -> CNode | None:
         """
-        The parameters in brackets of the old tuple form; None for an ordinary parameter.
+        The parameters in parentheses of the old tuple form; None for an ordinary parameter.
         """
 
     def GetName(self) -> CNode | None:
@@ -908,7 +908,7 @@ class CFuncdefStmt(CStmt):
         """The name after `def`."""
 
     def GetParameters(self) -> CParametersNode | None:
-        """The parameters with their brackets."""
+        """The parameters with their parentheses."""
 
     def GetReturnType(self) -> CExpression | None:
         """The expression after `->`; None when the header has no arrow."""
@@ -960,7 +960,7 @@ class CDelStmt(CStmt):
 
     def GetExpressions(self) -> list[CNode]:
         """
-        A new list of the expressions that are deleted. One in brackets is a single expression.
+        A new list of the expressions that are deleted. One in parentheses is a single expression.
         """
     kSupportedRules: list[str] = ["del_stmt: 'del' exprlist"]
 
@@ -1066,7 +1066,7 @@ class CExprStmt(CStmt):
 
     def GetAugAssignOp(self) -> str | None:
         """
-        The operator of an augmented assignment, such as "+="; None when there is none. The operators "|=" and "@=" aren't told.
+        The operator of an augmented assignment, such as "+="; None when there is none. The operators "|=" and "@=" give None.
         """
 
 class CReturnStmt(CStmt):
@@ -1229,13 +1229,13 @@ def IsSetLiteral(atom_node: CAtom) -> bool:
 
 def IsGenExpression(atom_node: CAtom) -> bool:
     """
-    True for a generator in its brackets under a grammar that has its `for` right in them. Where the
+    True for a generator in its parentheses under a grammar that has its `for` right in them. Where the
     `for` is a node of its own, as in both grammars here, False: ask IsComprehension.
     """
 
 def IsTupleLiteralNode(node: CNode) -> bool:
     """
-    True for a tuple, in any number of brackets or none. AssertionError for brackets that hold more
+    True for a tuple, in any number of parentheses or none. AssertionError for parentheses that hold more
     than one node, ValueError for an atom without children.
     """
 

@@ -18,7 +18,7 @@ inline double DoubleValueForULongLongBits(uint64_t l) {
     return std::bit_cast<double>(l);
 }
 
-// Of a host integer of any sign and size the low 64 bits count. On failure -1.0, with a TypeError for
+// Of a host integer of any sign and size only the low 64 bits count. On failure -1.0, with a TypeError for
 // what isn't an integer.
 inline double DoubleValueForPyIntBits(nb::handle l) {
     const uint64_t bits = PyLong_AsUnsignedLongLongMask(l.ptr());

@@ -15,7 +15,7 @@ namespace {
 constexpr CNeighbourFunction kReportCurrentException("reflect", "ReportCurrentException");
 constexpr CNeighbourFunction kRaiseWithTraceback("reflect", "RaiseWithTraceback");
 
-// A fault of the walkers that isn't a syntax error, as a ValueError which tells the line.
+// A fault of the walkers that isn't a syntax error, as a ValueError that names the line.
 void RaiseCouldNotAnalyze(CLogicalLine& logical, const CHostError& inner) {
     const CHandlingScope handling(inner);
     const nb::object exc_info = HomeModule().attr("sys").attr("exc_info")();

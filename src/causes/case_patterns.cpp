@@ -1,4 +1,4 @@
-// Patterns of a `case`.
+// The patterns of a `case`.
 
 #include <algorithm>
 

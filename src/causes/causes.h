@@ -3,7 +3,7 @@
 //   out    a CProblem that names the cause, and a hint where a usual slip is recognised
 //   keeps  a parser, which is asked what would make the line sound
 //   start  at CCauses::Of; the causes and their order are in causes.cpp, one idea a file
-// Only lines with a fault come here, so nothing of it costs sound text.
+// Only lines with a fault come here, so sound text pays nothing for it.
 #pragma once
 
 #include <memory>

@@ -1,4 +1,4 @@
-// Characters that are no Python, and what follows a backslash.
+// Characters that aren't Python, and what follows a backslash.
 
 #include <algorithm>
 #include <array>
@@ -34,7 +34,7 @@ struct CRange32 {
     uint32_t last;
 };
 
-// Controls, blanks and marks without a shape, and what belongs to nobody.
+// Controls, blanks, marks without a shape, surrogates and private characters.
 constexpr auto kNonPrintable = std::to_array<CRange32>({
     {0x0000, 0x001F}, {0x007F, 0x00A0}, {0x00AD, 0x00AD},   {0x0600, 0x0605},   {0x061C, 0x061C},
     {0x06DD, 0x06DD}, {0x070F, 0x070F}, {0x1680, 0x1680},   {0x180E, 0x180E},   {0x2000, 0x200F},

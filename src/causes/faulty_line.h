@@ -1,4 +1,4 @@
-// A line with a fault as a cause looks at it: its tokens without comments, and the place where the parser
+// A line with a fault, as the recognisers see it: its tokens without comments, and the place where the parser
 // stopped.
 #pragma once
 
@@ -76,7 +76,7 @@ class CFaultyLine {
     // The parser would have taken the token where it stopped.
     bool Takes(CInventedToken token) const { return FaultWith({_fAt, 0, {token}}) > _fAt; }
 
-    // A problem that covers tokens, both included. Where one is after the end, the last one counts.
+    // A problem that covers the tokens from the first to the last, both included.
     CProblem Problem(ECode code, int first_i, int last_i, std::string message, std::string hint = {}) const;
     CProblem ProblemAt(ECode code, uint32_t start, uint32_t end, std::string message,
                        std::string hint = {}) const;

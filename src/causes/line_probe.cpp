@@ -12,7 +12,7 @@ int CLineProbe::FaultWith(const CRawLogical& line, bool in_async_def, const CEdi
     const auto begin = tokens.begin() + edit.at;
     const auto rest = tokens.end() - begin > edit.removed ? begin + edit.removed : tokens.end();
     _fEdited.tokens.assign(tokens.begin(), begin);
-    // It has the place of the token that follows, and the text of the first one, which is no bracket.
+    // It has the place of the token that follows, and the text of the first one, which isn't a bracket.
     CRawToken invented = begin != tokens.end() ? *begin : tokens.back();
     invented.start = tokens.front().start;
     invented.length = tokens.front().length;

@@ -5,7 +5,7 @@
 
 namespace codeloom {
 
-// Tokens; the token may also come after the place where the parser stopped.
+// By single tokens; they may also come after the place where the parser stopped.
 CCause UnterminatedString(const CFaultyLine& line, int i);  // strings.cpp
 CCause QuoteInString(const CFaultyLine& line);
 CCause UnknownPrefix(const CFaultyLine& line, int i);

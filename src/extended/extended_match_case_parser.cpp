@@ -16,7 +16,7 @@ namespace {
 
 constexpr Py_ssize_t kPatternIndex = 1;  // of the first token after `case`
 
-// What is in the invented brackets needs none: no comprehension, no `yield`, no lone star.
+// An expression that is valid without the invented parentheses: no comprehension, `yield` or lone star.
 bool IsSubject(const CNode& node) {
     if (node.As<CStarExpression>() || node.As<CYieldExpr>() || node.HasText("yield")) return false;
     CTestListStarExpr* const list = node.As<CTestListStarExpr>();
@@ -34,7 +34,7 @@ struct CExtendedMatchCaseParser::CPatternTokens : CMatchCaseStatementParser::CPa
     void RefuseKeyword(Py_ssize_t i) const { extended_parser._RefuseKeyword(i); }
 };
 
-// Removed tokens are none of the statement's: those before the bound in `def f[T: match.a]()`.
+// Removed tokens don't belong to the statement: those before the bound in `def f[T: match.a]()`.
 nb::tuple CExtendedMatchCaseParser::_RemoveSkipToks(nb::tuple toks, nb::tuple positions) {
     nb::list kept_toks, kept_positions;
     for (Py_ssize_t i = 0; i < TupleSize(toks); ++i) {

@@ -1,4 +1,4 @@
-// `match` and `case` as the language has them, where the parser beneath takes a part of it.
+// `match` and `case` as the language has them, where the base parser takes a part of it.
 //   case a, b:    case *a, b:    case ():    case "a" "b":
 //   in     the same as there
 //   out    the same nodes; a sequence without brackets is a CSequencePatternNode of patterns and commas alone

@@ -118,7 +118,7 @@ CNodeRef CExtendedParser::_ParseMatchOrCase(const nb::tuple& toks, bool in_async
 }
 
 // `case[x + 1]: int` looks like a case whose pattern is bad. It may be the annotation of a name, and before
-// 3.10 it is none else.
+// 3.10 it is always a name.
 CNodeRef CExtendedParser::_ParseMatchCaseOrName(const nb::tuple& toks, bool in_async_def,
                                                 const CPositions& positions, Py_ssize_t word_i) {
     const bool may_be_name = IsToken(toks, _FindNextNonSkipIndex(toks, word_i), "[");
@@ -170,7 +170,7 @@ void CExtendedParser::_RefuseLastComma(const nb::tuple& toks, Py_ssize_t with_i)
 }
 
 //   except A, B:         may lack its brackets (PEP 758)
-//   except A, B as e:    may not, which the grammar doesn't tell
+//   except A, B as e:    may not, which the grammar doesn't know
 CNodeRef CExtendedParser::_ParseSpecialCaseExceptStar(nb::tuple toks, bool in_async_def, CPositions positions,
                                                       Py_ssize_t i) {
     Py_ssize_t comma_i = -1, as_i = -1;
@@ -219,13 +219,13 @@ bool CExtendedParser::_FitsDecoratorRule(const nb::tuple& toks, Py_ssize_t at_i)
     } while (IsToken(toks, i, "."));
     if (IsToken(toks, i, "(")) {
         i = _NonNestedFindTokenIndex(nb::str(")"), toks, i + 1, TupleSize(toks));
-        if (i == -1) return true;  // the grammar tells what is wrong
+        if (i == -1) return true;  // the grammar finds what is wrong
         i = _FindNextNonSkipIndex(toks, i);
     }
     return i >= TupleSize(toks);
 }
 
-//   def f[]():    an empty list is none
+//   def f[]():    an empty list isn't allowed
 nb::list CExtendedParser::_NodesForTypeParameters(nb::tuple toks, bool in_async_def, CPositions positions,
                                                   Py_ssize_t start, Py_ssize_t end, bool raise_errors) {
     if (raise_errors && _FindNextNonSkipIndex(toks, start) >= end) _RaiseParseError(nb::int_(end));

@@ -1,5 +1,5 @@
 // extended/: the language beyond Python 3.8 for those who read whole files of it.
-//   in     the same as the classes beneath
+//   in     the same as its base classes
 //   out    the same node classes, so that walkers need nothing new
 //   keeps  the same
 //   start  at CExtendedParser, which a host could have written with the operations that it overrides

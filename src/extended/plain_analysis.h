@@ -38,7 +38,7 @@ class CPlainAnalysis {
     static bool CanTake(const CLogicalLine& logical);
 
     // What AnalyzeSingleLogical returns, with the records on the line. Nothing, and the line as it was, where
-    // there is more to tell than plain data does: a limit, or a failure that isn't a syntax error.
+    // there is more to report than plain data can: a limit, or a failure that isn't a syntax error.
     std::optional<nb::object> Analyze(CLogicalLine& logical, bool in_async_def, bool first_in_def);
 
   private:

@@ -1,4 +1,4 @@
-// The part of CExtendedParser that tells `type` the keyword from `type` the name.
+// The part of CExtendedParser that distinguishes `type` the keyword from `type` the name.
 #include "extended/extended_parser.h"
 #include "extended/outside_brackets.h"
 #include "host/errors.h"
@@ -58,7 +58,7 @@ CNodeRef CExtendedParser::_ParseSpecialCaseWithTypeParameter(nb::tuple toks, boo
 }
 
 //   type X = int    type X[T] = list[T]
-//          ^                  ^             tells it from `type`, the name
+//          ^                  ^             distinguishes it from `type`, the name
 bool CExtendedParser::_BeginsTypeAlias(const nb::tuple& toks, Py_ssize_t type_i) {
     const Py_ssize_t name_i = _FindNextNonSkipIndex(toks, type_i);
     if (!_IsPlainName(toks, name_i)) return false;

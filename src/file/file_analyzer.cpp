@@ -294,7 +294,7 @@ void CFileAnalyzer::_PlaceFaults() {
     }
 }
 
-// What the rules see, those see who look for names.
+// Whoever looks for names sees what the rules see.
 
 void CFileAnalyzer::Take(const CRawLogical& part, const CTree& tree) {
     _fChecker.Take(part, tree);

@@ -6,7 +6,7 @@ namespace codeloom {
 
 namespace {
 
-// What a text is full of is said once: prompts, markup.
+// What a text may be full of is reported once: prompts, markup.
 bool IsSaid(const CProblem& problem, const CProblems& reported) {
     return std::any_of(reported.begin(), reported.end(), [&](const CProblem& other) {
         return other.code == problem.code && other.message == problem.message;

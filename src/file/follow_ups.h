@@ -1,4 +1,4 @@
-// Faults of lines that follow from one that is marked already, which are none of their own.
+// Faults of lines that follow from one that is marked already, and aren't reported.
 //   in     the problem of each line with a fault, in the order of the file
 //   out    whether it follows from an earlier one
 #pragma once

@@ -13,7 +13,7 @@ struct CCharPlace {
     uint32_t column = 0;
 };
 
-// A piece of a text as hosts see it. Rows and columns count from 1, columns in characters; the end is after
+// A range of a text, as hosts see it. Rows and columns count from 1, columns in characters; the end is after
 // the last character.
 struct CRange {
     uint32_t row = 0;

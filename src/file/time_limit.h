@@ -1,4 +1,4 @@
-// How long a pass over a text may take, in the time that its thread runs, so that a busy machine changes
+// How long a pass over a text may take, in the time that its thread runs, so a busy machine changes
 // nothing.
 #pragma once
 

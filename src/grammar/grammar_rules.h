@@ -24,7 +24,7 @@ struct CTokenTypes {
     bool IsShared(int type) const;
 };
 
-// One kind of token, as the grammar tells them apart.
+// One kind of token, as far as the grammar distinguishes them.
 struct CTerminal {
     int type;
     std::string text;  // of a keyword, or of an operator whose type other operators share; else empty

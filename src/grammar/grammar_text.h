@@ -14,7 +14,7 @@
 
 namespace codeloom {
 
-// What is wrong with a grammar; the host sees a ValueError. The message names file and row.
+// What is wrong with a grammar, which the host sees as a ValueError. The message names the file and the row.
 struct CGrammarError : std::invalid_argument {
     CGrammarError(const std::string& file_name, int row, const std::string& what)
         : std::invalid_argument(file_name + ":" + std::to_string(row) + ": " + what) {}

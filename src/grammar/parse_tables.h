@@ -2,7 +2,7 @@
 //   in     the rules of a grammar
 //   out    for each place in a rule a row, and in it for each label of the next token the move to make
 //
-// Terminals that no rule tells apart share a label.
+// Terminals that no rule distinguishes share a label.
 //
 // Where single children are promoted, chains make an atom cheap. When a rule is begun, the next token alone
 // decides which rule it begins with, which one that begins with, and so on down to the rule that takes the

@@ -17,8 +17,8 @@ namespace codeloom {
 
 class CDispatchWalker;
 
-// A visit of a native class: what is in the dictionary, and the shorter road to it. Its result says by
-// its truth whether the children are wanted.
+// A visit of a native class: what is in the dictionary, and the shorter road to it. The truth value of
+// its result says whether the children are wanted.
 struct CNativeVisit {
     using Function = nb::object (*)(CDispatchWalker& walker, CNode& node);
 

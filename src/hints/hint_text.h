@@ -12,7 +12,7 @@ namespace codeloom {
 // What makes a comment one that may hold a hint.
 bool HoldsTypeMark(nb::handle comment);
 
-// The hint in a comment, after as many blanks as there are bytes before it; none for a comment that is
+// The hint in a comment, after as many blanks as there are bytes before it; None for a comment that is
 // no hint, or a bare `type: ignore`.
 CTextOrNone AlignedHintInComment(const nb::str& comment);
 

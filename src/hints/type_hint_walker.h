@@ -41,7 +41,7 @@ class CTypeHintWalker : public CDispatchWalker {
 
     void Walk(CNodeRef node, CLogicalLine& logical, bool first_in_def) override;
 
-    // The results of visits say by their truth whether the children are to be visited.
+    // The truth value of a visit's result says whether the children are to be visited.
     OPERATIONS_OF(CTypeHintWalker, CDispatchWalker)
     OPERATION(nb::object, _VisitFuncdefStmt, (CFuncdefStmt& node),
               "Record the hints of a def's arguments and of what it returns.", "node"_a);

@@ -84,7 +84,7 @@ inline uint64_t DictVersion(nb::handle dict_or_none) {
 // True when `candidate` is a class derived from `base`, or `base` itself.
 bool IsSubclass(nb::handle candidate, nb::handle base);
 
-// As the host's bool() tells it.
+// The truth value, as the host's bool() gives it.
 inline bool IsTrue(nb::handle value) {
     const int is_true = PyObject_IsTrue(value.ptr());
     if (is_true < 0) throw nb::python_error();

@@ -107,7 +107,7 @@ void RaiseHostError(nb::handle error) {
 namespace {
 
 // Where the stack of this thread is as good as used up: what lies beyond is for the host's own calls. Null
-// when the platform doesn't tell.
+// when the platform doesn't say.
 const char* LowestStackAddress() {
 #ifdef __linux__
     constexpr size_t kReserve = 128 * 1024;

@@ -49,7 +49,7 @@ std::string HostName(const std::type_info& type);
 [[noreturn]] void RaiseForeignInit(const std::type_info& called, const std::type_info& wanted,
                                    nb::handle self);
 
-// Raises the host's AttributeError of an operation on none.
+// Raises the host's AttributeError of an operation on None.
 [[noreturn]] void RaiseNoneUsed(const std::type_info& wanted);
 
 // True when the class of `candidate` is T or derived from it.
@@ -64,7 +64,7 @@ bool IsOfClass(nb::handle candidate) {
 }
 
 // The object of class T inside `candidate`; null when it is of another class or not yet constructed. Classes
-// whose common base, `CAnyOfKind`, knows which one it is of are told apart by that.
+// whose common base, `CAnyOfKind`, knows which one it is of are distinguished by that.
 template <class T>
 T* TryInstance(nb::handle candidate) {
     if constexpr (requires { typename T::CAnyOfKind; }) {

@@ -1,4 +1,4 @@
-// Which texts are keys of a dictionary of the host. Most that aren't are told by their first character and
+// Which texts are keys of a dictionary of the host. Most that aren't are known by their first character and
 // their length, without a question to the dictionary.
 #pragma once
 

@@ -54,7 +54,7 @@ class CHostOperation {
 };
 
 // What a T is to the host: the name of a class, or the type as signatures write it, where "%" stands for a
-// class. Of an integer its size tells why one may not do.
+// class. For an integer its size says why one may not do.
 template <class T>
 std::string HostTypeName() {
     constexpr std::string_view name = nb::detail::make_caster<T>::Name.text;

@@ -19,7 +19,7 @@ struct CTruth {
 namespace nanobind::detail {
 
 template <>
-struct has_arg_defaults<codeloom::CTruth> : std::true_type {};  // none is no less a truth value
+struct has_arg_defaults<codeloom::CTruth> : std::true_type {};  // None is a truth value too
 
 template <>
 struct type_caster<codeloom::CTruth> {

@@ -22,7 +22,7 @@ class CLineAnalyzer::CImpl {
     bool HasMoreToTell() const { return _fHasMoreToTell; }
 
   private:
-    // How far the records went before some part.
+    // How many records there were before a part.
     struct CMark {
         size_t records = 0;
         size_t values = 0;

@@ -44,7 +44,7 @@ class CLineAnalyzer {
 
     CLineResult Analyze(const CRawLogical& line, const CLineRequest& request);
 
-    // The same where the line stands. `records` and `false_hints` may be null.
+    // The same, with places in the file. `records` and `false_hints` may be null.
     CLineResult Analyze(const CRawLogical& line, CRecords* records, CFalseHints* false_hints = nullptr) {
         return Analyze(line, {line.in_async_def, line.first_in_def, records, false_hints});
     }

@@ -37,13 +37,13 @@ class CLengthLimits {
         return kMostRepeatedText + file_size * kMostRepeatedTextPerByte;
     }
 
-    // Whether `line` is too long, the expressions within it included. Otherwise what its records repeat
+    // True when `line` is too long, the expressions within it included. Otherwise what its records repeat
     // counts from now on.
     ETooLong Take(const CRawLogical& line) {
         return line.tokens.size() <= kFewTokens && line.embedded.empty() ? ETooLong::kNot : _Measure(line);
     }
 
-    // What to tell of a line that is too long.
+    // What to say about a line that is too long.
     static std::string Message(ETooLong what, const CRawLogical& line);
 
   private:

@@ -1,5 +1,5 @@
 // What a chain is up to one of its trailers, as the visit goes on from left to right. The text grows with it,
-// so that the names of a chain cost their own length and not that of all before them once more.
+// so that each name of a chain costs its own length, not that of all the ones before.
 #pragma once
 
 #include <string_view>
@@ -49,7 +49,7 @@ class CChainName {
     CTextBuffer& _fScratch;
     const size_t _fStart;       // in the scratch
     size_t _fCount = 0;         // of the trailers in the scratch
-    bool _fIsInSource = false;  // the text stands in the source as it is, without blanks or rows between
+    bool _fIsInSource = false;  // the source has the text as it is, without blanks or rows between
 };
 
 }  // namespace codeloom

@@ -23,7 +23,7 @@ const CTreeNode& FirstPart(const CTree& tree, const CTreeNode& name) {
 
 // Imports
 
-// `import a.b` binds `a` and tells of `a`; `import a.b as c` binds `c` and tells of `a.b`.
+// `import a.b` binds `a` and records `a`; `import a.b as c` binds `c` and records `a.b`.
 void CNameWalker::_VisitImport(const CTreeNode& node) {
     if (!_IsRecording()) return;
     ForEachImportedName(*_fTree, NamesOfImport(*_fTree, node), [&](const CImportedName& imported) {
@@ -146,7 +146,7 @@ void CNameWalker::_RecordDeclared(const CTreeNode& node, char kind) {
     });
 }
 
-// A bound stands after the stars: "*" of `*Ts`, "int" of `T: int`. On a line that opens no scope, such as
+// A bound comes after the stars: "*" of `*Ts`, "int" of `T: int`. On a line that opens no scope, such as
 // `type X[T] = int`, the parameter leaves no record.
 void CNameWalker::_VisitTypeParameter(const CTreeNode& node) {
     const CTreeNode* const spec = SpecOfTypeParameter(*_fTree, node);

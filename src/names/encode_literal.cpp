@@ -12,7 +12,7 @@ namespace {
 
 // A character that ends rows, in one of the senses that the host's texts know.
 struct CRowEnder {
-    size_t length = 0;  // in bytes; zero where no such character stands
+    size_t length = 0;  // in bytes; zero where there is no such character
     std::string_view escape;
 };
 

@@ -16,7 +16,7 @@ constexpr bool IsValue(EPiece piece) {
     return piece == EPiece::kOperand || piece == EPiece::kTrailer || piece == EPiece::kCloser;
 }
 
-// The word parts operands. `print` and `exec` stand like names.
+// The word separates operands. `print` and `exec` are placed like names.
 bool IsParting(EWord word) {
     return word != EWord::kPrint && word != EWord::kExec && !IsOperandWord(word);
 }
@@ -27,7 +27,7 @@ bool EndsWithWord(std::string_view piece) {
     return IsParting(WordOf(blank == std::string_view::npos ? piece : piece.substr(blank + 1)));
 }
 
-// What a piece is that is no operator.
+// What a piece is that isn't an operator.
 EPiece KindOfExpression(std::string_view piece) {
     const bool is_attribute = piece[0] == '.' && piece.size() > 1 && piece[1] != '.' && !IsDigit(piece[1]);
     if (is_attribute || piece[0] == '(' || piece[0] == '[') return EPiece::kTrailer;
@@ -101,7 +101,7 @@ EPiece KindOf(std::string_view piece, EPiece previous) {
     return found.length == piece.size() ? KindOfToken(found.type, previous) : KindOfExpression(piece);
 }
 
-// Brackets that may open a trailer do so when a value stands before them.
+// Brackets that may open a trailer do so when a value comes before them.
 constexpr bool HasBlankBetween(EPiece previous, EPiece kind) {
     if (kind == EPiece::kCloser || kind == EPiece::kComma || kind == EPiece::kColon) return false;
     switch (previous) {

@@ -19,7 +19,7 @@ std::string JoinTokens(std::span<const std::string_view> pieces);
 // The same, piece by piece, for a text that grows.
 class CTokenJoiner {
   public:
-    // Puts a blank, where one belongs, before the piece that stands in `text` from `start` to its end.
+    // Puts a blank, where one belongs, before the piece that is in `text` from `start` to its end.
     void PartFromPrevious(std::string& text, size_t start);
 
     // Appends the blank that belongs before a token, which the caller appends next.
@@ -34,9 +34,9 @@ class CTokenJoiner {
         kNone,     // before the first piece
         kOperand,  // a name, a literal, an expression
         kTrailer,  // `.name`, or an operand that begins with ( or [
-        kWord,     // a keyword that is no operand, or an expression that ends with one
+        kWord,     // a keyword that isn't an operand, or an expression that ends with one
         kOpener,
-        kBrace,  // an opener that is no trailer's
+        kBrace,  // an opener that doesn't begin a trailer
         kCloser,
         kComma,  // a semicolon too
         kColon,

@@ -107,7 +107,7 @@ CNameWalker::CFunctionName CNameWalker::_FunctionOf(const CChain& chain, size_t 
 
 // Calls
 
-// The arguments of a call, null without any, and what they tell of a function with a name.
+// The arguments of a call, null without any, and what they say about a function with a name.
 void CNameWalker::_VisitArguments(const CTreeNode* arguments, CFunctionName function) {
     if (arguments != nullptr) {
         ForEachArgument(*_fTree, *arguments, [&](const CArgumentParts& parts) {

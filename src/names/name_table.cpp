@@ -26,7 +26,7 @@ void CNameTable::Clear() {
     _SetSlots(kFirstSlotCount);
 }
 
-// So many slots, with all names in them.
+// Makes this many slots, with all names in them.
 void CNameTable::_SetSlots(uint32_t count) {
     _fSlots.assign(count, 0);
     _fMask = count - 1;

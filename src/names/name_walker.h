@@ -1,13 +1,13 @@
 // names/: what one logical line does with names.
 //   in     the tree of one line
 //   out    records appended to those of the text, each with its place, in the order in which the walk meets
-//          what they tell; the names read come at the end. Those of arguments stand among the others.
+//          what they say; the names read come at the end. Those of arguments are among the others.
 //   keeps  the storage of its notes and texts
 //   start  at CNameWalker::Walk, then the switch in name_walker.cpp
 //
 // loads.cpp          names, chains, calls, comprehensions, decorators
 // definitions.cpp    `def`, `lambda`, `class`, imports, `global`, type parameters
-// targets.cpp        assignments: the names on the left with what stands on the right
+// targets.cpp        assignments: the names on the left with what is on the right
 // statements.cpp     `for`, `with`, `except`, `return`, `yield`, `:=`, `match`, `case`
 // value_equivs.cpp   what a value is recorded as
 #pragma once
@@ -44,7 +44,7 @@ class CNameWalker {
     CWalkResult Walk(const CTree& tree, const CTreeNode& node, CRecords* records);
 
   private:
-    // What a name that is met is: read; a target, whose record is made elsewhere; a target within an
+    // What a name that is met may be: read; a target, whose record is made elsewhere; a target within an
     // expression, of a comprehension or a lambda.
     enum class EContext : uint8_t { kLoad, kStore, kStoreWithin };
 
@@ -119,8 +119,8 @@ class CNameWalker {
     void _VisitCase(const CTreeNode& node);
     void _VisitPattern(const CTreeNode& node);
 
-    // What a value stands for: appends the payload to the values and gives its kind; 0 where that can't be
-    // told. `_fTrailer` stands after it where a part of the value is meant.
+    // What a value stands for: appends the payload to the values and gives its kind; 0 where that isn't
+    // known. `_fTrailer` comes after it where a part of the value is meant.
     char _AppendEquiv(const CTreeNode& value);
     char _AppendEquivOfAtom(const CTreeNode& atom);
     char _AppendEquivOfChain(const CChain& chain);

@@ -82,7 +82,7 @@ void CNodeText::AppendChain(const CChain& chain, CTextBuffer& text) {
     for (const CTreeNode& trailer : chain.trailers.subspan(shown_count)) AppendTrailer(trailer, text);
 }
 
-// As much of `a.b.c` as stands in the source without blanks, in one piece. Gives the count of its trailers.
+// As much of `a.b.c` as the source has without blanks, in one piece. Gives the count of its trailers.
 size_t CNodeText::_AppendNames(const CChain& chain, CTextBuffer& text) {
     const CRawToken* last = &_fTree.Token(*chain.atom);
     const uint32_t start = last->start;

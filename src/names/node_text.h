@@ -1,6 +1,6 @@
 // Nodes into short texts, as names are recorded with them: `a.b.c`, `f(x)`.
 //
-// What stands in brackets is shown, and strings of harmless characters as they are; `(a)` is shown as `a`.
+// What is in brackets is shown, and strings of harmless characters as they are; `(a)` is shown as `a`.
 // What nests deeper than kMostNesting throws CLimitHit.
 #pragma once
 
@@ -26,7 +26,7 @@ class CNodeText {
     void AppendChain(const CChain& chain, CTextBuffer& text);
     void AppendTrailer(const CTreeNode& trailer, CTextBuffer& text);
 
-    // Of an expression with operators. The text is of no use, and may end early, once it exceeds `most`
+    // Of an expression with operators. The text is meaningless, and may end early, once it exceeds `most`
     // bytes.
     void AppendOperators(const CTreeNode& node, CTextBuffer& text, size_t most, bool with_parentheses);
 

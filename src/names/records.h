@@ -1,4 +1,4 @@
-// Records of a text as plain data: what its lines say about names, and where each name stands.
+// Records of a text as plain data: what its lines say about names, and where each name is.
 #pragma once
 
 #include <cstdint>
@@ -17,7 +17,7 @@ struct CRecord {
     uint32_t name;   // in the table of names
     uint32_t value;  // where the payload, without its prefix, begins in the texts
     uint32_t value_length;
-    uint32_t start;  // the bytes of the file at which the name stands; equal where it stands nowhere
+    uint32_t start;  // the bytes of the file at which the name is; equal where it is nowhere
     uint32_t end;
     char kind;
     bool of_arg;

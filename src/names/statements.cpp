@@ -64,7 +64,7 @@ void CNameWalker::_VisitYield(const CTreeNode& node) {
     _Add(_NumberOfLeaf(keyword), kind, SpanOfLeaf(*_fTree, keyword), value);
 }
 
-// The prefix of a record stands openly where the payload of another holds it.
+// The prefix of a record is visible where the payload of another holds it.
 void CNameWalker::_InsertPrefix(size_t pos, char kind) {
     CTextBuffer& values = _fRecords->values;
     const size_t start = _fScratch.size();

@@ -80,7 +80,7 @@ void CNameWalker::_RecordTarget(const CTreeNode& target, const CTreeNode* value)
     if (value != nullptr) _AddEquiv(name, *value, place);
 }
 
-// A list, whatever the right side could tell.
+// A list, whatever the right side could say.
 void CNameWalker::_RecordStarredTarget(const CTreeNode& starred) {
     const CTreeNode& shown = DropParentheses(*_fTree, starred);
     const uint32_t name = _NumberOfText(shown);

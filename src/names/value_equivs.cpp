@@ -10,7 +10,7 @@ namespace {
 constexpr size_t kMaxExpressionLength = 120;  // bytes, without a trailer
 constexpr char kNoEquiv = 0;
 
-// What stands in parentheses of any number that aren't a tuple's.
+// What is in any number of parentheses that aren't a tuple's.
 const CTreeNode& InnermostOf(const CTree& tree, const CTreeNode& atom) {
     const CTreeNode* inner = &atom;
     while (inner->Is(ENodeKind::kAtom) && BracketOf(tree, *inner) == EBracket::kParenthesis)
@@ -49,7 +49,7 @@ char CNameWalker::_AppendEquivOfLeaf(const CTreeNode& leaf) {
         (_fRecords->values += _fTree->Text(leaf)) += _fTrailer.View();
         return kPlainEquivKind;
     }
-    // No part of a literal can be told.
+    // No part of a literal is known.
     if (!_fTrailer.empty()) return kNoEquiv;
     if (leaf.Is(ENodeKind::kNumberLiteral)) return _AppendNumber(leaf, {});
     if (leaf.Is(ENodeKind::kStringLiteral)) return _AppendString(leaf);

@@ -1,4 +1,4 @@
-// The limits of a walk over one logical line, as data.
+// The limits of a walk over one logical line.
 #pragma once
 
 #include <cstdint>

@@ -64,7 +64,7 @@ void COccurrenceFinder::_VisitLambda(const CTreeNode& node) {
     _VisitIn(scope, BodyOfLambda(*_fTree, node));
 }
 
-// Annotations are evaluated where they stand, or later in a scope of their own.
+// Annotations are evaluated where they are, or later in a scope of their own.
 void COccurrenceFinder::_VisitAnnotation(const CTreeNode& node, uint32_t header_scope) {
     if (!_DefersAnnotations()) return _VisitIn(header_scope, node);
     if (_fAnnotationScope == 0)

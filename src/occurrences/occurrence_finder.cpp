@@ -280,7 +280,7 @@ COccurrence& COccurrenceFinder::_AddAttribute(const CTreeNode& leaf, ERole role,
     return added;
 }
 
-// Expressions within the literal are read where it stands.
+// Expressions within the literal are read where the literal is.
 void COccurrenceFinder::_NoteString(const CTreeNode& leaf) {
     const CSpan span = SpanOfLeaf(*_fTree, leaf);
     _fStrings.push_back({span.start, span.end, _fScope, _fFlags});

@@ -118,7 +118,7 @@ class COccurrenceFinder {
     const uint32_t _fNoName;
     bool _fHasDeferredAnnotations = false;  // asked for by an import from the future
 
-    // Of the line
+    // State of the line
     size_t _fFirstItem = 0;
     size_t _fFirstScope = 0;
     uint32_t _fOpenedScope = 0;
@@ -127,7 +127,7 @@ class COccurrenceFinder {
     bool _fHasParts = false;  // embedded ones or hints in comments, whose names come after those of the line
     std::vector<CString> _fStrings;
 
-    // Of the tree under way
+    // State of the tree that is being visited
     const CTree* _fTree = nullptr;
     uint32_t _fScope = 0;
     uint8_t _fFlags = 0;

@@ -17,7 +17,7 @@ struct CPlace {
     nb::object offset;
 };
 
-// A pair of the host as a place; ValueError when it hasn't two items.
+// A pair of the host as a place; ValueError when it doesn't have two items.
 CPlace Unpack(nb::handle pair) {
     nb::tuple items(nb::borrow(pair));
     if (items.size() != 2) {

@@ -9,7 +9,7 @@ namespace codeloom {
 
 // Makes, and doesn't raise, a SyntaxError at `context`: a token index, or a (row, column) tuple. An index
 // past the last token stands for the place just after it. `pos_info_in_tok` (lineno, utf8_col) refines the
-// place within the token, or is none. `logical` is read by attribute.
+// place within the token, unless it is None. `logical` is read by attribute.
 nb::object CreateSyntaxError(nb::handle msg, nb::handle logical, nb::handle context,
                              nb::handle pos_info_in_tok);
 

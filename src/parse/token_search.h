@@ -1,4 +1,4 @@
-// Searches outside brackets among the tokens of a logical line. Kinds of brackets aren't told apart. The
+// Searches outside brackets among the tokens of a logical line. Kinds of brackets aren't distinguished. The
 // depth may fall below zero, where nothing is found.
 #pragma once
 

@@ -164,7 +164,7 @@ void CBlockTracker::TakeYield() {
     if (function->full_header.end > 0) _ReportTooManyFrames(function->full_header);
 }
 
-// Once a text.
+// Once per text.
 void CBlockTracker::_ReportTooManyFrames(const CSpan& place) {
     if (std::exchange(_fHasTooManyFrames, true)) return;
     _Report(ECode::kTooManyBlocks, place.start, place.end, "too many statically nested blocks");
@@ -303,7 +303,7 @@ void CBlockTracker::_ReportMissingBlock(uint32_t start, uint32_t end) {
     _fHasPlaceProblem = true;
 }
 
-// False where tabs and blanks disagree about how deep the line lies. Reported once a block.
+// False where tabs and blanks disagree about how deep the line lies. Reported once per block.
 bool CBlockTracker::_CheckTabs(const CIndent& indent) {
     if (!_fLanguage.IsPython3()) return true;
     CBlock& block = _Top();

@@ -20,7 +20,7 @@
 
 namespace codeloom {
 
-// Columns of an indentation as the interpreter counts them: tabs to the next multiple of eight, and tabs as
+// Columns of an indentation, as the interpreter counts them: tabs to the next multiple of eight, and tabs as
 // one column. Both must agree about what is deeper.
 struct CIndent {
     int32_t column = 0;
@@ -32,7 +32,7 @@ struct CIndent {
 struct CBlock {
     CIndent indent;
     int32_t odd_column = -1;   // of lines in it that were dedented to no known depth
-    int32_t header_depth = 0;  // deeper than this is within a header that stands in this block
+    int32_t header_depth = 0;  // deeper than this is within a header in this block
     EClause clause =
         EClause::kSimple;            // of the header; kSimple for the module, and where the header is unknown
     bool is_unknown = false;         // nothing can be said of its header
@@ -83,7 +83,7 @@ class CBlockTracker {
     // The line that was entered last holds a `yield`.
     void TakeYield();
 
-    // Takes note of the line that was entered last: whether it has a fault of its own.
+    // Notes whether the line that was entered last has a fault of its own.
     void Leave(const CRawLogical& logical, bool has_fault);
 
     // Call once, after the last line. What is missing at the end is reported at its last token.

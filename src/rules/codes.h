@@ -143,13 +143,13 @@ enum class ECode : uint16_t {
     kFieldsTooDeep = 905,
 };
 
-// What no interpreter refuses: a type hint in a comment or in quotes, what it only warns of, and what is too
+// What an interpreter takes: a bad hint in a comment or in quotes, what it only warns of, and what is too
 // long for us.
 constexpr bool IsWarning(ECode code) {
     return code == ECode::kInvalidHint || code == ECode::kJumpOutOfFinally || code == ECode::kLineTooLong;
 }
 
-// A statement or an expression that stands where it may not.
+// A statement or an expression where it isn't allowed.
 constexpr bool IsPlacement(ECode code) {
     return code >= ECode::kOutsideFunction && code <= ECode::kJumpOutOfFinally;
 }

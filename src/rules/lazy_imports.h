@@ -1,4 +1,4 @@
-// Where a lazy import may stand (PEP 810), and what it may import.
+// Where a lazy import is allowed (PEP 810), and what it may import.
 #pragma once
 
 #include "rules/blocks.h"

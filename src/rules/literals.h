@@ -12,7 +12,7 @@ bool MayHaveBadLiteral(const CRawLogical& line);
 // Requires: the line parses, so that neighbouring strings are one expression.
 void CheckLiterals(const CRawLogical& line, const CLanguage& language, CProblems& problems);
 
-// A backslash at the end of the file has no row to go on with.
+// A backslash at the end of the file, which has no row to continue on.
 void CheckEnd(const CRawLogical& line, const CLanguage& language, CProblems& problems);
 
 }  // namespace codeloom

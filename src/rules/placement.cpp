@@ -144,7 +144,7 @@ const CPlacement& CPlacementRules::_PlaceIn(const CBlockTracker& blocks) {
     return _fPlace;
 }
 
-// Of the blocks around a line only the innermost may be new.
+// Of the blocks around a line, only the innermost may be new.
 void CPlacementRules::_TrackFunctions(const std::vector<CBlock>& blocks) {
     const auto is_under_way = [&](const CStrictFunction& function) {
         return function.block_i < blocks.size() &&

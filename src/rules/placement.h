@@ -1,4 +1,4 @@
-// What may stand only in certain places: `return`, `yield`, `await`, `break`, `import *` and the like.
+// What is allowed only in certain places: `return`, `yield`, `await`, `break`, `import *` and the like.
 //   in     the tree of a sound line, and the blocks around it
 //   out    problems
 //   keeps  for each function under way what is only known at its end

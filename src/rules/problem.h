@@ -3,7 +3,7 @@
 //   in     logical lines with their trees and faults, in the order of the file
 //   out    CProblem: code, bytes, message, related places, hint
 //   keeps  the blocks around the line
-// One mark for a fault: what follows from a fault already marked isn't a problem of its own.
+// One mark per fault: what follows from a fault already marked isn't a problem of its own.
 #pragma once
 
 #include <algorithm>
@@ -15,7 +15,7 @@
 
 namespace codeloom {
 
-// Another place that a problem has to do with: where the parenthesis was opened, the header that lacks its
+// Another place that matters to a problem: where the parenthesis was opened, the header that lacks its
 // block.
 struct CRelated {
     uint32_t start;

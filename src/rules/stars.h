@@ -1,4 +1,4 @@
-// Starred expressions where they can't stand.
+// Starred expressions where they aren't allowed.
 #pragma once
 
 #include "rules/rule_context.h"

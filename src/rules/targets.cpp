@@ -97,7 +97,7 @@ class CTargetCheck {
         return false;
     }
 
-    // One in parentheses is refused wherever it stands.
+    // One in parentheses is refused wherever it is.
     bool _CheckLoneStar(const CTreeNode& target) const {
         if (!target.Is(ENodeKind::kStar)) return false;
         if (_IsDelete()) return _Refuse(target, EExpression::kStarred, false);

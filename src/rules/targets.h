@@ -8,7 +8,7 @@ namespace codeloom {
 // What an assignment statement binds, and what any other statement does.
 enum class ETargetUse : uint8_t { kStatement, kAssign, kDelete };
 
-// One mark for one target.
+// One mark per target.
 void CheckTarget(const CRuleContext& context, const CTreeNode& target, ETargetUse use);
 
 // The name of what is defined or imported, a parameter or a keyword argument.

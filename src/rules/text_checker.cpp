@@ -11,7 +11,7 @@ namespace codeloom {
 
 namespace {
 
-// In quotes anything may stand that reads as a hint.
+// Quotes may hold anything that reads as a hint.
 bool IsHint(const CRawLogical& part) {
     return part.type == ELogicalType::kStringifiedTypeHint || part.type == ELogicalType::kCommentedTypeHint;
 }

@@ -1,4 +1,4 @@
-// The rules for one text: what is around its lines, and what may stand where.
+// The rules for one text: what is around its lines, and what is allowed where.
 #pragma once
 
 #include <vector>
@@ -51,7 +51,7 @@ class CTextChecker final : public CTreeObserver {
     }
 
   private:
-    // Apart, so that most lines pay for the question alone.
+    // A function of its own, so that most lines pay only for the question.
     [[gnu::noinline]] void _Check(const CRawLogical& part, const CTree& tree);
     CLineSetting _Setting(const CTree& tree) const;
     void _CheckField(const CRawLogical& part, const CTree& tree);

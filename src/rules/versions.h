@@ -8,7 +8,7 @@ namespace codeloom {
 // From this version on the parser knows all that is newer.
 inline constexpr int kNeedsNoVersionCheck = 312;
 
-// Reports the first form of a line that its version hasn't.
+// Reports the first form of a line that its version doesn't have.
 void CheckVersion(const CRuleContext& context);
 
 }  // namespace codeloom

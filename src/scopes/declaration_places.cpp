@@ -37,7 +37,7 @@ bool HasPattern(const char* bytes) {
     return (halves[0] | halves[1]) != 0;
 }
 
-// The word stands where a statement may begin, with a blank after it.
+// The word is where a statement may begin, with a blank after it.
 bool MayBeginStatement(std::string_view text, size_t pos, size_t length) {
     const char next = ByteAt(text, pos + length);
     if (!IsBlank(next) && next != '\\') return false;

@@ -90,7 +90,7 @@ void CDeclarationCheck::_Note(uint32_t i, CSeen& seen) {
     }
 }
 
-// One mark a declaration. That of a name with both kinds is on the first one, as the interpreter has it.
+// One mark per declaration. That of a name with both kinds is on the first one, as the interpreter has it.
 void CDeclarationCheck::_CheckDeclaration(uint32_t i, const CSeen& seen) {
     const size_t problem_count = _fProblems.size();
     _CheckEarlier(i, seen);
@@ -129,7 +129,7 @@ void CDeclarationCheck::_CheckAnnotation(uint32_t i, const CSeen& seen) {
         .related.push_back({_Item(declaration).start, _Item(declaration).end, "the declaration"});
 }
 
-// A `nonlocal` at module level is refused where it stands.
+// A `nonlocal` at module level is refused where it is.
 void CDeclarationCheck::_CheckBinding(uint32_t i) {
     const CSymbol& symbol = _SymbolOf(i);
     if (symbol.scope == 0 || symbol.Is(CSymbol::kIsDeclaredGlobal)) return;

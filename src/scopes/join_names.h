@@ -1,5 +1,5 @@
 // The names of a text out of those of its parts. What a part says of names doesn't change with its place, so
-// that after an edit only the part around it is gone over anew, and the scopes are made of what is there.
+// that after an edit only the part around it is visited again, and the scopes are made of what is there.
 #pragma once
 
 #include <memory>

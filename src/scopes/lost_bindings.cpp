@@ -38,7 +38,7 @@ class CLostBindingFinder {
     bool _IsWord(size_t i, EWord word) const { return i < _fTokens.size() && _fTokens[i]->word == word; }
     bool _IsName(size_t i) const { return i < _fTokens.size() && IsPlainName(*_fTokens[i]); }
 
-    // A name that is no part of a chain.
+    // A name that isn't part of a chain.
     bool _IsTarget(size_t i) const {
         return _IsName(i) && (i == 0 || !_IsType(i - 1, kTokenId_DOT)) && !_IsType(i + 1, kTokenId_DOT) &&
                !_IsType(i + 1, kTokenId_LPAR) && !_IsType(i + 1, kTokenId_LSQB);
@@ -78,7 +78,7 @@ class CLostBindingFinder {
             if (_IsTarget(i)) _fFound.names.push_back(_fTokens[i]);
     }
 
-    // What stands before the last `=` outside brackets, or before the `:` of an annotation.
+    // What comes before the last `=` outside brackets, or before the `:` of an annotation.
     void _FindTargets() {
         size_t end = _IsName(0) && _IsType(1, kTokenId_COLON) ? 1 : 0;
         int depth = 0;

@@ -1,4 +1,4 @@
-// What a line with a fault plainly binds, by its tokens.
+// What a line with a fault evidently binds, by its tokens.
 #pragma once
 
 #include <vector>
@@ -13,7 +13,7 @@ struct CLostBindings {
     std::vector<const CRawToken*> parameters;  // in the scope that its header opens
 };
 
-// The names of definitions and their parameters, what stands before `=`, after `as`, between `for` and `in`,
+// The names of definitions and their parameters, what comes before `=`, after `as`, between `for` and `in`,
 // and what is imported. The names of the line lead from the tokens, which must outlive them.
 CLostBindings FindLostBindings(const CRawLogical& line, EClause clause);
 

@@ -107,7 +107,7 @@ std::vector<uint32_t> CNameQueries::References(uint32_t occurrence_i) const {
 
 // Unused names
 
-// What speaks against calling a name unused.
+// Reasons not to call a name unused.
 struct CNameQueries::CUses {
     std::vector<bool> is_used;                      // by symbol
     std::vector<bool> is_all_read;                  // by scope: something in it may read any of its names

@@ -47,7 +47,7 @@ class CNameQueries {
     // if wanted.
     std::vector<uint32_t> Unused(bool with_parameters) const;
 
-    // What is read and bound nowhere.
+    // What is read but bound nowhere.
     std::vector<uint32_t> Undefined() const;
 
   private:

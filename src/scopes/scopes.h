@@ -46,7 +46,7 @@ struct CSymbol {
     }
     bool IsLocal() const { return binding == EBinding::kLocal || (scope == 0 && (flags & kIsBound) != 0); }
     bool MayBeBound() const { return (flags & (kIsBound | kIsBoundElsewhere)) != 0; }
-    // False for what only stands for a global name that the module itself doesn't mention.
+    // False for a global name that the module itself doesn't mention.
     bool IsMentioned() const { return flags != 0 && flags != kIsBoundElsewhere; }
 };
 

@@ -8,9 +8,9 @@
 // block_scopes.h     the scope around a line, by its blocks
 // scope_builder.cpp  symbols, then where each is bound
 // join_names.h       the names of a text out of those of its parts
-// lost_bindings.cpp  what a line with a fault binds by all appearances
+// lost_bindings.cpp  what a line with a fault evidently binds
 // declarations.cpp   what is wrong with `global` and `nonlocal`
-// A line with a fault is a gap: nothing is known of its names but that they stand there, and what it plainly
+// A line with a fault is a gap: nothing is known of its names but that they are there, and what it plainly
 // binds. The occurrences of a line and the scopes within it depend on that line alone, but for the import
 // that defers annotations; what is made of blocks is made anew when lines change.
 #pragma once
@@ -31,7 +31,7 @@ struct CLineNames {
     bool has_fault = false;
 };
 
-// What a line with a fault binds by all appearances.
+// What a line with a fault evidently binds.
 struct CLostBinding {
     uint32_t name = 0;
     uint32_t scope = 0;  // among all
@@ -49,7 +49,7 @@ struct CTextNames {
         return line_i < lines.size() ? lines[line_i].first_occurrence
                                      : static_cast<uint32_t>(occurrences.items.size());
     }
-    // Gives back what lies unused.
+    // Releases memory that isn't used.
     void Shrink();
 
     uint32_t LineOfOccurrence(uint32_t occurrence_i) const;

@@ -12,7 +12,7 @@
 
 namespace codeloom {
 
-// As the interpreter's module `inspect` tells them apart.
+// As the interpreter's module `inspect` distinguishes them.
 #define CODELOOM_PARAMETER_KINDS(KIND)                  \
     KIND(kPositionalOnly, "positional only")            \
     KIND(kPositionalOrKeyword, "positional or keyword") \

@@ -42,7 +42,7 @@ inline bool IsBareGenerator(const CTree& tree, const CTreeNode& argument) {
 struct CArgumentParts {
     const CTreeNode* name = nullptr;   // before `=`
     const CTreeNode* value = nullptr;  // after `=`; otherwise the argument itself
-    EStars stars = EStars::kNone;      // of a lone argument they aren't told, see StarsOfArgument
+    EStars stars = EStars::kNone;      // not set for a lone argument, see StarsOfArgument
 };
 
 inline CArgumentParts PartsOfArgument(const CTree& tree, const CTreeNode& argument) {
@@ -50,7 +50,7 @@ inline CArgumentParts PartsOfArgument(const CTree& tree, const CTreeNode& argume
     return {&tree.Child(argument, 0), &tree.Child(argument, 2), EStars::kNone};
 }
 
-// `a, b=1, *c` in a call, in the brackets of a class too
+// `a, b=1, *c` in a call, in the parentheses of a class too
 //   child    argument  ','  argument ...
 // In the 2.7 grammar `*` and `**` are children too, before their argument.
 inline bool IsArgumentList(const CTreeNode& arguments) {

@@ -60,7 +60,7 @@ struct CItems {
 // Nothing for a plain expression, `(a)` included.
 CItems ItemsOf(const CTree& tree, const CTreeNode& node);
 
-// The same of a tuple in parentheses, of which a single item may be in more of them. False for any other
+// The same for a tuple in parentheses, whose single item may be in further ones. False for any other
 // node.
 bool IsParenthesizedTuple(const CTree& tree, const CTreeNode& node, CItems& items);
 

@@ -1,7 +1,7 @@
 // What the patterns of a `case` are made of (PEP 634), by descent into ranges of tokens.
 //   in     a step that plans a node, and the tokens of its range
 //   out    the steps that make its parts, put down in a plan
-// Every step decides by the first token or by a search outside brackets; what fits nothing fails at its
+// Every step decides by the first token or by a search outside brackets; what doesn't fit fails at its
 // token. Parsers of plain and of hosted trees share it.
 //
 // Tokens has CIndex, CPlan and kNone; Type(i) and Count(); Find(mark, start_i, end_i), the index of a mark

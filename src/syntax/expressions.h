@@ -139,7 +139,7 @@ inline const CTreeNode& ValueOfNamed(const CTree& tree, const CTreeNode& named) 
     return tree.Child(named, 2);
 }
 
-// `a, b` and `a,`; `a for b in c` where it is without brackets of its own
+// `a, b` and `a,`; `a for b in c` without parentheses of its own
 //   child    item  ','  item  ',' ...
 //   child    item  comprehension
 // The lists of these forms are kTestList, and kListmaker within the brackets of the 2.7 grammar.

@@ -1,4 +1,4 @@
-// The first form of a line that its version of the language hasn't.
+// The first form of a line that its version of the language doesn't have.
 #pragma once
 
 #include <cstdint>

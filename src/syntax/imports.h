@@ -44,7 +44,7 @@ inline const CTreeNode* StarOfFromImport(const CTree& tree, const CTreeNode& sta
     return IsToken(last, kTokenId_STAR) ? &last : nullptr;
 }
 
-// One name or a list of them, without the brackets around it.
+// One name or a list of them, without the parentheses around it.
 inline const CTreeNode& NamesOfFromImport(const CTree& tree, const CTreeNode& statement) {
     const uint32_t names_i = ImportIndexOf(tree, statement) + 1;
     return tree.Child(statement, HasTokenAt(tree, statement, names_i, kTokenId_LPAR) ? names_i + 1 : names_i);

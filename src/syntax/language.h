@@ -66,7 +66,7 @@ struct CChainClass {
     int row_around = 0;
     uint16_t rule_number = 0;
     ENodeKind kind = ENodeKind::kNode;
-    bool may_be_refused = false;  // a node of it may have a form that the language hasn't
+    bool may_be_refused = false;  // a node of it may have a form that the language lacks
     bool is_line = false;         // simple statements and the newline after them
 };
 

@@ -17,7 +17,7 @@ class CLineParser {
     explicit CLineParser(const CLanguage& language);
     ~CLineParser();
 
-    // The statement of a line, an embedded one too, into `tree`. On a fault the tree is of no use. A tree may
+    // The statement of a line, an embedded one too, into `tree`. On a fault the tree is undefined. A tree may
     // be empty without a fault: the line holds no statement then, or more than one.
     CFault Parse(const CRawLogical& logical, bool in_async_def, CTree& tree);
 

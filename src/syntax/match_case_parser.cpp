@@ -9,7 +9,7 @@ namespace codeloom {
 
 namespace {
 
-// What is in the invented parentheses needs none: no comprehension, no `yield`, no lone star.
+// An expression that is valid without the invented parentheses: no comprehension, `yield` or lone star.
 bool IsSubject(const CTree& tree, const CTreeNode& node) {
     if (node.Is(ENodeKind::kStar) || node.Is(ENodeKind::kYield) || node.word == EWord::kYield) return false;
     return !node.Is(ENodeKind::kTestList) || !tree.Child(node, 1).Is(ENodeKind::kCompFor);

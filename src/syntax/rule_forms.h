@@ -10,7 +10,7 @@
 
 namespace codeloom {
 
-// The nodes that a form is known by: `a := b`, `*a`, and `a, b` without brackets.
+// The nodes that a form is known by: `a := b`, `*a`, and `a, b` without parentheses.
 enum class EFormPart { kNamed, kStar, kList };
 
 struct CFormSign {
@@ -29,7 +29,7 @@ struct TRuleForm {
 
     const char* rule;
     const CForm* form;
-    // The child at fault; kNone when the node hasn't the form.
+    // The child at fault; kNone when the node doesn't have the form.
     int32_t (*find)(const Node& node);
 };
 
@@ -71,7 +71,7 @@ int32_t NamedArgument(const Node& node) {
     return node.HasSign(1, kColonEqual) ? 1 : TRuleForm<Node>::kNone;
 }
 
-// In a set of one; the `:=` of `(x := 1)` has its brackets.
+// In a set of one; the `:=` of `(x := 1)` is in parentheses.
 template <class Node>
 int32_t InBraces(const Node& node) {
     return node.HasSign(0, kBrace) ? At<Node, 1, EFormPart::kNamed>(node) : TRuleForm<Node>::kNone;

@@ -13,7 +13,7 @@ struct CTokenRange {
     uint32_t end;
 };
 
-// 1 for an opening bracket, -1 for a closing one, 0 for any other token. Kinds of brackets aren't told apart.
+// 1 for an opening bracket, -1 for a closing one, 0 for any other token. Kinds of brackets don't matter.
 constexpr int DepthStep(const CRawToken& token) {
     if (IsOpenerType(token.type)) return 1;
     return IsCloserType(token.type) ? -1 : 0;

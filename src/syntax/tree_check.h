@@ -1,4 +1,4 @@
-// What every tree must be; for builds with assertions.
+// What holds for every tree, checked in builds with assertions.
 #pragma once
 
 namespace codeloom {

@@ -1,4 +1,4 @@
-// Who wants to see the trees of a line: rules and what finds occurrences.
+// The interface of those who see the trees of a line: rules, and what finds occurrences.
 #pragma once
 
 #include "syntax/nodes.h"

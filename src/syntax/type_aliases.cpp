@@ -1,4 +1,4 @@
-// What tells `type` the keyword from `type` the name.
+// What distinguishes `type` the keyword from `type` the name.
 #include "syntax/span_parser.h"
 #include "tokenizer/keywords.h"
 
@@ -26,7 +26,7 @@ void ForEachStatement(const CTokenSpan& span, Visit visit) {
 }  // namespace
 
 //   type X = int    type X[T] = list[T]
-//          ^                  ^             tells it from `type`, the name
+//          ^                  ^             distinguishes it from `type`, the name
 bool CSpanParser::_BeginsTypeAlias(const CTokenSpan& span, uint32_t type_i) const {
     const uint32_t name_i = span.Next(type_i);
     if (!_IsPlainName(span, name_i)) return false;

@@ -1,4 +1,4 @@
-// Plain records that grow one by one: cheaper by the item than a vector, and moved in one go, if at all.
+// An array of plain records that grows one by one: cheaper per item than a vector, and moved in one copy.
 #pragma once
 
 #include <algorithm>
@@ -76,7 +76,7 @@ class TPlainArray {
         if (count > _fCapacity) _SetCapacity(count);
     }
 
-    // Gives back what lies unused.
+    // Releases memory that isn't used.
     void Shrink() {
         if (_fSize != _fCapacity) _SetCapacity(std::max<size_t>(_fSize, 1));
     }

@@ -1,4 +1,4 @@
-// Runs of bytes: how far blanks, names, strings and rows go. They are most of a text, so they are looked at
+// Runs of bytes: how far blanks, names, strings and rows go. They are most of a text, so they are read
 // eight bytes at a time where that is less work.
 #pragma once
 
@@ -56,7 +56,7 @@ inline unsigned NameBytes(const char* bytes) {
 
 }  // namespace scan
 
-// The first position from `pos` on whose byte has the trait, or hasn't.
+// The first position from `pos` on whose byte has the trait, or doesn't have it.
 template <EByteTrait trait, bool has>
 inline size_t FindByte(std::string_view text, size_t pos) {
     for (; pos + scan::kStep <= text.size(); pos += scan::kStep) {

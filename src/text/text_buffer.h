@@ -1,4 +1,4 @@
-// A text that grows piece by piece, most of them short: cheaper by the piece than a string, and with room
+// A text that grows piece by piece, most of them short: cheaper per piece than a string, and with its storage
 // kept when it is cut.
 #pragma once
 
@@ -37,7 +37,7 @@ class CTextBuffer {
         _SetCapacity(capacity);
     }
 
-    // Gives back what lies unused.
+    // Releases memory that isn't used.
     void Shrink() {
         if (_fSize != _fCapacity) _SetCapacity(std::max<size_t>(_fSize, 1));
     }
@@ -95,7 +95,7 @@ class CTextBuffer {
         }
     }
 
-    // Apart, so that short pieces need no room for a call.
+    // A function of its own, so that short pieces need no room for a call.
     [[gnu::noinline]] CTextBuffer& _AppendLong(std::string_view piece) {
         if (_fCapacity - _fSize < piece.size())
             reserve(std::max(2 * _fCapacity, _fSize + piece.size() + kFirstCapacity));

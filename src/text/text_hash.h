@@ -8,7 +8,7 @@
 
 namespace codeloom {
 
-// Another one in each process, so that nobody can make texts that all have one hash.
+// Different in each process, so that nobody can make texts that all have one hash.
 extern const uint64_t gTextHashSeed;
 
 namespace text_hash {
@@ -20,7 +20,7 @@ Word Load(const char* pointer) {
     return word;
 }
 
-// The first and the last eight bytes of a text, which overlap in a short one; of less than eight what tells
+// The first and the last eight bytes of a text, which overlap in a short one; of less than eight what sets
 // texts of one length apart.
 struct CEnds {
     uint64_t first = 0;
@@ -37,7 +37,7 @@ inline CEnds EndsOf(const char* text, size_t length) {
     return {byte_at(0) | byte_at(length / 2) << 8, byte_at(length - 1)};
 }
 
-// Both halves of a product, which each bit of both factors has a say in.
+// Both halves of a product, which depend on each bit of both factors.
 inline uint64_t Mixed(uint64_t a, uint64_t b) {
     __extension__ using CProduct = unsigned __int128;
     const CProduct product = static_cast<CProduct>(a) * b;
@@ -46,7 +46,7 @@ inline uint64_t Mixed(uint64_t a, uint64_t b) {
 
 }  // namespace text_hash
 
-// The ends tell texts of this length apart.
+// The ends distinguish texts of this length.
 inline constexpr size_t kMostInEnds = 16;
 
 // Of a text of at most so many bytes, whose ends are known.

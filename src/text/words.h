@@ -1,5 +1,5 @@
 // The words of the language by number: keywords of any version, soft keywords, and the operators whose token
-// type alone doesn't tell them apart.
+// type alone doesn't distinguish them.
 #pragma once
 
 #include <array>
@@ -68,7 +68,7 @@ enum class EWord : uint8_t {
         kCount
 };
 
-// A name that no statement may bind, although it is no word of the language: in sets of words it has the last
+// A name that no statement may bind, although the language has no such word: in sets of words it is the last
 // bit.
 inline constexpr std::string_view kDebugName = "__debug__";
 inline constexpr uint64_t kDebugNameBit = uint64_t{1} << 63;

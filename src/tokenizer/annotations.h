@@ -9,7 +9,7 @@
 
 namespace codeloom {
 
-// Adds to `hints` the indices of the string tokens that stand where a hint is expected, in source order: the
+// Adds to `hints` the indices of the string tokens in places where a hint is expected, in source order: the
 // annotations of parameters, results and targets, the bounds of type parameters, and what is subscripted in
 // them. Not within `Literal[...]`, calls and dictionaries, and within `Annotated[...]` only in the first
 // place.

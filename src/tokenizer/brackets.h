@@ -21,13 +21,13 @@ class CBrackets {
     char Innermost() const { return _fOpen.back().closer; }
     void Clear() { _fOpen.clear(); }
 
-    // Takes account of the opener at `pos`; false when it is known that it will never be closed.
+    // Takes note of the opener at `pos`; false when it is known that it will never be closed.
     bool Open(char opener, size_t pos) {
         _fOpen.push_back({pos, CloserOf(opener)});
         return _fUnclosed.empty() || !_IsKnownUnclosed(pos);
     }
 
-    // Takes account of a closer; false when it is of the wrong kind.
+    // Takes note of a closer; false when it is of the wrong kind.
     bool Close(char closer) {
         if (!AreOpen()) return true;
         if (_fOpen.back().closer != closer) return false;

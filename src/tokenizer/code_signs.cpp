@@ -10,7 +10,7 @@ namespace codeloom {
 
 namespace {
 
-// `next` is a bracket or a dot tied to a name; in prose a blank stands before a bracket.
+// `next` is a bracket or a dot tied to a name; in prose a blank comes before a bracket.
 bool AreTied(const CRowToken& name, const CRowToken& next) {
     if (name.type != kTokenId_NAME || name.text.data() + name.text.size() != next.text.data()) return false;
     return next.text == "(" || next.text == "[" || next.text == ".";

@@ -10,7 +10,7 @@ namespace codeloom {
 
 namespace {
 
-// The tokens can be an expression, as far as their first one and the signs outside brackets tell; the grammar
+// The tokens can be an expression, as far as their first one and the signs outside brackets show; the grammar
 // would take statements too.
 bool CanBeExpression(const std::vector<CRawToken>& tokens, std::string_view text) {
     const CRawToken* first = FindFirstSignificant(tokens);

@@ -168,7 +168,7 @@ size_t CFstringScanner::_ScanConversion(size_t pos, bool& is_sound) {
     return pos;
 }
 
-// The sign that ends the expression, where the "=" at `pos` stands before one as in `{x = !r}`; `pos`
+// The sign that ends the expression, where the "=" at `pos` comes before one as in `{x = !r}`; `pos`
 // otherwise.
 size_t CFstringScanner::_ScanDebugSign(size_t pos) {
     const std::string_view text = _fLexer.Text();

@@ -14,7 +14,7 @@ namespace codeloom {
 class CLexer;
 struct CLexedToken;
 
-// Is told of fields and their tokens while a string is scanned. Fields nest: a field that begins before
+// Takes fields and their tokens while a string is scanned. Fields nest: a field that begins before
 // another one has ended lies in a string inside that one's expression, or in its format spec.
 class CFieldListener {
   public:
@@ -33,11 +33,11 @@ class CFieldListener {
     ~CFieldListener() = default;
 };
 
-// Nothing here calls itself: what is open stands on a stack of its own, so that nesting of the text costs no
+// Nothing here calls itself: what is open is on a stack of its own, so that nesting of the text costs no
 // call depth.
 class CFstringScanner {
   public:
-    // For one scan. Nothing is told to a `listener` of none. `depth` counts the fields around the string.
+    // For one scan. `listener` may be null. `depth` counts the fields around the string.
     CFstringScanner(CLexer& lexer, CFieldListener* listener, int depth)
         : _fLexer(lexer), _fListener(listener), _fDepth(depth) {}
 

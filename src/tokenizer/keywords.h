@@ -1,4 +1,4 @@
-// What a keyword says about the row or the expression that it stands in.
+// What a keyword says about the row or the expression that it is in.
 #pragma once
 
 #include <array>
@@ -16,10 +16,10 @@ namespace codeloom {
 namespace keywords {
 
 enum ETrait : uint8_t {
-    kStatementOnly = 1,  // begins a statement and stands nowhere else: in no version inside brackets
-    kBinary = 2,         // stands between two operands, or begins what may follow an operand
+    kStatementOnly = 1,  // begins a statement and is nowhere else: in no version inside brackets
+    kBinary = 2,         // comes between two operands, or begins what may follow an operand
     kAfterOperand = 4,   // of these, one that nothing can begin with
-    kNoOperand = 8,      // a further word that is no operand, or not surely
+    kNoOperand = 8,      // a further word that isn't an operand, or may not be one
     kHeader = 16,  // begins a compound statement, `if`, `else` and `for` if they don't continue an expression
 };
 
@@ -98,7 +98,7 @@ inline bool MayBeginHeader(std::string_view text, size_t pos) {
     }
 }
 
-// What stands at `pos`, after `from`, is the rest of an import, not of `yield from`.
+// What is at `pos`, after `from`, is the rest of an import, not of `yield from`.
 inline bool IsImported(std::string_view text, size_t pos) {
     for (;;) {
         while (IsBlank(ByteAt(text, pos)) || ByteAt(text, pos) == '.') ++pos;

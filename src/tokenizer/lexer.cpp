@@ -72,7 +72,7 @@ CLexedToken CLexer::_LexString(size_t pos, const CStringStart& start, int depth)
     return {found.end, type, EWord::kNone, found.may_span_rows, start.has_fields, is_special};
 }
 
-// Inside another f-string a failure is no waste of its own: the outermost string fails with it and counts it.
+// Inside another f-string a failure isn't counted again: the outermost string fails with it and counts it.
 CStringEnd CLexer::_FindFieldStringEnd(size_t pos, const CStringStart& start, int depth) {
     if (_fWasteLeft == 0) return {pos, false};
     CFstringScanner scanner(*this, nullptr, depth);

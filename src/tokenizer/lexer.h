@@ -55,7 +55,7 @@ class CLexer {
     size_t LookedAt() const { return _fLookedAt; }
     void NoteLook(size_t end) { _fLookedAt = std::max(_fLookedAt, end); }
 
-    // The bytes that were scanned in vain, and those that may be before the rest is taken as it stands.
+    // The bytes that were scanned in vain, and those that may be before the rest is taken as it is.
     size_t ScannedInVain() const {
         return MostScannedInVain(_fText.size()) - std::min(_fWasteLeft, _fDoubtLeft);
     }

@@ -22,7 +22,7 @@ constexpr bool IsAssignmentOperator(int16_t type, EWord word) {
            type == kTokenId_DOUBLESLASHEQUAL;
 }
 
-// The type of the line as far as its first tokens tell; kUnknown for an expression or an assignment.
+// The type of the line as far as its first tokens show; kUnknown for an expression or an assignment.
 ELogicalType TypeOfBeginning(const CRawLogical& logical);
 
 // The line begins with the keyword of a compound statement, so that a ";" in it belongs to the body on its

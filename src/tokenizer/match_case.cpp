@@ -42,7 +42,7 @@ class CTokenReader {
 };
 
 // A subject or a pattern can begin with `token`, `next` being the token after it. Brackets, stars and signs
-// can also go on with an expression that begins with a name; the header's end tells.
+// can also go on with an expression that begins with a name; the header's end decides.
 bool CanBeginSubject(const CTokenReader& reader, const CRawToken& token, const CRawToken& next) {
     if (token.length == 0) return false;
     switch (reader.FirstKind(token)) {
@@ -62,7 +62,7 @@ bool CanBeginSubject(const CTokenReader& reader, const CRawToken& token, const C
 }
 
 // Reads the header as if the word were a name, to tell whether the ":" could begin an annotation of it:
-//   match(a).b: int      match[a][b]: int     two trailers each, and the last is no call
+//   match(a).b: int      match[a][b]: int     two trailers each, and the last isn't a call
 //   match (a): ...       match [a], b: ...    no target of an annotation
 class CTargetReader {
   public:

@@ -38,7 +38,7 @@ constexpr size_t LongEnd(std::string_view text, size_t end) {
     return AsLower(ByteAt(text, end)) == 'l' ? end + 1 : end;
 }
 
-// `0x1F`, `0b1`, `0o17`; `pos` itself where no such number stands.
+// `0x1F`, `0b1`, `0o17`; `pos` itself where there is no such number.
 constexpr size_t BasedEnd(std::string_view text, size_t pos) {
     size_t end = pos + 2;
     switch (AsLower(ByteAt(text, pos + 1))) {
@@ -57,7 +57,7 @@ constexpr size_t BasedEnd(std::string_view text, size_t pos) {
     return end == pos + 2 ? pos : LongEnd(text, end);
 }
 
-// The end of `e5`, `E-5`; `pos` itself where no exponent stands.
+// The end of `e5`, `E-5`; `pos` itself where there is no exponent.
 constexpr size_t ExponentEnd(std::string_view text, size_t pos) {
     if (AsLower(ByteAt(text, pos)) != 'e') return pos;
     const char sign = ByteAt(text, pos + 1);
@@ -85,7 +85,7 @@ constexpr size_t WholeEnd(std::string_view text, size_t pos, size_t end) {
 
 }  // namespace number_lexer
 
-// The end of the longest number at `pos`, which stands on a digit, or on a "." before a digit. What runs on
+// The end of the longest number at `pos`, which is on a digit, or on a "." before a digit. What runs on
 // after it (`1abc`, `0xg`, `1__0`) is a token of its own, which no grammar takes there unless it is a
 // keyword as in `1if x else y`.
 constexpr size_t NumberEnd(std::string_view text, size_t pos) {

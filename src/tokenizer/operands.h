@@ -50,7 +50,7 @@ inline bool BeginsString(std::string_view text, size_t pos) {
     return CanBeginString(text[pos]) && ReadStringStart(text, pos).quote_length > 0;
 }
 
-// What begins at `pos` must follow an operand: a closing bracket, a binary operator that is no sign, a comma.
+// What begins at `pos` must follow an operand: a closing bracket, a comma, a binary operator but a sign.
 inline bool ContinuesExpression(std::string_view text, size_t pos) {
     const char c = text[pos];
     switch (ByteKind(c)) {

@@ -14,7 +14,7 @@ namespace codeloom {
 
 struct COperator {
     int16_t type = kTokenId_ERRORTOKEN;
-    uint8_t length = 0;         // zero where no operator stands
+    uint8_t length = 0;         // zero where there is no operator
     EWord word = EWord::kNone;  // of operators that share their type
 };
 

@@ -10,7 +10,7 @@ namespace codeloom {
 namespace {
 
 // The row ends with two quotes that begin no empty string: they are left of triple quotes. Such a string
-// stands after a blank, an operator, an opener or a prefix of at most two letters.
+// comes after a blank, an operator, an opener or a prefix of at most two letters.
 bool EndsInLostQuotes(std::string_view row, char quote) {
     const size_t last = row.find_last_not_of(" \t)]},;:");
     if (last == std::string_view::npos || last == 0) return false;
@@ -74,7 +74,7 @@ size_t FindProseEnd(CLexer& lexer, size_t pos, size_t end, size_t& looked_at) {
         last_end = row.end;
         if (IsComment(row)) continue;
         if (!row.is_in_brackets && EndsInLostQuotes(row.text, start.quote)) return RowTextEnd(text, row);
-        // One broken row may be one of code, two on end hardly are.
+        // One broken row may be code; two in succession hardly are.
         const bool is_broken = IsBroken(row) || LooksLikeProse(row);
         is_broken_code = is_broken && !is_broken_code && HasSignsOfCode(row);
         if (is_in_session || (is_broken && !is_broken_code)) {

@@ -1,4 +1,4 @@
-// What stands around the quotes of a string: whether it fits quotes that begin one, or that end one.
+// What is around the quotes of a string: whether it fits quotes that begin one, or that end one.
 #pragma once
 
 #include <cstddef>
@@ -16,7 +16,7 @@ bool CannotFollowString(std::string_view text, size_t pos);
 // What begins at `pos` hardly follows on its row a string that ends at `end`.
 bool HardlyFollowsString(std::string_view text, size_t pos, size_t end);
 
-// The row at `pos` begins with two words that hardly stand side by side in code, or with what needs an
+// The row at `pos` begins with two words that are hardly side by side in code, or with what needs an
 // operand before it.
 bool HardlyBeginsCode(std::string_view text, size_t pos);
 
@@ -27,7 +27,7 @@ size_t SkipToNextRow(std::string_view text, size_t pos);
 // The string at `pos` is the first thing in brackets.
 bool StandsInBrackets(std::string_view text, size_t pos);
 
-// The string at `pos` stands in no brackets, as far as its row and the end of the row before show.
+// The string at `pos` isn't in brackets, as far as its row and the end of the row before show.
 bool StandsOutsideBrackets(std::string_view text, size_t pos);
 
 }  // namespace codeloom

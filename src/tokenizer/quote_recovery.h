@@ -13,7 +13,7 @@ namespace codeloom {
 // rows show that its closing quotes are missing: after the last row that can't be code. Zero when the string
 // is sound. `looked_at` is how far the search went.
 //
-// A string is doubted when what stands around its closing quotes is odd for closing quotes. It is given up
+// A string is doubted when what is around its closing quotes is odd for closing quotes. It is given up
 // when the rows after it can't be code, and fit much worse than those that are code if it isn't closed. Both
 // only happen in broken text.
 size_t FindUnclosedTripleEnd(CLexer& lexer, size_t pos, const CStringStart& start, const CStringEnd& found,

@@ -22,7 +22,7 @@ struct CPosition {
 // No longer text is read, so that offsets, rows and columns fit into 32 bits.
 inline constexpr size_t kMaxTextSize = INT32_MAX;
 
-// A token as a plain record; its text lies in the text of the file, and a separator is no token.
+// A token as a plain record; its text lies in the text of the file, and a separator isn't a token.
 struct CRawToken {
     uint32_t start = 0;  // in the text of the file
     uint32_t length = 0;
@@ -55,7 +55,7 @@ struct CLogicalFacts {
     std::string_view file_text;
     ELogicalType type = ELogicalType::kUnknown;
     int32_t first_row = 0;  // in the text of the file, for an embedded logical too
-    // Where position (0, 0) of this logical stands in the file: {first_row, 0} for a top-level logical; the
+    // Where position (0, 0) of this logical is in the file: {first_row, 0} for a top-level logical; the
     // place of its first character for an embedded one, whose columns in row 0 are relative to the embedded
     // text.
     CPosition origin;

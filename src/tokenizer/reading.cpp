@@ -32,7 +32,7 @@ int CReading::ReadRow() {
     return fit;
 }
 
-// One broken row may be one of code, two on end hardly are.
+// One broken row may be code; two in succession hardly are.
 int CReading::_Fit(bool is_broken) const {
     int fit = !is_broken && HasCodeShape(_fRow) ? kCode : 0;
     if (is_broken) fit = !_fIsAfterBroken && HasSignsOfCode(_fRow) ? kBrokenCode : kNoCode;
@@ -41,7 +41,7 @@ int CReading::_Fit(bool is_broken) const {
     return fit;
 }
 
-// How well the quotes of a string of many rows fit what stands around them; zero for any other token.
+// How well the quotes of a string of many rows fit what is around them; zero for any other token.
 int CReading::_FitOfQuotes(const CRowToken& token) const {
     if (token.type != kTokenId_STRING) return 0;
     const size_t start = static_cast<size_t>(token.text.data() - _fText.data());
@@ -54,7 +54,7 @@ int CReading::_FitOfQuotes(const CRowToken& token) const {
     return kQuotes * ((is_opened ? 1 : -1) + (is_closed ? 1 : -1) - is_opened_at_end);
 }
 
-// The row is one of code, but not here: a statement within brackets, what is none outside of them, or a row
+// The row is one of code, but not here: a statement within brackets, what isn't one outside of them, or a row
 // that is deeper than its block.
 bool CReading::_IsOutOfPlace() const {
     if (_fInBrackets || _fRow.is_in_brackets) return BeginsStatement(_fRow) || BeginsHeader(_fRow);

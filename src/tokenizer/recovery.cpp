@@ -84,7 +84,7 @@ class CHeaderRows {
     CHeaderRows(const CTokenRow& first, int32_t indent)
         : _fIndent(indent), _fHasParameters(BeginsDefinition(first)), _fEnd(first.end) {}
 
-    // The end of the header as far as the rows tell.
+    // The end of the header as far as the rows show.
     size_t End() const { return _fEnd; }
 
     // Takes the next row, which with the comments before it begins at `start`; false when the end is known.

@@ -24,8 +24,8 @@ bool IsTriple(const CRowToken& token) {
 }
 
 // Calls `visit` with each token and the number of brackets open at it, an opener and a closer counted as
-// open, and less than zero after a closer of an outer bracket. Ends when `visit` returns true, and tells
-// that.
+// open, and less than zero after a closer of an outer bracket. Ends when `visit` returns true, and says
+// whether it did.
 template <class Visit>
 bool AnyToken(const CTokenRow& row, Visit visit) {
     int depth = 0;
@@ -71,7 +71,7 @@ bool HasOuterColon(const CTokenRow& row) {
     return AnyToken(row, [](const CRowToken& token, int depth) { return depth <= 0 && token.text == ":"; });
 }
 
-// Behind an opener no `for` and no `if` can continue an expression.
+// After an opener no `for` and no `if` can continue an expression.
 bool BeginsStatement(const CTokenRow& row) {
     if (StartsStatement(row.text, 0)) return true;
     const bool is_after_opener = LastKind(row.before) == EByteKind::kOpener;

@@ -30,21 +30,21 @@ bool ContinuesExpression(const CTokenRow& row);
 // The row begins with an operand although the row before ends with one.
 bool FollowsOperand(const CTokenRow& row);
 
-// A second operand stands directly after the one that the row begins with.
+// A second operand comes directly after the one that the row begins with.
 bool BeginsWithTwoOperands(const CTokenRow& row);
 
 // The row holds a closer for which it has no opener.
 bool ClosesOuterBracket(const CTokenRow& row);
 
-// A "=" stands outside the row's own brackets.
+// A "=" is outside the row's own brackets.
 bool HasAssignment(const CTokenRow& row);
 
-// A "=" after an attribute stands outside the row's own brackets: no keyword argument.
+// A "=" after an attribute is outside the row's own brackets: it isn't a keyword argument.
 bool AssignsToPart(const CTokenRow& row);
 
 bool EndsInColon(const CTokenRow& row);
 
-// A ":" stands outside the row's own brackets.
+// A ":" is outside the row's own brackets.
 bool HasOuterColon(const CTokenRow& row);
 
 // The row ends in a ":" outside its own brackets.
@@ -71,10 +71,10 @@ bool EndsInOpenTriple(const CTokenRow& row);
 // The row begins a string with triple quotes.
 bool HasTripleQuotes(const CTokenRow& row);
 
-// The row, as far as the first triple quotes, is surely no row of sound code.
+// The row, as far as the first triple quotes, surely isn't a row of sound code.
 bool IsBroken(const CTokenRow& row);
 
-// The row is hardly one of code, but may be.
+// The row is unlikely to be code, but may be.
 bool LooksLikeProse(const CTokenRow& row);
 
 }  // namespace codeloom

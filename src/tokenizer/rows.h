@@ -21,7 +21,7 @@ struct CTokenRow {
     std::vector<CRowToken> tokens;
     CRowToken before;             // the last token of the rows before; an empty one before the first row
     bool is_in_brackets = false;  // begins within brackets that the rows before have opened
-    size_t stray_closer_end = 0;  // after the first closer that stands where no bracket is open; or zero
+    size_t stray_closer_end = 0;  // after the first closer where no bracket is open; or zero
 
     // The row was read from its beginning.
     bool IsWhole() const { return start != SIZE_MAX; }
@@ -47,7 +47,7 @@ class CRowReader {
     // The next row, into `row`, whose storage is reused; false at the end of the text.
     bool Next(CTokenRow& row);
 
-    // Takes the brackets that are open for none.
+    // Treats the brackets that are open as if they weren't.
     void ForgetBrackets() { _fBrackets.clear(); }
     // Likewise, but for those that the last row has opened.
     void ForgetOuterBrackets() { _fBrackets.erase(_fBrackets.begin(), _fBrackets.begin() + _fOuterCount); }

@@ -1,4 +1,4 @@
-// The defs and classes around a logical line, as far as indentation tells.
+// The defs and classes around a logical line, as far as indentation shows.
 #pragma once
 
 #include <cstdint>
@@ -11,7 +11,7 @@ namespace codeloom {
 class CScopes {
   public:
     // Sets what the scopes say about `logical`, whose type is known and whose row is indented by `indent`,
-    // and opens the scope that it begins. `is_mid_row`: it stands after another logical of the same row.
+    // and opens the scope that it begins. `is_mid_row`: it comes after another logical of the same row.
     void Visit(CRawLogical& logical, int32_t indent, bool is_mid_row);
 
   private:

@@ -123,7 +123,7 @@ inline CStringEnd FindSingleEnd(std::string_view text, size_t pos, char quote) {
 
 }  // namespace string_lexer
 
-// The end of the string whose content begins at `pos`, fields not regarded.
+// The end of the string whose content begins at `pos`, whatever its fields are.
 inline CStringEnd FindStringEnd(std::string_view text, size_t pos, char quote, bool is_triple) {
     return is_triple ? string_lexer::FindTripleEnd(text, pos, quote)
                      : string_lexer::FindSingleEnd(text, pos, quote);

@@ -10,7 +10,7 @@ namespace codeloom {
 
 class CStringTokens {
   public:
-    // Stands on the first token. `text` must outlive it.
+    // Begins on the first token. `text` must outlive it.
     explicit CStringTokens(std::string_view text) : _fLexer(text) { _Take(0); }
 
     bool IsAtEnd() const { return _fPos == _fLexer.Text().size(); }
@@ -25,7 +25,7 @@ class CStringTokens {
     // when it closes. Closers too many don't count.
     size_t NestCount() const { return _fNestCount; }
 
-    // Moves to the next token. Blanks, row ends, comments and backslashes between rows are none.
+    // Moves to the next token. Blanks, row ends, comments and backslashes between rows aren't tokens.
     void Next();
 
   private:

@@ -213,7 +213,7 @@ void CTokenizer::_AddToken(CRawLogical& logical) {
     _Note(pos, token);
 }
 
-// Takes account of a token of any kind but the most frequent ones. It may hold rows.
+// Takes note of a token of any kind but the most frequent ones. It may hold rows.
 void CTokenizer::_Note(size_t pos, CLexedToken token) {
     const std::string_view text = _fLexer.Text();
     switch (token.type) {
@@ -250,8 +250,8 @@ inline void CTokenizer::_NoteSign(COperator op) {
     if (op.type == kTokenId_COLON) --facts.open_lambdas;
 }
 
-// The ";" at the place parts two logical lines. One that parts nothing is a token, and a fault. One in a row
-// whose quotes don't match may as well stand in a string, and parts nothing either.
+// The ";" at the place ends a logical line. One that ends none is a token, and a fault. One in a row
+// whose quotes don't match may as well be in a string, and ends nothing either.
 bool CTokenizer::_IsSeparator(const CRawLogical& logical) {
     if (_fIsCompound || FindLastSignificant(logical.tokens).length == 0 || _HasOpenQuote()) return false;
     _fIsCompound = IsCompound(logical);
@@ -298,7 +298,7 @@ bool CTokenizer::_BeginsHeader(const CRawLogical& logical) {
     return BeginsHeader(row) || BeginsStatement(row);
 }
 
-// The ":" that the rows end with can't stand in the parentheses that are open, so it is the header's.
+// The ":" that the rows end with can't be in the parentheses that are open, so it is the header's.
 bool CTokenizer::_EndsHeader(const CRawLogical& logical) const {
     if (_fBrackets.Innermost() != ')' || !IsCompoundWord(logical.tokens.front().word)) return false;
     return std::none_of(logical.tokens.begin(), logical.tokens.end(), [](const CRawToken& token) {

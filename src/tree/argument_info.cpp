@@ -233,7 +233,7 @@ void BindArgumentInfo(nb::module_& module) {
     module.def(
         "GetUsedArgInfoList", &GetUsedArgInfoList, "node"_a.none(),
         "A new list of CArgInfo, one for each argument of a call: `node` is its argument list, or a lone "
-        "argument, whose prefix isn't told.");
+        "argument, whose prefix isn't known.");
 }
 
 }  // namespace codeloom

@@ -21,7 +21,7 @@ struct CArgument {
     CTextOrNone prefix;  // "*" or "**"
     CNodeRef type_expr;  // the annotation
 
-    // A parameter of the old form that is a tuple of names in brackets has nothing but these.
+    // A parameter of the old form that is a tuple of names in parentheses has nothing but these.
     bool is_tuple = false;
     CArgumentList tuple;
 
@@ -47,7 +47,7 @@ class CArgInfo : public CHosted, public CArgument {
 CArgumentList GetDefiningArgInfoList(CNodeRef node);
 
 // The arguments of a call. `node` is a CUsedArglistNode, a CTestListStarExpr, or a lone argument. The prefix
-// of a lone argument isn't told.
+// of a lone argument isn't known.
 CArgumentList GetUsedArgInfoList(CNodeRef node);
 
 // Binds CArgInfo and the functions.

@@ -1,5 +1,5 @@
 // Arguments of calls and of definitions. A lone argument is without its list, as a node of this file
-// where it has parts, or else as the name or expression itself: argument_info.h tells of all shapes alike.
+// where it has parts, or else as the name or expression itself: argument_info.h describes all shapes alike.
 #pragma once
 
 #include "tree/node.h"
@@ -18,7 +18,7 @@ class CSingleUsedArgumentNode : public CNode {
     OPERATION(CTextOrNone, GetPrefix, (), "\"*\" or \"**\"; None without such.");
     OPERATION(CNodeRef, GetName, (), "What is before `=`; None when there is no `=`.");
     OPERATION(CNodeRef, GetValue, (), "The value after `=`; the node itself when there is no `=`.");
-    OPERATION(bool, IsUnparenthesizedGenExpr, (), "True for a comprehension without brackets of its own.");
+    OPERATION(bool, IsUnparenthesizedGenExpr, (), "True for a comprehension without parentheses of its own.");
     OPERATION(CNodeRef, GetNameAssigned, (), "What is before `:=`; None when there is no `:=`.");
     OPERATION(CNodeRef, GetNamedRightHandExpression, (), "The value after `:=`; None when there is no `:=`.");
     END_OPERATIONS
@@ -35,7 +35,7 @@ class CFunctionParameterDef : public CNode {
   public:
     OPERATIONS_OF(CFunctionParameterDef, CNode)
     OPERATION(CNodeRef, GetNestedListNode, (),
-              "The parameters in brackets of the old tuple form; None for an ordinary parameter.");
+              "The parameters in parentheses of the old tuple form; None for an ordinary parameter.");
     OPERATION(CNodeRef, GetName, (), "The name; None for the tuple form.");
     OPERATION(CNodeRef, GetTypeExpr, (), "The annotation; None when there is none.");
     END_OPERATIONS

@@ -49,7 +49,7 @@ class TChildren {
         return _fNodes[_IndexOf(i)].get();
     }
 
-    // The child at `i` as a T, empty when it is none; TypeError when it is of another class.
+    // The child at `i` as a T, empty when it is None; TypeError when it is of another class.
     template <class T>
     CRef<T> RefAt(Py_ssize_t i) const {
         if (_HasList()) [[unlikely]]
@@ -74,7 +74,7 @@ class TChildren {
         return list;
     }
 
-    // The list that the host has; invalid when it hasn't asked for one.
+    // The list that the host has; invalid unless it has asked for one.
     const nb::object& ListOfHost() const { return _fList; }
 
     // Gives each native child to take(child), or else the host's list to the caller, and is those of a leaf

@@ -30,7 +30,7 @@ class CFuncdefStmt : public CStmt {
   public:
     OPERATIONS_OF(CFuncdefStmt, CStmt)
     OPERATION(CTextOrNone, GetFunctionName, (), "The name after `def`.");
-    OPERATION(CRef<CParametersNode>, GetParameters, (), "The parameters with their brackets.");
+    OPERATION(CRef<CParametersNode>, GetParameters, (), "The parameters with their parentheses.");
     OPERATION(CExpressionRef, GetReturnType, (),
               "The expression after `->`; None when the header has no arrow.");
     OPERATION(CNodeRef, GetSuite, (), "The body; None for a node without children.");
@@ -71,7 +71,7 @@ class CTypeParameter : public CNode {
 };
 
 // Type parameters, then the statement that they belong to (PEP 695). Made by hand, by no grammar state. The
-// statement is none when nothing was left of it.
+// statement is None when nothing was left of it.
 //   child    type parameter  type parameter ...  statement
 class CWithTypeParameters : public CStmt {
   public:

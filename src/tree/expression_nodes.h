@@ -95,7 +95,7 @@ class CYieldExpr : public CExpression {
     static constexpr Py_ssize_t kArgumentIndex = 1;
 };
 
-// `a, b` and `a,`: comma lists of expressions; `a for b in c` within brackets
+// `a, b` and `a,`: comma lists of expressions; `a for b in c` within parentheses
 //   child    item  ','  item  ',' ...
 //   child    item  comprehension
 class CTestListStarExpr : public CExpression {
@@ -104,7 +104,7 @@ class CTestListStarExpr : public CExpression {
     int GetSubExprCount() override;
     OPERATIONS_OF(CTestListStarExpr, CExpression)
     OPERATION(bool, IsTuple, (), "True for a comma list; False for a comprehension.");
-    OPERATION(bool, IsGenExpr, (), "True for a comprehension, which is here without its brackets.");
+    OPERATION(bool, IsGenExpr, (), "True for a comprehension, which is here without its parentheses.");
     END_OPERATIONS
 };
 

@@ -6,7 +6,7 @@ namespace codeloom {
 
 namespace {
 
-// Counts the steps down a chain of brackets: a tree that a host made may contain itself.
+// Counts the steps down a chain of parentheses: a tree that a host made may contain itself.
 class CDescent {
   public:
     void Step() {
@@ -69,7 +69,7 @@ bool IsDottedChain(const CChainParts& chain) {
     const auto& [atom, trailers] = chain;
     for (Py_ssize_t i = 0; i < trailers.Size(); ++i)
         if (trailers.At<CTrailer>(i)->GetDotName().is_none()) return false;
-    // Brackets before a trailer aren't simple.
+    // Parentheses before a trailer aren't simple.
     return trailers.Size() == 0 ? IsDottedName(*atom) : atom->As<CNameLiteral>() != nullptr;
 }
 
@@ -106,12 +106,13 @@ void BindNodeHelpers(nb::module_& module) {
         "return the original node. ");
     module.def("IsSetLiteral", &IsSetLiteral, "atom_node"_a,
                "True for a set display. ValueError for an atom without children.");
-    module.def("IsGenExpression", &IsGenExpression, "atom_node"_a,
-               "True for a generator in its brackets under a grammar that has its `for` right in them. Where "
-               "the\n`for` is a node of its own, as in both grammars here, False: ask IsComprehension.");
+    module.def(
+        "IsGenExpression", &IsGenExpression, "atom_node"_a,
+        "True for a generator in its parentheses under a grammar that has its `for` right in them. "
+        "Where the\n`for` is a node of its own, as in both grammars here, False: ask IsComprehension.");
     module.def("IsTupleLiteralNode", &IsTupleLiteralNode, "node"_a,
-               "True for a tuple, in any number of brackets or none. AssertionError for brackets that hold "
-               "more\nthan one node, ValueError for an atom without children.");
+               "True for a tuple, in any number of parentheses or none. AssertionError for parentheses that "
+               "hold more\nthan one node, ValueError for an atom without children.");
 }
 
 }  // namespace codeloom

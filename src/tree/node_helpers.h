@@ -8,15 +8,15 @@
 
 namespace codeloom {
 
-// `a` for `(a)` and `((a))`; the node itself for anything else, a tuple and a generator in their brackets
+// `a` for `(a)` and `((a))`; the node itself for anything else, a tuple and a generator in parentheses
 // included.
 CNodeRef DropSimpleParens(CNode& node);
 
-// The elements of a tuple in brackets, `(a, b)` or `()`; nothing for any other node. A generator has one
+// The elements of a tuple in parentheses, `(a, b)` or `()`; nothing for any other node. A generator has one
 // element, which is empty.
 std::optional<std::vector<CNodeRef>> ExpandSeqLiteral(CNode& node);
 
-// True for a name and for a chain of names, `a.b.c`; for the first of them in brackets too.
+// True for a name and for a chain of names, `a.b.c`; for the first of them in parentheses too.
 bool IsDottedName(CNode& node);
 
 // The same for an atom and the trailers after it.
@@ -28,7 +28,7 @@ bool IsSetLiteral(CAtom& atom_node);
 // True for `(a for b in c)` under a grammar that doesn't wrap the `for` in a node of its own.
 bool IsGenExpression(CAtom& atom_node);
 
-// True for a tuple, in brackets of any number or in none.
+// True for a tuple, in any number of parentheses or in none.
 bool IsTupleLiteralNode(CNode& node);
 
 void BindNodeHelpers(nb::module_& module);

@@ -151,7 +151,7 @@ bool CNodeToTextConverterImpl::_AppendChain(std::string& text, Chain& chain,
 bool CNodeToTextConverterImpl::AppendTextForAtomPlusTrailers(std::string& text, CNode& atom,
                                                              const CNodeRange& trailers,
                                                              const CNodeTextOptions& options) {
-    // The brackets of `(a).b` are no longer simple.
+    // The parentheses of `(a).b` are no longer simple.
     const bool discard_simple_parens = options.discard_simple_parens && trailers.Size() == 0;
     const CNodeTextOptions atom_options{options.dotted_name_only, discard_simple_parens,
                                         options.literal_only};

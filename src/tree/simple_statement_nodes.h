@@ -45,7 +45,7 @@ class CExprStmt : public CStmt {
               "equal_num"_a);
     OPERATION(CTextOrNone, GetAugAssignOp, (),
               "The operator of an augmented assignment, such as \"+=\"; None when there is none. The "
-              "operators \"|=\" and \"@=\" aren't told.");
+              "operators \"|=\" and \"@=\" give None.");
     END_OPERATIONS
 
   private:
@@ -70,7 +70,7 @@ class CDelStmt : public CStmt {
   public:
     OPERATIONS_OF(CDelStmt, CStmt)
     OPERATION(CNodeList, GetExpressions, (),
-              "A new list of the expressions that are deleted. One in brackets is a single expression.");
+              "A new list of the expressions that are deleted. One in parentheses is a single expression.");
     END_OPERATIONS
 
   private:

@@ -1,4 +1,4 @@
-// The side of the comments.
+// Hints in comments.
 #include <algorithm>
 #include <string>
 

@@ -13,7 +13,7 @@ namespace {
 
 constexpr std::string_view kLiteral = "Literal";
 
-// The name in ` as name` at `pos`; empty where it doesn't stand.
+// The name in ` as name` at `pos`; empty where there is none.
 std::string_view NameAfterAs(std::string_view text, size_t pos) {
     const size_t as = SkipSpace(text, pos);
     if (as == pos || !text.substr(as).starts_with("as")) return {};
@@ -28,7 +28,7 @@ bool HasArguments(std::string_view hint) {
     return !first.starts_with(')') && !first.starts_with("...");
 }
 
-// The stars of parameters, which are first within the brackets or after a comma.
+// The stars of parameters, which are first within the parentheses or after a comma.
 void BlankStars(std::string& hint) {
     int depth = 0;
     char last = '\0';
@@ -47,7 +47,7 @@ bool EndsWithArrow(std::string_view text) {
     return WithoutSpaceAtEnd(text).ends_with("->");
 }
 
-// The brackets of `-> (bool)`; those of a tuple can't be done without.
+// The parentheses of `-> (bool)`; a tuple needs its own.
 void BlankBracketsOfResult(std::string& hint) {
     const size_t end = EndBeforeSpace(hint, hint.size());
     if (end == 0 || hint[end - 1] != ')') return;
@@ -87,7 +87,7 @@ void CFalseHints::MakeReadable(std::string& hint) {
     BlankDotsAsResult(hint);
 }
 
-// The line is a `def` with empty brackets.
+// The line is a `def` with empty parentheses.
 bool CFalseHints::_TakesNothing() const {
     if (_fLine->type != ELogicalType::kFunctionDef) return false;
     const auto& tokens = _fLine->tokens;

@@ -1,11 +1,11 @@
-// What looks like a type hint and is none.
+// What looks like a type hint and isn't one.
 //   in     the text of a file, then its lines one after the other
 //   out    which of their hints aren't hints
 //   keeps  what the file says of `Literal`, once it matters
 //   start  at CFalseHints::BeginLine
-// The walk for hints takes every comment that begins with "type:" for a hint, save a bare `# type: ignore`.
+// The walk for hints takes every comment that begins with "type:" for a hint, except a bare `# type: ignore`.
 // But people write `# type: ignore[code]` and plain prose there too, and forms of hints that the grammar
-// doesn't know. It takes strings in annotations for hints, save within `Literal[...]`; but people write prose
+// doesn't know. It takes strings in annotations for hints, except in `Literal[...]`; but people write prose
 // there too, and one line doesn't show that its file says `from typing import Literal as L`.
 #pragma once
 

@@ -29,7 +29,7 @@ struct CDefForHint {
 
 CDefForHint DefForHint(std::string_view hint);
 
-// True for the hint of a function, in brackets.
+// True for the hint of a function, in parentheses.
 bool HasFunctionForm(std::string_view hint);
 
 }  // namespace codeloom

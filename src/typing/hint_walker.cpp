@@ -12,7 +12,7 @@ namespace codeloom {
 
 namespace {
 
-// No hint is below an expression; statements are below nodes that are none.
+// No hint is below an expression; statements are below nodes that aren't expressions.
 bool MayHoldHints(const CTree& tree, const CTreeNode& root) {
     switch (root.kind) {
         case ENodeKind::kFuncdef:

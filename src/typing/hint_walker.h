@@ -8,7 +8,7 @@
 // hint_walker.cpp    the walk, the visits, and pairing names with hints
 // comment_hints.cpp  hints in comments
 // hint_parser.h      their text into trees; function_hint.h of those of functions
-// false_hints.h      what looks like a hint and is none
+// false_hints.h      what looks like a hint and isn't one
 #pragma once
 
 #include <optional>
@@ -35,7 +35,7 @@ struct CHintContext {
 struct CHintResult {
     CFault fault;  // the records of the line are of no use then
     ELimit limit = ELimit::kNone;
-    // The hint of a function speaks of arguments that its `def` hasn't. The line is to leave no records.
+    // The hint of a function names arguments that its `def` lacks. The line is to leave no records.
     bool is_given_up = false;
     bool is_deep = false;  // the tree of a hint in a comment is larger than walks go
 };

@@ -126,7 +126,7 @@ bool HoldsProse(std::string_view text) {
     return open_conditions > 0;
 }
 
-// `-> (a, b)`: what a function returns can't be a tuple without brackets of its own.
+// `-> (a, b)`: what a function returns can't be a tuple without parentheses of its own.
 bool HasTupleAsResult(std::string_view hint) {
     for (size_t pos = hint.find("->"); pos != std::string_view::npos; pos = hint.find("->", pos)) {
         pos = SkipSpace(hint, pos + 2);

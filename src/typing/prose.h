@@ -1,4 +1,4 @@
-// Prose told from type hints. Every test takes time in proportion to the text.
+// Prose distinguished from type hints. Every test takes time in proportion to the text.
 #pragma once
 
 #include <string_view>

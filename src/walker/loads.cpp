@@ -25,7 +25,7 @@ nb::object WithinExprEquiv(const CNode& name) {
                        BytesForInteger(ResultFromHost<Py_ssize_t>(name.fContext)));
 }
 
-// A lone `*a` is an argument whose record doesn't tell of the star.
+// A lone `*a` is an argument whose record doesn't mention the star.
 bool IsStarred(const CArgument& argument) {
     const CRef<CSingleUsedArgumentNode> single(argument.value->As<CSingleUsedArgumentNode>());
     return !argument.prefix.is_none() || (single && !single->GetPrefix().is_none());

@@ -1,6 +1,6 @@
 // walker/: what one logical line does with names.
 //   in     the typed tree of one line, and its CLogicalLine
-//   out    records appended to that line, in the order in which the walk meets what they tell; the names read
+//   out    records appended to that line, in the order in which the walk meets what they say; the names read
 //          come at the end
 //   keeps  nothing from one line to the next, but its limits and its text converter
 //   start  at CNodeWalker::Walk, then the table in dispatch.cpp

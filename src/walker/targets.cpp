@@ -84,7 +84,7 @@ void CNodeWalker::_ProcessTargets(CNode& lhs, CNodeRef rhs, CBytesOrNone extra_t
     }
 }
 
-// A list, whatever the right side could tell.
+// A list, whatever the right side could say.
 void CNodeWalker::_ProcessStarredTarget(CStarExpression& target) {
     const CBytesOrNone name = _TextForNode(*target.GetStarredExpression());
     if (name.is_none()) return;

@@ -35,7 +35,7 @@ CSignedNumber SignedNumber(CFactorExpr& factor) {
     return {CRef<CNumberLiteral>(child->As<CNumberLiteral>()), std::move(sign)};
 }
 
-// Leaves but names. No part of one can be told.
+// Leaves but names. No part of one is known.
 bool IsLiteral(const CNode& node) {
     return node.As<CNumberLiteral>() != nullptr || node.As<CStringLiteral>() != nullptr ||
            TextIsOneOf(node.fText, "None", "True", "False");

@@ -24,7 +24,7 @@ class CKeywords {
     void Add(const std::string& text, int label);
     void Seal();  // call once, after the last Add
 
-    // The label of the keyword `text`, a text string; -1 when it is none.
+    // The label of the keyword `text`, a text string; -1 when it isn't one.
     int Find(nb::handle text) const {
         return PyUnicode_CHECK_INTERNED(text.ptr()) ? _FindIdentity(text) : _FindContent(text);
     }

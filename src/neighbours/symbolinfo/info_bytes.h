@@ -12,7 +12,7 @@ namespace nb = nanobind;
 
 namespace codeloom {
 
-// The record of a literal: the prefix, the type, ":", and unless `text` is none a blank and the text.
+// The record of a literal: the prefix, the type, ":", and, where there is a `text`, a blank and the text.
 // TypeError when `text` is neither a string nor none.
 nb::object BuildLiteralInfo(std::string_view type_name, nb::handle text);
 
