@@ -149,19 +149,19 @@ class Range:
 
     @property
     def row(self) -> int:
-        ...
+        """The row of its first character."""
 
     @property
     def column(self) -> int:
-        ...
+        """The column of its first character."""
 
     @property
     def end_row(self) -> int:
-        ...
+        """The row of its last character."""
 
     @property
     def end_column(self) -> int:
-        ...
+        """The column after its last character."""
 
     def __eq__(self, other: object, /) -> bool:
         ...
@@ -214,20 +214,20 @@ class Problem:
     @property
     def severity(self) -> Literal['error', 'warning']:
         """
-        "error" for what the interpreter refuses; "warning" for a type hint that can't be read and for a line that is too long to analyse.
+        "error" for what the interpreter refuses; "warning" for a type hint that can't be read, a way out of a `finally`, and a line that is too long to analyse.
         """
 
     @property
     def range(self) -> Range:
-        """What it is about, at least one character unless the text is empty."""
+        """Where it is: at least one character, unless the text is empty."""
 
     @property
     def related(self) -> tuple[tuple[Range, str], ...]:
-        """Other places that it has to do with, each with what it is."""
+        """Other places that belong to it, each with a few words on why."""
 
     @property
     def hint(self) -> str | None:
-        """What may have been meant, if that is known."""
+        """What may have been meant; None where that isn't known."""
 
     @property
     def source_row(self) -> str:
@@ -279,11 +279,11 @@ class Line:
 
     @property
     def problems(self) -> Problems:
-        """What is wrong with it."""
+        """What is wrong with it, in the order of the text."""
 
     @property
     def records(self) -> Records:
-        """What it says of names; nothing when it has a problem."""
+        """What it says of names; empty when it has a problem."""
 
     @property
     def occurrences(self) -> Occurrences:
@@ -322,18 +322,18 @@ class Record:
 
     @property
     def payload(self) -> str:
-        """What is said besides the kind, as text."""
+        """What else is said, as text; its form depends on the kind."""
 
     @property
     def value(self) -> None | int | str | tuple[str, str | None]:
         """
-        The payload by its form: None, a text, the index of a token, (module, name) or (type, value).
+        The payload as a value: None, a text, the index of a token, (module, name) or (type, value).
         """
 
     @property
     def of_argument(self) -> bool:
         """
-        True when the name is an argument or a type parameter of the definition on its line.
+        True when the name is a parameter or a type parameter of the definition on its line.
         """
 
     @property
@@ -376,11 +376,11 @@ class Limit:
 
     @property
     def message(self) -> str:
-        """The same in words."""
+        """The limit in words."""
 
     @property
     def line(self) -> Line:
-        """The line."""
+        """The line that is too much."""
 
     def __repr__(self) -> str:
         ...
@@ -603,7 +603,7 @@ class Scope:
 
     @property
     def symbols(self) -> tuple[Symbol, ...]:
-        """Its names, in the order in which they come up."""
+        """Its names, in the order in which they first appear."""
 
     def __repr__(self) -> str:
         ...
@@ -627,11 +627,11 @@ class Symbol:
 
     @property
     def name(self) -> str:
-        """The name, as a class around it mangles it."""
+        """The name, as the class around it mangles it."""
 
     @property
     def scope(self) -> Scope:
-        """The scope."""
+        """The scope that it is a name of."""
 
     @property
     def is_local(self) -> bool:
@@ -639,7 +639,7 @@ class Symbol:
 
     @property
     def is_global(self) -> bool:
-        """It is a name of the module, or none known."""
+        """It is a name of the module, or isn't bound in the text."""
 
     @property
     def is_free(self) -> bool:
@@ -659,7 +659,7 @@ class Symbol:
 
     @property
     def is_assigned(self) -> bool:
-        """It gets a value, but by an import or a call."""
+        """It gets a value, other than by an import or as a parameter."""
 
     @property
     def is_parameter(self) -> bool:
@@ -731,7 +731,7 @@ class Occurrence:
     @property
     def home(self) -> Scope | None:
         """
-        The scope that binds its name; None where none of the text is known to.
+        The scope that binds its name; None where no scope of the text is known to.
         """
 
     @property
@@ -892,7 +892,7 @@ class Hint:
     @property
     def name(self) -> str:
         """
-        The name or chain that it is about; of what a function gives back, that of the function.
+        The name or chain that it is about; of what a function returns, that of the function.
         """
 
     @property
@@ -992,7 +992,7 @@ class Signature:
 
     @property
     def return_hint(self) -> Hint | None:
-        """The hint of what it gives back; None without one."""
+        """The hint of what it returns; None without one."""
 
     def __repr__(self) -> str:
         ...
@@ -1174,7 +1174,7 @@ class Analysis:
 
     @property
     def path(self) -> str:
-        """The name that problems bear."""
+        """The name of the text, which is in its problems."""
 
     @property
     def python(self) -> str:
@@ -1215,7 +1215,7 @@ class Analysis:
     @property
     def occurrences(self) -> Occurrences:
         """
-        Every appearance of a name, in the order of the text. What runs can't be known: names that are made by `exec`, `globals()` or `setattr` don't appear.
+        Every appearance of a name, in the order of the text. Names that are only made at run time, by `exec`, `globals()` or `setattr`, don't appear.
         """
 
     @property
@@ -1224,22 +1224,22 @@ class Analysis:
 
     def definitions(self, name: str) -> tuple[Occurrence, ...]:
         """
-        Where the name gets a value, in any scope. Which of them is the one at run time isn't known.
+        Where the name gets a value, in any scope. Which of these runs isn't known.
         """
 
     def references(self, occurrence: Occurrence) -> tuple[Occurrence, ...]:
         """
-        All occurrences of the name that its scope binds, this one included; nothing for an attribute, whose object isn't known. ValueError for one of another analysis.
+        All occurrences of the name that its scope binds, this one included; none for an attribute, whose object isn't known. ValueError for one of another analysis.
         """
 
     def occurrence_at(self, row: int, column: int) -> Occurrence | None:
         """
-        The occurrence at a place, or that ends there. Both count from 1, columns in characters; ValueError for less.
+        The occurrence at a place, or the one that ends there. Row and column count from 1, columns in characters; ValueError for less than 1.
         """
 
     def unused(self, *, parameters: bool=False) -> tuple[Occurrence, ...]:
         """
-        The first binding of each import and of each local name of a function that nothing in the text reads; with `parameters` theirs too. Names that begin with `_` are left out, and what `__all__` lists. What other modules read, and what a name is looked up by as text, isn't known.
+        The first binding of each import and of each local name of a function that nothing in the text reads; with `parameters` theirs too. Names that begin with `_` are left out, and what `__all__` lists. What other modules read isn't known, nor which names are looked up as text.
         """
 
     def undefined(self) -> tuple[Occurrence, ...]:
@@ -1254,12 +1254,12 @@ class Analysis:
     @property
     def hints(self) -> Hints:
         """
-        Every type hint of the text, line by line: those of variables, attributes, parameters and of what functions give back, in annotations and in comments.
+        Every type hint of the text, line by line: those of variables, attributes, parameters and of what functions return, in annotations and in comments.
         """
 
     def table(self, name: str) -> Table:
         """
-        One of the tables of docs/tables.md, such as "lines", whole; ValueError when there is none of that name.
+        One of the tables of docs/tables.md, such as "lines", whole; ValueError for an unknown name.
         """
 
 class DocumentText:

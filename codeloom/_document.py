@@ -63,7 +63,7 @@ class Document:
 
     @property
     def path(self) -> str:
-        """The name that problems bear."""
+        """The name of the text, which is in its problems."""
         return self._path
 
     @property
@@ -83,7 +83,7 @@ class Document:
 
     @property
     def analysis(self) -> Analysis:
-        """What the text says now; the same as `analyze` says of it."""
+        """What `analyze` says of the text as it is now."""
         return self._analysis
 
     @property
@@ -92,17 +92,17 @@ class Document:
         return self._text.end
 
     def position(self, row: int, column: int) -> Position:
-        """A place of the analysis, with the column in what this document counts.
+        """A row and a column of the analysis as a position in this document, whose columns count `encoding`.
 
         ValueError for a place that the text doesn't have.
         """
         return row, self._text.column_of(row, column)
 
     def edit(self, start: Position, end: Position, new_text: str) -> "Change":
-        """Put `new_text` in the place of what is from `start` up to `end`, and say what that changes.
+        """Replace what is from `start` up to `end` by `new_text`, and say what that changes.
 
-        ValueError for a position that the text doesn't have, within a character too, and for an `end`
-        before `start`; the text then stays as it is.
+        ValueError for a position that the text doesn't have, or that is within a character, and for an
+        `end` before `start`; the text then stays as it is.
         """
         if not isinstance(new_text, str):
             raise TypeError(f"new_text must be a str, not {type(new_text).__name__}")
@@ -128,6 +128,15 @@ class Change:
     edit has moved it, has neither gone nor come; all others have.
     """
 
+    before: Analysis
+    """The analysis before the edit."""
+    after: Analysis
+    """The analysis after it."""
+    range: Range
+    """What the edit replaced, in the text before."""
+    new_range: Range
+    """What is there now, in the text after."""
+
     def __init__(self, before: Analysis, after: Analysis, range: Range, new_range: Range) -> None:
         self.before = before
         self.after = after
@@ -136,17 +145,17 @@ class Change:
 
     @property
     def lines_gone(self) -> tuple[Line, ...]:
-        """The logical lines of the text before that are no more, or have another text or indentation."""
+        """The logical lines of the text before that are gone, or have another text or indentation now."""
         return self._lines[0]
 
     @property
     def lines_come(self) -> tuple[Line, ...]:
-        """The logical lines of the text after that are in their place."""
+        """The logical lines of the text after that weren't there before."""
         return self._lines[1]
 
     @property
     def problems_gone(self) -> tuple[Problem, ...]:
-        """The problems that are no more."""
+        """The problems that are gone."""
         return self._problems[0]
 
     @property
@@ -156,7 +165,7 @@ class Change:
 
     @property
     def occurrences_gone(self) -> tuple[Occurrence, ...]:
-        """The appearances of names that are no more, or have another resolution now."""
+        """The appearances of names that are gone, or have another resolution now."""
         return self._occurrences[0]
 
     @property
@@ -166,7 +175,7 @@ class Change:
 
     @property
     def scopes_gone(self) -> tuple[Scope, ...]:
-        """The scopes that are no more, or whose symbols are others now."""
+        """The scopes that are gone, or have other symbols now."""
         return self._scopes[0]
 
     @property

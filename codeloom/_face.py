@@ -25,10 +25,12 @@ def analyze(
     """What a source text says: its problems, its lines, their records.
 
     Bytes are decoded as those of a file: by their byte order mark or their coding comment, else as
-    UTF-8. `path` is the name that problems bear. `python` is the version that the text is written in,
-    such as "3.12" or "2.7". With `false_hints` all that looks like a type hint is taken for one.
+    UTF-8. `path` is the name of the text, which is in its problems. `python` is the version that the
+    text is written in, such as "3.12" or "2.7". With `false_hints` everything that looks like a type
+    hint is taken for one.
 
-    It never fails on what the text holds: what can't be read is a problem too.
+    It never fails on what the text holds: what can't be read is a problem too. TypeError for an
+    argument of a wrong type, ValueError for an unknown version.
     """
     if isinstance(source, str):
         text = source_from_text(source)

@@ -6,6 +6,8 @@ text after it is what it prints. Blocks of a console hold commands after `$` wit
 """
 
 import ast
+import enum
+import inspect
 import os
 import re
 import shutil
@@ -89,15 +91,33 @@ def test_examples(page, place, rewrite):
     assert found.split("\n") == text.split("\n") or rewrite
 
 
-def test_every_name_has_an_example():
+def test_every_name_attribute_and_argument_has_an_example():
     blocks = "".join(match["code"] for match in PYTHON.finditer((ROOT / "docs/api.md").read_text()))
-    used = {node.id for node in ast.walk(ast.parse(blocks)) if isinstance(node, ast.Name)}
-    assert set(codeloom.__all__) <= used
+    nodes = list(ast.walk(ast.parse(blocks)))
+    assert set(codeloom.__all__) <= {node.id for node in nodes if isinstance(node, ast.Name)}
+    objects = [getattr(codeloom, name) for name in codeloom.__all__]
+    classes = [each for each in objects if inspect.isclass(each) and not issubclass(each, enum.Enum)]
+    attributes = {name for each in classes for name in {*vars(each), *each.__annotations__} if name[0] != "_"}
+    assert attributes <= {node.attr for node in nodes if isinstance(node, ast.Attribute)}
+    functions = [each for each in objects if inspect.isfunction(each)] + [codeloom.Document]
+    arguments = {name for each in functions for name in inspect.getfullargspec(each).kwonlyargs}
+    assert arguments <= {node.arg for node in nodes if isinstance(node, ast.keyword)}
+
+
+def test_every_attribute_is_explained():
+    tool = tool_named("make_api_page")
+    page = tool.PAGE.read_text("utf-8")
+    assert tool.with_tables(page) == page, "run: python tools/make_api_page.py"
+    objects = [getattr(codeloom, name) for name in codeloom.__all__]
+    classes = {each for each in objects if inspect.isclass(each) and not issubclass(each, enum.Enum)}
+    assert set(re.findall("<!-- table of (.*) -->", page)) == {each.__name__ for each in classes}
+    assert not re.findall(r"^\| .*\|  \|$", page, re.MULTILINE), "an attribute without a description"
 
 
 def test_links_lead_somewhere():
     for path in [ROOT / "README.md", *ROOT.glob("docs/*.md")]:
-        for link in re.findall(r"\]\(([^)#:]+)(?:#[^)]*)?\)", path.read_text()):
+        text = re.sub(r"^```.*?^```$", "", path.read_text(), flags=re.MULTILINE | re.DOTALL)
+        for link in re.findall(r"\]\(([^)#:]+)(?:#[^)]*)?\)", text):
             assert (path.parent / link).exists(), (path.name, link)
 
 

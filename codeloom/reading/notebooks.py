@@ -31,9 +31,13 @@ class Notebook:
     """The text of a notebook's code cells, and the place of each of its rows.
 
     `text` holds the cells in their order, each from a row of its own. Rows that are the notebook's own,
-    such as `%magic` and `!command`, are comments in it, so that rows keep their numbers. `is_python` is
-    false for a notebook in another language, which has no text.
+    such as `%magic` and `!command`, are comments in it, so that rows keep their numbers.
     """
+
+    text: str
+    """The text of the code cells, for `analyze`."""
+    is_python: bool
+    """False for a notebook in another language, whose text is empty."""
 
     def __init__(self, data: bytes) -> None:
         """Read a notebook from its JSON; ValueError when it isn't one."""
@@ -51,9 +55,9 @@ class Notebook:
         self.text = "".join(texts)
 
     def place(self, row: int) -> tuple[int, int]:
-        """The number of the cell that a row of `text` comes from, and its row there; all count from 1.
+        """The number of the cell that a row of `text` comes from, and the row in that cell.
 
-        Cells of all kinds count. The row after the last one belongs to the last cell.
+        All count from 1, and cells of all kinds count. The row after the last one belongs to the last cell.
         """
         if not self._cells:
             return 1, row

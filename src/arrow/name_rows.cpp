@@ -18,7 +18,7 @@ const TColumns<COccurrenceRow>& COccurrenceSource::Columns() {
                                               "Where its name is bound; null for what belongs "
                                               "to no scope, such as an attribute.")
             .Add<&COccurrenceRow::home>("home",
-                                        "The index of the scope that binds its name; null where none "
+                                        "The index of the scope that binds its name; null where no scope "
                                         "of the text is known to.")
             .Add<&COccurrenceRow::is_definition>("is_definition", "It is the name of a `def` or a `class`.")
             .Add<&COccurrenceRow::in_f_string>("in_f_string", "It is in a field of an f-string.")
@@ -90,14 +90,16 @@ const TColumns<CSymbolRow>& CSymbolSource::Columns() {
     static const auto columns =
         TColumns<CSymbolRow>()
             .Add<&CSymbolRow::scope>("scope", "The index of its scope.")
-            .Add<&CSymbolRow::name>("name", "The name, as a class around it mangles it.")
+            .Add<&CSymbolRow::name>("name", "The name, as the class around it mangles it.")
             .Add<&CSymbolRow::is_local>("is_local", "The scope binds it.")
-            .Add<&CSymbolRow::is_global>("is_global", "It is a name of the module, or none known.")
+            .Add<&CSymbolRow::is_global>("is_global",
+                                         "It is a name of the module, or isn't bound in the text.")
             .Add<&CSymbolRow::is_free>("is_free", "A function around the scope binds it.")
             .Add<&CSymbolRow::is_declared_global>("is_declared_global", "A `global` names it.")
             .Add<&CSymbolRow::is_nonlocal>("is_nonlocal", "A `nonlocal` names it.")
             .Add<&CSymbolRow::is_referenced>("is_referenced", "The scope reads it.")
-            .Add<&CSymbolRow::is_assigned>("is_assigned", "It gets a value, but by an import or a call.")
+            .Add<&CSymbolRow::is_assigned>("is_assigned",
+                                           "It gets a value, other than by an import or as a parameter.")
             .Add<&CSymbolRow::is_parameter>("is_parameter", "It is a parameter.")
             .Add<&CSymbolRow::is_imported>("is_imported", "An import binds it.")
             .Add<&CSymbolRow::is_annotated>("is_annotated", "It is annotated.")

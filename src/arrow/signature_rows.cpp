@@ -32,7 +32,7 @@ const TColumns<CSignatureRow>& CSignatureSource::Columns() {
             .Add<&CSignatureRow::is_method>("is_method", "It is right in the body of a class.")
             .Add<&CSignatureRow::parameters>("parameters", "How many parameters it has.")
             .Add<&CSignatureRow::return_hint>("return_hint",
-                                              "The hint of what it gives back; null without "
+                                              "The hint of what it returns; null without "
                                               "one.");
     return columns;
 }

@@ -49,10 +49,10 @@ void BindRange(nb::module_& module) {
         nb::pooled());
     range.def(nb::init<uint32_t, uint32_t, uint32_t, uint32_t>(), "row"_a, "column"_a, "end_row"_a,
               "end_column"_a);
-    range.def_ro("row", &CRange::row);
-    range.def_ro("column", &CRange::column);
-    range.def_ro("end_row", &CRange::end_row);
-    range.def_ro("end_column", &CRange::end_column);
+    range.def_ro("row", &CRange::row, "The row of its first character.");
+    range.def_ro("column", &CRange::column, "The column of its first character.");
+    range.def_ro("end_row", &CRange::end_row, "The row of its last character.");
+    range.def_ro("end_column", &CRange::end_column, "The column after its last character.");
     range.def(
         "__eq__", [](const CRange& self, const CRange& other) { return self == other; }, nb::is_operator(),
         nb::sig("def __eq__(self, other: object, /) -> bool"));
@@ -85,20 +85,19 @@ void BindProblem(nb::module_& module) {
         "severity",
         [](const CProblemItem& self) { return TextFromUtf8(WordOf(SeverityOf(self.Data().code))); },
         nb::sig("def severity(self) -> typing.Literal[\"error\", \"warning\"]"),
-        "\"error\" for what the interpreter refuses; \"warning\" for a type hint that can't be read and for "
-        "a "
-        "line that is too long to analyse.");
+        "\"error\" for what the interpreter refuses; \"warning\" for a type hint that can't be read, a way "
+        "out of a `finally`, and a line that is too long to analyse.");
     problem.def_prop_ro("range", &CProblemItem::Range,
-                        "What it is about, at least one character unless the text is empty.");
+                        "Where it is: at least one character, unless the text is empty.");
     problem.def_prop_ro("related", &CProblemItem::Related,
                         nb::sig("def related(self) -> tuple[tuple[Range, str], ...]"),
-                        "Other places that it has to do with, each with what it is.");
+                        "Other places that belong to it, each with a few words on why.");
     problem.def_prop_ro(
         "hint",
         [](const CProblemItem& self) -> nb::object {
             return self.Data().hint.empty() ? nb::none() : TextFromUtf8(self.Data().hint);
         },
-        nb::sig("def hint(self) -> str | None"), "What may have been meant, if that is known.");
+        nb::sig("def hint(self) -> str | None"), "What may have been meant; None where that isn't known.");
     problem.def_prop_ro(
         "source_row",
         [](const CProblemItem& self) {
@@ -131,10 +130,11 @@ void BindLine(nb::module_& module) {
         nb::sig("def indent(self) -> int | None"),
         "The width of the blanks before it; None after another line on the same row.");
     line.def_prop_ro(
-        "problems", [](const CLineItem& self) { return ProblemsOf(self); }, "What is wrong with it.");
+        "problems", [](const CLineItem& self) { return ProblemsOf(self); },
+        "What is wrong with it, in the order of the text.");
     line.def_prop_ro(
         "records", [](const CLineItem& self) { return RecordsOf(self); },
-        "What it says of names; nothing when it has a problem.");
+        "What it says of names; empty when it has a problem.");
     BindNamesOfLine(line);
     line.def("__repr__", [](const CLineItem& self) {
         return nb::str("<Line {}: {!r}>").format(self.Range().row, TextFromUtf8(self.Text()));
@@ -151,14 +151,14 @@ void BindRecord(nb::module_& module) {
         nb::sig("def name(self) -> str"), "The name; a chain such as `a.b` is one too.");
     record.def_prop_ro(
         "payload", [](const CRecordItem& self) { return TextFromUtf8(self.Payload()); },
-        nb::sig("def payload(self) -> str"), "What is said besides the kind, as text.");
+        nb::sig("def payload(self) -> str"), "What else is said, as text; its form depends on the kind.");
     record.def_prop_ro("value", &CRecordItem::Value,
                        nb::sig("def value(self) -> None | int | str | tuple[str, str | None]"),
-                       "The payload by its form: None, a text, the index of a token, (module, name) or "
+                       "The payload as a value: None, a text, the index of a token, (module, name) or "
                        "(type, value).");
     record.def_prop_ro(
         "of_argument", [](const CRecordItem& self) { return self.Data().of_arg; },
-        "True when the name is an argument or a type parameter of the definition on its line.");
+        "True when the name is a parameter or a type parameter of the definition on its line.");
     record.def_prop_ro(
         "range",
         [](const CRecordItem& self) -> nb::object {
@@ -177,8 +177,8 @@ void BindLimit(nb::module_& module) {
     limit.def_prop_ro(
         "kind", [](const CLimitItem& self) { return MemberOf(self.Data().limit); },
         nb::sig("def kind(self) -> LimitKind"), "Which limit it met.");
-    limit.def_prop_ro("message", &CLimitItem::Message, "The same in words.");
-    limit.def_prop_ro("line", &CLimitItem::Line, "The line.");
+    limit.def_prop_ro("message", &CLimitItem::Message, "The limit in words.");
+    limit.def_prop_ro("line", &CLimitItem::Line, "The line that is too much.");
     limit.def("__repr__", [](const CLimitItem& self) {
         return nb::str("<Limit {}: {}>").format(self.Line().Range().row, self.Message());
     });
@@ -198,7 +198,8 @@ void BindAnalysis(nb::class_<CAnalysis>& analysis) {
         "For `codeloom.analyze`, which decodes. `faults` are places that aren't text, and `unreadable` the "
         "offset of each character that stands for something unreadable.");
     analysis.def_prop_ro(
-        "path", [](const CAnalysis& self) { return self.file->Path(); }, "The name that problems bear.");
+        "path", [](const CAnalysis& self) { return self.file->Path(); },
+        "The name of the text, which is in its problems.");
     analysis.def_prop_ro(
         "python", [](const CAnalysis& self) { return self.file->Python(); },
         "The version of Python that the text is written in.");
@@ -254,9 +255,8 @@ void BindFace(nb::module_& module) {
     analysis.def(
         "table", [](const CAnalysis& self, std::string_view name) { return TableOf(*self.file, name); },
         "name"_a, nb::sig("def table(self, name: str) -> Table"),
-        "One of the tables of docs/tables.md, such as \"lines\", whole; ValueError when there is none of "
-        "that "
-        "name.");
+        "One of the tables of docs/tables.md, such as \"lines\", whole; ValueError for an "
+        "unknown name.");
 }
 
 }  // namespace codeloom

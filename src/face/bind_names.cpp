@@ -62,7 +62,7 @@ void BindScope(nb::module_& module) {
     scope.def_prop_ro("range", &CScopeItem::Range,
                       "From its header or expression to the end of its last line.");
     scope.def_prop_ro("symbols", &CScopeItem::Symbols, nb::sig("def symbols(self) -> tuple[Symbol, ...]"),
-                      "Its names, in the order in which they come up.");
+                      "Its names, in the order in which they first appear.");
     scope.def("__repr__", [](const CScopeItem& self) {
         return nb::str("<Scope {}: {}>").format(self.Range().row, TextFromUtf8(self.Text()));
     });
@@ -87,18 +87,19 @@ void BindSymbol(nb::module_& module) {
     BindCopies(symbol);
     symbol.def_prop_ro(
         "name", [](const CSymbolItem& self) { return TextFromUtf8(self.Name()); },
-        nb::sig("def name(self) -> str"), "The name, as a class around it mangles it.");
-    symbol.def_prop_ro("scope", &CSymbolItem::Scope, "The scope.");
+        nb::sig("def name(self) -> str"), "The name, as the class around it mangles it.");
+    symbol.def_prop_ro("scope", &CSymbolItem::Scope, "The scope that it is a name of.");
     symbol.def_prop_ro(
         "is_local", [](const CSymbolItem& self) { return self.Data().IsLocal(); }, "The scope binds it.");
     symbol.def_prop_ro(
         "is_global", [](const CSymbolItem& self) { return self.Data().IsGlobal(); },
-        "It is a name of the module, or none known.");
+        "It is a name of the module, or isn't bound in the text.");
     BindBinding(symbol, "is_free", CSymbol::EBinding::kFree, "A function around the scope binds it.");
     BindBinding(symbol, "is_declared_global", CSymbol::EBinding::kGlobalExplicit, "A `global` names it.");
     BindFlag(symbol, "is_nonlocal", CSymbol::kIsDeclaredNonlocal, "A `nonlocal` names it.");
     BindFlag(symbol, "is_referenced", CSymbol::kIsReferenced, "The scope reads it.");
-    BindFlag(symbol, "is_assigned", CSymbol::kIsAssigned, "It gets a value, but by an import or a call.");
+    BindFlag(symbol, "is_assigned", CSymbol::kIsAssigned,
+             "It gets a value, other than by an import or as a parameter.");
     BindFlag(symbol, "is_parameter", CSymbol::kIsParameter, "It is a parameter.");
     BindFlag(symbol, "is_imported", CSymbol::kIsImported, "An import binds it.");
     BindFlag(symbol, "is_annotated", CSymbol::kIsAnnotated, "It is annotated.");
@@ -126,7 +127,7 @@ void BindOccurrence(nb::module_& module) {
         nb::sig("def resolution(self) -> Resolution | None"),
         "Where its name is bound; None for what belongs to no scope, such as an attribute.");
     occurrence.def_prop_ro("home", &COccurrenceItem::Home, nb::sig("def home(self) -> Scope | None"),
-                           "The scope that binds its name; None where none of the text is known to.");
+                           "The scope that binds its name; None where no scope of the text is known to.");
     occurrence.def_prop_ro("symbol", &COccurrenceItem::Symbol, nb::sig("def symbol(self) -> Symbol | None"),
                            "Its name in its scope; None for what belongs to no scope.");
     occurrence.def_prop_ro("object", &COccurrenceItem::Object, nb::sig("def object(self) -> Range | None"),
@@ -176,8 +177,8 @@ void BindNamesOfLine(nb::class_<CLineItem>& line) {
 void BindNamesOfAnalysis(nb::class_<CAnalysis>& analysis) {
     analysis.def_prop_ro(
         "occurrences", [](const CAnalysis& self) { return OccurrencesOf(self.file); },
-        "Every appearance of a name, in the order of the text. What runs can't be known: names that are "
-        "made by `exec`, `globals()` or `setattr` don't appear.");
+        "Every appearance of a name, in the order of the text. Names that are only made at run time, by "
+        "`exec`, `globals()` or `setattr`, don't appear.");
     analysis.def_prop_ro(
         "scopes", [](const CAnalysis& self) { return ScopesOf(self.file); },
         "The scopes, in the order in which they begin; the module is the first.");
@@ -188,15 +189,16 @@ void BindNamesOfAnalysis(nb::class_<CAnalysis>& analysis) {
             return TupleOf(self.file, QueriesOf(*self.file).Definitions(text.c_str()));
         },
         "name"_a, nb::sig("def definitions(self, name: str) -> tuple[Occurrence, ...]"),
-        "Where the name gets a value, in any scope. Which of them is the one at run time isn't known.");
+        "Where the name gets a value, in any scope. Which of these runs isn't known.");
     analysis.def("references", &References, "occurrence"_a,
                  nb::sig("def references(self, occurrence: Occurrence) -> tuple[Occurrence, ...]"),
-                 "All occurrences of the name that its scope binds, this one included; nothing for an "
+                 "All occurrences of the name that its scope binds, this one included; none for an "
                  "attribute, whose object isn't known. ValueError for one of another analysis.");
-    analysis.def("occurrence_at", &OccurrenceAt, "row"_a, "column"_a,
-                 nb::sig("def occurrence_at(self, row: int, column: int) -> Occurrence | None"),
-                 "The occurrence at a place, or that ends there. Both count from 1, columns in characters; "
-                 "ValueError for less.");
+    analysis.def(
+        "occurrence_at", &OccurrenceAt, "row"_a, "column"_a,
+        nb::sig("def occurrence_at(self, row: int, column: int) -> Occurrence | None"),
+        "The occurrence at a place, or the one that ends there. Row and column count from 1, columns in "
+        "characters; ValueError for less than 1.");
     analysis.def(
         "unused",
         [](const CAnalysis& self, nb::handle parameters) {
@@ -207,8 +209,7 @@ void BindNamesOfAnalysis(nb::class_<CAnalysis>& analysis) {
         nb::sig("def unused(self, *, parameters: bool = False) -> tuple[Occurrence, ...]"),
         "The first binding of each import and of each local name of a function that nothing in the text "
         "reads; with `parameters` theirs too. Names that begin with `_` are left out, and what `__all__` "
-        "lists. "
-        "What other modules read, and what a name is looked up by as text, isn't known.");
+        "lists. What other modules read isn't known, nor which names are looked up as text.");
     analysis.def(
         "undefined",
         [](const CAnalysis& self) { return TupleOf(self.file, QueriesOf(*self.file).Undefined()); },

@@ -24,7 +24,7 @@ void BindHint(nb::module_& module) {
     hint.def_prop_ro(
         "name", [](const CHintItem& self) { return TextFromUtf8(TextOf(*self.file, self.Data().target)); },
         nb::sig("def name(self) -> str"),
-        "The name or chain that it is about; of what a function gives back, that of the function.");
+        "The name or chain that it is about; of what a function returns, that of the function.");
     hint.def_prop_ro("target", &CHintItem::Target, "Where that name is.");
     hint.def_prop_ro(
         "in_comment", [](const CHintItem& self) { return self.Data().in_comment; }, "It is in a comment.");
@@ -74,7 +74,7 @@ void BindSignature(nb::module_& module) {
                           "Its parameters; those within a tuple of Python 2 one by one.");
     signature.def_prop_ro("return_hint", &CSignatureItem::ReturnHint,
                           nb::sig("def return_hint(self) -> Hint | None"),
-                          "The hint of what it gives back; None without one.");
+                          "The hint of what it returns; None without one.");
     signature.def("__repr__", [](const CSignatureItem& self) {
         return nb::str("<Signature {}: {}>")
             .format(self.Range().row, TextFromUtf8(TextOf(*self.file, self.Data().name)));
@@ -104,7 +104,7 @@ void BindSignaturesOfAnalysis(nb::class_<CAnalysis>& analysis) {
             return {self.file, 0, 1, self.file->Signatures().hints.size()};
         },
         "Every type hint of the text, line by line: those of variables, attributes, parameters and of what "
-        "functions give back, in annotations and in comments.");
+        "functions return, in annotations and in comments.");
 }
 
 }  // namespace codeloom
