@@ -6,7 +6,7 @@ from collections.abc import Iterator, Sequence
 from contextlib import suppress
 from dataclasses import dataclass, replace
 
-from codeloom._analysis import Analysis, Line, Problem
+from codeloom._analysis import Analysis, Line, Problem, Range
 from codeloom.logicalinspect import TextFromTokens
 from codeloom.logicalline import CLogicalLine, kCommentedTypeHint
 from codeloom.optpgen import ParseError
@@ -23,12 +23,10 @@ _HINDRANCES = ("CL101", "CL902")
 class LineTree:
     """A logical line with what is wrong with it, and its tree unless the grammar refuses it or it is empty.
 
-    `row` and `column` count from 1, the column in characters. An expression within a line, such as
-    the field of an f-string, is a line of its own here.
+    An expression within a line, such as the field of an f-string, is a line of its own here.
     """
 
-    row: int
-    column: int
+    range: Range
     text: str
     tree: CNode | None
     problems: Sequence[Problem]
@@ -91,7 +89,7 @@ class _TreeReader:
                 continue
             found = self._read(embedded, embedded.fOrigin, logical.fInAsyncDef, ())
             if found.tree is None:
-                own = [each for each in problems if self._is_within(each, embedded, found)]
+                own = [each for each in problems if _starts_within(each.range, found.range)]
                 problems[:] = [each for each in problems if each not in own]
                 found = replace(found, problems=own)
             yield found
@@ -108,17 +106,16 @@ class _TreeReader:
         if self._hindrances.isdisjoint(_rows_of(logical, origin[0])):
             with suppress(ParseError, SyntaxError):  # what is wrong is among the problems
                 tree = self._parser.ParseToNode(logical, in_async_def)
-        row, col = logical.fPositions[0] if logical.fPositions else (0, 0)
-        row, column = self._place(origin, row, col)
-        return LineTree(row, column, TextFromTokens(logical).lstrip(), tree, problems)
+        place = self._range_of(logical, origin)
+        return LineTree(place, TextFromTokens(logical).lstrip(), tree, problems)
 
-    def _is_within(self, problem: Problem, embedded: CLogicalLine, tree: LineTree) -> bool:
-        """True for a problem of an expression within a line, whose tree it is."""
-        if not embedded.fPositions:
-            return False
-        row, col = embedded.fPositions[-1]
-        end = self._place(embedded.fOrigin, row, col + len(embedded.fToks[-1].encode()))
-        return (tree.row, tree.column) <= (problem.range.row, problem.range.column) <= end
+    def _range_of(self, logical: CLogicalLine, origin: tuple[int, int]) -> Range:
+        """From the first token of a logical to its last one."""
+        if not logical.fPositions:
+            return Range(*self._place(origin, 0, 0) * 2)
+        row, col = logical.fPositions[-1]
+        end = self._place(origin, row, col + len(logical.fToks[-1].encode()))
+        return Range(*self._place(origin, *logical.fPositions[0]), *end)
 
     def _place(self, origin: tuple[int, int], row: int, utf8_col: int) -> tuple[int, int]:
         """Row and column, from 1, of a place in a logical whose text begins at `origin`.
@@ -130,6 +127,11 @@ class _TreeReader:
         offset = min(start + utf8_col, len(self._utf8))
         row = bisect_right(self._starts, offset) - 1
         return row + 1, len(self._utf8[self._starts[row] : offset].decode(errors="ignore")) + 1
+
+
+def _starts_within(place: Range, around: Range) -> bool:
+    start, end = (around.row, around.column), (around.end_row, around.end_column)
+    return start <= (place.row, place.column) <= end
 
 
 _UTF8_ROW_END = re.compile(ROW_END.pattern.encode())

@@ -42,6 +42,21 @@ def test_statuses_and_summaries(write_files, run_cli, arguments, status, summary
     assert done.stderr == said.get(status, said.get(" ".join(arguments), ""))
 
 
+def test_warnings_are_problems_and_look_different(write_files, run_cli):
+    write_files({"a.py": "x = 1  # type: List[\n"})
+    done = run_cli("check", "a.py", "--color", "always")
+    assert done.returncode == 1 and "\033[33mCL601\033[0m warning: type hint: '[' was" in done.stdout
+    assert "CL601 warning: type hint: '[' was" in run_cli("check", "a.py", "--format", "concise").stdout
+    assert run_cli("check", "a.py", "--ignore", "CL601").returncode == 0
+
+
+def test_what_is_read_is_not_overwritten(write_files, run_cli):
+    folder = write_files({"a.py": "x = )\n"})
+    done = run_cli("check", "./a.py", "-o", "a.py")
+    assert done.returncode == 2 and "a.py is to be read: name another file" in done.stderr
+    assert (folder / "a.py").read_text() == "x = )\n"
+
+
 def test_output(write_files, run_cli):
     write_files({"a b.py": "if x:\n\ty = '日本' )\r\n", "c.py": b"'\xe9'\n" + b"z = 1 ) " + b"+ 1 " * 60})
     done = run_cli("check", "a b.py", "c.py")
@@ -92,6 +107,8 @@ def test_the_examples(run_cli):
         (["tree"], "name a line as FILE:ROW, or give one with -c CODE"),
         (["check", "--config", "absent.toml"], "can't read absent.toml: No such file or directory"),
         (["check", "--baseline", "absent.json"], "can't read absent.json: No such file or directory"),
+        (["--verson"], "no option --verson: did you mean '--version'?"),
+        (["completion", "csh"], "unknown value 'csh'"),
         (["check", "-o", "absent/a.txt", "."], "can't write absent/a.txt: No such file or directory"),
         (["tree", "f.py:1", "-c", "x"], "not allowed with"),
         (["tree", "-c", "x", "--format", "xml"], "unknown value 'xml'"),
@@ -105,7 +122,7 @@ def test_wrong_use(run_cli, arguments, words):
 
 def test_version_and_help(run_cli):
     assert run_cli("--version").stdout.startswith("codeloom ")
-    for arguments in (["--help"], ["help"], ["check", "--help"], ["help", "check"], ["help", "tree"]):
+    for arguments in (["--help"], ["help"], ["check", "--help"], ["-h", "check"], ["help", "tree"]):
         done = run_cli(*arguments)
         assert done.returncode == 0 and "examples:" in done.stdout
         assert ("--python" in done.stdout) == (len(arguments) == 2)
@@ -282,10 +299,11 @@ class TestEndings:
         assert (process.returncode, stderr) == (130, b"")
 
     @pytest.mark.skipif(not os.path.exists("/dev/full"), reason="needs a full device")
-    def test_a_full_disk(self, write_files, start_cli):
+    @pytest.mark.parametrize("argument", ["a.py", "--help"])
+    def test_a_full_disk(self, write_files, start_cli, argument):
         write_files({"a.py": "x = )\n"})
         with open("/dev/full", "wb") as full:
-            process = start_cli("a.py", stdout=full)
+            process = start_cli(argument, stdout=full)
             _, stderr = process.communicate(timeout=30)
         assert (process.returncode, stderr) == (2, b"codeloom: can't write: No space left on device\n")
 

@@ -44,6 +44,7 @@ def test_the_command(run_cli):
     assert done.stdout.startswith("CL212 a missing colon\n\nThe header of a statement")
     assert "wrong:\n\n    if a\n        pass\n\nright:\n\n    if a:\n" in done.stdout
     assert len(run_cli("explain").stdout.splitlines()) == len(EXPLAINED)
+    assert run_cli("explain", "--format", "concise").stdout.startswith("CL101 a character or an encoding")
     done = run_cli("explain", "CL999")
     assert (done.returncode, done.stdout) == (2, "") and "there is no code 'CL999'" in done.stderr
 

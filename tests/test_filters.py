@@ -55,11 +55,12 @@ def test_a_baseline(write_files, places, run_cli, form):
     # The same from another folder, and by the settings.
     (folder / "codeloom.toml").write_text("baseline = 'known.json'\n")
     assert [row.removeprefix(str(folder)) for row in places(str(folder / "b.py"))] == []
+    run_cli("check", ".", "--format", form, "-o", "known.json")  # written anew
+    assert places(".") == []
     for text in ("", "{}", '{"run"', "[1]"):
         write_files({"known.json": text})
         done = run_cli("check", "a.py")
-        if text:
-            assert done.returncode == 2 and "isn't a report of codeloom" in done.stderr
+        assert done.returncode == 2 and "isn't a report of codeloom" in done.stderr
     assert "No such file" in run_cli("check", "a.py", "--baseline", "absent").stderr
 
 

@@ -204,11 +204,12 @@ def test_github(written, write_files, run_cli):
     )
     assert rows[3].startswith("::error file=n.ipynb,title=CL203::cell 2, row 2, column 5: ")
     assert rows[4] == "::error file=absent.py,title=codeloom::can't be read: No such file or directory"
-    write_files({"many, 1.py": "x = )\n" * 13})
+    write_files({"many, 1.py": "x = )\n" * 13 + "x = 1  # type: (\n"})
     rows = run_cli("check", "--format", "github", "many, 1.py").stdout.splitlines()
     assert rows[0].startswith("::error file=many%2C 1.py,")
-    assert [row.startswith("::error") for row in rows] == [True] * 10 + [False] * 4
-    assert rows[-1] == "3 more problems aren't annotated: GitHub shows 10 errors of a step"
+    assert [row.startswith("::error") for row in rows] == [True] * 10 + [False] * 5
+    assert rows[-2].startswith("::warning")  # which are counted by themselves
+    assert rows[-1].startswith("3 more problems aren't annotated: GitHub shows 10 errors and 10 warnings")
 
 
 def test_the_text_shows_what_belongs_together(write_files, run_cli):

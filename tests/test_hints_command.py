@@ -118,7 +118,7 @@ def test_what_a_signature_is_written_as():
         (["absent.py", "b.py"], 2, ["b.py:1:7: CL211 invalid syntax. Perhaps you forgot a comma?"]),
         (["--python", "2.7", "old.py"], 0, ["old.py:1:1: def f(a, b, c)", "    a  = 1, int"]),
         (["c.py"], 0, ["c.py:1:1: def f(a)"]),
-        (["--false-hints", "c.py"], 1, ["c.py:1:20: CL601 type hint: invalid syntax"]),
+        (["--false-hints", "c.py"], 1, ["c.py:1:20: CL601 warning: type hint: invalid syntax"]),
     ],
 )
 def test_the_command(run_cli, write_files, arguments, status, rows):

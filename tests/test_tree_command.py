@@ -125,6 +125,17 @@ def test_what_cannot_be_read(write_files, run_cli):
     assert Headings(done.stdout)[1].startswith("f.py:2:6: CL101 byte 0xE9 can't be read as utf-8")
 
 
+def test_a_row_of_a_cell(write_files, run_cli):
+    cells = [
+        {"cell_type": kind, "source": text} for kind, text in (("markdown", "# A"), ("code", "a\nb = 1"))
+    ]
+    write_files({"n.ipynb": json.dumps({"cells": cells})})
+    assert run_cli("tree", "n.ipynb:cell 2:2:1:").stdout.startswith("n.ipynb:cell 2:2:1: b = 1\nCExprStmt")
+    for place in ("n.ipynb:2", "n.ipynb:cell 1:1"):
+        done = run_cli("tree", place)
+        assert done.returncode == 2 and "name FILE:cell N:ROW" in done.stderr
+
+
 def test_other_grammars(run_cli):
     assert run_cli("tree", "-c", "print x", "--python", "2.7").stdout.startswith("CNode print_stmt")
     assert run_cli("tree", "-c", "print x").returncode == 1
@@ -144,7 +155,7 @@ def test_json(write_files, run_cli):
 
     (line,) = Items("-c", CODE)
     tree = line.pop("tree")
-    place = {"row": 1, "column": 1, "end_row": 1, "end_column": 1}
+    place = {"row": 1, "column": 1, "end_row": 1, "end_column": len(CODE) + 1}
     assert line == {"type": "tree", "path": "<string>", **place, "text": CODE, "problems": []}
     assert Texts(tree) == ["x", "=", "foo", "(", '"é\\n"', ")"]
     assert tree["children"][2]["children"][1] == {
@@ -163,6 +174,9 @@ def test_json(write_files, run_cli):
     (line,) = (line for line in lines if line["tree"] is None)
     (problem,) = line["problems"]
     assert (problem["row"], problem["column"], problem["code"]) == (8, 5, "CL202")
+    (line, field) = Items("-c", 'x = """\n""" + f"{é}"')
+    assert (line["end_row"], line["end_column"]) == (2, 13)
+    assert (field["row"], field["column"], field["end_column"]) == (2, 10, 11)
     (line,) = Items("-c", "case a: b")
     assert line["tree"]["children"][1]["position"] == [0, 5]
 

@@ -34,6 +34,9 @@ COMMANDS = {
     "completion": ("completion", "CompletionCommand", "print a script that completes commands in your shell"),
 }
 
+_HELP_WORDS = ("help", "-h", "--help")
+_OPTIONS = ("--help", "--version")  # without a command
+
 _HELP = """usage: codeloom COMMAND ...
 
 Analyses Python source, from {oldest} to {newest}, one logical line at a time.
@@ -62,14 +65,16 @@ def options_from(argv: Sequence[str]) -> Options:
     SystemExit after help and wrong use, WrongUseError for wrong settings.
     """
     name, rest = (argv[0], argv[1:]) if argv else ("", ())
-    if name in ("-h", "--help", "help") and not rest:
-        print(_help())
+    if name in _HELP_WORDS and not rest:
+        print(_help(), flush=True)
         sys.exit(0)
-    if name == "help":
+    if name in _HELP_WORDS:
         name, rest = rest[0], ("--help",)
     if not name:
         print_error(_help())
         sys.exit(2)
+    if name.startswith("-"):
+        _fail("codeloom", f"there is no option {name}{nearest(name, _OPTIONS)}")
     if name not in COMMANDS:
         _fail("codeloom", f"there is no command {name!r}{nearest(name, COMMANDS)}")
     command = command_named(name)
@@ -116,6 +121,10 @@ class _Parser(argparse.ArgumentParser):
             known = [name for action in self._actions for name in action.option_strings]
             self.error(f"there is no option {option}{nearest(option, known)}")
         return found
+
+    def print_help(self, file=None):  # type: ignore[no-untyped-def]
+        """As the base class does, which says nothing when it can't write."""
+        print(self.format_help(), end="", file=file, flush=True)
 
     def error(self, message: str) -> NoReturn:
         """End with the status of wrong use."""

@@ -7,7 +7,7 @@ from shlex import quote
 from codeloom.cli.arguments import COMMANDS, command_named, parser_of
 from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Console
-from codeloom.cli.options import Options
+from codeloom.cli.options import Options, choice_of
 
 SHELLS = ("bash", "zsh", "fish")
 
@@ -79,7 +79,7 @@ class CompletionCommand(Command):
     @classmethod
     def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
         """Add the shell."""
-        parser.add_argument("shell", choices=SHELLS, help="bash, zsh or fish")
+        parser.add_argument("shell", **choice_of(SHELLS), metavar="SHELL", help="bash, zsh or fish")
 
     def run(self, options: Options) -> ExitStatus:
         """Print the script."""

@@ -33,6 +33,7 @@ class Colour(StrEnum):
     DIM = "\033[2m"
     RED = "\033[31m"
     GREEN = "\033[32m"
+    YELLOW = "\033[33m"
     CYAN = "\033[36m"
 
 

@@ -4,7 +4,7 @@ import argparse
 
 from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Colour, Console
-from codeloom.cli.formats import FOR_FACTS, format_named
+from codeloom.cli.formats import FOR_ALL_ITEMS, format_named
 from codeloom.cli.formats.json import ObjectFormat
 from codeloom.cli.options import Options, add_output_arguments
 from codeloom.cli.project import WrongUseError, nearest
@@ -28,7 +28,7 @@ class ExplainCommand(Command):
         "codeloom explain",
         "codeloom explain --format json | jq '.items[].code'",
     )
-    FORMATS = FOR_FACTS
+    FORMATS = FOR_ALL_ITEMS
 
     @classmethod
     def add_arguments(cls, parser: argparse.ArgumentParser) -> None:
@@ -47,6 +47,8 @@ class ExplainCommand(Command):
         with opened_console(options) as console:
             if options.format == "text":
                 _print_all(console, chosen, is_list=not codes)
+            elif options.format == "concise":
+                _print_titles(console, chosen)
             else:
                 _write_all(console, options.format, chosen)
         return ExitStatus.SOUND
@@ -58,6 +60,11 @@ def _print_all(console: Console, chosen: list[Explanation], is_list: bool) -> No
         return
     for explanation in chosen:
         _print(console, explanation)
+
+
+def _print_titles(console: Console, chosen: list[Explanation]) -> None:
+    for explanation in chosen:
+        console.print_row(f"{explanation.code} {explanation.title}")
 
 
 def _write_all(console: Console, name: str, chosen: list[Explanation]) -> None:

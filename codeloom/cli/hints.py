@@ -3,7 +3,6 @@
 from collections.abc import Iterable, Iterator
 from typing import TYPE_CHECKING, Any
 
-from codeloom._analysis import Range
 from codeloom.cli.console import Colour, Console
 from codeloom.cli.excerpt import on_one_row, printable
 from codeloom.cli.items import Finding, Item
@@ -24,14 +23,9 @@ class SignatureItem(Item):
         self._source = source
         self._signature = signature
 
-    @property
-    def _place(self) -> Range:
-        row, column = self._signature.range.row, self._signature.range.column
-        return Range(row, column, row, column)
-
     def show(self, console: Console) -> None:
         """The def's place and names, and below it a row for whatever has a type."""
-        place = console.coloured(Colour.BOLD, self._source.label(self._place))
+        place = console.coloured(Colour.BOLD, self._source.label(self._signature.range))
         console.print_row(f"{place} {printable(_head(self._signature))}")
         rows = [(label, on_one_row(text)) for label, text in _rows(self._signature) if text]
         width = max((len(label) for label, _ in rows), default=0)
@@ -44,7 +38,7 @@ class SignatureItem(Item):
     def rows(self) -> Iterator[str]:
         """The def's place and names, and what has a type after it."""
         types = "; ".join(f"{label} {on_one_row(text)}" for label, text in _rows(self._signature) if text)
-        row = f"{self._source.label(self._place)} {_head(self._signature)}"
+        row = f"{self._source.label(self._signature.range)} {_head(self._signature)}"
         yield printable(f"{row}: {types}" if types else row)
 
     def fields(self) -> Iterator[dict[str, Any]]:
@@ -53,7 +47,7 @@ class SignatureItem(Item):
         arguments = signature.arguments
         yield {
             "type": "signature",
-            **self._source.fields(self._place),
+            **self._source.fields(signature.range),
             "name": signature.name,
             "is_async": signature.is_async,
             "type_parameters": list(signature.type_parameters),

@@ -64,7 +64,7 @@ class IndexCommand(Command):
             "--tables",
             type=as_argument(_table_names),
             metavar="NAMES",
-            help=f"only these tables, separated by commas (default: {','.join(TABLES)})",
+            help=f"only these tables, separated by commas (default: {', '.join(TABLES)})",
         )
         parser.add_argument(
             "--resume", action="store_true", help="go on with a run that didn't come to its end"

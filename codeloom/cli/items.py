@@ -76,6 +76,16 @@ class Finding(Item):
         )
 
     @property
+    def is_warning(self) -> bool:
+        """True for what the interpreter runs nevertheless."""
+        return self.severity == "warning"
+
+    @property
+    def title(self) -> str:
+        """The message, for a warning with this word before it."""
+        return f"warning: {self.message}" if self.is_warning else self.message
+
+    @property
     def source_row(self) -> str:
         """The text of the row in which it begins."""
         return self.source.row_text(self.range.row)
@@ -87,7 +97,7 @@ class Finding(Item):
     def rows(self) -> Iterator[str]:
         """Place, code and message."""
         hint = f" ({self.hint})" if self.hint else ""
-        yield f"{self.source.label(self.range)} {self.code} {printable(on_one_row(self.message + hint))}"
+        yield f"{self.source.label(self.range)} {self.code} {printable(on_one_row(self.title + hint))}"
 
     def fields(self) -> Iterator[dict[str, Any]]:
         """All that is known of it."""
@@ -124,7 +134,8 @@ def show_findings(findings: list[Finding], console: Console) -> None:
         return
     for finding in findings:
         place = finding.source.label(finding.range)
-        console.print_message([(Colour.BOLD, place), (Colour.RED, finding.code)], finding.message)
+        colour = Colour.YELLOW if finding.is_warning else Colour.RED
+        console.print_message([(Colour.BOLD, place), (colour, finding.code)], finding.title)
     _show_rows(findings, console)
     hints = {finding.hint: finding.range.column for finding in reversed(findings)}
     for hint, column in reversed(hints.items()):

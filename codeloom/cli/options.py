@@ -91,6 +91,7 @@ class Options:
         self._keep_format_of(given)
         for name, value in given.items():
             setattr(self, name, value)
+        self._check_output()
 
     @property
     def version(self) -> str:
@@ -105,6 +106,18 @@ class Options:
         """What a search through folders leaves out."""
         patterns = (*self.exclude, *self.extend_exclude)
         return Exclusion(self.project.root, patterns, gitignore=self.gitignore, force=self.force_exclude)
+
+    def _check_output(self) -> None:
+        """WrongUseError for an output that would overwrite what is read; a baseline is written anew."""
+        if any(map(self._is_output, (*self.paths, self.place, self.project.settings_file))):
+            raise WrongUseError(f"{self.output} is to be read: name another file for the output")
+        if self._is_output(self.baseline):
+            self.baseline = None
+
+    def _is_output(self, path: str | None) -> bool:
+        if path is None or self.output is None or not os.path.isfile(self.output):
+            return False
+        return os.path.exists(path) and os.path.samefile(path, self.output)
 
     def _keep_format_of(self, given: Mapping[str, Any]) -> None:
         """A format in the settings is for the commands that have it."""
@@ -155,7 +168,7 @@ def _add_selecting(parser: argparse.ArgumentParser) -> None:
     group = parser.add_argument_group("which problems")
     codes: dict[str, Any] = {"type": as_argument(_selectors), "action": "extend", "metavar": "CODES"}
     group.add_argument(
-        "--select", **codes, help="report only these codes, such as CL301, or CL3 for all that begin so"
+        "--select", **codes, help="report only these codes, such as CL301, or CL3 for all that begin with it"
     )
     group.add_argument(
         "--ignore", **codes, help="don't report these codes; of two that match, the longer one counts"
@@ -194,16 +207,14 @@ def add_output_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
     group = parser.add_argument_group("output")
     group.add_argument(
         "--format",
-        choices=formats,
-        type=as_argument(lambda name: _one_of(name, formats)),
+        **choice_of(formats),
         metavar="FORMAT",
         help=f"{', '.join(formats[:-1])} or {formats[-1]} (default: text)",
     )
     group.add_argument("-o", "--output", metavar="FILE", help="write to this file, not the standard output")
     group.add_argument(
         "--color",
-        choices=COLOURS,
-        type=as_argument(lambda name: _one_of(name, COLOURS)),
+        **choice_of(COLOURS),
         metavar="WHEN",
         help="auto, always or never (default: auto, which heeds NO_COLOR and FORCE_COLOR)",
     )
@@ -242,6 +253,11 @@ def add_python_argument(parser: argparse.ArgumentParser) -> None:
 def add_exit_zero_argument(parser: argparse._ActionsContainer) -> None:
     """Add `exit_zero`."""
     parser.add_argument("--exit-zero", action="store_true", help="exit with 0 even if there are problems")
+
+
+def choice_of(names: Sequence[str]) -> dict[str, Any]:
+    """For an argument that takes one of some words: what names the nearest when it is another."""
+    return {"choices": names, "type": as_argument(lambda name: _one_of(name, names))}
 
 
 def as_argument(read: Callable[[str], Any]) -> Callable[[str], Any]:
@@ -337,5 +353,6 @@ __all__ = [
     "add_reading_arguments",
     "add_source_arguments",
     "as_argument",
+    "choice_of",
     "count",
 ]

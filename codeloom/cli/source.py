@@ -58,6 +58,11 @@ class Source:
         """The cell of a notebook, or None, and the row in it; for a row of the analysis."""
         return (None, row) if self._notebook is None else self._notebook.place(row)
 
+    def row_in_text(self, cell: int | None, row: int) -> int | None:
+        """The row of the analysis for one of a notebook's cell; None where no cell has it."""
+        rows = range(1, len(self.rows) + 1)
+        return next((each for each in rows if self.cell_and_row(each) == (cell, row)), None)
+
     def row_label(self, row: int) -> str:
         """The file and a row in it, as people read it."""
         cell, row = self.cell_and_row(row)

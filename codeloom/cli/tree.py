@@ -18,7 +18,9 @@ from codeloom.cli.tally import Tally
 from codeloom.cli.tree_items import TreeItem
 
 # A place as `codeloom check` prints it; the column doesn't matter here.
-_PLACE = re.compile(r"(?P<path>.+?):(?P<row>\d{1,9})(?::\d+)?:?", re.ASCII | re.DOTALL)
+_PLACE = re.compile(
+    r"(?P<path>.+?):(?:cell (?P<cell>\d{1,9}):)?(?P<row>\d{1,9})(?::\d+)?:?", re.ASCII | re.DOTALL
+)
 
 
 class TreeCommand(Command):
@@ -47,8 +49,8 @@ class TreeCommand(Command):
             "place",
             nargs="?",
             metavar="FILE:ROW",
-            help="the line on a row of a file, counted from 1; all lines of a FILE; or - for the standard "
-            "input",
+            help="the line on a row of a file, counted from 1, or of a notebook's cell (FILE:cell N:ROW); "
+            "all lines of a FILE; or - for the standard input",
         )
         what.add_argument("-c", dest="code", metavar="CODE", help="the line itself, or several")
         add_reading_arguments(parser)
@@ -64,7 +66,7 @@ class TreeCommand(Command):
             if options.code is not None:
                 analysis = analyze(options.code, python=options.version, false_hints=options.false_hints)
                 return _print(Source(analysis.path, analysis), options, None, console)
-            path, row = _path_and_row(options.place or "")
+            path, cell, row = _parts_of(options.place or "")
             if os.path.isdir(path):
                 return _fail(f"{printable_path(path)} is a folder: name a file in it", console)
             try:
@@ -72,6 +74,10 @@ class TreeCommand(Command):
             except OSError as error:
                 console.print_failure(error)
                 return ExitStatus.FAILURE
+            if source.is_notebook and row is not None:
+                row = source.row_in_text(cell, row)
+                if row is None:
+                    return _fail(f"there is no code in {options.place}: name FILE:cell N:ROW", console)
             return _print(source, options, row, console)
 
 
@@ -107,9 +113,12 @@ def _fail(message: str, console: Console) -> ExitStatus:
     return ExitStatus.FAILURE
 
 
-def _path_and_row(place: str) -> tuple[str, int | None]:
+def _parts_of(place: str) -> tuple[str, int | None, int | None]:
+    """The path, the cell of a notebook and the row."""
     match = None if os.path.exists(place) else _PLACE.fullmatch(place)
-    return (match["path"], int(match["row"])) if match else (place, None)
+    if match is None:
+        return place, None, None
+    return match["path"], int(match["cell"]) if match["cell"] else None, int(match["row"])
 
 
 def _nothing_there(source: Source, row: int | None) -> str:

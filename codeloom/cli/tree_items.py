@@ -5,7 +5,6 @@ from collections.abc import Iterator
 from itertools import pairwise
 from typing import TYPE_CHECKING, Any
 
-from codeloom._analysis import Range
 from codeloom.cli.console import Colour, Console
 from codeloom.cli.excerpt import printable
 from codeloom.cli.items import Finding, Item, show_items
@@ -46,7 +45,7 @@ class TreeItem(Item):
             return
         if self._has_heading:
             console.print_row(
-                f"{console.coloured(Colour.BOLD, self._source.label(self._place))} {self.heading}"
+                f"{console.coloured(Colour.BOLD, self._source.label(self.line.range))} {self.heading}"
             )
         if self.line.tree is None:
             console.print_row(console.coloured(Colour.DIM, "no tree"))
@@ -59,13 +58,13 @@ class TreeItem(Item):
         for finding in self.findings:
             yield from finding.rows()
         if self.line.tree is not None or not self.findings:
-            yield f"{self._source.label(self._place)} {self.heading}"
+            yield f"{self._source.label(self.line.range)} {self.heading}"
 
     def fields(self) -> Iterator[dict[str, Any]]:
         """All but the tree."""
         yield {
             "type": "tree",
-            **self._source.fields(self._place),
+            **self._source.fields(self.line.range),
             "text": self.line.text,
             "problems": [fields for finding in self.findings for fields in finding.fields()],
         }
@@ -75,11 +74,6 @@ class TreeItem(Item):
         for fields in self.fields():
             tree = "null" if self.line.tree is None else "".join(_json_pieces(self.line.tree))
             yield f'{json.dumps(fields)[:-1]}, "tree": {tree}}}'
-
-    @property
-    def _place(self) -> Range:
-        row, column = self.line.row, self.line.column
-        return Range(row, column, row, column)
 
 
 def nodes_of(tree: "CNode") -> Iterator[tuple["CNode", int]]:

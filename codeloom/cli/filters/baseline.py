@@ -18,7 +18,7 @@ class Baseline:
     """The problems of a report that `--format json` or `jsonl` has written."""
 
     def __init__(self, path: str) -> None:
-        """Read the report; OSError when it can't be read, ValueError when it is none."""
+        """Read the report; OSError when it can't be read, ValueError when it isn't one."""
         with open(path, encoding="utf-8") as file:
             text = file.read()
         try:
@@ -47,4 +47,7 @@ def _items_of(text: str) -> list[dict[str, str]]:
     if text.startswith('{"run"'):
         items: list[dict[str, str]] = json.loads(text)["items"]
         return items
-    return [json.loads(row) for row in text.splitlines()]
+    run, *items = [json.loads(row) for row in text.splitlines()]
+    if run["type"] != "run":
+        raise ValueError
+    return items

@@ -18,12 +18,10 @@ FORMATS = {
     "sarif": ("sarif", "SarifFormat"),
     "dot": ("dot", "DotFormat"),
 }
-# Those that hold whatever a command shows, with those for problems alone, and with those for trees alone; and
-# those for what isn't about a source.
+# Those that hold whatever a command shows, with those for problems alone, and with those for trees alone.
 FOR_ALL_ITEMS = ("text", "concise", "json", "jsonl")
 FOR_PROBLEMS = (*FOR_ALL_ITEMS, "github", "gitlab", "junit", "sarif")
 FOR_TREES = (*FOR_ALL_ITEMS, "dot")
-FOR_FACTS = ("text", "json", "jsonl")
 
 
 def format_named(name: str) -> "type[Format]":

@@ -35,7 +35,7 @@ class DotFormat(Format):
                 self._console.print_error(row)
         if item.line.tree is None:
             return
-        path = [self._add_node(f"{item.line.row}: {item.heading}", "plaintext")]
+        path = [self._add_node(f"{item.line.range.row}: {item.heading}", "plaintext")]
         for node, depth in nodes_of(item.line.tree):
             del path[depth + 1 :]
             is_leaf = node.fText is not None

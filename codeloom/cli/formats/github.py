@@ -1,10 +1,11 @@
 """For GitHub's workflows: annotations of the files of a change.
 
-GitHub shows 10 errors of a step and no more, so that what is beyond is printed as plain rows, with their
-number at the end.
+GitHub shows 10 errors and 10 warnings of a step, so that more are printed as plain rows, with their number
+at the end.
 """
 
 import os
+from collections import Counter
 from collections.abc import Iterable
 
 from codeloom.cli.excerpt import on_one_row, printable
@@ -13,7 +14,7 @@ from codeloom.cli.items import Finding, Item
 from codeloom.cli.source import Source
 from codeloom.cli.tally import Tally
 
-MOST_ANNOTATIONS = 10
+MOST_ANNOTATIONS = 10  # of a kind
 _LONGEST_MESSAGE = 4_000  # GitHub cuts what is longer than 4 KB in what it shows
 
 _ESCAPES = {"%": "%25", "\r": "%0D", "\n": "%0A"}
@@ -23,7 +24,9 @@ _PROPERTY_ESCAPES = {**_ESCAPES, ":": "%3A", ",": "%2C"}
 class GithubFormat(Format):
     """An `::error` or `::warning` row for each of the first problems."""
 
-    _count = 0
+    def begin(self) -> None:
+        """Nothing is counted yet."""
+        self._counts: Counter[str] = Counter()
 
     def add(self, source: Source, items: Iterable[Item]) -> None:
         """Print the problems of one file."""
@@ -38,12 +41,11 @@ class GithubFormat(Format):
 
     def end(self, tally: Tally) -> None:
         """Say how much isn't annotated."""
-        more = self._count - MOST_ANNOTATIONS
+        more = sum(max(count - MOST_ANNOTATIONS, 0) for count in self._counts.values())
         if more > 0:
             noun = "problem isn't" if more == 1 else "problems aren't"
-            self._console.print_row(
-                f"{more:,} more {noun} annotated: GitHub shows {MOST_ANNOTATIONS} errors of a step"
-            )
+            limit = f"{MOST_ANNOTATIONS} errors and {MOST_ANNOTATIONS} warnings"
+            self._console.print_row(f"{more:,} more {noun} annotated: GitHub shows {limit} of a step")
 
     def _add(self, source: Source, finding: Finding) -> None:
         place = source.place_fields(finding.range)
@@ -59,14 +61,14 @@ class GithubFormat(Format):
         self._annotate(properties, message + (f" ({finding.hint})" if finding.hint else ""), finding)
 
     def _annotate(self, properties: dict[str, str], message: str, finding: Finding | None = None) -> None:
-        self._count += 1
-        if self._count > MOST_ANNOTATIONS and finding is not None:
+        kind = "error" if finding is None else finding.severity
+        self._counts[kind] += 1
+        if self._counts[kind] > MOST_ANNOTATIONS and finding is not None:
             for row in finding.rows():
                 self._console.print_row(row)
             return
         pairs = (f"{name}={_escaped(value, _PROPERTY_ESCAPES)}" for name, value in properties.items())
         text = _escaped(message[:_LONGEST_MESSAGE], _ESCAPES)
-        kind = "error" if finding is None else finding.severity
         self._console.print_row(f"::{kind} {','.join(pairs)}::{text}")
 
 
