@@ -1,9 +1,9 @@
 # Made by tools/make_stubs.py; don't edit.
 import collections.abc
 import typing
-from collections.abc import Sequence
+from collections.abc import Callable, Sequence
 import enum
-from typing import Literal, Self
+from typing import Literal, Self, overload
 
 class RecordKind(enum.Enum):
     """What a record says of its name; docs/records.md lists all kinds."""
@@ -1122,7 +1122,12 @@ def file_columns() -> list[tuple[str, str, bool, str]]:
 class SourceBatch:
     """For `codeloom.corpus`: the sources in a table of another library."""
 
+    @overload
     def __init__(self, table: object, path: str, content: str, python: str) -> None:
+        ...
+
+    @overload
+    def __init__(self, paths: list[str], contents: list[bytes | None], pythons: list[str | None]) -> None:
         ...
 
     def __len__(self) -> int:
@@ -1163,6 +1168,20 @@ class SourceBatch:
 
     def analyze(self, tables: list[str], false_hints: bool, max_seconds: float) -> dict[str, Table]:
         ...
+
+class ParquetPart:
+    """For `codeloom.corpus`: what many sources say, as Parquet files."""
+
+    def __init__(self, tables: list[str], false_hints: bool, max_seconds: float, notes: dict[str, dict[str, str]], compress: Callable[[memoryview], bytes]) -> None:
+        """
+        `notes` are those of each table's file; `compress` is that of Zstandard.
+        """
+
+    def add(self, sources: SourceBatch) -> None:
+        """Analyses what was taken of a batch."""
+
+    def finish(self) -> dict[str, bytes]:
+        """The files by the names of their tables, once."""
 
 class Analysis:
     """What a text says. Each part is worked out when it is first asked for."""

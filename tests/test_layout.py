@@ -22,6 +22,7 @@ STEPS = [
     ["file"],
     ["document"],
     ["arrow"],
+    ["parquet"],
     ["host"],
     ["neighbours", "strutils", "_fastaccess", "symbolinfo"],
     ["tree"],

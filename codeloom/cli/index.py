@@ -99,7 +99,8 @@ class IndexCommand(Command):
     def run(self, options: Options) -> ExitStatus:
         """Bring the index up to date; WrongUseError where it can't be one."""
         with needing_extra("index", "arrow", "pyarrow"):
-            from codeloom.corpus.index import Indexer, settings_of
+            from codeloom.corpus.index import Indexer
+            from codeloom.corpus.part import settings_of
             from codeloom.corpus.store import StoreError, WritableStore
         settings = settings_of(
             options.version,

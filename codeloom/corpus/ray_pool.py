@@ -5,12 +5,10 @@ need no disk in common, and a part of a worker that dies is simply made again, b
 """
 
 from collections.abc import Callable, Sequence
-from typing import Any
 
-import pyarrow
 import ray
 
-from codeloom.corpus.index import Hashed, Settings, write_tables
+from codeloom.corpus.part import Hashed, parquet_files
 from codeloom.corpus.store import WritableStore
 
 # How often a part is tried again when its worker dies.
@@ -35,7 +33,7 @@ class RayPool:
                 **own,
             )
         self.jobs = jobs or max(int(ray.cluster_resources().get("CPU", 1)), 1)
-        self._task = ray.remote(max_retries=_RETRIES)(_files_of)
+        self._task = ray.remote(max_retries=_RETRIES)(parquet_files)
         self._settings = ray.put(store.settings)
 
     def submit(self, part: int, sources: Sequence[Hashed]) -> Callable[[], None]:
@@ -44,9 +42,7 @@ class RayPool:
 
         def wait() -> None:
             for name, data in ray.get(result).items():
-                with open(self._store.temporary_path(name, part), "wb") as file:
-                    file.write(data)
-                self._store.synchronise(name, part)
+                self._store.write(name, part, data)
 
         return wait
 
@@ -54,15 +50,3 @@ class RayPool:
         """Leave the cluster, and end it if it was started here."""
         if self._is_ours:
             ray.shutdown()
-
-
-def _files_of(settings: Settings, sources: Sequence[Hashed]) -> dict[str, bytes]:
-    """The Parquet files of a part, by the names of their tables."""
-    sinks: dict[str, Any] = {}
-
-    def sink_of(name: str) -> Any:
-        sinks[name] = pyarrow.BufferOutputStream()
-        return sinks[name]
-
-    write_tables(settings, sources, sink_of)
-    return {name: sink.getvalue().to_pybytes() for name, sink in sinks.items()}

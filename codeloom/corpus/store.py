@@ -121,13 +121,15 @@ class WritableStore(Store):
         self._next += 1
         return self._next - 1
 
-    def temporary_path(self, table: str, part: int) -> str:
-        """Where to write a part of a table before it is committed."""
-        return self.path_of(table, part) + _TEMPORARY
+    def write(self, table: str, part: int, data: bytes) -> None:
+        """Have a part of a table on the disk, before it is committed."""
+        with open(self._temporary_path(table, part), "wb") as file:
+            file.write(data)
+            file.flush()
+            os.fsync(file.fileno())
 
-    def synchronise(self, table: str, part: int) -> None:
-        """Have what was written of a part on the disk."""
-        _synchronise(self.temporary_path(table, part), os.O_RDONLY)
+    def _temporary_path(self, table: str, part: int) -> str:
+        return self.path_of(table, part) + _TEMPORARY
 
     def commit(self, part: int | None, replaces: Iterable[int] = ()) -> None:
         """Make a part count whose files are written, synchronised, at their temporary paths.
@@ -137,7 +139,7 @@ class WritableStore(Store):
         replaced = sorted(replaces)
         if part is not None:
             for table in self.tables:
-                os.replace(self.temporary_path(table, part), self.path_of(table, part))
+                os.replace(self._temporary_path(table, part), self.path_of(table, part))
             for table in self.tables:
                 _synchronise(os.path.join(self.folder, table))
         row: dict[str, Any] = {} if part is None else {"part": part}
@@ -200,9 +202,9 @@ def _locked(folder: str) -> int:
     return descriptor
 
 
-def _synchronise(path: str, flags: int = os.O_RDONLY | os.O_DIRECTORY) -> None:
-    """Have a file, or the names in a folder, on the disk."""
-    descriptor = os.open(path, flags)
+def _synchronise(folder: str) -> None:
+    """Have the names in a folder on the disk."""
+    descriptor = os.open(folder, os.O_RDONLY | os.O_DIRECTORY)
     try:
         os.fsync(descriptor)
     finally:

@@ -2,41 +2,35 @@
 
 #include <algorithm>
 
-#include "arrow/table_builder.h"
 #include "file/time_limit.h"
 
 namespace codeloom {
 
 namespace {
 
-class CBatchRun {
-  public:
-    explicit CBatchRun(const CBatchSettings& settings) : _fSettings(settings) {
-        _fFileSettings.false_hints = settings.false_hints;
-        _fFileSettings.wants_records = _fFileSettings.wants_names = false;
-        for (const CTableKind* kind : settings.tables) {
-            _fFileSettings.wants_records |= kind->wants_records;
-            _fFileSettings.wants_names |= kind->wants_names;
-            _fBuilders.push_back(kind->make(true));
-        }
-    }
-
-    void Take(CBatchFile& file);
-    std::vector<std::shared_ptr<const CTable>> Finish();
-
-  private:
-    const CBatchSettings& _fSettings;
-    CFileSettings _fFileSettings;
-    std::vector<std::unique_ptr<CTableBuilder>> _fBuilders;
-    std::vector<CFileRow> _fFiles;
-};
-
 uint32_t CountRows(const CRowIndex& rows) {
     return rows.Count() - (rows.Text(rows.Count() - 1).empty() ? 1 : 0);
 }
 
-void CBatchRun::Take(CBatchFile& file) {
-    CFileRow& row = file.row;
+}  // namespace
+
+std::vector<CTableKind::CColumnInfo> FileColumnInfos() {
+    return ColumnInfosOf(FileColumns());
+}
+
+CBatchAnalyzer::CBatchAnalyzer(CBatchSettings settings)
+    : _fSettings(std::move(settings)), _fFiles(FileColumns(), false) {
+    _fFileSettings.false_hints = _fSettings.false_hints;
+    _fFileSettings.wants_records = _fFileSettings.wants_names = false;
+    for (const CTableKind* kind : _fSettings.tables) {
+        _fFileSettings.wants_records |= kind->wants_records;
+        _fFileSettings.wants_names |= kind->wants_names;
+        _fBuilders.push_back(kind->make(true));
+    }
+}
+
+void CBatchAnalyzer::Take(const CBatchFile& file) {
+    CFileRow row = file.row;
     if (file.text) {
         const CTimeLimit limit(_fSettings.most_seconds);
         _fFileSettings.version = file.version;
@@ -55,27 +49,27 @@ void CBatchRun::Take(CBatchFile& file) {
             row.problems = static_cast<uint32_t>(analysis.problems.size());
         }
     }
-    _fFiles.push_back(row);
+    _fFiles.Append({row}, 0);
 }
 
-std::vector<std::shared_ptr<const CTable>> CBatchRun::Finish() {
-    std::vector<std::shared_ptr<const CTable>> tables;
-    for (const auto& builder : _fBuilders) tables.push_back(builder->Finish());
-    tables.push_back(TableOfRows(FileColumns(), _fFiles));
+std::vector<std::pair<std::string_view, const CTable*>> CBatchAnalyzer::Tables() const {
+    std::vector<std::pair<std::string_view, const CTable*>> tables;
+    for (size_t i = 0; i < _fBuilders.size(); ++i)
+        tables.emplace_back(_fSettings.tables[i]->name, &_fBuilders[i]->Rows());
+    tables.emplace_back(kFilesTable, &_fFiles.Table());
     return tables;
 }
 
-}  // namespace
-
-std::vector<CTableKind::CColumnInfo> FileColumnInfos() {
-    return ColumnInfosOf(FileColumns());
+void CBatchAnalyzer::ClearRows() {
+    for (const auto& builder : _fBuilders) builder->ClearRows();
+    _fFiles.Clear();
 }
 
-std::vector<std::shared_ptr<const CTable>> AnalyzeBatch(std::span<CBatchFile> files,
-                                                        const CBatchSettings& settings) {
-    CBatchRun run(settings);
-    for (CBatchFile& file : files) run.Take(file);
-    return run.Finish();
+std::vector<std::shared_ptr<const CTable>> CBatchAnalyzer::Finish() {
+    std::vector<std::shared_ptr<const CTable>> tables;
+    for (const auto& builder : _fBuilders) tables.push_back(builder->Finish());
+    tables.push_back(_fFiles.Finish());
+    return tables;
 }
 
 }  // namespace codeloom

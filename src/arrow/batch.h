@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "arrow/file_rows.h"
+#include "arrow/table_builder.h"
 #include "arrow/tables.h"
 #include "file/file_analyzer.h"
 
@@ -33,8 +34,25 @@ struct CBatchSettings {
 inline constexpr std::string_view kFilesTable = "files";
 std::vector<CTableKind::CColumnInfo> FileColumnInfos();
 
-// The tables that the settings name, in their order, and that of the files. Any thread may call it.
-std::vector<std::shared_ptr<const CTable>> AnalyzeBatch(std::span<CBatchFile> files,
-                                                        const CBatchSettings& settings);
+// Analyses texts one after the other, on any thread, and gathers what they say.
+class CBatchAnalyzer {
+  public:
+    explicit CBatchAnalyzer(CBatchSettings settings);
+
+    void Take(const CBatchFile& file);
+
+    // The tables that the settings name, in their order, and that of the files.
+    std::vector<std::pair<std::string_view, const CTable*>> Tables() const;
+    // Leaves no rows, but what was learned of names.
+    void ClearRows();
+    // The same tables to keep; nothing is left.
+    std::vector<std::shared_ptr<const CTable>> Finish();
+
+  private:
+    const CBatchSettings _fSettings;
+    CFileSettings _fFileSettings;
+    std::vector<std::unique_ptr<CTableBuilder>> _fBuilders;
+    TRows<CFileRow> _fFiles;
+};
 
 }  // namespace codeloom

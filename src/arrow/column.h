@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "names/name_table.h"
+#include "text/plain_array.h"
 
 namespace codeloom {
 
@@ -21,9 +22,13 @@ class CBits {
     }
     size_t Count() const { return _fCount; }
     const void* Data() const { return _fBytes.data(); }
+    void Clear() {
+        _fBytes.clear();
+        _fCount = 0;
+    }
 
   private:
-    std::vector<uint8_t> _fBytes;
+    TPlainArray<uint8_t> _fBytes;
     size_t _fCount = 0;
 };
 
@@ -42,6 +47,14 @@ class CColumn {
     size_t Count() const { return _fCount; }
     size_t NullCount() const { return _fNullCount; }
     const void* Validity() const { return _fNullCount == 0 ? nullptr : _fValidity.Data(); }
+
+    // Of names that come by number, the text's own; up to the next text.
+    virtual void BeginText(const CNameTable&) {}
+    // Leaves nothing but the dictionary.
+    virtual void ClearRows() {
+        _fCount = _fNullCount = 0;
+        _fValidity.Clear();
+    }
 
   protected:
     void _CountValue() {
@@ -74,11 +87,15 @@ class TNumberColumn final : public CColumn {
     }
     const char* Format() const override { return sizeof(Number_) == 8 ? "l" : "i"; }
     std::vector<const void*> Buffers() const override { return {_fNumbers.data()}; }
+    void ClearRows() override {
+        CColumn::ClearRows();
+        _fNumbers.clear();
+    }
 
   private:
     static_assert(sizeof(Number_) == 8 || sizeof(Number_) == 4);
 
-    std::vector<Number_> _fNumbers;
+    TPlainArray<Number_> _fNumbers;
 };
 
 class CBoolColumn final : public CColumn {
@@ -89,6 +106,10 @@ class CBoolColumn final : public CColumn {
     }
     const char* Format() const override { return "b"; }
     std::vector<const void*> Buffers() const override { return {_fBits.Data()}; }
+    void ClearRows() override {
+        CColumn::ClearRows();
+        _fBits.Clear();
+    }
 
   private:
     CBits _fBits;
@@ -97,6 +118,8 @@ class CBoolColumn final : public CColumn {
 // UTF-8 with offsets of 64 bits, since those of a batch of texts may have no room in 32.
 class CTextColumn final : public CColumn {
   public:
+    CTextColumn() { _fOffsets.push_back(0); }
+
     void Add(std::string_view text) {
         _fTexts += text;
         _fOffsets.push_back(static_cast<int64_t>(_fTexts.size()));
@@ -108,9 +131,14 @@ class CTextColumn final : public CColumn {
     }
     const char* Format() const override { return "U"; }
     std::vector<const void*> Buffers() const override { return {_fOffsets.data(), _fTexts.data()}; }
+    void ClearRows() override {
+        CColumn::ClearRows();
+        _fOffsets.CutTo(1);
+        _fTexts.clear();
+    }
 
   private:
-    std::vector<int64_t> _fOffsets = {0};
+    TPlainArray<int64_t> _fOffsets;
     CTextBuffer _fTexts;
 };
 
@@ -124,6 +152,10 @@ class CDictionaryColumn : public CColumn {
     const char* Format() const override { return "i"; }
     std::vector<const void*> Buffers() const override { return {_fIndexes.data()}; }
     const CColumn* Dictionary() const override { return &_fDictionary; }
+    void ClearRows() override {
+        CColumn::ClearRows();
+        _fIndexes.clear();
+    }
 
   protected:
     void _AddIndex(size_t i) {
@@ -134,7 +166,7 @@ class CDictionaryColumn : public CColumn {
     CTextColumn _fDictionary;
 
   private:
-    std::vector<int32_t> _fIndexes;
+    TPlainArray<int32_t> _fIndexes;
 };
 
 // The words of a fixed list, by their numbers.
@@ -149,14 +181,32 @@ class CWordColumn final : public CDictionaryColumn {
 // Names and other texts that come again and again.
 class CNameColumn final : public CDictionaryColumn {
   public:
-    void Add(std::string_view name) {
-        const uint32_t number = _fNames.Number(name);
-        if (number == _fDictionary.Count()) _fDictionary.Add(name);
-        _AddIndex(number);
+    void Add(std::string_view name) { _AddIndex(_NumberOf(name)); }
+
+    // Each text has numbers of its own for names, most of which come again.
+    void BeginText(const CNameTable& names) override {
+        _fTextNames = &names;
+        _fOfText.clear();
+        _fOfText.Resize(names.Count(), kUnknown);
+    }
+    void AddNumber(uint32_t number) {
+        uint32_t& known = _fOfText[number];
+        if (known == kUnknown) known = _NumberOf(_fTextNames->Text(number));
+        _AddIndex(known);
     }
 
   private:
+    static constexpr uint32_t kUnknown = UINT32_MAX;
+
+    uint32_t _NumberOf(std::string_view name) {
+        const uint32_t number = _fNames.Number(name);
+        if (number == _fDictionary.Count()) _fDictionary.Add(name);
+        return number;
+    }
+
     CNameTable _fNames;
+    const CNameTable* _fTextNames = nullptr;
+    TPlainArray<uint32_t> _fOfText;
 };
 
 }  // namespace codeloom

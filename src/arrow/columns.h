@@ -3,7 +3,7 @@
 //
 //   uint32_t      32-bit integer        int64_t            64-bit integer
 //   bool          boolean               std::string_view   text
-//   TRepeated     dictionary-coded text
+//   TRepeated     dictionary-coded text      CNumbered   the same, by its number in the text's table of names
 //   an enum with words (file/kind_words.h)                 dictionary-coded text
 //   CRange        four columns: row, column, end_row, end_column
 //   std::optional of one of them: the same, and may be null
@@ -28,6 +28,11 @@ struct TRepeated {
     Text text;
 };
 using CRepeated = TRepeated<std::string_view>;
+
+// A name, by its number in the table that the text's names are in.
+struct CNumbered {
+    uint32_t number;
+};
 
 template <class Field>
 struct TColumnOf {
@@ -66,6 +71,11 @@ struct TColumnOf<std::string_view> : TPlainColumnOf<CTextColumn> {
 template <class Text>
 struct TColumnOf<TRepeated<Text>> : TPlainColumnOf<CNameColumn> {
     static void Add(CNameColumn& column, const TRepeated<Text>& repeated) { column.Add(repeated.text); }
+};
+
+template <>
+struct TColumnOf<CNumbered> : TPlainColumnOf<CNameColumn> {
+    static void Add(CNameColumn& column, const CNumbered& name) { column.AddNumber(name.number); }
 };
 
 template <class Field>

@@ -81,7 +81,7 @@ CRecordRow CRecordSource::Of(uint32_t i) {
     const bool has_place = record.start < record.end;
     return {.line = _fLine,
             .kind = RecordKindOf(record.kind),
-            .name = {analysis.records.Name(record)},
+            .name = {record.name},
             .payload = analysis.records.Value(record),
             .of_argument = record.of_arg,
             .range = has_place ? std::optional(_fText.rows.RangeOf(record.start, record.end)) : std::nullopt};

@@ -26,7 +26,7 @@ struct CLineRow {
 struct CRecordRow {
     uint32_t line;
     ERecordKind kind;
-    CRepeated name;
+    CNumbered name;
     std::string_view payload;
     bool of_argument;
     std::optional<CRange> range;
@@ -67,6 +67,7 @@ class CRecordSource {
     static const TColumns<CRow>& Columns();
     static size_t Count(const CFileAnalysis& analysis) { return analysis.records.records.size(); }
     explicit CRecordSource(const CTextFacts& text) : _fText(text) {}
+    const CNameTable& Names() const { return *_fText.analysis.records.names; }
     CRow Of(uint32_t i);
 
   private:

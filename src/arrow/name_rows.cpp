@@ -40,7 +40,7 @@ COccurrenceRow COccurrenceSource::Of(uint32_t i) {
     const EResolution resolution = _fQueries.Resolution(i);
     const auto has = [&](COccurrence::EFlag flag) { return (item.flags & flag) != 0; };
     COccurrenceRow row = {.line = _fLine,
-                          .name = {names.occurrences.Name(item)},
+                          .name = {item.name},
                           .role = item.role,
                           .range = _fText.rows.RangeOf(item.start, item.end),
                           .scope = names.ScopeOf(names.lines[_fLine], item.scope),
@@ -79,7 +79,7 @@ CScopeRow CScopeSource::Of(uint32_t i) const {
     const auto text_end = static_cast<uint32_t>(_fText.text.size());
     return {.scope = i,
             .kind = scope.kind,
-            .name = {names.occurrences.names->Text(scope.name)},
+            .name = {scope.name},
             .parent = i == 0 ? std::nullopt : std::optional(scope.parent),
             .range = i == 0 ? _fText.rows.RangeOf(0, text_end) : _fText.rows.RangeOf(scope.start, scope.end)};
 }
@@ -126,7 +126,7 @@ CSymbolRow CSymbolSource::Of(uint32_t i) const {
     const CTextNames& names = _fText.analysis.names;
     const CSymbol& symbol = names.scopes.symbols[_fMentioned[i]];
     return {.scope = symbol.scope,
-            .name = {names.occurrences.names->Text(symbol.name)},
+            .name = {symbol.name},
             .is_local = symbol.IsLocal(),
             .is_global = symbol.IsGlobal(),
             .is_free = symbol.binding == CSymbol::EBinding::kFree,

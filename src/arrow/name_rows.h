@@ -8,7 +8,7 @@ namespace codeloom {
 
 struct COccurrenceRow {
     uint32_t line;
-    CRepeated name;
+    CNumbered name;
     ERole role;
     CRange range;
     uint32_t scope;
@@ -24,14 +24,14 @@ struct COccurrenceRow {
 struct CScopeRow {
     uint32_t scope;
     EScopeKind kind;
-    CRepeated name;
+    CNumbered name;
     std::optional<uint32_t> parent;
     CRange range;
 };
 
 struct CSymbolRow {
     uint32_t scope;
-    CRepeated name;
+    CNumbered name;
     bool is_local;
     bool is_global;
     bool is_free;
@@ -53,6 +53,7 @@ class COccurrenceSource {
     static size_t Count(const CFileAnalysis& analysis) { return analysis.names.occurrences.items.size(); }
     explicit COccurrenceSource(const CTextFacts& text)
         : _fText(text), _fQueries(text.analysis.names, text.text, text.version) {}
+    const CNameTable& Names() const { return *_fText.analysis.names.occurrences.names; }
     CRow Of(uint32_t i);
 
   private:
@@ -68,6 +69,7 @@ class CScopeSource {
     static const TColumns<CRow>& Columns();
     static size_t Count(const CFileAnalysis& analysis) { return analysis.names.scopes.scopes.size(); }
     explicit CScopeSource(const CTextFacts& text) : _fText(text) {}
+    const CNameTable& Names() const { return *_fText.analysis.names.occurrences.names; }
     CRow Of(uint32_t i) const;
 
   private:
@@ -81,6 +83,7 @@ class CSymbolSource {
     static const TColumns<CRow>& Columns();
     static size_t Count(const CFileAnalysis& analysis);
     explicit CSymbolSource(const CTextFacts& text);
+    const CNameTable& Names() const { return *_fText.analysis.names.occurrences.names; }
     CRow Of(uint32_t i) const;
 
   private:

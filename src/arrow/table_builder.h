@@ -15,68 +15,86 @@ namespace codeloom {
 
 inline constexpr const char* kFileIdColumn = "file_id";
 
-template <class Source>
-class TTableBuilder final : public CTableBuilder {
+// Rows in columns.
+template <class Row>
+class TRows {
   public:
-    explicit TTableBuilder(bool with_file_id) : _fWithFileId(with_file_id) { _Begin(); }
-
-    void Append(const CTextFacts& text, const CSelection& selection) override {
-        Source source(text);
-        for (size_t done = 0; done < selection.count; done += _fRows.size()) {
-            _fRows.clear();
-            const size_t end = std::min(selection.count, done + kMostRows);
-            for (size_t i = done; i < end; ++i) _fRows.push_back(source.Of(selection.At(i)));
-            _AppendRows(text.file_id);
-        }
+    // `columns` must outlive it.
+    TRows(const TColumns<Row>& columns, bool with_file_id) : _fColumns(columns), _fWithFileId(with_file_id) {
+        _Begin();
     }
 
-    void AppendAll(const CTextFacts& text) override { Append(text, {0, 1, Source::Count(text.analysis)}); }
+    // What the columns of names go by, up to the next call.
+    void BeginText(const CNameTable& names) {
+        for (CTable::CField& field : _fTable.fields) field.column->BeginText(names);
+    }
 
-    std::shared_ptr<const CTable> Finish() override {
+    void Append(const std::vector<Row>& rows, int64_t file_id) {
+        size_t field_i = 0;
+        if (_fWithFileId) {
+            auto& ids = static_cast<TNumberColumn<int64_t>&>(*_fTable.fields[field_i++].column);
+            for (size_t i = 0; i < rows.size(); ++i) ids.Add(file_id);
+        }
+        for (const auto& spec : _fColumns.Specs()) spec.append(*_fTable.fields[field_i++].column, rows);
+        _fTable.count += rows.size();
+    }
+
+    const CTable& Table() const { return _fTable; }
+
+    void Clear() {
+        for (CTable::CField& field : _fTable.fields) field.column->ClearRows();
+        _fTable.count = 0;
+    }
+
+    std::shared_ptr<const CTable> Finish() {
         auto table = std::make_shared<const CTable>(std::move(_fTable));
         _Begin();
         return table;
     }
 
   private:
-    // As many as stay in the processor's cache while they are put into columns.
-    static constexpr size_t kMostRows = 256;
-
     void _Begin() {
         _fTable = {};
         if (_fWithFileId)
             _fTable.fields.push_back({kFileIdColumn, false, std::make_unique<TNumberColumn<int64_t>>()});
-        for (const auto& spec : Source::Columns().Specs())
+        for (const auto& spec : _fColumns.Specs())
             _fTable.fields.push_back({spec.name, spec.is_nullable, spec.make()});
     }
 
-    void _AppendRows(int64_t file_id) {
-        size_t field_i = 0;
-        if (_fWithFileId) {
-            auto& ids = static_cast<TNumberColumn<int64_t>&>(*_fTable.fields[field_i++].column);
-            for (size_t i = 0; i < _fRows.size(); ++i) ids.Add(file_id);
-        }
-        for (const auto& spec : Source::Columns().Specs())
-            spec.append(*_fTable.fields[field_i++].column, _fRows);
-        _fTable.count += _fRows.size();
-    }
-
+    const TColumns<Row>& _fColumns;
     const bool _fWithFileId;
     CTable _fTable;
-    std::vector<typename Source::CRow> _fRows;
 };
 
-// A table of rows that are there already.
-template <class Row>
-std::shared_ptr<const CTable> TableOfRows(const TColumns<Row>& columns, const std::vector<Row>& rows) {
-    CTable table;
-    table.count = rows.size();
-    for (const auto& spec : columns.Specs()) {
-        table.fields.push_back({spec.name, spec.is_nullable, spec.make()});
-        spec.append(*table.fields.back().column, rows);
+template <class Source>
+class TTableBuilder final : public CTableBuilder {
+  public:
+    explicit TTableBuilder(bool with_file_id) : _fTable(Source::Columns(), with_file_id) {}
+
+    void Append(const CTextFacts& text, const CSelection& selection) override {
+        Source source(text);
+        if constexpr (requires { source.Names(); }) _fTable.BeginText(source.Names());
+        for (size_t done = 0; done < selection.count; done += _fRows.size()) {
+            _fRows.clear();
+            const size_t end = std::min(selection.count, done + kMostRows);
+            for (size_t i = done; i < end; ++i) _fRows.push_back(source.Of(selection.At(i)));
+            _fTable.Append(_fRows, text.file_id);
+        }
     }
-    return std::make_shared<const CTable>(std::move(table));
-}
+
+    void AppendAll(const CTextFacts& text) override { Append(text, {0, 1, Source::Count(text.analysis)}); }
+
+    const CTable& Rows() const override { return _fTable.Table(); }
+    void ClearRows() override { _fTable.Clear(); }
+    std::shared_ptr<const CTable> Finish() override { return _fTable.Finish(); }
+
+  private:
+    // As many as stay in the processor's cache while they are put into columns.
+    static constexpr size_t kMostRows = 256;
+
+    TRows<typename Source::CRow> _fTable;
+    std::vector<typename Source::CRow> _fRows;
+};
 
 // The name of a column's type, for people.
 inline std::string_view TypeNameOf(const CColumn& column) {

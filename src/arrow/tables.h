@@ -48,6 +48,10 @@ class CTableBuilder {
     virtual ~CTableBuilder() = default;
     virtual void Append(const CTextFacts& text, const CSelection& selection) = 0;
     virtual void AppendAll(const CTextFacts& text) = 0;
+    // What was appended.
+    virtual const CTable& Rows() const = 0;
+    // Leaves no rows, but the dictionaries, so that further rows go by the same numbers.
+    virtual void ClearRows() = 0;
     // The builder is empty afterwards.
     virtual std::shared_ptr<const CTable> Finish() = 0;
 };

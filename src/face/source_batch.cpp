@@ -6,7 +6,6 @@
 #include <nanobind/stl/string_view.h>
 #include <nanobind/stl/vector.h>
 
-#include "arrow/batch.h"
 #include "face/settings.h"
 #include "host/errors.h"
 #include "host/text.h"
@@ -63,6 +62,24 @@ std::string_view Utf8Of(const nb::str& text) {
     return {utf8, static_cast<size_t>(size)};
 }
 
+std::string_view BytesIn(const nb::bytes& bytes) {
+    return {bytes.c_str(), bytes.size()};
+}
+
+// Of str, bytes or None. The objects keep the texts.
+std::vector<std::optional<std::string_view>> CellsOf(const nb::list& objects) {
+    std::vector<std::optional<std::string_view>> cells;
+    for (const nb::handle object : objects) {
+        if (object.is_none())
+            cells.emplace_back();
+        else if (PyBytes_Check(object.ptr()))
+            cells.emplace_back(BytesIn(nb::borrow<nb::bytes>(object)));
+        else
+            cells.emplace_back(Utf8Of(nb::cast<nb::str>(object)));
+    }
+    return cells;
+}
+
 EFileState StateNamed(std::string_view word) {
     const auto words = WordsOf<EFileState>();
     const auto found = std::find(words.begin(), words.end(), word);
@@ -78,6 +95,14 @@ CSourceBatch::CSourceBatch(nb::handle table, const char* path, const char* conte
       _fContents(_Column(content, false)),
       _fPythons(_Column(python, true)),
       _fHoldsText(_fInput.IsText(*_fInput.ColumnNamed(content))) {}
+
+CSourceBatch::CSourceBatch(const nb::list& paths, const nb::list& contents, const nb::list& pythons)
+    : _fInput(TArrowOwner<ArrowSchema>()),
+      _fPaths(CellsOf(paths)),
+      _fContents(CellsOf(contents)),
+      _fPythons(CellsOf(pythons)) {
+    for (const nb::list& list : {paths, contents, pythons}) _fLists.append(nb::tuple(list));
+}
 
 CTableInput CSourceBatch::_Input(nb::handle table) {
     if (nb::hasattr(table, "__arrow_c_stream__")) {
@@ -183,8 +208,7 @@ void CSourceBatch::Mark(std::string_view state, nb::str reason) {
 
 std::string_view CSourceBatch::CFile::Text() const {
     if (!decoded.is_valid()) return *content;
-    const nb::bytes bytes = nb::borrow<nb::bytes>(decoded);
-    return {bytes.c_str(), bytes.size()};
+    return BytesIn(nb::borrow<nb::bytes>(decoded));
 }
 
 CFileRow CSourceBatch::CFile::Row() const {
@@ -204,11 +228,7 @@ CFileRow CSourceBatch::CFile::Row() const {
     return row;
 }
 
-nb::dict CSourceBatch::Analyze(const std::vector<std::string>& tables, bool false_hints, double max_seconds) {
-    CBatchSettings settings;
-    settings.false_hints = false_hints;
-    settings.most_seconds = max_seconds;
-    for (const std::string& name : tables) settings.tables.push_back(&TableKindNamed(name));
+std::vector<CBatchFile> CSourceBatch::Files() const {
     std::vector<CBatchFile> files;
     for (const CFile& file : _fFiles) {
         CBatchFile& made = files.emplace_back(CBatchFile{.row = file.Row(), .text = std::nullopt});
@@ -217,15 +237,31 @@ nb::dict CSourceBatch::Analyze(const std::vector<std::string>& tables, bool fals
         if (file.state == EFileState::kOk || file.state == EFileState::kUnreadable) made.text = file.Text();
         CSourceFile::MakeLanguages(file.version);
     }
+    return files;
+}
+
+CBatchSettings BatchSettings(const std::vector<std::string>& tables, bool false_hints, double max_seconds) {
+    CBatchSettings settings;
+    settings.false_hints = false_hints;
+    settings.most_seconds = max_seconds;
+    for (const std::string& name : tables) settings.tables.push_back(&TableKindNamed(name));
+    return settings;
+}
+
+nb::dict CSourceBatch::Analyze(const std::vector<std::string>& tables, bool false_hints,
+                               double max_seconds) const {
+    CBatchAnalyzer analyzer(BatchSettings(tables, false_hints, max_seconds));
+    const std::vector<CBatchFile> files = Files();
     std::vector<std::shared_ptr<const CTable>> made;
     {
         const nb::gil_scoped_release released;
-        made = AnalyzeBatch(files, settings);
+        for (const CBatchFile& file : files) analyzer.Take(file);
+        made = analyzer.Finish();
     }
     nb::dict by_name;
     by_name[HostText(kFilesTable)] = CHostTable{kFilesTable, made.back()};
-    for (size_t i = 0; i < settings.tables.size(); ++i) {
-        const std::string_view name = settings.tables[i]->name;
+    for (size_t i = 0; i + 1 < made.size(); ++i) {
+        const std::string_view name = FindTable(tables[i])->name;
         by_name[HostText(name)] = CHostTable{name, made[i]};
     }
     return by_name;
@@ -236,6 +272,10 @@ void BindSourceBatch(nb::module_& module) {
                                    "For `codeloom.corpus`: the sources in a table of another library.");
     batch.def(nb::init<nb::handle, const char*, const char*, const char*>(), "table"_a, "path"_a, "content"_a,
               "python"_a);
+    batch.def(nb::init<const nb::list&, const nb::list&, const nb::list&>(), "paths"_a, "contents"_a,
+              "pythons"_a,
+              nb::sig("def __init__(self, paths: list[str], contents: list[bytes | None], pythons: list[str "
+                      "| None]) -> None"));
     batch.def("__len__", &CSourceBatch::Count);
     batch.def("path", &CSourceBatch::Path, "i"_a, nb::sig("def path(self, i: int) -> str | None"));
     batch.def("python", &CSourceBatch::Python, "i"_a, nb::sig("def python(self, i: int) -> str | None"));

@@ -6,7 +6,7 @@
 #include <string_view>
 #include <vector>
 
-#include "arrow/file_rows.h"
+#include "arrow/batch.h"
 #include "arrow/input.h"
 #include "face/arrow_streams.h"
 #include "face/source_file.h"
@@ -20,6 +20,8 @@ class CSourceBatch {
     // Takes over what `table` gives by the Arrow interfaces. Raises TypeError for what gives nothing,
     // ValueError for a column that isn't there or that holds no text. `python` may be missing.
     CSourceBatch(nb::handle table, const char* path, const char* content, const char* python);
+    // Of lists: str, bytes or None, and str or None. Raises TypeError for anything else.
+    CSourceBatch(const nb::list& paths, const nb::list& contents, const nb::list& pythons);
 
     size_t Count() const { return _fPaths.size(); }
     // Of a source, by its row; None for a null.
@@ -40,8 +42,10 @@ class CSourceBatch {
     // Of the source that was taken last, which has no rows in tables unless it is `unreadable`.
     void Mark(std::string_view state, nb::str reason);
 
+    // What was taken, as long as the batch is there.
+    std::vector<CBatchFile> Files() const;
     // The tables of these names, and the table `files`.
-    nb::dict Analyze(const std::vector<std::string>& tables, bool false_hints, double max_seconds);
+    nb::dict Analyze(const std::vector<std::string>& tables, bool false_hints, double max_seconds) const;
 
   private:
     using CCells = std::vector<std::optional<std::string_view>>;
@@ -69,12 +73,15 @@ class CSourceBatch {
     const std::optional<std::string_view>& _ContentAt(size_t i) const;
 
     CTableInput _fInput;
+    nb::list _fLists;  // what was given in place of a table
     CCells _fPaths;
     CCells _fContents;
     CCells _fPythons;
-    bool _fHoldsText;
+    bool _fHoldsText = false;
     std::vector<CFile> _fFiles;
 };
+
+CBatchSettings BatchSettings(const std::vector<std::string>& tables, bool false_hints, double max_seconds);
 
 void BindSourceBatch(nb::module_& module);
 
