@@ -27,6 +27,7 @@ COMMANDS = {
     "names": ("names", "NamesCommand", "list every name: what it does there, and its scope"),
     "hints": ("hints", "HintsCommand", "list each def with the types of its arguments and results"),
     "tree": ("tree", "TreeCommand", "print the syntax tree of a line"),
+    "report": ("report", "ReportCommand", "write a page for a browser: problems, source, names, charts"),
     "index": ("index", "IndexCommand", "write what many files say into tables, as Parquet files"),
     "query": ("query", "QueryCommand", "ask about an index in SQL"),
     "serve": ("serve", "ServeCommand", "serve an editor by the language server protocol"),

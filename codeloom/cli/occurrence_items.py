@@ -85,13 +85,7 @@ class OccurrenceItem(Item):
         place, line = occurrence.range, occurrence.line.range
         _, row = self._source.cell_and_row(place.row)
         shown = str(place.column) if place.row == line.row else f"{row}:{place.column}"
-        scope, home = occurrence.scope, occurrence.home
-        where = title(scope)
-        if home is not None and home != scope:
-            where = f"{where}, of {title(home)}"
-        elif occurrence.resolution in _UNBOUND:
-            where = f"{where}, {_UNBOUND[occurrence.resolution]}"
-        return shown, printable(occurrence.name), occurrence.role.value, printable(where)
+        return shown, printable(occurrence.name), occurrence.role.value, printable(where(occurrence))
 
     def _text(self) -> str:
         occurrence = self._occurrence
@@ -104,6 +98,16 @@ class OccurrenceItem(Item):
         else:
             where = "" if home == occurrence.scope else f" of {title(home)}"
         return f"{role}{where} in {title(occurrence.scope)}"
+
+
+def where(occurrence: Occurrence) -> str:
+    """The scope that a name is in, and the one that binds it or what else is known."""
+    scope, home = occurrence.scope, occurrence.home
+    if home is not None and home != scope:
+        return f"{title(scope)}, of {title(home)}"
+    if occurrence.resolution in _UNBOUND:
+        return f"{title(scope)}, {_UNBOUND[occurrence.resolution]}"
+    return title(scope)
 
 
 def title(scope: Scope) -> str:

@@ -77,6 +77,9 @@ class Options:
     sql: str = ""
     index: str = ""
 
+    title: str | None = None
+    source: str = "auto"
+
     project: Project
 
     def __init__(self, given: Mapping[str, Any]) -> None:
@@ -127,7 +130,16 @@ class Options:
 
 
 def add_source_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]) -> None:
-    """Add what every command has that goes through files."""
+    """Add what every command has that goes through files and prints what it finds."""
+    add_run_arguments(parser)
+    group = add_output_arguments(parser, formats)
+    add_jobs_argument(group)
+    group.add_argument("--statistics", action="store_true", help="count the problems by code at the end")
+    add_watch_argument(group)
+
+
+def add_run_arguments(parser: argparse.ArgumentParser) -> None:
+    """Add what says which files are read, how, and which of their problems count."""
     parser.add_argument(
         "paths",
         nargs="*",
@@ -141,7 +153,6 @@ def add_source_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
         "--show-files", action="store_true", help="list the files that would be read, and exit"
     )
     _add_selecting(parser)
-    _add_running(add_output_arguments(parser, formats))
 
 
 def add_finding_arguments(parser: argparse.ArgumentParser) -> argparse._ArgumentGroup:
@@ -186,9 +197,8 @@ def _add_selecting(parser: argparse.ArgumentParser) -> None:
     add_exit_zero_argument(group)
 
 
-def _add_running(group: argparse._ArgumentGroup) -> None:
-    add_jobs_argument(group)
-    group.add_argument("--statistics", action="store_true", help="count the problems by code at the end")
+def add_watch_argument(group: argparse._ArgumentGroup) -> None:
+    """Add `watch`."""
     group.add_argument("--watch", action="store_true", help="run again whenever a file changes")
 
 
@@ -219,10 +229,15 @@ def add_output_arguments(parser: argparse.ArgumentParser, formats: Sequence[str]
         help="auto, always or never (default: auto, which heeds NO_COLOR and FORCE_COLOR)",
     )
     group.add_argument("-q", "--quiet", action="count", help="no summary; -qq: no problems either")
+    add_verbose_argument(group)
+    return group
+
+
+def add_verbose_argument(group: argparse._ArgumentGroup) -> None:
+    """Add `verbose`."""
     group.add_argument(
         "-v", "--verbose", action="store_true", help="say which settings and versions are used"
     )
-    return group
 
 
 def add_reading_arguments(parser: argparse.ArgumentParser) -> None:
@@ -351,7 +366,10 @@ __all__ = [
     "add_output_arguments",
     "add_python_argument",
     "add_reading_arguments",
+    "add_run_arguments",
     "add_source_arguments",
+    "add_verbose_argument",
+    "add_watch_argument",
     "as_argument",
     "choice_of",
     "count",

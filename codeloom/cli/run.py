@@ -31,24 +31,36 @@ from codeloom.reading.files import (
 TYPE_CHECKING = False  # `typing` takes long to import
 if TYPE_CHECKING:
     from codeloom.cli.filters.changes import Changes
+    from codeloom.cli.formats.base import Format
 
 STDIN_NAME = "<stdin>"
 
 
 class Run:
-    """What the options come to: files, filters, a format, counts."""
+    """What the options come to: files, filters, a format, counts.
 
-    def __init__(self, options: Options, console: Console, *, records: bool, names: bool) -> None:
+    `output` is a format that isn't one of those with a name.
+    """
+
+    def __init__(
+        self,
+        options: Options,
+        console: Console,
+        *,
+        records: bool,
+        names: bool,
+        output: Format | None = None,
+    ) -> None:
         self.options = options
         self.console = console
         self.tally = Tally()
-        self.format = format_named(options.format)(console, options.command.NAME)
+        self.format = output or format_named(options.format)(console, options.command.NAME)
         self._needs_records, self._needs_names = records, names
         self._needs_fingerprints = self.format.NEEDS_FINGERPRINTS or options.baseline is not None
         self._filters, self._changes = _filters_of(options)
         self._version = options.version
         # What is printed on the terminal all the time shows well enough how far a run is.
-        is_wanted = not ((records or names) and console.is_terminal)
+        is_wanted = self.format.WRITES_AT_END or not ((records or names) and console.is_terminal)
         self._progress = Progress(console, self._count_files, is_wanted=is_wanted)
 
     def files(self) -> Iterator[str | OSError]:

@@ -42,22 +42,27 @@ class SourceCommand(Command):
             print_facts(options)
         if options.watch:
             return self._watch(options)
-        return self._run_once(options)
+        return self.run_once(options)
 
-    def _run_once(self, options: Options) -> ExitStatus:
+    def run_once(self, options: Options) -> ExitStatus:
+        """Show all files one time."""
         with opened_console(options) as console:
-            run = Run(options, console, records=self.NEEDS_RECORDS, names=self.NEEDS_NAMES)
-            if options.show_files:
-                return _show_files(run, console)
-            run.format.begin()
-            for source, problems in run.sources():
-                items = list(self.items(source, problems))
-                run.tally.add(source, [item for item in items if isinstance(item, Finding)])
-                if options.quiet < 2 or run.format.IS_FOR_PROGRAMS:
-                    run.format.add(source, items)
-                if items:
-                    console.flush()
-            return run.end()
+            return self.show(Run(options, console, records=self.NEEDS_RECORDS, names=self.NEEDS_NAMES))
+
+    def show(self, run: Run) -> ExitStatus:
+        """Show what a run reads, or the names of its files."""
+        options, console = run.options, run.console
+        if options.show_files:
+            return _show_files(run, console)
+        run.format.begin()
+        for source, problems in run.sources():
+            items = list(self.items(source, problems))
+            run.tally.add(source, [item for item in items if isinstance(item, Finding)])
+            if options.quiet < 2 or run.format.IS_FOR_PROGRAMS:
+                run.format.add(source, items)
+            if items:
+                console.flush()
+        return run.end()
 
     def _watch(self, options: Options) -> ExitStatus:
         """Run again and again, until the user interrupts it."""
@@ -70,7 +75,7 @@ class SourceCommand(Command):
             before = now
             if options.output is None and sys.stdout is not None and sys.stdout.isatty():
                 print("\033[H\033[2J\033[3J", end="")
-            self._run_once(options)
+            self.run_once(options)
 
 
 def _stamps(options: Options) -> dict[str, tuple[int, int]]:

@@ -20,6 +20,8 @@ class Format(ABC):
     NEEDS_FINGERPRINTS = False
     # True for what programs read: UTF-8 whatever the terminal takes.
     IS_FOR_PROGRAMS = True
+    # True when nothing is written before the end.
+    WRITES_AT_END = False
 
     def __init__(self, console: Console, command: str) -> None:
         self._console = console
