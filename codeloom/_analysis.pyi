@@ -1281,6 +1281,46 @@ class Analysis:
         One of the tables of docs/tables.md, such as "lines", whole; ValueError for an unknown name.
         """
 
+class DocumentEdit:
+    """For `codeloom.Document`: what an edit replaced."""
+
+    @property
+    def range(self) -> Range:
+        """What was replaced, in the text before."""
+
+    @property
+    def new_range(self) -> Range:
+        """What is there now."""
+
+class DocumentChange:
+    """
+    For `codeloom.Change`: what an edit has changed. Each question is answered by two tuples: what is gone, and what came.
+    """
+
+    def __init__(self, before: Analysis, after: Analysis, edit: DocumentEdit) -> None:
+        ...
+
+    def moved(self, range: Range) -> Range | None:
+        """
+        Where a range of the text before is now; None where the edit has cut into it.
+        """
+
+    @property
+    def lines(self) -> tuple[tuple[Line, ...], tuple[Line, ...]]:
+        """Logical lines."""
+
+    @property
+    def problems(self) -> tuple[tuple[Problem, ...], tuple[Problem, ...]]:
+        """Problems."""
+
+    @property
+    def occurrences(self) -> tuple[tuple[Occurrence, ...], tuple[Occurrence, ...]]:
+        """Appearances of names."""
+
+    @property
+    def scopes(self) -> tuple[tuple[Scope, ...], tuple[Scope, ...]]:
+        """Scopes."""
+
 class DocumentText:
     """
     For `codeloom.Document`: a text that changes, in pieces that keep what they say.
@@ -1306,10 +1346,8 @@ class DocumentText:
         A column in characters as one of the document. ValueError for an unknown place.
         """
 
-    def edit(self, start: tuple[int, int], end: tuple[int, int], new_text: str) -> tuple[Range, Range]:
-        """
-        Put a text in the place of a range. The range before, and that of the new text.
-        """
+    def edit(self, start: tuple[int, int], end: tuple[int, int], new_text: str) -> DocumentEdit:
+        """Put a text in the place of a range, and say what was replaced."""
 
 def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, with_records: bool, with_names: bool) -> list[Analysis | None]:
     """

@@ -1,31 +1,32 @@
 """The text of an editor that changes, with what it says after each edit."""
 
 import os
-from collections import Counter
-from collections.abc import Callable, Hashable, Iterable
 from functools import cached_property
-from operator import attrgetter
 
-from codeloom._analysis import Analysis, DocumentText, Line, Occurrence, Problem, Range, Scope
+from codeloom._analysis import (
+    Analysis,
+    DocumentChange,
+    DocumentEdit,
+    DocumentText,
+    Line,
+    Occurrence,
+    Problem,
+    Range,
+    Scope,
+)
 from codeloom._face import analyze, path_text
 from codeloom.reading.languages import NEWEST, version_number
 
 TYPE_CHECKING = False  # `typing` takes longer to import than this module
 if TYPE_CHECKING:
-    from typing import Literal, TypeVar
+    from typing import Literal
 
     Encoding = Literal["utf-8", "utf-16", "utf-32"]
-    Item = TypeVar("Item")
 
 # From 1, and what columns count is said where a position is taken.
 Position = tuple[int, int]
 
 _ENCODINGS = ("utf-8", "utf-16", "utf-32")
-_SAID_OF_SYMBOL = attrgetter(
-    "name",
-    *("is_local", "is_global", "is_free", "is_declared_global", "is_nonlocal", "is_referenced"),
-    *("is_assigned", "is_parameter", "is_imported", "is_annotated", "is_type_parameter", "is_namespace"),
-)
 
 
 class Document:
@@ -108,9 +109,9 @@ class Document:
             raise TypeError(f"new_text must be a str, not {type(new_text).__name__}")
         start, end = _checked(start, "start"), _checked(end, "end")
         before = self._analysis
-        gone, come = self._text.edit(start, end, new_text)
+        edit = self._text.edit(start, end, new_text)
         self._analysis = self._text.analysis or self._analyzed()
-        return Change(before, self._analysis, gone, come)
+        return Change(before, self._analysis, edit)
 
     def _analyzed(self) -> Analysis:
         """What a text says that has to be mended before."""
@@ -137,11 +138,12 @@ class Change:
     new_range: Range
     """What is there now, in the text after."""
 
-    def __init__(self, before: Analysis, after: Analysis, range: Range, new_range: Range) -> None:
+    def __init__(self, before: Analysis, after: Analysis, edit: DocumentEdit) -> None:
         self.before = before
         self.after = after
-        self.range = range
-        self.new_range = new_range
+        self.range = edit.range
+        self.new_range = edit.new_range
+        self._changed = DocumentChange(before, after, edit)
 
     @property
     def lines_gone(self) -> tuple[Line, ...]:
@@ -185,77 +187,27 @@ class Change:
 
     def moved(self, range: Range) -> Range | None:
         """Where a range of the text before is now; None where the edit has cut into it."""
-        start, end = (range.row, range.column), (range.end_row, range.end_column)
-        cut, cut_end = (self.range.row, self.range.column), (self.range.end_row, self.range.end_column)
-        if cut < start < cut_end or cut < end < cut_end:
-            return None
-        new_start = self._shifted(start) if start >= cut_end and end > cut else start
-        return Range(*new_start, *(end if end <= cut else self._shifted(end)))
+        return self._changed.moved(range)
 
     def __repr__(self) -> str:
         gone, come = self.range, self.new_range
         return f"<Change of {self.after.path!r}: {gone} to {come}>"
 
-    def _shifted(self, place: Position) -> Position:
-        row, column = place
-        if row == self.range.end_row:
-            column += self.new_range.end_column - self.range.end_column
-        return row + self.new_range.end_row - self.range.end_row, column
-
     @cached_property
     def _lines(self) -> tuple[tuple[Line, ...], tuple[Line, ...]]:
-        return self._differences(
-            self.before.lines, self.after.lines, lambda line: (line.kind, line.indent, line.text)
-        )
+        return self._changed.lines
 
     @cached_property
     def _problems(self) -> tuple[tuple[Problem, ...], tuple[Problem, ...]]:
-        return self._differences(
-            self.before.problems,
-            self.after.problems,
-            lambda problem: (problem.code, problem.message, problem.hint, len(problem.related)),
-        )
+        return self._changed.problems
 
     @cached_property
     def _occurrences(self) -> tuple[tuple[Occurrence, ...], tuple[Occurrence, ...]]:
-        return self._differences(
-            self.before.occurrences,
-            self.after.occurrences,
-            lambda occurrence: (occurrence.name, occurrence.role, occurrence.resolution),
-        )
+        return self._changed.occurrences
 
     @cached_property
     def _scopes(self) -> tuple[tuple[Scope, ...], tuple[Scope, ...]]:
-        return self._differences(self.before.scopes, self.after.scopes, _said_of_scope)
-
-    def _differences(
-        self, before: "Iterable[Item]", after: "Iterable[Item]", said: "Callable[[Item], Hashable]"
-    ) -> "tuple[tuple[Item, ...], tuple[Item, ...]]":
-        """The items of both sides that the other one lacks, by their place and by what is said of them."""
-        old = [(self.moved(item.range), said(item), item) for item in before]  # type: ignore[attr-defined]
-        new = [(item.range, said(item), item) for item in after]  # type: ignore[attr-defined]
-        return _missing(old, new), _missing(new, old)
-
-
-def _missing(
-    items: "list[tuple[Range | None, Hashable, Item]]",
-    others: "list[tuple[Range | None, Hashable, Item]]",
-) -> "tuple[Item, ...]":
-    left: Counter[tuple[Range | None, Hashable]] = Counter()
-    left.update((place, said) for place, said, _ in others if place is not None)
-    found = []
-    for place, said, item in items:
-        if left[place, said] > 0:
-            left[place, said] -= 1
-        else:
-            found.append(item)
-    return tuple(found)
-
-
-def _said_of_scope(scope: Scope) -> Hashable:
-    parent = scope.parent
-    around = (parent.kind, parent.name) if parent else None
-    return scope.kind, scope.name, around, frozenset(map(_SAID_OF_SYMBOL, scope.symbols))
+        return self._changed.scopes
 
 
 def _checked(position: object, name: str) -> Position:

@@ -1,8 +1,13 @@
 // document/: a text that changes, and what it says after each change.
 //   in     a text, then edits of it
-//   out    for each text what AnalyzeFile says of it
+//   out    for each text what AnalyzeFile says of it, and which pieces of it are others than before
 //   keeps  the text in pieces, each with what it says; an edit leaves most of them as they are
 //   start  at CPieces
+//
+// piece.h            a part of a text, and what it says
+// piece_list.h       pieces one after the other, found by byte, line and row
+// joined_problems.h  the problems of all pieces, without those that follow from others
+// columns.h          what the columns of a host count
 #pragma once
 
 #include <cstdint>
@@ -13,36 +18,9 @@
 #include <string_view>
 #include <vector>
 
-#include "file/file_part.h"
+#include "document/piece_list.h"
 
 namespace codeloom {
-
-// What a piece says of names, its places counted as those of the piece.
-struct CPieceNames {
-    CTextNames names;
-    CSignatures signatures;
-};
-
-// A part of a text, wherever it is: all places are counted from its beginning.
-struct CPiece {
-    uint32_t length = 0;
-    uint32_t looked_at = 0;
-    CPartState state;  // before it
-    CProblems problems;
-    std::vector<CLineFault> faults;
-    CProblems late_problems;
-    std::vector<CLine> lines;
-    std::vector<CLineLimit> limits;  // lines are counted from its first one
-    size_t scanned_in_vain = 0;
-    size_t repeated_text = 0;
-    bool has_asked_for_literals = false;
-    std::vector<CBlock> closed;
-    bool may_have_reopened = false;
-    bool needs_whole_text = false;
-    mutable std::unique_ptr<const CPieceNames> names;  // once they have been asked for
-};
-
-using CPiecePtr = std::shared_ptr<const CPiece>;
 
 // What went from `start` to `end`, and how much came in its place.
 struct CTextEdit {
@@ -53,6 +31,14 @@ struct CTextEdit {
     uint32_t NewEnd() const { return start + new_length; }
 };
 
+// Lines of the text before, and those of the text after that are in their place. All others are the same.
+struct CReplacedLines {
+    uint32_t old_first = 0;
+    uint32_t old_end = 0;
+    uint32_t new_first = 0;
+    uint32_t new_end = 0;
+};
+
 // A text in pieces. Copies share what is the same in them, and nothing in them changes. Names of all that
 // share are in one table, so they are for one thread at a time.
 class CPieces {
@@ -61,14 +47,24 @@ class CPieces {
     // Settings that ask for records or names aren't regarded.
     CPieces(std::string_view text, const CFileSettings& settings);
 
-    // Those of the text that an edit has made of the one of these pieces.
-    CPieces Edited(std::string_view text, const CTextEdit& edit) const;
+    // Those of the text that an edit has made of `old_text`, the one of these pieces; appends to `replaced`.
+    CPieces Edited(std::string_view old_text, std::string_view text, const CTextEdit& edit,
+                   std::vector<CReplacedLines>& replaced) const;
 
-    // The same as AnalyzeFile says of the text, without records; none where the text is one of the rare ones
-    // that must be analysed as a whole.
+    // False where the text is one of the rare ones that must be analysed as a whole. Requires for what
+    // follows: true.
+    bool SayAll() const;
+
+    // The same as AnalyzeFile says of the text, without records. None where the names, if wanted, take an
+    // analysis of the whole.
     std::optional<CFileAnalysis> Analysis(std::string_view text, bool wants_names) const;
+    CProblems Problems(std::string_view text) const;
+    uint32_t LineCount() const { return _fPieces.Sums().size.line; }
+    CLine Line(uint32_t line_i) const;
 
-    size_t Count() const { return _fPieces.size(); }
+    uint32_t RowCount() const { return _fPieces.Sums().size.row + 1; }
+
+    const CPieceList& List() const { return _fPieces; }
 
   private:
     friend class CPieceWork;
@@ -79,8 +75,8 @@ class CPieces {
     void _JoinNames(std::string_view text, CFileAnalysis& analysis) const;
 
     CFileSettings _fSettings;
-    std::vector<CPiecePtr> _fPieces;
-    CLiteralTexts _fLiterals;  // the names for `Literal`, if a piece has asked for them
+    CPieceList _fPieces;
+    std::optional<CLiteralTexts> _fLiterals;  // the names for `Literal`, if a piece has asked for them
 };
 
 }  // namespace codeloom

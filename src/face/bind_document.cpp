@@ -2,12 +2,15 @@
 #include "face/bind_document.h"
 
 #include <nanobind/nanobind.h>
+#include <nanobind/stl/optional.h>
 #include <nanobind/stl/pair.h>
 #include <nanobind/stl/string_view.h>
 
 #include "face/bind_items.h"
+#include "face/change.h"
 #include "face/document.h"
 #include "face/settings.h"
+#include "host/refuse_new.h"
 #include "host/text.h"
 
 namespace nb = nanobind;
@@ -22,9 +25,44 @@ EUnit UnitOf(std::string_view encoding) {
     return encoding == "utf-16" ? EUnit::kUtf16 : EUnit::kCharacter;
 }
 
+void BindEdit(nb::module_& module) {
+    nb::class_<CDocumentEdit> edit(module, "DocumentEdit", "For `codeloom.Document`: what an edit replaced.",
+                                   nb::type_slots(kNotMadeByHost));
+    edit.def_ro("range", &CDocumentEdit::range, "What was replaced, in the text before.");
+    edit.def_ro("new_range", &CDocumentEdit::new_range, "What is there now.");
+}
+
+void BindChange(nb::module_& module) {
+    nb::class_<CChange> change(module, "DocumentChange",
+                               "For `codeloom.Change`: what an edit has changed. Each question is answered "
+                               "by two tuples: what is gone, and what came.");
+    change.def(
+        "__init__",
+        [](CChange* self, const CAnalysis& before, const CAnalysis& after, const CDocumentEdit& edit) {
+            new (self) CChange(before.file, after.file, edit.range, edit.new_range, edit.replaced);
+        },
+        "before"_a, "after"_a, "edit"_a);
+    change.def("moved", &CChange::Moved, "range"_a,
+               "Where a range of the text before is now; None where the edit has cut into it.");
+    change.def_prop_ro("lines", &CChange::Lines,
+                       nb::sig("def lines(self) -> tuple[tuple[Line, ...], tuple[Line, ...]]"),
+                       "Logical lines.");
+    change.def_prop_ro("problems", &CChange::Problems,
+                       nb::sig("def problems(self) -> tuple[tuple[Problem, ...], tuple[Problem, ...]]"),
+                       "Problems.");
+    change.def_prop_ro(
+        "occurrences", &CChange::Occurrences,
+        nb::sig("def occurrences(self) -> tuple[tuple[Occurrence, ...], tuple[Occurrence, ...]]"),
+        "Appearances of names.");
+    change.def_prop_ro("scopes", &CChange::Scopes,
+                       nb::sig("def scopes(self) -> tuple[tuple[Scope, ...], tuple[Scope, ...]]"), "Scopes.");
+}
+
 }  // namespace
 
 void BindDocument(nb::module_& module) {
+    BindEdit(module);
+    BindChange(module);
     nb::class_<CDocument> document(
         module, "DocumentText",
         "For `codeloom.Document`: a text that changes, in pieces that keep what they say.");
@@ -60,8 +98,7 @@ void BindDocument(nb::module_& module) {
            nb::str new_text) {
             return self.Edit({start.first, start.second}, {end.first, end.second}, std::move(new_text));
         },
-        "start"_a, "end"_a, "new_text"_a,
-        "Put a text in the place of a range. The range before, and that of the new text.");
+        "start"_a, "end"_a, "new_text"_a, "Put a text in the place of a range, and say what was replaced.");
 }
 
 }  // namespace codeloom

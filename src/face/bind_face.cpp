@@ -102,8 +102,9 @@ void BindProblem(nb::module_& module) {
     problem.def_prop_ro(
         "source_row",
         [](const CProblemItem& self) {
-            const CRowIndex& rows = self.file->Rows();
-            return TextFromUtf8(rows.Text(rows.PlaceOf(self.Data().start).row));
+            const uint32_t start = self.Data().start;
+            const CPlacedRows at = self.file->RowsAt(start);
+            return TextFromUtf8(at.rows.Text(at.rows.PlaceOf(start - at.start).row));
         },
         nb::sig("def source_row(self) -> str"), "The text of the row in which it begins.");
     problem.def("__str__", &CProblemItem::Text);

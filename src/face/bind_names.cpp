@@ -25,15 +25,16 @@ nb::object TupleOf(const CSourceFilePtr& file, const std::vector<uint32_t>& occu
 uint32_t OffsetOf(const CSourceFile& file, int row, int column) {
     if (row < 1) RaiseHost(PyExc_ValueError, "row must be at least 1");
     if (column < 1) RaiseHost(PyExc_ValueError, "column must be at least 1");
-    const CRowIndex& rows = file.Rows();
-    if (static_cast<uint32_t>(row) > rows.Count()) return static_cast<uint32_t>(file.Text().size());
-    const std::string_view text = rows.Text(static_cast<uint32_t>(row - 1));
+    if (static_cast<uint32_t>(row) > file.RowCount()) return static_cast<uint32_t>(file.Text().size());
+    const CPlacedRows around = file.RowsAround(static_cast<uint32_t>(row - 1));
+    const uint32_t row_i = static_cast<uint32_t>(row - 1) - around.first_row;
+    const std::string_view text = around.rows.Text(row_i);
     size_t pos = 0;
     for (; column > 1 && pos < text.size(); --column) {
         ++pos;
         while (pos < text.size() && (static_cast<unsigned char>(text[pos]) & 0xC0) == 0x80) ++pos;
     }
-    return rows.Start(static_cast<uint32_t>(row - 1)) + static_cast<uint32_t>(pos);
+    return around.start + around.rows.Start(row_i) + static_cast<uint32_t>(pos);
 }
 
 nb::object OccurrenceAt(const CAnalysis& analysis, nb::handle row, nb::handle column) {

@@ -29,54 +29,83 @@ std::string Shown(const CRowColumn& place) {
 }  // namespace
 
 CDocument::CDocument(nb::str text, nb::str path, nb::str python, const CFileSettings& settings, EUnit unit)
-    : _fPath(std::move(path)),
-      _fPython(std::move(python)),
-      _fSettings(settings),
-      _fUnit(unit),
-      _fRows(CUtf8(text)) {
+    : _fPath(std::move(path)), _fPython(std::move(python)), _fSettings(settings), _fUnit(unit) {
     CSourceFile::MakeLanguages(settings.version);
     const CUtf8 utf8(text);
-    _Take(Spliced(utf8, {}, {}), {});
+    _Take(Spliced(utf8, {}, {}));
 }
 
-std::pair<CRange, CRange> CDocument::Edit(const CRowColumn& start, const CRowColumn& end, nb::str new_text) {
+CDocumentEdit CDocument::Edit(const CRowColumn& start, const CRowColumn& end, nb::str new_text) {
     const uint32_t first = _OffsetOf("start", start, _fUnit);
     const uint32_t last = _OffsetOf("end", end, _fUnit);
     if (last < first)
         RaiseHost(PyExc_ValueError, ("end " + Shown(end) + " is before start " + Shown(start)).c_str());
     const CUtf8 came(new_text);
-    const CRange gone = _RangeOf(first, last);
+    CDocumentEdit done;
+    done.range = _RangeOf(first, last);
     const std::string_view text = Text();
     CPlainFile joined = Spliced(text.substr(0, first), came, text.substr(last));
     const CTextEdit edit{first, last, static_cast<uint32_t>(came->size())};
-    _fRows.Edit(joined.Text(), edit);
-    _Take(std::move(joined), edit);
-    return {gone, _RangeOf(first, edit.NewEnd())};
+    if (_fFile && IsSourceText(came)) {
+        done.replaced = _TakeEdited(std::move(joined), edit);
+    } else {
+        _Take(std::move(joined));
+    }
+    done.new_range = _RangeOf(first, edit.NewEnd());
+    return done;
 }
 
-// The pieces of a text that couldn't be analysed are made anew for the next one.
-void CDocument::_Take(CPlainFile text, const CTextEdit& edit) {
-    if (!IsSourceText(text.Text())) {
-        _fUnreadable = text.Text();
-        _fFile.reset();
-        _fPieces.reset();
-        return;
+void CDocument::_Take(CPlainFile text) {
+    if (IsSourceText(text.Text())) {
+        CPieces pieces(text.Text(), _fSettings);
+        return _TakePieces(std::move(text), std::move(pieces));
     }
-    _fPieces = std::make_shared<const CPieces>(_fPieces ? _fPieces->Edited(text.Text(), edit)
-                                                        : CPieces(text.Text(), _fSettings));
-    _fFile = std::make_shared<const CSourceFile>(std::move(text), _fPath, _fPython, _fSettings, _fPieces,
-                                                 _fRows.Starts());
+    _fFile.reset();
+    _fPieces.reset();
+    _fUnreadable = text.Text();
+    _fUnreadableRows.emplace(_fUnreadable);
+}
+
+// Which lines are others is known only where pieces say what they say before and after.
+std::optional<std::vector<CReplacedLines>> CDocument::_TakeEdited(CPlainFile text, const CTextEdit& edit) {
+    std::vector<CReplacedLines> replaced;
+    const bool was_in_pieces = _fPieces->SayAll();
+    CPieces edited = _fPieces->Edited(Text(), text.Text(), edit, replaced);
+    _TakePieces(std::move(text), std::move(edited));
+    if (!was_in_pieces || !_fPieces->SayAll()) return {};
+    return replaced;
+}
+
+void CDocument::_TakePieces(CPlainFile text, CPieces pieces) {
+    _fPieces = std::make_shared<const CPieces>(std::move(pieces));
+    _fFile = std::make_shared<const CSourceFile>(std::move(text), _fPath, _fPython, _fSettings, _fPieces);
     _fUnreadable = {};
+    _fUnreadableRows.reset();
+}
+
+CPlacedRows CDocument::_RowsAround(int64_t row) const {
+    if (_fFile) return _fFile->RowsAround(static_cast<uint32_t>(row - 1));
+    return {*_fUnreadableRows};
+}
+
+std::string_view CDocument::_Row(int64_t row) const {
+    const CPlacedRows around = _RowsAround(row);
+    return around.rows.Text(static_cast<uint32_t>(row - 1) - around.first_row);
+}
+
+uint32_t CDocument::_StartOf(int64_t row) const {
+    const CPlacedRows around = _RowsAround(row);
+    return around.start + around.rows.Start(static_cast<uint32_t>(row - 1) - around.first_row);
 }
 
 CRowColumn CDocument::End() const {
-    const int64_t row = _fRows.Count();
-    return {row, EndColumn(_fRows.Row(Text(), row), _fUnit)};
+    const int64_t row = _RowCount();
+    return {row, EndColumn(_Row(row), _fUnit)};
 }
 
 int64_t CDocument::ColumnOf(const CRowColumn& place) const {
     const uint32_t offset = _OffsetOf("place", place, EUnit::kCharacter);
-    const uint32_t start = _fRows.Starts()[static_cast<size_t>(place.row) - 1];
+    const uint32_t start = _StartOf(place.row);
     return EndColumn(Text().substr(start, offset - start), _fUnit);
 }
 
@@ -84,29 +113,20 @@ uint32_t CDocument::_OffsetOf(const char* argument, const CRowColumn& place, EUn
     const auto refuse = [&](const std::string& why) {
         RaiseHost(PyExc_ValueError, (std::string(argument) + " " + Shown(place) + why).c_str());
     };
-    if (place.row < 1 || place.row > _fRows.Count())
-        refuse(": there is no row " + std::to_string(place.row) + ", but " + std::to_string(_fRows.Count()));
-    const std::string_view row = _fRows.Row(Text(), place.row);
+    if (place.row < 1 || place.row > _RowCount())
+        refuse(": there is no row " + std::to_string(place.row) + ", but " + std::to_string(_RowCount()));
+    const std::string_view row = _Row(place.row);
     const std::optional<size_t> bytes =
         place.column < 1 ? row.size() + 1 : BytesBefore(row, place.column, unit);
     if (!bytes) refuse(" is within a character");
     if (*bytes > row.size())
         refuse(": row " + std::to_string(place.row) + " ends at column " +
                std::to_string(EndColumn(row, unit)));
-    return _fRows.Starts()[static_cast<size_t>(place.row) - 1] + static_cast<uint32_t>(*bytes);
+    return _StartOf(place.row) + static_cast<uint32_t>(*bytes);
 }
 
 CRange CDocument::_RangeOf(uint32_t start, uint32_t end) const {
-    const std::vector<uint32_t>& starts = _fRows.Starts();
-    const auto place = [&](uint32_t offset) {
-        const auto row = std::upper_bound(starts.begin(), starts.end(), offset) - starts.begin();
-        const uint32_t row_start = starts[static_cast<size_t>(row) - 1];
-        const std::string_view before = Text().substr(row_start, offset - row_start);
-        return CRowColumn{row, EndColumn(before, EUnit::kCharacter)};
-    };
-    const CRowColumn first = place(start), last = place(end);
-    return {static_cast<uint32_t>(first.row), static_cast<uint32_t>(first.column),
-            static_cast<uint32_t>(last.row), static_cast<uint32_t>(last.column)};
+    return _fFile ? _fFile->RangeOf(start, end) : _fUnreadableRows->RangeOf(start, end);
 }
 
 }  // namespace codeloom

@@ -6,12 +6,20 @@
 #include <string>
 #include <string_view>
 #include <utility>
+#include <vector>
 
+#include "document/columns.h"
 #include "document/pieces.h"
-#include "document/row_starts.h"
 #include "face/source_file.h"
 
 namespace codeloom {
+
+// What an edit replaced, where the new text is, and which lines are others; none where that isn't known.
+struct CDocumentEdit {
+    CRange range;
+    CRange new_range;
+    std::optional<std::vector<CReplacedLines>> replaced;
+};
 
 // For one thread at a time. A text that can't be analysed as it is, since it holds NUL or lone surrogates, is
 // edited here all the same.
@@ -24,9 +32,9 @@ class CDocument {
     // What the text says; null for one that can't be analysed as it is.
     const CSourceFilePtr& File() const { return _fFile; }
 
-    // Puts a text in the place of a range, and gives the range before, and that of what is there now. Raises
-    // ValueError, naming the argument, for a place that the text doesn't have; the text then stays as it is.
-    std::pair<CRange, CRange> Edit(const CRowColumn& start, const CRowColumn& end, nb::str new_text);
+    // Puts a text in the place of a range. Raises ValueError, naming the argument, for a place that the text
+    // doesn't have; the text then stays as it is.
+    CDocumentEdit Edit(const CRowColumn& start, const CRowColumn& end, nb::str new_text);
 
     // After the last character.
     CRowColumn End() const;
@@ -34,18 +42,26 @@ class CDocument {
     int64_t ColumnOf(const CRowColumn& place) const;
 
   private:
+    uint32_t _RowCount() const { return _fFile ? _fFile->RowCount() : _fUnreadableRows->Count(); }
+    // `row` from 1.
+    CPlacedRows _RowsAround(int64_t row) const;
+    std::string_view _Row(int64_t row) const;
+    uint32_t _StartOf(int64_t row) const;
     uint32_t _OffsetOf(const char* argument, const CRowColumn& place, EUnit unit) const;
     CRange _RangeOf(uint32_t start, uint32_t end) const;
-    void _Take(CPlainFile text, const CTextEdit& edit);
+    void _Take(CPlainFile text);
+    std::optional<std::vector<CReplacedLines>> _TakeEdited(CPlainFile text, const CTextEdit& edit);
+    void _TakePieces(CPlainFile text, CPieces pieces);
 
     nb::str _fPath;
     nb::str _fPython;
     CFileSettings _fSettings;
     EUnit _fUnit;
     CSourceFilePtr _fFile;
-    std::string _fUnreadable;  // the text, where there is no file
     std::shared_ptr<const CPieces> _fPieces;
-    CRowStarts _fRows;
+    // Where there is no file.
+    std::string _fUnreadable;
+    std::optional<CRowIndex> _fUnreadableRows;
 };
 
 }  // namespace codeloom

@@ -56,6 +56,22 @@ size_t CProblemItem::Hash() const {
 
 // Lines
 
+std::string_view CLineItem::Text() const {
+    const CLine line = Data();
+    return file->Text().substr(line.start, line.end - line.start);
+}
+
+CRange CLineItem::Range() const {
+    const CLine line = Data();
+    return RangeOfBytes(*file, line.start, line.end);
+}
+
+int CLineItem::Indent() const {
+    const uint32_t start = Data().start;
+    const CPlacedRows at = file->RowsAt(start);
+    return at.rows.IndentOf(start - at.start);
+}
+
 bool CLineItem::operator==(const CLineItem& other) const {
     if (file == other.file && i == other.i) return true;
     return Data().type == other.Data().type && Text() == other.Text() && Range() == other.Range();
@@ -127,17 +143,16 @@ size_t CLimitItem::Hash() const {
 // Sequences
 
 CProblemItems ProblemsOf(const CSourceFilePtr& file) {
-    return AllOf<CProblemItems>(file, file->Analysis().problems.size());
+    return AllOf<CProblemItems>(file, file->Problems().size());
 }
 
 CProblemItems ProblemsOf(const CLineItem& line) {
-    const CFileAnalysis& analysis = line.file->Analysis();
-    const size_t first = analysis.FirstProblem(line.i);
-    return {line.file, first, 1, analysis.FirstProblem(line.i + 1) - first};
+    const size_t first = line.file->FirstProblem(line.i);
+    return {line.file, first, 1, line.file->FirstProblem(line.i + 1) - first};
 }
 
 CLineItems LinesOf(const CSourceFilePtr& file) {
-    return AllOf<CLineItems>(file, file->Analysis().lines.size());
+    return AllOf<CLineItems>(file, file->LineCount());
 }
 
 CRecordItems RecordsOf(const CSourceFilePtr& file) {

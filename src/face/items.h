@@ -10,7 +10,7 @@
 namespace codeloom {
 
 inline CRange RangeOfBytes(const CSourceFile& file, uint32_t start, uint32_t end) {
-    return file.Rows().RangeOf(start, end);
+    return file.RangeOf(start, end);
 }
 
 // An object of the host around a new Class, made without a look for its class.
@@ -35,7 +35,7 @@ struct CProblemItem : CItem {
     using CItem::CItem;
     static constexpr const char* kSequence = "problems";  // the attribute of an analysis that holds them
 
-    const CProblem& Data() const { return file->Analysis().problems[i]; }
+    const CProblem& Data() const { return file->Problems()[i]; }
     std::string_view Message() const { return Data().message; }
     std::string Code() const { return CodeText(Data().code); }
     CRange Range() const { return RangeOfBytes(*file, Data().start, Data().end); }
@@ -50,10 +50,10 @@ struct CLineItem : CItem {
     using CItem::CItem;
     static constexpr const char* kSequence = "lines";
 
-    const CLine& Data() const { return file->Analysis().lines[i]; }
-    std::string_view Text() const { return file->Text().substr(Data().start, Data().end - Data().start); }
-    CRange Range() const { return RangeOfBytes(*file, Data().start, Data().end); }
-    int Indent() const { return file->Rows().IndentOf(Data().start); }
+    CLine Data() const { return file->Line(i); }
+    std::string_view Text() const;
+    CRange Range() const;
+    int Indent() const;
     bool operator==(const CLineItem& other) const;
     size_t Hash() const;
 };

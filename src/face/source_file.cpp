@@ -43,14 +43,14 @@ CSourceFile::CSourceFile(CPlainFile file, nb::str path, nb::str python, const CF
 }
 
 CSourceFile::CSourceFile(CPlainFile text, nb::str path, nb::str python, const CFileSettings& settings,
-                         std::shared_ptr<const CPieces> pieces, std::vector<uint32_t> row_starts)
+                         std::shared_ptr<const CPieces> pieces)
     : _fFile(std::move(text)),
       _fText(_fFile.Text()),
       _fPath(std::move(path)),
       _fPython(std::move(python)),
       _fSettings(settings),
       _fPieces(std::move(pieces)),
-      _fRows(std::make_unique<const CRowIndex>(_fText, std::move(row_starts))) {}
+      _fArePiecesAll(_fPieces->SayAll()) {}
 
 // What the pieces of a document say, which they all share: the interpreter's lock is kept.
 std::unique_ptr<const CFileAnalysis> CSourceFile::_FromPieces(bool wants_names) const {
@@ -66,7 +66,7 @@ nb::bytes CSourceFile::Utf8() const {
 const CFileAnalysis& CSourceFile::_Analyzed(std::shared_ptr<const CFileAnalysis>& kept, bool wants_records,
                                             bool wants_names) const {
     if (kept) return *kept;
-    if (_fPieces && !wants_records && (kept = _FromPieces(wants_names))) return *kept;
+    if (_Pieces() != nullptr && !wants_records && (kept = _FromPieces(wants_names))) return *kept;
     CFileSettings settings = _fSettings;
     settings.wants_records = wants_records;
     settings.wants_names = wants_names;
@@ -88,6 +88,52 @@ void CSourceFile::MakeLanguages(int version) {
 const CRowIndex& CSourceFile::Rows() const {
     if (!_fRows) _fRows = std::make_unique<const CRowIndex>(Text());
     return *_fRows;
+}
+
+CPlacedRows CSourceFile::RowsAt(uint32_t offset) const {
+    if (!_fPieces) return {Rows()};
+    const CPlacedPiece& at = _fPieces->List().AtByte(offset);
+    return {at.piece->rows, at.before.start, at.before.row};
+}
+
+CPlacedRows CSourceFile::RowsAround(uint32_t row) const {
+    if (!_fPieces) return {Rows()};
+    const CPlacedPiece& at = _fPieces->List().AtRow(row);
+    return {at.piece->rows, at.before.start, at.before.row};
+}
+
+CRange CSourceFile::RangeOf(uint32_t start, uint32_t end) const {
+    const CPlacedRows at = RowsAt(start);
+    if (end - at.start <= at.rows.TextSize()) {
+        CRange range = at.rows.RangeOf(start - at.start, end - at.start);
+        range.row += at.first_row;
+        range.end_row += at.first_row;
+        return range;
+    }
+    const CPlacedRows at_end = RowsAt(end);
+    const CCharPlace first = at.rows.PlaceOf(start - at.start);
+    const CCharPlace last = at_end.rows.PlaceOf(end - at_end.start);
+    return {first.row + at.first_row + 1, first.column + 1, last.row + at_end.first_row + 1, last.column + 1};
+}
+
+uint32_t CSourceFile::LineCount() const {
+    return _Pieces() != nullptr ? _fPieces->LineCount() : static_cast<uint32_t>(Analysis().lines.size());
+}
+
+CLine CSourceFile::Line(uint32_t line_i) const {
+    return _Pieces() != nullptr ? _fPieces->Line(line_i) : Analysis().lines[line_i];
+}
+
+const CProblems& CSourceFile::Problems() const {
+    if (_Pieces() == nullptr) return Analysis().problems;
+    if (!_fProblemsOfPieces)
+        _fProblemsOfPieces = std::make_unique<const CProblems>(_fPieces->Problems(Text()));
+    return *_fProblemsOfPieces;
+}
+
+uint32_t CSourceFile::FirstProblem(uint32_t line_i) const {
+    if (line_i >= LineCount()) return static_cast<uint32_t>(Problems().size());
+    return line_i == 0 ? 0 : FirstProblemFrom(Problems(), Line(line_i).start);
 }
 
 nb::str CSourceFile::HostText() const {

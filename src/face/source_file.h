@@ -25,6 +25,13 @@ namespace codeloom {
 // What the Python layer says of what was no text.
 CUnreadable UnreadableOf(const nb::list& faults, const nb::list& offsets);
 
+// Some rows of a text: what they say is counted from a place of it.
+struct CPlacedRows {
+    const CRowIndex& rows;
+    uint32_t start = 0;
+    uint32_t first_row = 0;
+};
+
 // One text with all that is known of it. Everything but the text is worked out when it is first asked for,
 // and stays as it is from then on.
 class CSourceFile {
@@ -35,9 +42,9 @@ class CSourceFile {
     // For a file that was read natively, with the result of a pass that was made as the settings say.
     CSourceFile(CPlainFile file, nb::str path, nb::str python, const CFileSettings& settings,
                 const std::shared_ptr<const CFileAnalysis>& analysis);
-    // For a text of a document, in its pieces, with the beginnings of its rows.
+    // For a text of a document, in its pieces.
     CSourceFile(CPlainFile text, nb::str path, nb::str python, const CFileSettings& settings,
-                std::shared_ptr<const CPieces> pieces, std::vector<uint32_t> row_starts);
+                std::shared_ptr<const CPieces> pieces);
 
     std::string_view Text() const { return _fText; }
     nb::bytes Utf8() const;
@@ -52,6 +59,13 @@ class CSourceFile {
         if (_fWithRecords) return *_fWithRecords;
         return _fWithNames ? *_fWithNames : _Analyzed(_fQuick, false);
     }
+    // Of all that, without putting the pieces of a document together.
+    uint32_t LineCount() const;
+    CLine Line(uint32_t line_i) const;
+    const CProblems& Problems() const;
+    // The problems of a line are those from FirstProblem(line_i) up to FirstProblem(line_i + 1).
+    uint32_t FirstProblem(uint32_t line_i) const;
+
     const CFileAnalysis& WithRecords() const { return _Analyzed(_fWithRecords, true); }
     const CFileAnalysis& WithNames() const { return _Analyzed(_fWithNames, false, true); }
     const CTextNames& Names() const { return WithNames().names; }
@@ -62,6 +76,12 @@ class CSourceFile {
     static void MakeLanguages(int version);
 
     const CRowIndex& Rows() const;
+    // The same for those around a byte, and for those around a row, from 0: of a document those of a piece.
+    CPlacedRows RowsAt(uint32_t offset) const;
+    CPlacedRows RowsAround(uint32_t row) const;
+    uint32_t RowCount() const { return _fPieces ? _fPieces->RowCount() : Rows().Count(); }
+    CRange RangeOf(uint32_t start, uint32_t end) const;
+
     nb::str HostText() const;
     // A name of the records, and one of the occurrences, by its number; the same object each time.
     nb::object HostName(uint32_t number) const {
@@ -72,6 +92,8 @@ class CSourceFile {
     }
 
   private:
+    // The pieces, if they say all.
+    const CPieces* _Pieces() const { return _fArePiecesAll ? _fPieces.get() : nullptr; }
     static nb::object _Named(const CNameTable& names, std::vector<nb::object>& made, uint32_t number);
     std::unique_ptr<const CFileAnalysis> _FromPieces(bool wants_names) const;
     const CFileAnalysis& _Analyzed(std::shared_ptr<const CFileAnalysis>& kept, bool wants_records,
@@ -85,6 +107,8 @@ class CSourceFile {
     CFileSettings _fSettings;
     CUnreadable _fUnreadable;
     std::shared_ptr<const CPieces> _fPieces;  // of a document, else null
+    bool _fArePiecesAll = false;
+    mutable std::unique_ptr<const CProblems> _fProblemsOfPieces;
     // Results of passes; one that looked for both is kept as both.
     mutable std::shared_ptr<const CFileAnalysis> _fQuick;  // with neither records nor names
     mutable std::shared_ptr<const CFileAnalysis> _fWithRecords;

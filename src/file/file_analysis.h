@@ -65,8 +65,9 @@ struct CFileAnalysis {
     uint32_t LineOfRecord(uint32_t record_i) const;
     // The line that holds a place, or the one before it; none in a text without lines.
     std::optional<uint32_t> LineAt(uint32_t offset) const;
-    // The problems of a line are those from FirstProblem(line_i) up to FirstProblem(line_i + 1).
-    uint32_t FirstProblem(size_t line_i) const;
 };
+
+// The index of the first problem that begins at the byte or after it.
+uint32_t FirstProblemFrom(const CProblems& problems, uint32_t start);
 
 }  // namespace codeloom

@@ -439,9 +439,7 @@ std::optional<uint32_t> CFileAnalysis::LineAt(uint32_t offset) const {
     return static_cast<uint32_t>(after - lines.begin()) - 1;
 }
 
-uint32_t CFileAnalysis::FirstProblem(size_t line_i) const {
-    if (line_i >= lines.size()) return static_cast<uint32_t>(problems.size());
-    const uint32_t start = line_i == 0 ? 0 : lines[line_i].start;
+uint32_t FirstProblemFrom(const CProblems& problems, uint32_t start) {
     const auto first =
         std::lower_bound(problems.begin(), problems.end(), start,
                          [](const CProblem& problem, uint32_t offset) { return problem.start < offset; });

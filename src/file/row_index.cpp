@@ -40,11 +40,6 @@ CRowIndex::CRowIndex(std::string_view text) : _fText(text) {
     _CountBlocks();
 }
 
-CRowIndex::CRowIndex(std::string_view text, std::vector<uint32_t> starts)
-    : _fText(text), _fStarts(std::move(starts)) {
-    _CountBlocks();
-}
-
 void CRowIndex::_CountBlocks() {
     if (IsAscii(_fText)) return;
     uint32_t before = 0;

@@ -28,9 +28,8 @@ struct CRange {
 class CRowIndex {
   public:
     explicit CRowIndex(std::string_view text);
-    // The same where the beginnings of the rows are known.
-    CRowIndex(std::string_view text, std::vector<uint32_t> starts);
 
+    size_t TextSize() const { return _fText.size(); }
     uint32_t Count() const { return static_cast<uint32_t>(_fStarts.size()); }
 
     // Requires: `offset` is at most the length of the text.

@@ -124,6 +124,20 @@ std::string_view CFalseHints::_NameBeforeBracketAt(uint32_t pos) {
     return _fOpenNames.empty() ? std::string_view() : _fOpenNames.back();
 }
 
+// It is three words with white space between them, so three words on either side are looked at.
+bool MayNameLiteral(std::string_view text, size_t start, size_t end) {
+    const auto is_space = [&](size_t pos) {
+        return IsAscii(text[pos]) && IsSpaceCode(static_cast<unsigned char>(text[pos]));
+    };
+    for (int word = 0; word < 3; ++word) {
+        while (start > 0 && is_space(start - 1)) --start;
+        while (start > 0 && !is_space(start - 1)) --start;
+        while (end < text.size() && is_space(end)) ++end;
+        while (end < text.size() && !is_space(end)) ++end;
+    }
+    return text.substr(start, end - start).find(kLiteral) != std::string_view::npos;
+}
+
 const std::unordered_set<std::string_view>& CLiteralNames::Get() {
     if (_fNames) return *_fNames;
     std::unordered_set<std::string_view>& names = _fNames.emplace();

@@ -26,11 +26,16 @@ class CLiteralNames {
     explicit CLiteralNames(std::string_view file_text) : _fText(file_text) {}
 
     const std::unordered_set<std::string_view>& Get();
+    // For a text that is known to have these, which must outlive it.
+    void Know(std::unordered_set<std::string_view> names) { _fNames = std::move(names); }
 
   private:
     std::string_view _fText;
     std::optional<std::unordered_set<std::string_view>> _fNames;
 };
+
+// False where what is in [start, end) of a text can't be a part of what gives `Literal` another name.
+bool MayNameLiteral(std::string_view text, size_t start, size_t end);
 
 class CFalseHints {
   public:
