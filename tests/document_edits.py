@@ -20,7 +20,6 @@ import pyarrow
 from codeloom import VERSIONS, Analysis, Document, Range, analyze
 from codeloom._analysis import table_kinds
 
-
 # So many edits lie between two whose items are compared one by one; the others are compared by tables.
 CLOSE_LOOK = 25
 
