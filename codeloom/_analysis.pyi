@@ -1346,6 +1346,21 @@ class DocumentText:
         A column in characters as one of the document. ValueError for an unknown place.
         """
 
+    def character_column_of(self, row: int, column: int) -> int:
+        """
+        A column of the document as one in characters: the end of the row for one after it.
+        """
+
+    @property
+    def row_count(self) -> int:
+        """How many rows the text has."""
+
+    def row(self, row: int) -> str:
+        """The text of a row, without its end."""
+
+    def between(self, start: tuple[int, int], end: tuple[int, int]) -> str:
+        """The text between two places in characters."""
+
     def edit(self, start: tuple[int, int], end: tuple[int, int], new_text: str) -> DocumentEdit:
         """Put a text in the place of a range, and say what was replaced."""
 

@@ -99,6 +99,30 @@ class Document:
         """
         return row, self._text.column_of(row, column)
 
+    def place(self, row: int, column: int) -> Position:
+        """A position as the analysis counts, in characters.
+
+        A column after the end of a row is its end, one within a character the end of that. ValueError for
+        a row that the text doesn't have.
+        """
+        return row, self._text.character_column_of(row, column)
+
+    @property
+    def row_count(self) -> int:
+        """How many rows the text has; the last one may be empty."""
+        return self._text.row_count
+
+    def row(self, row: int) -> str:
+        """The text of a row, without its end; ValueError for one that isn't there."""
+        return self._text.row(row)
+
+    def between(self, start: Position, end: Position) -> str:
+        """The text between two places of the analysis.
+
+        ValueError for a place that the text doesn't have; nothing for an `end` before `start`.
+        """
+        return self._text.between(start, end)
+
     def edit(self, start: Position, end: Position, new_text: str) -> "Change":
         """Replace what is from `start` up to `end` by `new_text`, and say what that changes.
 

@@ -12,9 +12,14 @@ from codeloom.rows import RowTexts
 
 TYPE_CHECKING = False  # `typing` takes long to import
 if TYPE_CHECKING:
-    from typing import Any
+    from typing import Any, Protocol
 
-    from codeloom.reading.notebooks import Notebook
+    class CellPlaces(Protocol):
+        """Where the rows of a notebook's text come from."""
+
+        def place(self, row: int) -> tuple[int, int]:
+            """The number of the cell, and the row in it."""
+
 
 # What a cell of a notebook may do and a module may not.
 _NOTEBOOK_FORMS = ("'await' outside function", "'async ", "asynchronous comprehension")
@@ -23,7 +28,7 @@ _NOTEBOOK_FORMS = ("'await' outside function", "'async ", "asynchronous comprehe
 class Source:
     """A file, or the standard input, with its analysis; for a notebook the one of its cells."""
 
-    def __init__(self, path: str, analysis: Analysis, notebook: Notebook | None = None) -> None:
+    def __init__(self, path: str, analysis: Analysis, notebook: CellPlaces | None = None) -> None:
         self.path = path
         self.analysis = analysis
         self._notebook = notebook

@@ -47,7 +47,7 @@ class Notebook:
         texts = []
         row = 1
         for number, source in cells if self.is_python else ():
-            text = _at_depth_zero(_without_magic(source))
+            text = code_of_cell(source)
             self._cells.append(number)
             self._first_rows.append(row)
             texts.append(text)
@@ -71,6 +71,14 @@ def read_notebook(data: bytes, path: str) -> Notebook:
         return Notebook(data)
     except (ValueError, RecursionError) as error:
         raise OSError(errno.EINVAL, f"it isn't a notebook: {error}", path) from None
+
+
+def code_of_cell(source: str) -> str:
+    """A cell's text with comments, or `pass` within a block, in place of what isn't Python.
+
+    Its rows end with a line feed, the last one too, and have their numbers and columns. A row may be added.
+    """
+    return _at_depth_zero(_without_magic(source))
 
 
 def _code_cells(data: bytes) -> tuple[list[tuple[int, str]], bool]:
@@ -110,10 +118,6 @@ def _source_of(cell: dict[str, Any]) -> str:
 
 
 def _without_magic(source: str) -> str:
-    """A cell's text with comments, or `pass` within a block, in place of what isn't Python.
-
-    It ends with the end of a row, and its rows end with a line feed.
-    """
     text = _ROW_END.sub("\n", source)
     if not text.endswith("\n"):
         text += "\n"

@@ -2,7 +2,8 @@
 
     transport       bytes of the standard streams -> messages, ahead in a thread of their own
     protocol        messages -> calls; what is no message gets an error
-    documents       the open texts: rows, edits, positions in the client's units, settings
+    documents       what is open by its name; document and notebook: positions in the client's units
+    live_text       a text that is edited: its analysis, its settings, the problems that wait
     diagnostics ... one file a feature: a document and a position -> what the protocol wants
 
 `serve` runs it. It needs the packages of the extra `lsp`.

@@ -10,7 +10,7 @@ from lsprotocol import types
 from codeloom._analysis import Analysis, Role, Scope, ScopeKind, Symbol
 from codeloom.reading.languages import language_of
 from codeloom.server.blocks import line_at, scope_at
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 from codeloom.server.pieces import pieces_of
 
 if TYPE_CHECKING:
@@ -37,7 +37,7 @@ def register(server: "Server") -> None:
 
 def _items(document: OpenDocument, place: tuple[int, int]) -> Iterator[types.CompletionItem]:
     row, column = place
-    before = document.rows[row - 1][: column - 1]
+    before = document.row(row)[: column - 1]
     typed = _CHAIN.search(before)
     if typed is None or _NEW_NAME.search(before) or _is_text(document.analysis, place):
         return
@@ -165,7 +165,7 @@ def _written_attributes(document: OpenDocument, chain: str, place: tuple[int, in
         whole, one = occurrence.object, occurrence.range
         if whole is None or (one.end_row, one.end_column) == place or whole.row != whole.end_row:
             continue
-        if document.rows[whole.row - 1][whole.column - 1 : whole.end_column - 1] == chain:
+        if document.row(whole.row)[whole.column - 1 : whole.end_column - 1] == chain:
             found[occurrence.name] = None
     return found
 

@@ -9,7 +9,8 @@ from typing import TYPE_CHECKING, Any
 from lsprotocol import types
 
 from codeloom.cli.items import Finding
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
+from codeloom.server.live_text import LiveText
 from codeloom.server.patience import SECONDS
 from codeloom.server.places import PlacedText
 
@@ -31,7 +32,7 @@ def register(server: "Server") -> None:
     )
     def diagnostic(params: types.DocumentDiagnosticParams) -> types.DocumentDiagnosticReport:
         document = server.documents[params.text_document.uri]
-        items = diagnostics_of(document, server.publisher.due(document))
+        items = diagnostics_of(document, server.publisher.due(document.live))
         identity = result_id(items)
         if identity == params.previous_result_id:
             return types.RelatedUnchangedDocumentDiagnosticReport(identity)
@@ -45,7 +46,9 @@ class Publisher:
         self._server = server
         self._is_asked: bool | None = None
         # Of each text with problems that wait.
-        self._timers: dict[str, asyncio.TimerHandle] = {}
+        self._timers: dict[LiveText, asyncio.TimerHandle] = {}
+        # What was said last of each text, and of which version.
+        self._said: dict[str, tuple[int, Sequence[types.Diagnostic]]] = {}
 
     @property
     def is_asked(self) -> bool:
@@ -55,44 +58,60 @@ class Publisher:
             self._is_asked = of_text is not None and of_text.diagnostic is not None
         return self._is_asked
 
-    def show(self, document: OpenDocument) -> None:
-        """Publish the problems of a text."""
-        if not self.is_asked:
-            self.publish(document.uri, diagnostics_of(document, self.due(document)), document.version)
+    def show(self, live: LiveText) -> None:
+        """Publish the problems of a text, or of those cells of a notebook that have other ones now."""
+        documents = self._server.documents.analysed_by(live)
+        if self.is_asked and len(documents) == 1:
+            return
+        due, has_news = self.due(live), False
+        for document in documents:
+            said = document.version, diagnostics_of(document, due)
+            version, items = self._said.get(document.uri, (None, ()))
+            has_news = has_news or (version == said[0] and items != said[1])
+            if (version, items) != said:
+                self._said[document.uri] = said
+                self.publish(document.uri, said[1], document.version)
+        if has_news:
+            self._ask_to_ask()
 
-    def due(self, document: OpenDocument) -> Sequence[Finding]:
+    def due(self, live: LiveText) -> Sequence[Finding]:
         """The problems to show now; where others wait, they are shown when nobody types any more."""
-        findings, due = document.findings, document.due
-        if len(due) == len(findings) or not self._can_wait():
+        findings, due = live.findings, live.due
+        if len(due) == len(findings) or (self.is_asked and not self._can_be_made_to_ask):
             return findings
-        if (timer := self._timers.get(document.uri)) is not None:
-            timer.cancel()
-        loop = asyncio.get_running_loop()
-        self._timers[document.uri] = loop.call_later(SECONDS, self.settle, document)
+        self._stop_timer(live)
+        self._timers[live] = asyncio.get_running_loop().call_later(SECONDS, self.settle, live)
         return due
 
-    def settle(self, document: OpenDocument) -> None:
+    def settle(self, live: LiveText) -> None:
         """Show what has waited: nobody types any more."""
-        if (timer := self._timers.pop(document.uri, None)) is None:
-            return
-        timer.cancel()
-        document.patience.settle()
-        if self.is_asked:
-            self._server.workspace_diagnostic_refresh(None)
-        else:
-            self.show(document)
-
-    def _can_wait(self) -> bool:
-        """False for a client that asks, and can't be made to ask again."""
-        of_workspace = self._server.client_capabilities.workspace
-        of_diagnostics = of_workspace.diagnostics if of_workspace is not None else None
-        return not self.is_asked or bool(of_diagnostics is not None and of_diagnostics.refresh_support)
+        if self._stop_timer(live):
+            live.patience.settle()
+            self._ask_to_ask()
+            self.show(live)
 
     def clear(self, document: OpenDocument) -> None:
         """Take back the problems of a text."""
-        if (timer := self._timers.pop(document.uri, None)) is not None:
-            timer.cancel()
+        self._stop_timer(document.live)
+        self._said.pop(document.uri, None)
         self.publish(document.uri, [])
+
+    @property
+    def _can_be_made_to_ask(self) -> bool:
+        of_workspace = self._server.client_capabilities.workspace
+        of_diagnostics = of_workspace.diagnostics if of_workspace is not None else None
+        return bool(of_diagnostics is not None and of_diagnostics.refresh_support)
+
+    def _ask_to_ask(self) -> None:
+        """Have a client that asks for diagnostics do so again."""
+        if self.is_asked and self._can_be_made_to_ask:
+            self._server.workspace_diagnostic_refresh(None)
+
+    def _stop_timer(self, live: LiveText) -> bool:
+        timer = self._timers.pop(live, None)
+        if timer is not None:
+            timer.cancel()
+        return timer is not None
 
     def publish(self, uri: str, items: Sequence[types.Diagnostic], version: int | None = None) -> None:
         """Publish the diagnostics of any text, unless the client asks for them."""
@@ -102,8 +121,8 @@ class Publisher:
 
 
 def diagnostics_of(document: OpenDocument, findings: Sequence[Finding]) -> list[types.Diagnostic]:
-    """Problems of a text."""
-    return [diagnostic_of(document, finding) for finding in findings]
+    """Those of the problems that are in a text."""
+    return [diagnostic_of(document, finding) for finding in findings if document.holds(finding.range.row)]
 
 
 def diagnostic_of(text: PlacedText, finding: Finding) -> types.Diagnostic:

@@ -12,7 +12,7 @@ from lsprotocol import types
 from codeloom._analysis import Analysis
 from codeloom.cli.items import Finding
 from codeloom.server.diagnostics import diagnostic_of
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 from codeloom.server.remedies import Remedy, remedies_for
 
 if TYPE_CHECKING:
@@ -32,7 +32,7 @@ def register(server: "Server") -> None:
             return []
         document = server.documents[params.text_document.uri]
         actions = []
-        async for findings in document.slices(_findings_in(document, params.range), 1):
+        async for findings in document.live.slices(_findings_in(document, params.range), 1):
             for finding in findings:
                 actions += [_action(document, finding, one) for one in sound_remedies(document, finding)]
         return actions
@@ -45,7 +45,7 @@ def sound_remedies(document: OpenDocument, finding: Finding) -> Iterator[Remedy]
     for remedy in remedies_for(document, finding):
         if remedy.title in seen:
             continue
-        with document.trial(remedy.edits) as analysis:
+        with document.live.trial(remedy.edits) as analysis:
             after = _counts(analysis)
         key = finding.code, finding.message
         if after[key] < before[key] and after <= before:
@@ -59,9 +59,9 @@ def _counts(analysis: Analysis) -> Counter[tuple[str, str]]:
 
 def _findings_in(document: OpenDocument, range: types.Range) -> Sequence[Finding]:
     """The problems on the rows of a range."""
-    first, last = range.start.line + 1, range.end.line + 1
-    found = [one for one in document.findings if one.range.row <= last and one.range.end_row >= first]
-    return found[:_MOST_FINDINGS]
+    first, last = (edge.line + 1 + document.rows_before for edge in (range.start, range.end))
+    found = [one for one in document.live.findings if one.range.row <= last and one.range.end_row >= first]
+    return [one for one in found if document.holds(one.range.row)][:_MOST_FINDINGS]
 
 
 def _covers(kind: str | types.CodeActionKind, narrower: types.CodeActionKind) -> bool:
@@ -70,11 +70,10 @@ def _covers(kind: str | types.CodeActionKind, narrower: types.CodeActionKind) ->
 
 
 def _action(document: OpenDocument, finding: Finding, remedy: Remedy) -> types.CodeAction:
-    edits = [types.TextEdit(document.range(place), text) for place, text in remedy.edits]
     return types.CodeAction(
         remedy.title,
         kind=types.CodeActionKind.QuickFix,
         diagnostics=[diagnostic_of(document, finding)],
         is_preferred=remedy.is_sure or None,
-        edit=types.WorkspaceEdit({document.uri: edits}),
+        edit=document.workspace_edit(remedy.edits),
     )

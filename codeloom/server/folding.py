@@ -21,8 +21,8 @@ def register(server: "Server") -> None:
     @server.feature(types.TEXT_DOCUMENT_FOLDING_RANGE)
     async def folding_range(params: types.FoldingRangeParams) -> list[types.FoldingRange]:
         document = server.documents[params.text_document.uri]
-        folds = _Folds()
-        async for lines in document.slices(document.analysis.lines):
+        folds = _Folds(document.rows_before)
+        async for lines in document.live.slices(document.lines):
             folds.add(lines)
         return folds.end()
 
@@ -30,7 +30,8 @@ def register(server: "Server") -> None:
 class _Folds:
     """The folds of a text, line by line; rows count from 1 until they are sent."""
 
-    def __init__(self) -> None:
+    def __init__(self, rows_before: int) -> None:
+        self._rows_before = rows_before
         self._found: list[tuple[int, int, types.FoldingRangeKind | None]] = []
         # Blocks that are open: the indentation and the last row of their header.
         self._open: list[tuple[int, int]] = []
@@ -51,8 +52,9 @@ class _Folds:
         kinds: dict[tuple[int, int], types.FoldingRangeKind | None] = {}
         for first, last, kind in self._found:
             kinds[first, last] = kind or kinds.get((first, last))
+        before = self._rows_before + 1
         return [
-            types.FoldingRange(first - 1, last - 1, kind=kind)
+            types.FoldingRange(first - before, last - before, kind=kind)
             for (first, last), kind in sorted(kinds.items(), key=lambda fold: (fold[0][0], -fold[0][1]))
         ]
 

@@ -10,7 +10,7 @@ from codeloom._analysis import Analysis, Line, LineKind, Occurrence, Resolution,
 from codeloom._literals import EvaluateStringLiteral
 from codeloom.cli.names_in_words import statements
 from codeloom.server.blocks import line_index, start_of
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 from codeloom.server.navigation import bindings_of
 
 if TYPE_CHECKING:
@@ -57,12 +57,12 @@ def _paragraphs(document: OpenDocument, occurrence: Occurrence) -> Iterator[str]
     said = list(dict.fromkeys(fact for one in definitions or bindings for fact in _facts(one)))
     if said:
         yield _as_code(said[:_MOST_BINDINGS])
-    yield f"`{occurrence.name}`: {_meaning(occurrence, bindings)}"
+    yield f"`{occurrence.name}`: {_meaning(document, occurrence, bindings)}"
     if len(definitions) == 1 and (documentation := _documentation(analysis, definitions[0].line)):
         yield documentation
 
 
-def _meaning(occurrence: Occurrence, bindings: Sequence[Occurrence]) -> str:
+def _meaning(document: OpenDocument, occurrence: Occurrence, bindings: Sequence[Occurrence]) -> str:
     if occurrence.resolution is None:
         return _WITHOUT_SCOPE.get(occurrence.role, "an attribute")
     home = occurrence.home
@@ -71,8 +71,9 @@ def _meaning(occurrence: Occurrence, bindings: Sequence[Occurrence]) -> str:
     roles = {one.role for one in bindings}
     role = next((_ROLES[one] for one in _ROLES if one in roles), "a name")
     rows = sorted({one.range.row for one in bindings})
-    shown = ", ".join(map(str, rows[:_MOST_BINDINGS])) + (", ..." if len(rows) > _MOST_BINDINGS else "")
-    return f"{role} of {_scope_in_words(home)}, bound in row{'s' if len(rows) > 1 else ''} {shown}"
+    shown = [document.row_in_words(row) for row in rows[:_MOST_BINDINGS]]
+    more = ["..."] if len(rows) > _MOST_BINDINGS else []
+    return f"{role} of {_scope_in_words(home)}, bound in {', '.join([*shown, *more])}"
 
 
 def _scope_in_words(scope: Scope) -> str:

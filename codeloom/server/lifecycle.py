@@ -21,9 +21,13 @@ def register(server: "Server") -> None:
     @server.feature(types.TEXT_DOCUMENT_DID_SAVE)
     def did_save(params: types.DidSaveTextDocumentParams) -> None:
         if params.text_document.uri in server.documents:
-            server.publisher.settle(server.documents[params.text_document.uri])
+            server.publisher.settle(server.documents[params.text_document.uri].live)
         if os.path.basename(params.text_document.uri) in SETTINGS_FILES:
             server.settings_changed()
+
+    @server.feature(types.NOTEBOOK_DOCUMENT_DID_SAVE)
+    def did_save_notebook(params: types.DidSaveNotebookDocumentParams) -> None:
+        server.publisher.settle(server.documents.notebook(params.notebook_document.uri).live)
 
     @server.feature(types.WORKSPACE_DID_CHANGE_CONFIGURATION)
     def did_change_configuration(params: types.DidChangeConfigurationParams) -> None:

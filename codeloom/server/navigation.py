@@ -6,7 +6,7 @@ from typing import TYPE_CHECKING
 from lsprotocol import types
 
 from codeloom._analysis import Occurrence, Role
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -36,7 +36,7 @@ def register(server: "Server") -> None:
     @server.feature(types.TEXT_DOCUMENT_DOCUMENT_HIGHLIGHT)
     def highlight(params: types.DocumentHighlightParams) -> list[types.DocumentHighlight] | None:
         document = server.documents[params.text_document.uri]
-        found = same_names(document, params.position)
+        found = [one for one in same_names(document, params.position) if document.holds(one.range.row)]
         return [types.DocumentHighlight(document.range(one.range), _kind(one)) for one in found] or None
 
 

@@ -1,25 +1,26 @@
-"""A text with its name, and the places of it in the client's units."""
+"""Texts with their names, and places of them in the client's units."""
+
+from abc import ABC, abstractmethod
+from collections.abc import Iterable
 
 from lsprotocol import types
 
 from codeloom._analysis import Range
-from codeloom.server.rows import Rows
-from codeloom.server.units import Units
+from codeloom.cli.source import Source
+
+# How a text is written of which the client counts the units, and how long one is.
+_UNITS = {"utf-8": ("utf-8", 1), "utf-16": ("utf-16-le", 2), "utf-32": ("utf-32-le", 4)}
 
 
-class PlacedText:
+class PlacedText(ABC):
     """A text whose places are sent to the client, which counts from zero in its own units."""
 
-    def __init__(self, uri: str, rows: Rows, units: Units) -> None:
+    def __init__(self, uri: str) -> None:
         self.uri = uri
-        self.rows = rows
-        self.units = units
 
+    @abstractmethod
     def position(self, row: int, column: int) -> types.Position:
         """A place of the analysis as the client counts."""
-        text = self.rows[row - 1]
-        units = column - 1 if text.isascii() else self.units.length(text[: column - 1])
-        return types.Position(row - 1, units)
 
     def range(self, place: Range) -> types.Range:
         """A range of the analysis as the client counts."""
@@ -30,3 +31,25 @@ class PlacedText:
     def location(self, place: Range) -> types.Location:
         """The same with the name of the text."""
         return types.Location(self.uri, self.range(place))
+
+    def workspace_edit(self, edits: Iterable[tuple[Range, str]]) -> types.WorkspaceEdit:
+        """Edits of the text, or of the cells that it is analysed with."""
+        changes: dict[str, list[types.TextEdit]] = {}
+        for place, text in edits:
+            location = self.location(place)
+            changes.setdefault(location.uri, []).append(types.TextEdit(location.range, text))
+        return types.WorkspaceEdit(changes)
+
+
+class ClosedText(PlacedText):
+    """A text that isn't open: few places of it are asked for."""
+
+    def __init__(self, uri: str, source: Source, encoding: str) -> None:
+        super().__init__(uri)
+        self._source = source
+        self._codec, self._size = _UNITS[encoding]
+
+    def position(self, row: int, column: int) -> types.Position:
+        """As the base class says."""
+        before = self._source.row_text(row)[: column - 1]
+        return types.Position(row - 1, len(before.encode(self._codec, "surrogatepass")) // self._size)

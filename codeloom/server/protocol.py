@@ -2,8 +2,10 @@
 
 import asyncio
 import logging
+import operator
 from collections.abc import Generator
 from concurrent.futures import Future
+from functools import partial
 from typing import TYPE_CHECKING, Any
 
 from lsprotocol import types
@@ -15,9 +17,9 @@ from pygls.exceptions import (
     JsonRpcRequestCancelled,
     JsonRpcServerNotInitialized,
 )
-from pygls.protocol import LanguageServerProtocol, lsp_method
+from pygls.protocol import LanguageServerProtocol, default_converter, lsp_method
 
-from codeloom.server.transport import Inbox
+from codeloom.server.transport import Inbox, is_identity
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -25,6 +27,26 @@ if TYPE_CHECKING:
 _JSON_RPC = "jsonrpc"
 # What a message has at least one of.
 _MARKS = ("method", "result", "error")
+
+
+def strict_converter() -> Any:
+    """What makes objects of JSON: a null where the protocol has a text is refused, and not spelled out."""
+    converter: Any = default_converter()  # type: ignore[no-untyped-call]
+    for kind, hook in ((str, _text), (int, _whole_number)):  # and for none that derives from them
+        converter.register_structure_hook_func(partial(operator.is_, kind), hook)
+    return converter
+
+
+def _text(value: object, _: type) -> str:
+    if not isinstance(value, str):
+        raise TypeError(f"{value!r} isn't a text")
+    return value
+
+
+def _whole_number(value: object, _: type) -> int:
+    if isinstance(value, bool) or not isinstance(value, int | float) or value != int(value):
+        raise TypeError(f"{value!r} isn't a whole number")
+    return int(value)
 
 
 class Protocol(LanguageServerProtocol):
@@ -48,6 +70,8 @@ class Protocol(LanguageServerProtocol):
                 raise JsonRpcParseError(f"the message can't be read: {message}")
             if not isinstance(message, dict) or message.get(_JSON_RPC) != self.VERSION:
                 raise JsonRpcInvalidRequest("this is no message of JSON-RPC 2.0")
+            if not is_identity(message.get("id", 0)):
+                raise JsonRpcInvalidRequest("the id of a message is a whole number or a text")
             if is_cancelled:
                 raise JsonRpcRequestCancelled("the request was cancelled")
             self._check_order(message)
@@ -77,7 +101,8 @@ class Protocol(LanguageServerProtocol):
         if not is_message or ("id" in message and "method" in message):
             answer = {"code": error.code, "message": error.message}
             identity = message.get("id") if is_message else None
-            self._send_data({_JSON_RPC: self.VERSION, "id": identity, "error": answer})
+            known = identity if is_identity(identity) else None
+            self._send_data({_JSON_RPC: self.VERSION, "id": known, "error": answer})
         else:
             self._server.report_server_error(error, FeatureNotificationError)
 
@@ -114,3 +139,18 @@ class Protocol(LanguageServerProtocol):
     def lsp_text_document__did_close(self, params: types.DidCloseTextDocumentParams) -> None:
         """Forget a text."""
         self._server.closed(params.text_document.uri)
+
+    @lsp_method(types.NOTEBOOK_DOCUMENT_DID_OPEN)
+    def lsp_notebook_document__did_open(self, params: types.DidOpenNotebookDocumentParams) -> None:
+        """Take a notebook."""
+        self._server.notebook_opened(params)
+
+    @lsp_method(types.NOTEBOOK_DOCUMENT_DID_CHANGE)
+    def lsp_notebook_document__did_change(self, params: types.DidChangeNotebookDocumentParams) -> None:
+        """Change the cells of a notebook."""
+        self._server.notebook_changed(params)
+
+    @lsp_method(types.NOTEBOOK_DOCUMENT_DID_CLOSE)
+    def lsp_notebook_document__did_close(self, params: types.DidCloseNotebookDocumentParams) -> None:
+        """Forget a notebook."""
+        self._server.notebook_closed(params.notebook_document.uri)

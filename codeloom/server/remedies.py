@@ -10,7 +10,7 @@ from typing import NamedTuple
 from codeloom._analysis import Line, LineKind, Range
 from codeloom.cli.items import Finding
 from codeloom.server.blocks import line_at, line_index
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 from codeloom.server.pieces import CLOSER_OF, Piece, bracket_pairs, pieces_of
 
 Place = tuple[int, int]
@@ -47,13 +47,18 @@ class Patient:
         return [piece for piece in self.pieces if not piece.is_comment and piece.text != "\\"]
 
     @property
+    def row_text(self) -> str:
+        """The row in which the problem begins."""
+        return self.document.row(self.range.row)
+
+    @property
     def text(self) -> str:
         """What the problem marks."""
         return self.between(self.start, self.end)
 
     def between(self, start: Place, end: Place) -> str:
         """The text between two places."""
-        return self.document.rows.between((start[0] - 1, start[1] - 1), (end[0] - 1, end[1] - 1))
+        return self.document.between(start, end)
 
     def after(self, place: Place) -> list[Piece]:
         """The tokens from a place on."""
@@ -95,10 +100,13 @@ def _colon_for(patient: Patient) -> Iterator[Remedy]:
     has_colon = bool(following) and following[0].text == ":"
     edit = _replace(_blanks_before(patient, patient.start), patient.end, "" if has_colon else ":")
     yield Remedy(title, [edit])
-    rows = patient.document.rows
-    for row in range(patient.range.row, len(rows)):
-        if written[1] == "{" and rows[row].strip() == "}":
-            yield Remedy(title, [edit, _replace((row + 1, 1), (row + 1, len(rows[row]) + 1), "")])
+    if written[1] != "{":
+        return
+    document = patient.document
+    for row in range(patient.range.row + 1, document.row_count + 1):
+        text = document.row(row)
+        if text.strip() == "}":
+            yield Remedy(title, [edit, _replace((row, 1), (row, len(text) + 1), "")])
 
 
 def _left_out(patient: Patient) -> Iterator[Remedy]:
@@ -171,7 +179,7 @@ def _comma(patient: Patient) -> Iterator[Remedy]:
 def _quote(patient: Patient) -> Iterator[Remedy]:
     """The quote at the end of the row: in place of another kind, before the closing brackets, or last."""
     closed = re.match(r"close it with (\"+|'+)$", patient.hint)
-    row, text = patient.range.row, patient.document.rows[patient.range.row - 1]
+    row, text = patient.range.row, patient.row_text
     if closed is not None:
         quote = closed[1]
         other = "'" if quote == '"' else '"'
@@ -194,11 +202,11 @@ def _quote(patient: Patient) -> Iterator[Remedy]:
 
 
 def _end_of_text(patient: Patient) -> Place:
-    rows = patient.document.rows
-    row = len(rows)
-    while row > 1 and not rows[row - 1].strip():
+    document = patient.document
+    row = document.row_count
+    while row > 1 and not document.row(row).strip():
         row -= 1
-    return row, len(rows[row - 1]) + 1
+    return row, len(document.row(row)) + 1
 
 
 def _else(patient: Patient) -> Iterator[Remedy]:
@@ -217,13 +225,13 @@ def _body(patient: Patient) -> Iterator[Remedy]:
     width = (lines[i].indent or 0) if i >= 0 else 0
     yield Remedy("Indent the row", [_insert((patient.range.row, 1), _INDENT)])
     header = lines[i - 1] if i > 0 and lines[i].range.row == patient.range.row else lines[i]
-    place = header.range.end_row, len(patient.document.rows[header.range.end_row - 1]) + 1
+    place = header.range.end_row, len(patient.document.row(header.range.end_row)) + 1
     indent = " " * ((header.indent if header.indent is not None else width) + len(_INDENT))
     yield Remedy("Insert 'pass'", [_insert(place, f"\n{indent}pass")], is_sure=False)
 
 
 def _braces_or_field(patient: Patient) -> Iterator[Remedy]:
-    row = patient.document.rows[patient.range.row - 1]
+    row = patient.row_text
     column = patient.start[1]
     for i in range(len(row), column - 1, -1):
         yield Remedy("Insert '}'", [_insert((patient.range.row, i + 1), "}")], is_sure=False)
@@ -296,7 +304,7 @@ def _as_written(patient: Patient) -> Iterator[Remedy]:
 
 def _apart(patient: Patient, end: Place, text: str) -> str:
     """A text with blanks where it would run into what is before or after it."""
-    row = patient.document.rows[patient.range.row - 1]
+    row = patient.row_text
     before, after = row[: patient.start[1] - 1][-1:], row[end[1] - 1 :][:1]
     is_operator = "=" in text
     left = " " if _is_word(before) and (is_operator or _is_word(text[0])) else ""
@@ -321,7 +329,7 @@ def _character(patient: Patient) -> Iterator[Remedy]:
         return
     title = f"Write '{text}'" if text != " " else "Write a blank"
     yield Remedy(title, [_replace(patient.start, patient.end, text)])
-    row, number = patient.document.rows[patient.range.row - 1], patient.range.row
+    row, number = patient.row_text, patient.range.row
     edits = [
         _replace((number, i + 1), (number, i + 2), _CURLY_QUOTES[sign])
         for i, sign in enumerate(row)
@@ -412,7 +420,7 @@ def _import_from(patient: Patient) -> Iterator[Remedy]:
 
 
 def _own_row(patient: Patient) -> Iterator[Remedy]:
-    row = patient.document.rows[patient.range.row - 1]
+    row = patient.row_text
     indent = row[: len(row) - len(row.lstrip())]
     before = patient.before(patient.start)
     start = before[-1].end if before else patient.start

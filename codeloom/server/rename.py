@@ -11,7 +11,7 @@ from pygls.exceptions import JsonRpcException
 from codeloom._analysis import Analysis, Occurrence, Resolution, Role
 from codeloom.reading.languages import language_of
 from codeloom.server.blocks import line_at
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -46,9 +46,7 @@ def register(server: "Server") -> None:
         _check_faults(document, occurrence)
         edits = [(one, _replacement(document, one, name)) for one in occurrences]
         _check_meaning(document, edits, name)
-        return types.WorkspaceEdit(
-            {document.uri: [types.TextEdit(document.range(one.range), text) for one, text in edits]}
-        )
+        return document.workspace_edit([(one.range, text) for one, text in edits])
 
 
 def _named(document: OpenDocument, position: types.Position) -> Occurrence:
@@ -89,14 +87,16 @@ def _check_faults(document: OpenDocument, occurrence: Occurrence) -> None:
     """Names on a line with a fault aren't known, so none may stand there."""
     home = occurrence.home
     assert home is not None
-    first, last = (home.range.row, home.range.end_row) if home.parent is not None else (1, len(document.rows))
+    first, last = (home.range.row, home.range.end_row) if home.parent is not None else (1, document.row_count)
     for problem in document.analysis.problems:
         line = line_at(document.analysis, (problem.range.row, problem.range.column))
         if line is None or line.occurrences:  # its names are known
             continue
         row = line.range.row
         if row <= last and line.range.end_row >= first and _holds_word(line.text, occurrence.name):
-            raise RenameRefusedError(f"row {row} names {occurrence.name!r} and has a fault: mend it first")
+            raise RenameRefusedError(
+                f"{document.row_in_words(row)} names {occurrence.name!r} and has a fault: mend it first"
+            )
 
 
 def _holds_word(text: str, word: str) -> bool:
@@ -108,10 +108,10 @@ def _replacement(document: OpenDocument, occurrence: Occurrence, name: str) -> s
     if occurrence.role is not Role.IMPORT:
         return name
     place = occurrence.range
-    row = document.rows[place.row - 1]
+    row = document.row(place.row)
     if row[place.end_column - 1 :].lstrip().startswith("."):
         raise RenameRefusedError(
-            f"the import in row {place.row} can bind {occurrence.name!r} by this name only"
+            f"the import in {document.row_in_words(place.row)} can bind {occurrence.name!r} by this name only"
         )
     return name if _AS.search(row[: place.column - 1]) else f"{occurrence.name} as {name}"
 
@@ -119,7 +119,7 @@ def _replacement(document: OpenDocument, occurrence: Occurrence, name: str) -> s
 def _check_meaning(document: OpenDocument, edits: Sequence[tuple[Occurrence, str]], name: str) -> None:
     """Every occurrence must lead where it led, and no other may lead there."""
     places = list(_places_after(edits, name))
-    with document.trial([(one.range, new) for one, new in edits]) as analysis:
+    with document.live.trial([(one.range, new) for one, new in edits]) as analysis:
         found = analysis.occurrence_at(*places[0])
         after = analysis.references(found) if found is not None else ()
     if [(one.range.row, one.range.column) for one in after] != places:

@@ -7,7 +7,7 @@ from lsprotocol import types
 
 from codeloom._analysis import Line, Range
 from codeloom.server.blocks import block_end, contains, headers_around, line_at, start_of
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 from codeloom.server.pieces import bracket_pairs, pieces_of
 
 if TYPE_CHECKING:
@@ -29,8 +29,7 @@ def _selection(document: OpenDocument, place: Place) -> types.SelectionRange:
     """The ranges around a place, each in the next one."""
     row, column = place
     found = {Range(row, column, row, column), *_ranges(document, place)}
-    last = len(document.rows)
-    found.add(Range(1, 1, last, len(document.rows[last - 1]) + 1))
+    found.add(document.whole)
     chain: types.SelectionRange | None = None
     around: Range | None = None
     for range in sorted(found, key=_order):
@@ -75,7 +74,7 @@ def _in_line(line: Line, place: Place) -> Iterator[Range]:
 def _indent_at(document: OpenDocument, row: int, line: Line | None) -> int:
     if line is not None and line.indent is not None:
         return line.indent
-    text = document.rows[row - 1].expandtabs(8)
+    text = document.row(row).expandtabs(8)
     return len(text) - len(text.lstrip()) or len(text)
 
 

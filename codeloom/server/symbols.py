@@ -6,7 +6,7 @@ from lsprotocol import types
 
 from codeloom._analysis import Line, LineKind, Range, Role, Scope, ScopeKind
 from codeloom.server.blocks import scope_of_header
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -26,7 +26,7 @@ def register(server: "Server") -> None:
     async def document_symbol(params: types.DocumentSymbolParams) -> list[types.DocumentSymbol]:
         document = server.documents[params.text_document.uri]
         outline = _Outline(document)
-        async for lines in document.slices(document.analysis.lines):
+        async for lines in document.live.slices(document.lines):
             for line in lines:
                 outline.add(line)
         return outline.symbols

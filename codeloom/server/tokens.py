@@ -11,7 +11,7 @@ from lsprotocol import types
 
 from codeloom._analysis import Analysis, Occurrence, Resolution, Role, Scope, ScopeKind
 from codeloom.server.blocks import start_of
-from codeloom.server.documents import OpenDocument
+from codeloom.server.document import OpenDocument
 from codeloom.server.navigation import BINDINGS
 
 if TYPE_CHECKING:
@@ -56,14 +56,14 @@ def register(server: "Server") -> None:
     @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_FULL, _LEGEND)
     async def full(params: types.SemanticTokensParams) -> types.SemanticTokens:
         document = server.documents[params.text_document.uri]
-        return kept.keep(document, await _tokens(document, document.analysis.occurrences))
+        return kept.keep(document, await _tokens(document, document.occurrences))
 
     @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_FULL_DELTA, _LEGEND)
     async def delta(
         params: types.SemanticTokensDeltaParams,
     ) -> types.SemanticTokens | types.SemanticTokensDelta:
         document = server.documents[params.text_document.uri]
-        new = await _tokens(document, document.analysis.occurrences)
+        new = await _tokens(document, document.occurrences)
         old = kept.known(document, params.previous_result_id)
         answer = kept.keep(document, new)
         if old is None:
@@ -106,7 +106,7 @@ async def _tokens(document: OpenDocument, occurrences: Sequence[Occurrence]) -> 
     kinds = _Kinds(document.analysis)
     data: list[int] = []
     row = column = 0
-    async for part in document.slices(occurrences):
+    async for part in document.live.slices(occurrences):
         for occurrence in part:
             place = document.range(occurrence.range)
             start, end = place.start, place.end

@@ -110,7 +110,7 @@ class Inbox:
         identity, method = _field(message, "id"), _field(message, "method")
         if method == _CHANGE:
             self._changes[_uri(message)] -= 1
-        elif method is not None and _is_identity(identity):
+        elif method is not None and is_identity(identity):
             self._waiting.discard(identity)
             if identity in self._cancelled:
                 self._cancelled.discard(identity)
@@ -126,11 +126,11 @@ class Inbox:
         identity, method = _field(message, "id"), _field(message, "method")
         if method == _CANCEL:
             cancelled = _field(_field(message, "params"), "id")
-            if _is_identity(cancelled) and cancelled in self._waiting:
+            if is_identity(cancelled) and cancelled in self._waiting:
                 self._cancelled.add(cancelled)
         elif method == _CHANGE:
             self._changes[_uri(message)] += 1
-        elif method is not None and _is_identity(identity):
+        elif method is not None and is_identity(identity):
             self._waiting.add(identity)
 
 
@@ -142,8 +142,9 @@ def _uri(message: Any) -> str:
     return str(_field(_field(_field(message, "params"), "textDocument"), "uri"))
 
 
-def _is_identity(value: Any) -> bool:
-    return isinstance(value, int | str)
+def is_identity(value: Any) -> bool:
+    """True for what a request can be named by."""
+    return isinstance(value, int | str) and not isinstance(value, bool)
 
 
 class Writer:

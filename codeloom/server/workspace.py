@@ -15,12 +15,11 @@ from codeloom._face import analyze_file
 from codeloom.cli.source import Source
 from codeloom.reading.files import MODULE_SUFFIXES, NOTEBOOK_SUFFIX, find_files
 from codeloom.server.diagnostics import diagnostic_of, result_id
-from codeloom.server.places import PlacedText
-from codeloom.server.rows import Rows
+from codeloom.server.places import ClosedText
 from codeloom.server.settings import SETTINGS_FILES
 
 if TYPE_CHECKING:
-    from codeloom.server.documents import OpenDocument
+    from codeloom.server.document import OpenDocument
     from codeloom.server.server import Server
 
 Result = TypeVar("Result")
@@ -107,7 +106,7 @@ class ClosedFiles:
 
     def opened(self, document: "OpenDocument") -> None:
         """A file is open now, and its problems are published as such."""
-        known = self._by_path.pop(document.path, None)
+        known = self._by_path.pop(document.live.path, None)
         if known is not None and known.uri != document.uri and known.items:
             self._server.publisher.publish(known.uri, [])
 
@@ -181,11 +180,9 @@ class ClosedFiles:
             analysis = analyze_file(path, python=settings.python, false_hints=settings.false_hints)
         except OSError:  # it is no more, or nobody may read it
             return []
-        findings = settings.passed(Source(path, analysis))
-        if not findings:
-            return []
-        text = PlacedText(uri, Rows(analysis.text), documents.units)
-        return [diagnostic_of(text, finding) for finding in findings]
+        source = Source(path, analysis)
+        text = ClosedText(uri, source, documents.encoding)
+        return [diagnostic_of(text, finding) for finding in settings.passed(source)]
 
     def _take(self, path: str, new: _Known) -> None:
         old = self._by_path.get(path)

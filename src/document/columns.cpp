@@ -18,6 +18,11 @@ size_t CharacterEnd(std::string_view row, size_t pos) {
     return pos;
 }
 
+// How many units the character has that lies between two places of a row.
+int64_t UnitsOf(std::string_view row, size_t pos, size_t end, EUnit unit) {
+    return unit == EUnit::kByte ? static_cast<int64_t>(end - pos) : UnitsOf(row[pos], unit);
+}
+
 }  // namespace
 
 int64_t EndColumn(std::string_view row, EUnit unit) {
@@ -31,11 +36,21 @@ std::optional<size_t> BytesBefore(std::string_view row, int64_t column, EUnit un
     int64_t left = column - 1;
     while (left > 0 && pos < row.size()) {
         const size_t end = CharacterEnd(row, pos);
-        left -= unit == EUnit::kByte ? static_cast<int64_t>(end - pos) : UnitsOf(row[pos], unit);
+        left -= UnitsOf(row, pos, end, unit);
         pos = end;
     }
     if (left < 0) return {};
     return pos + static_cast<size_t>(left);
+}
+
+int64_t CharactersBefore(std::string_view row, int64_t column, EUnit unit) {
+    int64_t count = 0, left = column - 1;
+    for (size_t pos = 0; left > 0 && pos < row.size(); ++count) {
+        const size_t end = CharacterEnd(row, pos);
+        left -= UnitsOf(row, pos, end, unit);
+        pos = end;
+    }
+    return count;
 }
 
 }  // namespace codeloom

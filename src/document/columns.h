@@ -25,4 +25,8 @@ int64_t EndColumn(std::string_view row, EUnit unit);
 // character. Requires: column >= 1.
 std::optional<size_t> BytesBefore(std::string_view row, int64_t column, EUnit unit);
 
+// How many characters of a row begin before a column: all of them for one after its end. Requires: column
+// >= 1.
+int64_t CharactersBefore(std::string_view row, int64_t column, EUnit unit);
+
 }  // namespace codeloom

@@ -93,6 +93,24 @@ void BindDocument(nb::module_& module) {
         "row"_a, "column"_a,
         "A column in characters as one of the document. ValueError for an unknown place.");
     document.def(
+        "character_column_of",
+        [](const CDocument& self, int64_t row, int64_t column) {
+            return self.CharacterColumnOf({row, column});
+        },
+        "row"_a, "column"_a,
+        "A column of the document as one in characters: the end of the row for one after it.");
+    document.def_prop_ro("row_count", &CDocument::RowCount, "How many rows the text has.");
+    document.def(
+        "row", [](const CDocument& self, int64_t row) { return TextFromUtf8(self.Row(row)); }, "row"_a,
+        nb::sig("def row(self, row: int) -> str"), "The text of a row, without its end.");
+    document.def(
+        "between",
+        [](const CDocument& self, std::pair<int64_t, int64_t> start, std::pair<int64_t, int64_t> end) {
+            return TextFromUtf8(self.Between({start.first, start.second}, {end.first, end.second}));
+        },
+        "start"_a, "end"_a, nb::sig("def between(self, start: tuple[int, int], end: tuple[int, int]) -> str"),
+        "The text between two places in characters.");
+    document.def(
         "edit",
         [](CDocument& self, std::pair<int64_t, int64_t> start, std::pair<int64_t, int64_t> end,
            nb::str new_text) {

@@ -26,6 +26,10 @@ std::string Shown(const CRowColumn& place) {
     return "(" + std::to_string(place.row) + ", " + std::to_string(place.column) + ")";
 }
 
+void Refuse(const char* argument, const CRowColumn& place, const std::string& why) {
+    RaiseHost(PyExc_ValueError, (std::string(argument) + " " + Shown(place) + why).c_str());
+}
+
 }  // namespace
 
 CDocument::CDocument(nb::str text, nb::str path, nb::str python, const CFileSettings& settings, EUnit unit)
@@ -38,8 +42,7 @@ CDocument::CDocument(nb::str text, nb::str path, nb::str python, const CFileSett
 CDocumentEdit CDocument::Edit(const CRowColumn& start, const CRowColumn& end, nb::str new_text) {
     const uint32_t first = _OffsetOf("start", start, _fUnit);
     const uint32_t last = _OffsetOf("end", end, _fUnit);
-    if (last < first)
-        RaiseHost(PyExc_ValueError, ("end " + Shown(end) + " is before start " + Shown(start)).c_str());
+    if (last < first) Refuse("end", end, " is before start " + Shown(start));
     const CUtf8 came(new_text);
     CDocumentEdit done;
     done.range = _RangeOf(first, last);
@@ -99,7 +102,7 @@ uint32_t CDocument::_StartOf(int64_t row) const {
 }
 
 CRowColumn CDocument::End() const {
-    const int64_t row = _RowCount();
+    const int64_t row = RowCount();
     return {row, EndColumn(_Row(row), _fUnit)};
 }
 
@@ -109,19 +112,39 @@ int64_t CDocument::ColumnOf(const CRowColumn& place) const {
     return EndColumn(Text().substr(start, offset - start), _fUnit);
 }
 
+int64_t CDocument::CharacterColumnOf(const CRowColumn& position) const {
+    _CheckRow("position", position);
+    if (position.column < 1) Refuse("position", position, ": columns count from 1");
+    return 1 + CharactersBefore(_Row(position.row), position.column, _fUnit);
+}
+
+std::string_view CDocument::Row(int64_t row) const {
+    _CheckRow("place", {row, 1});
+    return _Row(row);
+}
+
+std::string_view CDocument::Between(const CRowColumn& start, const CRowColumn& end) const {
+    const uint32_t first = _OffsetOf("start", start, EUnit::kCharacter);
+    const uint32_t last = _OffsetOf("end", end, EUnit::kCharacter);
+    return Text().substr(first, std::max(last, first) - first);
+}
+
+void CDocument::_CheckRow(const char* argument, const CRowColumn& place) const {
+    if (place.row < 1 || place.row > RowCount())
+        Refuse(argument, place,
+               ": there is no row " + std::to_string(place.row) + ", but " + std::to_string(RowCount()));
+}
+
 uint32_t CDocument::_OffsetOf(const char* argument, const CRowColumn& place, EUnit unit) const {
-    const auto refuse = [&](const std::string& why) {
-        RaiseHost(PyExc_ValueError, (std::string(argument) + " " + Shown(place) + why).c_str());
-    };
-    if (place.row < 1 || place.row > _RowCount())
-        refuse(": there is no row " + std::to_string(place.row) + ", but " + std::to_string(_RowCount()));
+    _CheckRow(argument, place);
     const std::string_view row = _Row(place.row);
     const std::optional<size_t> bytes =
         place.column < 1 ? row.size() + 1 : BytesBefore(row, place.column, unit);
-    if (!bytes) refuse(" is within a character");
+    if (!bytes) Refuse(argument, place, " is within a character");
     if (*bytes > row.size())
-        refuse(": row " + std::to_string(place.row) + " ends at column " +
-               std::to_string(EndColumn(row, unit)));
+        Refuse(
+            argument, place,
+            ": row " + std::to_string(place.row) + " ends at column " + std::to_string(EndColumn(row, unit)));
     return _StartOf(place.row) + static_cast<uint32_t>(*bytes);
 }
 

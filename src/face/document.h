@@ -40,9 +40,17 @@ class CDocument {
     CRowColumn End() const;
     // The column of a place that is counted in characters, in what the document counts.
     int64_t ColumnOf(const CRowColumn& place) const;
+    // The other way round: the end of the row for a column after it, and the end of a character for one
+    // within it.
+    int64_t CharacterColumnOf(const CRowColumn& position) const;
+    uint32_t RowCount() const { return _fFile ? _fFile->RowCount() : _fUnreadableRows->Count(); }
+    // Without its end; `row` from 1.
+    std::string_view Row(int64_t row) const;
+    // Places are counted in characters.
+    std::string_view Between(const CRowColumn& start, const CRowColumn& end) const;
 
   private:
-    uint32_t _RowCount() const { return _fFile ? _fFile->RowCount() : _fUnreadableRows->Count(); }
+    void _CheckRow(const char* argument, const CRowColumn& place) const;
     // `row` from 1.
     CPlacedRows _RowsAround(int64_t row) const;
     std::string_view _Row(int64_t row) const;
