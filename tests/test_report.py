@@ -296,7 +296,7 @@ def test_keyboard(page_file, visit):
     assert page.locator("#tip").is_hidden()
     tab_until("at.matches('.problem .code')")
     press("Enter")
-    assert page.locator("#code-CL202").get_attribute("open") is not None
+    page.locator("#code-CL202[open]").wait_for()
     assert focused("at.closest('details').id") == "code-CL202"
     press("/")
     assert focused("at.id") == "search"
@@ -336,6 +336,9 @@ def test_search(page_file, visit):
     assert found("cl204") == ["src/pkg/box.py"]
     assert found("never CLOSED") == ["src/pkg/box.py", "src/wide.py"]
     assert found("filler_299") == ["src/pkg/box.py"]
+    summary_of(page, "box.py").click()
+    page.locator(".note a", has_text="filler_299").click()
+    assert page.locator(".row.target code").inner_text() == "filler_299 = 299"
     assert found("<img") == [f"src/{MARKUP.replace('/', '')}.py"]
     assert found("nothing has this") == []
     assert page.locator("#found").inner_text() == "Nothing has “nothing has this”."

@@ -132,10 +132,12 @@ def _write_whole(path: str, pieces: Iterable[str]) -> None:
     try:
         _write(new, pieces)
         os.replace(new, path)
-    except BaseException:
+    except OSError as error:
+        error.filename, error.filename2 = path, None  # which the user knows
+        raise
+    finally:
         if os.path.exists(new):
             os.unlink(new)
-        raise
 
 
 def _write(path: str, pieces: Iterable[str]) -> None:

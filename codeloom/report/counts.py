@@ -15,6 +15,8 @@ class Bar(NamedTuple):
     """One bar of a chart."""
 
     label: str
+    meaning: str
+    """What the label stands for; empty where it says that itself."""
     link: str | None
     """The fragment that it leads to."""
     problems: int
@@ -61,21 +63,25 @@ class Counts:
 
     def code_bars(self) -> list[Bar]:
         """The most frequent codes."""
-        return _bars((code, f"code-{code}", count) for code, count in _ordered(self._by_code))
+        known = explanations()
+        return _bars(
+            (code, known[code].title, f"code-{code}", count) for code, count in _ordered(self._by_code)
+        )
 
     def folder_bars(self) -> list[Bar]:
         """The folders with the most problems."""
-        return _bars((path, f"folder-{path}", count) for path, count in _ordered(self._by_folder))
+        return _bars((path, "", f"folder-{path}", count) for path, count in _ordered(self._by_folder))
 
 
 def _ordered(counter: Counter[str]) -> list[tuple[str, int]]:
     return sorted(counter.items(), key=lambda pair: (-pair[1], pair[0]))
 
 
-def _bars(counts: Iterable[tuple[str, str, int]]) -> list[Bar]:
-    rows: list[tuple[str, str | None, int]] = list(counts)
+def _bars(counts: Iterable[tuple[str, str, str, int]]) -> list[Bar]:
+    """Bars of labels, what these mean, links and counts."""
+    rows: list[tuple[str, str, str | None, int]] = list(counts)
     if len(rows) > _MOST_BARS:
         others = rows[_MOST_BARS - 1 :]
-        rows[_MOST_BARS - 1 :] = [(f"{len(others):,} others", None, sum(count for *_, count in others))]
+        rows[_MOST_BARS - 1 :] = [(f"{len(others):,} others", "", None, sum(count for *_, count in others))]
     longest = max((count for *_, count in rows), default=1)
-    return [Bar(label, link, count, round(100 * count / longest, 1)) for label, link, count in rows]
+    return [Bar(*row, share=round(100 * row[-1] / longest, 1)) for row in rows]

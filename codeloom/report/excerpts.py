@@ -9,6 +9,8 @@ from codeloom.cli.source import Source
 # Rows beside a broken line, and rows of the line itself on either side of the fault.
 _AROUND = 2
 _OF_LINE = 8
+# Fewer rows between two stretches are shown too.
+_LEAST_GAP = 3
 # Characters of a row, and those of them before its first fault.
 _LONGEST_ROW = 1000
 _BEFORE_FAULT = 200
@@ -30,11 +32,12 @@ def stretches_around(source: Source, findings: Sequence[Finding]) -> list[Stretc
     merged: list[Stretch] = []
     last_row = row_count(source)
     for first, last in sorted(stretch for finding in findings for stretch in _around(source, finding)):
-        first, last = max(first, 1), max(min(last, last_row), 1)
-        if merged and first <= merged[-1][1] + 1:
+        first = 1 if first <= _LEAST_GAP else min(first, last_row)
+        last = last_row if last > last_row - _LEAST_GAP else last
+        if merged and first - merged[-1][1] <= _LEAST_GAP:
             merged[-1] = merged[-1][0], max(last, merged[-1][1])
         else:
-            merged.append((min(first, last), last))
+            merged.append((first, last))
     return merged
 
 

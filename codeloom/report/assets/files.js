@@ -14,12 +14,10 @@ const problemText = (problem) => `${problem.code} ${problem.message} ${problem.h
 
 const hasAll = (text, words) => words.every((word) => text.includes(word));
 
-/** What of a file a search has found: its problems, or all if none is meant, and names. */
-function foundIn(file, words) {
-  const path = file.path.toLowerCase();
-  const problems = file.problems.filter((problem) => hasAll(`${path} ${problemText(problem)}`.toLowerCase(), words));
-  const names = words.length && file.names ? file.names.split("\n").filter((name) => words.some((word) => name.toLowerCase().includes(word))) : [];
-  return { problems, names };
+/** The names in a file that have one of some words. */
+function namesWith(file, words) {
+  if (!words.length) return [];
+  return file.names.split("\n").filter((name) => words.some((word) => name.toLowerCase().includes(word)));
 }
 
 class FileList {
@@ -133,7 +131,7 @@ class FileList {
   fill(details, file) {
     if (details.children.length > 1) return;
     const data = rowsOf(file);
-    details.append(...this.foundNames(file));
+    details.append(...this.foundNames(file, data));
     const omitted = file.count - file.problems.length;
     if (data) {
       details.view = new SourceView(file, data);
@@ -145,13 +143,16 @@ class FileList {
     if (omitted) details.append(make("p", { class: "note" }, `${counted(omitted, "problem")} more: run codeloom check on the file.`));
   }
 
-  /** What a search has found in a file besides its path. */
-  foundNames(file) {
-    const { names } = foundIn(file, this.words);
+  /** The names that a search has found in a file; one whose row is in the page leads there. */
+  foundNames(file, data) {
+    const names = namesWith(file, this.words);
     if (!names.length) return [];
-    const shown = names.slice(0, MOST_NAMES).map((name) => make("code", {}, name));
-    const more = names.length > MOST_NAMES ? ` and ${names.length - MOST_NAMES} more` : "";
-    return [make("p", { class: "note names" }, "names: ", ...shown.flatMap((name) => [name, " "]), more)];
+    const shown = names.slice(0, MOST_NAMES).map((name) => {
+      const row = data?.firstRowWith(name);
+      return row ? make("a", { href: fileLink(file, row) }, make("code", {}, name)) : make("code", {}, name);
+    });
+    const more = names.length > MOST_NAMES ? `and ${names.length - MOST_NAMES} more` : "";
+    return [make("p", { class: "note" }, "Names found: ", ...shown.flatMap((name) => [name, " "]), more)];
   }
 
   /** Up and down go from file to file, home and end to the first and the last. */
@@ -189,4 +190,5 @@ class FileList {
   }
 }
 
-const isBelow = (path, folder) => !folder || (folder === "." ? !path.includes("/") : path.startsWith(`${folder}/`));
+const isBelow = (path, folder) =>
+  !folder || (folder === "." ? !path.includes("/") : path.startsWith(`${folder}/`));

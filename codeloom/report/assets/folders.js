@@ -31,6 +31,10 @@ function joined(folder) {
   return { ...folder, folders };
 }
 
+/** A number, with its noun for those who can't see what it belongs to. */
+const badge = (count, noun, severity) =>
+  make("span", { class: `badge ${severity}` }, count.toLocaleString("en"), make("span", { class: "for-ears" }, ` ${noun}${count === 1 ? "" : "s"}`));
+
 class Folders {
   constructor(onChosen) {
     this.onChosen = onChosen;
@@ -49,19 +53,20 @@ class Folders {
     else byId("folders").remove();
   }
 
+  /** A folder, open when it is to be or when there is nothing beside it. */
   item(folder, isOpen) {
     const label = make(
       "span",
       { class: "label" },
       make("span", { class: "arrow", "aria-hidden": "true" }),
       make("span", { class: "name-of-folder" }, folder.name),
-      make("span", { class: folder.problems ? "badge error" : "lines" }, folder.problems ? counted(folder.problems, "problem") : counted(folder.files, "file")),
+      folder.problems ? badge(folder.problems, "problem", "error") : make("span", { class: "lines" }, counted(folder.files, "file")),
     );
     const item = make("li", { role: "treeitem", tabindex: "-1", "aria-selected": "false" }, label);
     item.dataset.path = folder.path;
     if (folder.folders.length) {
       item.setAttribute("aria-expanded", String(isOpen));
-      item.make = () => make("ul", { role: "group" }, ...folder.folders.map((each) => this.item(each, false)));
+      item.make = () => make("ul", { role: "group" }, ...folder.folders.map((each) => this.item(each, folder.folders.length === 1)));
       if (isOpen) item.append(item.make());
     }
     return item;

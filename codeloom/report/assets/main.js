@@ -48,7 +48,7 @@ const THEMES = ["system", "light", "dark"];
 
 function setTheme(theme) {
   document.documentElement.dataset.theme = theme;
-  byId("theme").textContent = `Colours: ${theme}`;
+  byId("theme").textContent = `Theme: ${theme}`;
 }
 
 function startTheme() {
@@ -87,6 +87,11 @@ function keepClear() {
 }
 
 addEventListener("hashchange", follow);
+document.addEventListener("click", (event) => {
+  // The address doesn't change, but what it shows may have been closed since.
+  const link = event.target.closest?.("a[href^='#']");
+  if (link && link.hash === location.hash) follow();
+});
 addEventListener("resize", keepClear);
 followNames(byId("list"));
 startTheme();

@@ -17,6 +17,20 @@ class FileRows {
     }
   }
 
+  /** The number of the first row that has a name; undefined when there is none in the page. */
+  firstRowWith(name) {
+    for (const number of this.place.keys()) {
+      const { text, start, names } = this.row(number);
+      if (!text.includes(name)) continue;
+      const characters = charactersOf(text);
+      for (let i = 0; i < names.length; i += 4) {
+        const first = names[i] - start;
+        if (names[i + 2] >= 0 && textOf(characters, first, first + names[i + 1]) === name) return number;
+      }
+    }
+    return undefined;
+  }
+
   labelOf(number) {
     const { cell, label } = this.row(number);
     return cell ? `cell ${cell[0]}, row ${label}` : `row ${label}`;
@@ -115,9 +129,8 @@ function problemElement(file, data, problem) {
       make("a", { class: "place", href: fileLink(file, problem.at[0]) }, placeOf(problem)),
       " ",
       make("a", { class: `code ${problem.severity}`, href: `#code-${problem.code}` }, problem.code),
-      " ",
+      problem.severity === "warning" ? " warning: " : " ",
       make("span", { class: "message" }, problem.message),
-      problem.severity === "warning" ? make("span", { class: "severity" }, " warning") : null,
     ),
     problem.hint ? make("p", { class: "hint" }, "hint: ", problem.hint) : null,
     related.length ? make("ul", { class: "places" }, ...related) : null,
@@ -131,7 +144,9 @@ class SourceView {
     this.data = data;
     this.marks = marksOf(file);
     this.problems = Map.groupBy(file.problems, (problem) => problem.at[0]);
-    this.element = make("div", { class: "source" }, ...this.parts());
+    // It scrolls sideways, by keyboard too.
+    const attributes = { class: "source", role: "group", tabindex: "0", "aria-label": `Source of ${file.path}` };
+    this.element = make("div", attributes, ...this.parts());
   }
 
   /** The rows around problems, with what is between them; all rows of a file without problems. */
