@@ -1364,12 +1364,24 @@ class DocumentText:
     def edit(self, start: tuple[int, int], end: tuple[int, int], new_text: str) -> DocumentEdit:
         """Put a text in the place of a range, and say what was replaced."""
 
-def analyze_files(paths: list[str], python: str, version: int, false_hints: bool, with_records: bool, with_names: bool) -> list[Analysis | None]:
+class FileReader:
     """
-    For `codeloom.analyze_paths`: what each file says, with its problems worked out, with `with_records` its records, and with `with_names` its occurrences, scopes, signatures and hints.
+    For `codeloom.analyze_paths`: files read and analysed by `jobs` threads, that which takes them included, with their problems worked out, with `with_records` their records, and with `with_names` their occurrences, scopes, signatures and hints.
+    """
 
-    None for a file that can't be read or that has to be decoded: the Python layer reads these.
-    """
+    def __init__(self, jobs: int, python: str, version: int, false_hints: bool, with_records: bool, with_names: bool) -> None:
+        ...
+
+    def submit(self, paths: list[str]) -> None:
+        """Some files to read. An empty path is none."""
+
+    def take(self) -> list[Analysis | None]:
+        """
+        What the files say that were submitted first. None for one that can't be read or that has to be decoded: the Python layer reads these.
+        """
+
+    def close(self) -> None:
+        """Ends the threads. What is left is read when it is taken."""
 
 def DumpNames(text: str, version: int, has_print_function: bool=False, with_records: bool=True) -> list[tuple[int, int, int, list[tuple[bytes, bytes, bool, int, int]]]]:
     """

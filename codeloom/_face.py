@@ -2,11 +2,10 @@
 
 import os
 from collections.abc import Callable, Iterable, Iterator
-from itertools import compress
 
-from codeloom._analysis import Analysis, analyze_files
+from codeloom._analysis import Analysis
 from codeloom.reading.ahead import read_ahead
-from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput, find_files, read_file
+from codeloom.reading.files import NOTEBOOK_SUFFIX, find_files, read_file
 from codeloom.reading.languages import NEWEST, version_number
 from codeloom.reading.source import source_from_bytes, source_from_text
 
@@ -96,7 +95,7 @@ def analyze_paths(
 
     `jobs` threads read and analyse files ahead, as many as the machine has processors unless told
     otherwise. They look for problems, and with `records` for records too; otherwise these are made
-    when they are first asked for.
+    when they are first asked for. Notebooks, and what has to be decoded, are read in their turn.
 
     What can't be read goes to `on_error`, an OSError with the path in `filename`; without `on_error`
     it is raised.
@@ -118,45 +117,32 @@ def analyze_paths(
     elif jobs < 1:
         raise ValueError(f"jobs must be at least 1, not {jobs}")
 
-    def read_plain(names: list[str]) -> Iterator[Analysis | None]:
-        return analyze_plain_files(names, python=python, false_hints=false_hints, records=records)
+    def read(path: str | OSError) -> Analysis:
+        if isinstance(path, OSError):
+            raise path
+        return analyze_file(path, python=python, false_hints=false_hints)
 
-    def read(name: str) -> Analysis:
-        analysis = analyze_file(name, python=python, false_hints=false_hints)
-        _ = analysis.records if records else analysis.problems  # worked out now, in this thread
-        return analysis
-
-    return _without_errors(read_ahead(find_files(names), read_plain, read, jobs), on_error)
+    found = find_files(names)
+    results = read_ahead(found, jobs=jobs, python=python, false_hints=false_hints, records=records)
+    return _without_errors(results, read, on_error)
 
 
 def _without_errors(
-    results: Iterator[Analysis | OSError], on_error: Callable[[OSError], None] | None
+    results: Iterator[tuple[str | OSError, Analysis | None]],
+    read: Callable[[str | OSError], Analysis],
+    on_error: Callable[[OSError], None] | None,
 ) -> Iterator[Analysis]:
-    for result in results:
-        if not isinstance(result, OSError):
-            yield result
-        elif on_error is None:
-            raise result
-        else:
-            on_error(result)
-
-
-def analyze_plain_files(
-    paths: list[str], *, python: str, false_hints: bool, records: bool = False, names: bool = False
-) -> Iterator[Analysis | None]:
-    """Each file analysed, all with one release of the interpreter's lock; None for what takes more to read.
-
-    With `records` and `names` what these are made of is worked out in the same pass. Notebooks, the
-    standard input, what isn't plain UTF-8 and what can't be read take more.
-    """
-    are_plain = [_is_plain(path) for path in paths]
-    plain = list(compress(paths, are_plain))
-    found = iter(analyze_files(plain, python, version_number(python), false_hints, records, names))
-    return (next(found) if is_plain else None for is_plain in are_plain)
-
-
-def _is_plain(name: str) -> bool:
-    return not (isinstance(name, StandardInput) or name.lower().endswith(NOTEBOOK_SUFFIX))
+    """What the results say; `read` is for those that say nothing yet."""
+    for path, analysis in results:
+        if analysis is None:
+            try:
+                analysis = read(path)
+            except OSError as error:
+                if on_error is None:
+                    raise
+                on_error(error)
+                continue
+        yield analysis
 
 
 def processor_count() -> int:

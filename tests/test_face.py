@@ -159,13 +159,13 @@ class TestPaths:
             list(analyze_paths(paths))
 
     def test_it_is_lazy(self, write_files):
-        folder = write_files({f"{i:03}.py": "x = 1\n" for i in range(60)})
+        folder = write_files({f"{i:03}.py": "x = 1\n" for i in range(200)})
         gone = []
         found = analyze_paths([folder], jobs=2, records=True, on_error=gone.append)
         assert len(next(found).records) == 2
-        for path in sorted(folder.iterdir())[30:]:
+        for path in sorted(folder.iterdir())[100:]:
             path.unlink()
-        assert (len(list(found)), len(gone)) == (29, 30)
+        assert (len(list(found)), len(gone)) == (99, 100)
 
 
 def test_threads():

@@ -5,9 +5,10 @@ import json
 import os
 
 import pytest
+from run_python import RunPython
 
 from codeloom import NEWEST, analyze_file, analyze_paths
-from codeloom._analysis import analyze_files
+from codeloom._analysis import FileReader
 
 ODD_FILES = {
     "empty.py": b"",
@@ -23,6 +24,12 @@ ODD_FILES = {
     "cells.ipynb": json.dumps({"cells": [{"cell_type": "code", "source": ["x = )\n"]}]}).encode(),
     "stub.pyi": b"def f(x: int) -> str: ...\n",
 }
+
+
+def read_natively(paths, jobs=1):
+    reader = FileReader(jobs, NEWEST, 315, False, False, False)
+    reader.submit(paths)
+    return reader.take()
 
 
 @pytest.fixture
@@ -57,9 +64,9 @@ def test_what_cannot_be_read(folder):
     found = analyze_paths(named[:-1], on_error=errors.append)
     assert [os.path.basename(analysis.path) for analysis in found] == ["plain.py"]
     assert [os.path.basename(error.filename) for error in errors] == ["absent.py", "pipe.py", "link.py"]
-    assert analyze_files(list(map(str, named)), NEWEST, 315, False, False, False).count(None) == 5
+    assert read_natively(list(map(str, named))).count(None) == 5
     with pytest.raises(TypeError):
-        analyze_files([b"plain.py"], NEWEST, 315, False, False, False)
+        read_natively([b"plain.py"])
 
 
 def test_what_counts_as_utf8(tmp_path):
@@ -78,5 +85,68 @@ def test_what_counts_as_utf8(tmp_path):
             expected.append(False)
         else:
             expected.append(True)
-    found = analyze_files(paths, NEWEST, 315, False, False, False)
+    found = read_natively(paths)
     assert [analysis is not None for analysis in found] == expected
+
+
+def test_order_however_many_threads(tmp_path):
+    """Files of very different lengths, so that threads overtake each other."""
+    paths = [tmp_path / f"{i:03}.py" for i in range(200)]
+    for i, path in enumerate(paths):
+        path.write_text("x = [a for a in b]\n" * (i * 37 % 101) ** 2 + f"y{i} = )\n")
+    for jobs in (1, 2, 16):
+        found = list(analyze_paths([tmp_path], jobs=jobs))
+        assert [analysis.path for analysis in found] == list(map(str, paths))
+        assert [analysis.problems[0].source_row for analysis in found] == [f"y{i} = )" for i in range(200)]
+
+
+def test_a_reader_that_is_closed_still_reads(tmp_path):
+    (tmp_path / "a.py").write_text("x = )\n")
+    reader = FileReader(4, NEWEST, 315, False, False, False)
+    for _ in range(20):
+        reader.submit([str(tmp_path / "a.py"), ""])
+    reader.close()
+    reader.close()
+    for _ in range(20):
+        analysis, nothing = reader.take()
+        assert (len(analysis.problems), nothing) == (1, None)
+    with pytest.raises(IndexError, match="nothing to take"):
+        reader.take()
+
+
+# The ways to leave files that were read ahead; none may wait forever, or crash.
+LEAVING = {
+    "dropped": "next(found); del found",
+    "closed": "next(found); found.close()",
+    "kept by a cycle": "next(found); cycle = [found]; cycle.append(cycle); del found, cycle",
+    "left to the end": "next(found); keep = found",
+    "left to the end of the process": "import builtins; next(found); builtins.kept = [found]; del found",
+    "raised out of": "next(found)\ntry:\n    found.throw(KeyboardInterrupt)\nexcept KeyboardInterrupt: pass",
+    "in a thread left alone": """
+import threading
+def Go():
+    for analysis in found: begun.set()
+begun = threading.Event()
+threading.Thread(target=Go, daemon=True).start()
+begun.wait()""",
+    "forked": """
+import warnings; warnings.simplefilter("ignore")
+next(found)
+child = os.fork()
+if child == 0:
+    try:
+        list(found)
+    except RuntimeError as error:
+        assert "forked" in str(error)
+        sys.exit(7)
+assert os.waitstatus_to_exitcode(os.waitpid(child, 0)[1]) == 7
+assert len(list(found)) == 199""",
+}
+
+
+@pytest.mark.parametrize("how", LEAVING)
+def test_leaving_files_that_are_read_ahead(tmp_path, how):
+    for i in range(200):
+        (tmp_path / f"{i:03}.py").write_text("x = [a for a in b]\n" * 500)
+    before = f"import os, sys, codeloom\nfound = codeloom.analyze_paths([{str(tmp_path)!r}], jobs=3)\n"
+    assert RunPython(f"{before}{LEAVING[how]}\nprint('left')") == "left\n"

@@ -6,7 +6,7 @@ import sys
 from collections.abc import Callable, Iterator, Sequence
 from contextlib import contextmanager
 
-from codeloom._face import analyze, analyze_plain_files, processor_count
+from codeloom._face import analyze, processor_count
 from codeloom.cli.command import ExitStatus
 from codeloom.cli.console import Console, say
 from codeloom.cli.excerpt import printable
@@ -65,24 +65,35 @@ class Run:
 
     def files(self) -> Iterator[str | OSError]:
         """The paths of the files to read, and what keeps a folder from being listed."""
-        yield from self._concerned(files_of(self.options, self._on_nothing))
+        return self._concerned(files_of(self.options, self._on_nothing))
 
     def _count_files(self) -> int:
         return sum(1 for _ in self._concerned(files_of(self.options)))
 
     def _concerned(self, paths: Iterator[str | OSError]) -> Iterator[str | OSError]:
-        for path in paths:
-            is_named = isinstance(path, OSError | StandardInput)
-            if is_named or self._changes is None or self._changes.concern(str(path)):
-                yield path
+        changes = self._changes
+        if changes is None:
+            return paths
+        named = (OSError, StandardInput)
+        return (path for path in paths if isinstance(path, named) or changes.concern(str(path)))
 
     def sources(self) -> Iterator[tuple[Source, list[Finding]]]:
         """Each file with the problems that count; what can't be read is reported."""
-        jobs = self.options.jobs or processor_count()
+        options = self.options
+        results = read_ahead(
+            self.files(),
+            jobs=options.jobs or processor_count(),
+            python=self._version,
+            false_hints=options.false_hints,
+            records=self._needs_records,
+            names=self._needs_names,
+        )
         with self._progress as progress:
-            for source in read_ahead(self.files(), self._read_plain, self._read, jobs):
-                if isinstance(source, OSError):
-                    self._on_error(source)
+            for path, analysis in results:
+                try:
+                    source = self._read(path) if analysis is None else Source(str(path), analysis)
+                except OSError as error:
+                    self._on_error(error)
                     continue
                 findings = self._findings(source)
                 if findings and self.console.is_terminal:
@@ -90,27 +101,10 @@ class Run:
                 yield source, findings
                 progress.show(self.tally)
 
-    def _read_plain(self, paths: list[str]) -> Iterator[Source | None]:
-        analyses = analyze_plain_files(
-            paths,
-            python=self._version,
-            false_hints=self.options.false_hints,
-            records=self._needs_records,
-            names=self._needs_names,
-        )
-        for path, analysis in zip(paths, analyses, strict=True):
-            yield None if analysis is None else Source(path, analysis)
-
-    def _read(self, path: str) -> Source:
-        source = read_source(path, self.options, self._version)
-        analysis = source.analysis
-        # Worked out now, in this thread.
-        if self._needs_records:
-            _ = analysis.records
-        if self._needs_names:
-            _ = analysis.occurrences
-        _ = analysis.problems
-        return source
+    def _read(self, path: str | OSError) -> Source:
+        if isinstance(path, OSError):
+            raise path
+        return read_source(path, self.options, self._version)
 
     def end(self) -> ExitStatus:
         """Write what goes after all files, and give the exit status."""

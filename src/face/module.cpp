@@ -3,7 +3,7 @@
 
 #include "face/bind_document.h"
 #include "face/bind_face.h"
-#include "face/file_batch.h"
+#include "face/file_reader.h"
 #include "face/names.h"
 #include "face/trees.h"
 #include "host/module_entry.h"
@@ -12,7 +12,7 @@ CODELOOM_MODULE(_analysis, module) {
     nanobind::set_leak_warnings(false);
     codeloom::BindFace(module);
     codeloom::BindDocument(module);
-    codeloom::BindFileBatch(module);
+    codeloom::BindFileReader(module);
     codeloom::BindNames(module);
     codeloom::BindTrees(module);
 }

@@ -9,6 +9,7 @@
 #include "face/settings.h"
 #include "host/errors.h"
 #include "host/text.h"
+#include "host/without_lock.h"
 #include "text/utf8.h"
 
 using namespace nb::literals;
@@ -34,7 +35,7 @@ void CheckStream(ArrowArrayStream& stream, int error) {
 // Others' code runs here, which may take its time.
 template <class Read>
 int WithoutLock(Read read) {
-    const nb::gil_scoped_release released;
+    const CWithoutLock released;
     return read();
 }
 
@@ -254,7 +255,7 @@ nb::dict CSourceBatch::Analyze(const std::vector<std::string>& tables, bool fals
     const std::vector<CBatchFile> files = Files();
     std::vector<std::shared_ptr<const CTable>> made;
     {
-        const nb::gil_scoped_release released;
+        const CWithoutLock released;
         for (const CBatchFile& file : files) analyzer.Take(file);
         made = analyzer.Finish();
     }

@@ -5,6 +5,7 @@
 
 #include "host/errors.h"
 #include "host/text.h"
+#include "host/without_lock.h"
 
 namespace codeloom {
 
@@ -73,7 +74,7 @@ const CFileAnalysis& CSourceFile::_Analyzed(std::shared_ptr<const CFileAnalysis>
     MakeLanguages(settings.version);
     std::shared_ptr<const CFileAnalysis> made;
     {
-        const nb::gil_scoped_release released;
+        const CWithoutLock released;
         made = std::make_shared<const CFileAnalysis>(AnalyzeFile(Text(), settings, _fUnreadable));
     }
     if (!kept) kept = std::move(made);  // another thread may have been faster
