@@ -10,6 +10,7 @@ from pathlib import Path
 import pytest
 
 from codeloom.cli.arguments import COMMANDS
+from codeloom.reading.files import _Seen
 
 EXAMPLES = Path(__file__).parent.parent / "examples"
 
@@ -163,6 +164,20 @@ class TestFiles:
         assert checked("b", ".") == ["b/c.py", "b/d.py", "./a.py"]
         (folder / "b/link.py").symlink_to("../a.py")
         assert checked("a.py", "b") == ["a.py", "b/c.py", "b/d.py"]
+        (folder / "b/hard.py").hardlink_to(folder / "b/d.py")
+        assert checked("b") == ["b/c.py", "b/d.py", "b/link.py"]
+
+    def test_files_that_share_a_number(self, write_files):
+        """As on two devices; one of them is gone when it is compared."""
+        folder = write_files({"a.py": "", "b.py": "", "c.py": ""})
+        (folder / "link.py").symlink_to("b.py")
+        seen = _Seen()
+        new = [
+            name
+            for name in ("a.py", "b.py", "c.py", "link.py", "a.py", "gone.py", "gone.py")
+            if seen.add(str(folder / name), 7)
+        ]
+        assert new == ["a.py", "b.py", "c.py", "gone.py"]
 
     def test_links_of_folders_are_followed_only_when_they_are_named(self, write_files, checked):
         folder = write_files({"a/b.py": ")", "other/c.py": ")"})

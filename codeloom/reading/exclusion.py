@@ -5,7 +5,7 @@ that it was written for, any other matches names at any depth.
 """
 
 import os
-from collections.abc import Iterable, Iterator, Sequence
+from collections.abc import Container, Iterable, Sequence
 
 TYPE_CHECKING = False  # `typing` takes longer to import than this module
 if TYPE_CHECKING:  # most searches don't need it, and it takes longer to import than they take
@@ -59,13 +59,18 @@ class Exclusion:
         self._is_default = tuple(patterns) == DEFAULT_PATTERNS
         self._rules = None if self._is_default else _Rules(enumerate(patterns, 1))
         self._ignore_files: dict[str, _Rules | None] = {}
+        self._known_ignores: dict[str, tuple[tuple[_Rules, str], ...]] = {}
         self._tops = {self._root: True} if is_top else {}
 
-    def in_folder(self, folder: str) -> "FolderExclusion":
-        """The same for what lies in one folder."""
+    def in_folder(self, folder: str, names: Container[str] | None = None) -> "FolderExclusion":
+        """The same for what lies in one folder; `names` are those of all that does, where they are known."""
         folder = os.path.abspath(folder)
+        if names is not None:
+            self._tops.setdefault(folder, _REPOSITORY in names)
+            if _GITIGNORE not in names:
+                self._ignore_files[folder] = None
         rules = [] if self._rules is None else [(self._rules, _relative(folder, self._root))]
-        return FolderExclusion(rules, list(self._ignores(folder)), self._is_default)
+        return FolderExclusion(rules, self._ignores(folder), self._is_default)
 
     def cause_for_named(self, path: str) -> Cause | None:
         """Why a file or a folder is left out although it is named itself; None when it isn't."""
@@ -89,7 +94,7 @@ class Exclusion:
             if path.startswith(inside):
                 here = self.in_folder(above)
             elif not self._is_top(path):
-                here = FolderExclusion([], list(self._ignores(above)), False)
+                here = FolderExclusion([], self._ignores(above), False)
             else:
                 return None
             cause = here.cause(os.path.basename(path), is_folder)
@@ -98,17 +103,29 @@ class Exclusion:
             path, is_folder = above, True
         return None
 
-    def _ignores(self, folder: str) -> "Iterator[tuple[_Rules, str]]":
+    def _ignores(self, folder: str) -> "list[tuple[_Rules, str]]":
         """The .gitignore files that hold for a folder, the nearest first, and its path from each."""
+        if not self._gitignore:
+            return []
+        return [(rules, _relative(folder, home)) for rules, home in self._ignores_at(folder)]
+
+    def _ignores_at(self, folder: str) -> "tuple[tuple[_Rules, str], ...]":
+        """The .gitignore files that hold for a folder, the nearest first, and the folder of each."""
+        unknown = []
         here = folder
-        while self._gitignore:
-            rules = self._ignore_file_in(here)
-            if rules is not None:
-                yield rules, _relative(folder, here)
+        while here not in self._known_ignores:
+            unknown.append(here)
             above = os.path.dirname(here)
             if self._is_top(here) or above == here:
-                return
+                break
             here = above
+        found = self._known_ignores.get(here, ())
+        for here in reversed(unknown):
+            rules = self._ignore_file_in(here)
+            if rules is not None:
+                found = ((rules, here), *found)
+            self._known_ignores[here] = found
+        return found
 
     def _ignore_file_in(self, folder: str) -> "_Rules | None":
         if folder not in self._ignore_files:

@@ -61,6 +61,8 @@ def left_out_by_force(cause: Cause) -> str:
 
 # What is the same for all names of a file or a folder: device and number, or else the path.
 _Identity = tuple[int, int] | str
+# What may be the same for others too, and costs nothing to know in a folder: the number, or else the path.
+_Number = int | str
 
 
 def _identity_of(path: str) -> _Identity:
@@ -71,6 +73,32 @@ def _identity_of(path: str) -> _Identity:
     except OSError:
         return path
     return status.st_dev, status.st_ino
+
+
+def _number_of(path: str) -> _Number:
+    identity = _identity_of(path)
+    return identity if isinstance(identity, str) else identity[1]
+
+
+class _Seen:
+    """Files and folders, whatever their names; the system is asked only about those that share a number."""
+
+    def __init__(self) -> None:
+        self._first_paths: dict[_Number, str] = {}
+        self._identities: set[_Identity] = set()  # of all whose number isn't theirs alone
+
+    def add(self, path: str, number: _Number) -> bool:
+        """False for what was added before, by this name or another."""
+        first = self._first_paths.get(number)
+        if first is None:
+            self._first_paths[number] = path
+            return True
+        self._identities.add(_identity_of(first))
+        identity = _identity_of(path)
+        if identity in self._identities:
+            return False
+        self._identities.add(identity)
+        return True
 
 
 class _FileFinder:
@@ -85,7 +113,7 @@ class _FileFinder:
         self._paths = paths
         self._exclusion = exclusion
         self._on_nothing = on_nothing
-        self._seen: set[_Identity] = set()
+        self._seen = _Seen()
         # What was left out, when somebody asks: where nothing was found.
         self._left_out: list[tuple[str, Cause]] | None = None
 
@@ -102,13 +130,13 @@ class _FileFinder:
 
     def _files_of(self, path: str) -> Iterator[str | OSError]:
         if isinstance(path, StandardInput):
-            if self._is_new(path):
+            if self._seen.add(path, _number_of(path)):
                 yield path
         elif self._exclusion.cause_for_named(path) is not None:
             return
         elif os.path.isdir(path):
             yield from self._files_below(path)
-        elif self._is_new(path):
+        elif self._seen.add(path, _number_of(path)):
             yield path
 
     def _why_nothing(self, path: str) -> str | None:
@@ -129,14 +157,15 @@ class _FileFinder:
 
     def _files_below(self, folder: str) -> Iterator[str | OSError]:
         # What is still to be looked at, the next one last; folders end in a separator.
-        pending = [os.path.join(folder, "")]
+        pending = [(os.path.join(folder, ""), _number_of(folder))]
         exclusion = self._exclusion.below_named(folder)
         is_named = True
         while pending:
-            path = pending.pop()
+            path, number = pending.pop()
+            if not self._seen.add(path, number):
+                continue
             if not path.endswith(os.sep):
-                if self._is_new(path):
-                    yield path
+                yield path
                 continue
             try:
                 pending += self._children(folder if is_named else path, is_named, exclusion)
@@ -144,17 +173,21 @@ class _FileFinder:
                 yield error
             is_named = False
 
-    def _children(self, folder: str, is_named: bool, exclusion: Exclusion) -> list[str]:
-        """What is of interest in a folder, in reverse order; nothing if it was looked at before."""
-        if not self._is_new(folder):
-            return []
+    def _children(self, folder: str, is_named: bool, exclusion: Exclusion) -> list[tuple[str, _Number]]:
+        """What is of interest in a folder, in reverse order."""
         with os.scandir(folder) as scan:
-            entries = sorted(scan, key=lambda entry: entry.name, reverse=True)
-        if not is_named and any(entry.name == _ENVIRONMENT_MARK for entry in entries):
+            entries = {entry.name: entry for entry in scan}
+        if not is_named and _ENVIRONMENT_MARK in entries:
             self._note(folder, ENVIRONMENT)
             return []
-        here = exclusion.in_folder(folder)
-        return [path for entry in entries if (path := self._path_of_interest(entry, here)) is not None]
+        here = exclusion.in_folder(folder, entries)
+        found = []
+        for name in sorted(entries, reverse=True):
+            entry = entries[name]
+            path = self._path_of_interest(entry, here)
+            if path is not None:
+                found.append((path, _number_of(path) if entry.is_symlink() else entry.inode()))
+        return found
 
     def _path_of_interest(self, entry: os.DirEntry[str], exclusion: FolderExclusion) -> str | None:
         """The path of a folder, with a separator, or of a Python file; None for anything else."""
@@ -171,21 +204,14 @@ class _FileFinder:
         if self._left_out is not None:
             self._left_out.append((path, cause))
 
-    def _is_new(self, path: str) -> bool:
-        """False for what was found before, by this name or another."""
-        identity = _identity_of(path)
-        if identity in self._seen:
-            return False
-        self._seen.add(identity)
-        return True
-
 
 def _path_of_file(entry: os.DirEntry[str]) -> str | None:
     """The path of a file that is to be read, or that can't be; None for anything else."""
-    is_hidden = entry.name.startswith(".")
     try:
-        is_broken = entry.is_symlink() and not os.path.exists(entry.path)
-        # A broken link is a failure when it is read; hidden ones are the locks of editors.
-        return entry.path if entry.is_file() or (is_broken and not is_hidden) else None
+        if entry.is_file():
+            return entry.path
+        is_failure = entry.is_symlink() and not os.path.exists(entry.path)
     except OSError:  # a link that leads to itself
-        return None if is_hidden else entry.path
+        is_failure = True
+    # A broken link is a failure when it is read; hidden ones are the locks of editors.
+    return entry.path if is_failure and not entry.name.startswith(".") else None
