@@ -37,6 +37,21 @@ constexpr bool IsScope(EClause clause) {
     return clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass;
 }
 
+constexpr bool IsHandler(EClause clause) {
+    return clause == EClause::kExcept || clause == EClause::kBareExcept || clause == EClause::kExceptStar;
+}
+
+// A clause that goes on with a statement before it.
+constexpr bool IsContinuation(EClause clause) {
+    return IsHandler(clause) || clause == EClause::kElif || clause == EClause::kElse ||
+           clause == EClause::kFinally;
+}
+
+constexpr bool IsDefinition(EClause clause) {
+    return clause == EClause::kDef || clause == EClause::kAsyncDef || clause == EClause::kClass ||
+           clause == EClause::kDecorator;
+}
+
 struct CStatementHead {
     EClause clause = EClause::kSimple;
     uint32_t start = 0;  // bytes of the first token
