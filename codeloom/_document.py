@@ -97,6 +97,7 @@ class Document:
 
         ValueError for a place that the text doesn't have.
         """
+        row, column = _checked((row, column), "place")
         return row, self._text.column_of(row, column)
 
     def place(self, row: int, column: int) -> Position:

@@ -56,7 +56,7 @@ def analyze_file(
 
     Of a notebook it is the text of its code cells; `read_notebook` gives the cell of each row.
     """
-    name = path_text(path)
+    name = _file_name(path)
     version_number(python)
     data = read_file(name)
     is_notebook = name.lower().endswith(NOTEBOOK_SUFFIX)
@@ -69,7 +69,7 @@ def read_notebook(path: str | os.PathLike[str]) -> "Notebook":
 
     Its `text` is what `analyze` takes, and its `place(row)` gives the cell and the row there, from 1.
     """
-    name = path_text(path)
+    name = _file_name(path)
     return _notebook(read_file(name), name)
 
 
@@ -104,7 +104,7 @@ def analyze_paths(
         raise TypeError("paths must be an iterable of paths, not a single one")
     if not isinstance(paths, Iterable):
         raise TypeError(f"paths must be an iterable of paths, not {type(paths).__name__}")
-    names = [path_text(path) for path in paths]
+    names = [_file_name(path) for path in paths]
     _check_flag("false_hints", false_hints)
     _check_flag("records", records)
     if on_error is not None and not callable(on_error):
@@ -153,6 +153,13 @@ def processor_count() -> int:
 def _check_flag(name: str, value: object) -> None:
     if not isinstance(value, bool):
         raise TypeError(f"{name} must be a bool, not {type(value).__name__}")
+
+
+def _file_name(path: str | os.PathLike[str]) -> str:
+    name = path_text(path)
+    if "\0" in name:
+        raise ValueError(f"path holds a NUL: {name!r}")
+    return name
 
 
 def path_text(path: str | os.PathLike[str]) -> str:

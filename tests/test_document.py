@@ -37,8 +37,8 @@ class TestPositions:
     @pytest.mark.parametrize(
         "start, end, message",
         [
-            ((0, 1), (1, 1), "start (0, 1): there is no row 0, but 7"),
-            ((1, 1), (8, 1), "end (8, 1): there is no row 8, but 7"),
+            ((0, 1), (1, 1), "start (0, 1): the last row is 7"),
+            ((1, 1), (8, 1), "end (8, 1): the last row is 7"),
             ((1, 0), (1, 1), "start (1, 0): row 1 ends at column 10"),
             ((1, 1), (1, 11), "end (1, 11): row 1 ends at column 10"),
             ((2, 3), (2, 2), "end (2, 2) is before start (2, 3)"),

@@ -13,7 +13,16 @@ import pytest
 from run_python import RunPython
 
 import codeloom
-from codeloom import LineKind, Range, RecordKind, analyze, analyze_file, analyze_paths, read_notebook
+from codeloom import (
+    Document,
+    LineKind,
+    Range,
+    RecordKind,
+    analyze,
+    analyze_file,
+    analyze_paths,
+    read_notebook,
+)
 
 TEXT = "import a\n\nclass B:\n\tdef f(self, é=1):  # why\n\t\treturn é.c; x = )\n"
 
@@ -136,6 +145,12 @@ class TestItems:
         (lambda: analyze("").references(1), TypeError, "occurrence must be an Occurrence, not int"),
         (lambda: analyze("").unused(parameters=1), TypeError, "parameters must be a bool, not int"),
         (lambda: read_notebook(3), TypeError, "path must be"),
+        (lambda: analyze_file("a\0b"), ValueError, r"path holds a NUL: 'a\\x00b'"),
+        (lambda: analyze("").table("\udc80"), ValueError, ""),
+        (lambda: analyze("").table(3), TypeError, "name must be a str, not int"),
+        (lambda: Range("1", 1, 1, 1), TypeError, "row must be an int, not str"),
+        (lambda: Range(1, 1, -1, 1), ValueError, "end_row must be at least 0"),
+        (lambda: Document("").position("1", 1), TypeError, "place must be a row and a column, both of type"),
     ],
 )
 def test_wrong_arguments(call, error, words):

@@ -188,6 +188,7 @@ def At(occurrences):
 def test_definitions_and_references():
     analysis = analyze("x = 1\ndef f(x):\n    return x\nx += y\nä = x; x\n")
     assert At(analysis.definitions("x")) == ["1:1 x", "2:7 x", "4:1 x"]
+    assert analysis.definitions("\udc80") == analysis.definitions("x\0") == ()
     assert At(analysis.references(analysis.occurrence_at(5, 5))) == ["1:1 x", "4:1 x", "5:5 x", "5:8 x"]
     assert At(analysis.references(analysis.occurrence_at(3, 12))) == ["2:7 x", "3:12 x"]
     assert At(analysis.references(analysis.occurrence_at(4, 6))) == ["4:6 y"]

@@ -15,6 +15,7 @@
 #include "face/parquet_part.h"
 #include "face/settings.h"
 #include "face/source_batch.h"
+#include "host/arguments.h"
 #include "host/refuse_new.h"
 #include "host/text.h"
 
@@ -48,8 +49,14 @@ void BindRange(nb::module_& module) {
         "A piece of a text. Rows and columns count from 1, columns in characters; the end is "
         "after the last character.",
         nb::pooled());
-    range.def(nb::init<uint32_t, uint32_t, uint32_t, uint32_t>(), "row"_a, "column"_a, "end_row"_a,
-              "end_column"_a);
+    range.def(
+        "__init__",
+        [](CRange* self, nb::handle row, nb::handle column, nb::handle end_row, nb::handle end_column) {
+            new (self) CRange{CountArgument(row, "row"), CountArgument(column, "column"),
+                              CountArgument(end_row, "end_row"), CountArgument(end_column, "end_column")};
+        },
+        "row"_a, "column"_a, "end_row"_a, "end_column"_a,
+        nb::sig("def __init__(self, row: int, column: int, end_row: int, end_column: int) -> None"));
     range.def_ro("row", &CRange::row, "The row of its first character.");
     range.def_ro("column", &CRange::column, "The column of its first character.");
     range.def_ro("end_row", &CRange::end_row, "The row of its last character.");
@@ -256,7 +263,10 @@ void BindFace(nb::module_& module) {
     BindNamesOfAnalysis(analysis);
     BindSignaturesOfAnalysis(analysis);
     analysis.def(
-        "table", [](const CAnalysis& self, std::string_view name) { return TableOf(*self.file, name); },
+        "table",
+        [](const CAnalysis& self, nb::handle name) {
+            return TableOf(*self.file, CUtf8(StrArgument(name, "name")));
+        },
         "name"_a, nb::sig("def table(self, name: str) -> Table"),
         "One of the tables of docs/tables.md, such as \"lines\", whole; ValueError for an "
         "unknown name.");

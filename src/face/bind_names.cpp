@@ -186,8 +186,8 @@ void BindNamesOfAnalysis(nb::class_<CAnalysis>& analysis) {
     analysis.def(
         "definitions",
         [](const CAnalysis& self, nb::handle name) {
-            const nb::str text = StrArgument(name, "name");
-            return TupleOf(self.file, QueriesOf(*self.file).Definitions(text.c_str()));
+            const CUtf8 text(StrArgument(name, "name"));
+            return TupleOf(self.file, QueriesOf(*self.file).Definitions(text));
         },
         "name"_a, nb::sig("def definitions(self, name: str) -> tuple[Occurrence, ...]"),
         "Where the name gets a value, in any scope. Which of these runs isn't known.");

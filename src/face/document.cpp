@@ -131,8 +131,7 @@ std::string_view CDocument::Between(const CRowColumn& start, const CRowColumn& e
 
 void CDocument::_CheckRow(const char* argument, const CRowColumn& place) const {
     if (place.row < 1 || place.row > RowCount())
-        Refuse(argument, place,
-               ": there is no row " + std::to_string(place.row) + ", but " + std::to_string(RowCount()));
+        Refuse(argument, place, ": the last row is " + std::to_string(RowCount()));
 }
 
 uint32_t CDocument::_OffsetOf(const char* argument, const CRowColumn& place, EUnit unit) const {

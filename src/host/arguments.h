@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <climits>
+#include <cstdint>
 #include <string>
 
 #include "host/errors.h"
@@ -33,6 +34,13 @@ inline int IntArgument(nb::handle value, const char* name) {
     const long long number = PyLong_AsLongLongAndOverflow(value.ptr(), &overflow);
     if (overflow != 0) return overflow < 0 ? INT_MIN : INT_MAX;
     return static_cast<int>(std::clamp<long long>(number, INT_MIN, INT_MAX));
+}
+
+// A number from zero; ValueError for less.
+inline uint32_t CountArgument(nb::handle value, const char* name) {
+    const int number = IntArgument(value, name);
+    if (number < 0) RaiseHost(PyExc_ValueError, (std::string(name) + " must be at least 0").c_str());
+    return static_cast<uint32_t>(number);
 }
 
 // An instance of a bound class; `type` is its name for the host, with its article.
