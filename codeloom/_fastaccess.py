@@ -1,7 +1,7 @@
 """Fast access to bytes, numbers, the clock and tokens.
 
 Among them are the classification of tokens, `GetTokenType` with its numbers `kTokenId_...`, and
-`CNonNestedSearch`, which skips the strings and brackets of Python source.
+`CNonNestedSearch`, which skips the strings and parentheses of Python source.
 """
 
 import time

@@ -1,4 +1,4 @@
-"""The tokens of one logical line with their places in the text, and the brackets that they are in."""
+"""The tokens of one logical line with their places in the text, and the parentheses that they are in."""
 
 from collections.abc import Iterator, Sequence
 from typing import NamedTuple
@@ -63,7 +63,7 @@ def _place_of(line: Line, rows: Sequence[str], text: str, row: int, column: int)
 
 
 def bracket_pairs(pieces: Sequence[Piece]) -> Iterator[tuple[Piece, Piece]]:
-    """Each opening bracket with the one that closes it, the inner ones first."""
+    """Each opening parenthesis with the one that closes it, the inner ones first."""
     open_ones: list[Piece] = []
     for piece in pieces:
         if piece.text in CLOSER_OF:

@@ -144,7 +144,7 @@ def _colon(patient: Patient) -> Iterator[Remedy]:
 
 
 def _closer(patient: Patient) -> Iterator[Remedy]:
-    """The closing bracket: at the end of a row, before the colon of a header, after the last item."""
+    """The closing parenthesis: at the end of a row, before the colon of a header, after the last item."""
     opener = patient.text[:1]
     closer = CLOSER_OF.get(opener)
     if closer is None:
@@ -177,7 +177,7 @@ def _comma(patient: Patient) -> Iterator[Remedy]:
 
 
 def _quote(patient: Patient) -> Iterator[Remedy]:
-    """The quote at the end of the row: in place of another kind, before the closing brackets, or last."""
+    """The quote at the end of the row: in place of another kind, before the closing parentheses, or last."""
     closed = re.match(r"close it with (\"+|'+)$", patient.hint)
     row, text = patient.range.row, patient.row_text
     if closed is not None:

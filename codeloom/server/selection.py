@@ -1,4 +1,4 @@
-"""What is selected step by step: the name, its chain, the brackets, the line, its block, the text."""
+"""What is selected step by step: the name, its chain, the parentheses, the line, its block, the text."""
 
 from collections.abc import Iterator
 from typing import TYPE_CHECKING

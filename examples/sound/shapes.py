@@ -1,4 +1,4 @@
-# Python 3.10: match, a bracketed with, unions of types.
+# Python 3.10: match, `with` in parentheses, unions of types.
 from dataclasses import dataclass
 
 
