@@ -146,7 +146,7 @@ class TestItems:
         (lambda: analyze("").unused(parameters=1), TypeError, "parameters must be a bool, not int"),
         (lambda: read_notebook(3), TypeError, "path must be"),
         (lambda: analyze_file("a\0b"), ValueError, r"path holds a NUL: 'a\\x00b'"),
-        (lambda: analyze("").table("\udc80"), ValueError, ""),
+        (lambda: analyze("").table("\udc80"), ValueError, "."),
         (lambda: analyze("").table(3), TypeError, "name must be a str, not int"),
         (lambda: Range("1", 1, 1, 1), TypeError, "row must be an int, not str"),
         (lambda: Range(1, 1, -1, 1), ValueError, "end_row must be at least 0"),
