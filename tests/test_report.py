@@ -360,6 +360,21 @@ def test_links_lead_to_rows_and_codes(page_file, visit):
     assert page.locator(".problem .place").last.inner_text() == "cell 3, 2:16"
     page.goto(f"{page_file.as_uri()}#folder-src/pkg")
     page.locator("#found", has_text="in src/pkg").wait_for()
+    assert page.locator("[role=treeitem][aria-selected=true] > .label").inner_text().split() == [
+        "pkg",
+        "2",
+        "problems",
+    ]
+
+
+@IN_BROWSER
+def test_folders_of_absolute_paths(tmp_path, visit):
+    write(tmp_path, {"elsewhere/a/b.py": "x = )\n", "elsewhere/c/d/e.py": "x = 1\n", "here/page.html": ""})
+    path = report_on(tmp_path / "here", str(tmp_path / "elsewhere"))
+    page = visit(path, f"#folder-{tmp_path}/elsewhere/c/d")
+    folders = page.locator("[role=treeitem] > .label > .name-of-folder").all_text_contents()
+    assert folders == ["all files", f"{tmp_path}/elsewhere", "a", "c/d"]
+    assert page.locator("#list .path").all_text_contents() == [f"{tmp_path}/elsewhere/c/d/e.py"]
 
 
 @IN_BROWSER

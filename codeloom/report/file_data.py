@@ -19,15 +19,15 @@ def shown_path(path: str) -> str:
     return printable_path(portable_path(path))
 
 
-def summary_fields(source: Source, findings: Sequence[Finding], most: int) -> dict[str, Any]:
-    """A file in the list of all: its counts, at most so many problems, and its names to search."""
+def summary_fields(source: Source, findings: Sequence[Finding], shown: Sequence[Finding]) -> dict[str, Any]:
+    """A file in the list of all: its counts, the problems that are shown, and its names to search."""
     severities = Counter(finding.severity for finding in findings)
     fields = {
         "path": shown_path(source.path),
         "lines": len(source.analysis.lines),
         "errors": severities["error"],
         "warnings": severities["warning"],
-        "problems": [_problem_fields(finding) for finding in findings[:most]],
+        "problems": [_problem_fields(finding) for finding in shown],
         "names": _names(source),
     }
     return {key: value for key, value in fields.items() if value or key == "path"}

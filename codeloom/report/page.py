@@ -50,7 +50,7 @@ class Page:
         """Take in a file with its problems."""
         shown = findings[: min(_MOST_OF_FILE, self._room)]
         self._room -= len(shown)
-        fields = summary_fields(source, findings, len(shown))
+        fields = summary_fields(source, findings, shown)
         self._counts.add(fields["path"], findings)
         if shown or self._is_whole:
             # As text, which takes less memory than the objects.

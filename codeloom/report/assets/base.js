@@ -9,7 +9,7 @@ function make(tag, attributes = {}, ...children) {
   for (const [name, value] of Object.entries(attributes)) {
     if (value !== undefined && value !== null && value !== false) element.setAttribute(name, value);
   }
-  element.append(...children.filter((child) => child !== null && child !== undefined));
+  element.append(...children.filter((child) => child)); // null and empty texts are nothing
   return element;
 }
 
@@ -44,4 +44,9 @@ function placeOf(problem) {
   return problem.cell ? `cell ${problem.cell[0]}, ${problem.cell[1]}:${column}` : `${row}:${column}`;
 }
 
-const fileLink = (file, row) => `#file-${encodeURI(file.path).replace(/#/g, "%23")}${row ? `:${row}` : ""}`;
+/** The address within the page of a file, a folder and so on. */
+const fragment = (kind, text) => `#${kind}-${encodeURI(text).replaceAll("#", "%23")}`;
+const fileLink = (file, row) => fragment("file", file.path) + (row ? `:${row}` : "");
+
+/** A count that stands out by what it counts. */
+const badge = (kind, ...content) => make("span", { class: `badge ${kind}` }, ...content);

@@ -111,17 +111,17 @@ class FileList {
 
   summary(file) {
     const slash = file.path.lastIndexOf("/") + 1;
-    const badge = (count, severity) => (count ? make("span", { class: `badge ${severity}` }, counted(count, severity)) : null);
+    const folder = make("span", { class: "folder" }, file.path.slice(0, slash));
     return make(
       "summary",
       {},
-      make("span", { class: "path" }, make("span", { class: "folder" }, file.path.slice(0, slash)), file.path.slice(slash)),
+      make("span", { class: "path" }, folder, file.path.slice(slash)),
       make(
         "span",
         { class: "badges" },
-        badge(file.errors, "error"),
-        badge(file.warnings, "warning"),
-        file.count ? null : make("span", { class: "badge sound" }, "no problems"),
+        file.errors ? badge("error", counted(file.errors, "error")) : null,
+        file.warnings ? badge("warning", counted(file.warnings, "warning")) : null,
+        file.count ? null : badge("sound", "no problems"),
         make("span", { class: "lines" }, counted(file.lines, "line")),
       ),
     );
@@ -137,10 +137,13 @@ class FileList {
       details.view = new SourceView(file, data);
       details.append(details.view.element);
       details.view.element.querySelectorAll(".plain").forEach(fillWhenNear);
-    } else {
-      details.append(make("p", { class: "note" }, file.count ? "" : "The page holds the rows around problems, and there are none here."));
+    } else if (!file.count) {
+      details.append(make("p", { class: "note" }, "The page holds the rows around problems, and there are none here."));
     }
-    if (omitted) details.append(make("p", { class: "note" }, `${counted(omitted, "problem")} more: run codeloom check on the file.`));
+    if (omitted) {
+      const text = `${counted(omitted, "problem")} more: run codeloom check on the file.`;
+      details.append(make("p", { class: "note" }, text));
+    }
   }
 
   /** The names that a search has found in a file; one whose row is in the page leads there. */

@@ -1,15 +1,17 @@
 // The tree of folders. One of them is chosen, and the list shows the files below it.
 
-/** Folders by name, each {name, path, files, problems, folders}; those with nothing beside them are joined. */
+const newFolder = (name, path) => ({ name, path, files: 0, problems: 0, folders: new Map() });
+
+/** The folder that holds all, with those below it. */
 function folderTree() {
-  const root = { name: "all files", path: "", files: 0, problems: 0, folders: new Map() };
+  const root = newFolder("all files", "");
   for (const file of allFiles) {
-    const parts = file.path.split("/").slice(0, -1);
     let folder = root;
     count(folder, file);
-    for (const [i, name] of parts.entries()) {
-      const path = parts.slice(0, i + 1).join("/");
-      if (!folder.folders.has(name)) folder.folders.set(name, { name, path, files: 0, problems: 0, folders: new Map() });
+    for (let end = file.path.indexOf("/", 1); end > 0; end = file.path.indexOf("/", end + 1)) {
+      const path = file.path.slice(0, end);
+      const name = folder === root ? path : path.slice(folder.path.length + 1);
+      if (!folder.folders.has(name)) folder.folders.set(name, newFolder(name, path));
       folder = folder.folders.get(name);
       count(folder, file);
     }
@@ -22,6 +24,7 @@ function count(folder, file) {
   folder.problems += file.count;
 }
 
+/** A folder whose only content is another one, as one with that. */
 function joined(folder) {
   const folders = [...folder.folders.values()].map(joined);
   const [only] = folders;
@@ -30,10 +33,6 @@ function joined(folder) {
   }
   return { ...folder, folders };
 }
-
-/** A number, with its noun for those who can't see what it belongs to. */
-const badge = (count, noun, severity) =>
-  make("span", { class: `badge ${severity}` }, count.toLocaleString("en"), make("span", { class: "for-ears" }, ` ${noun}${count === 1 ? "" : "s"}`));
 
 class Folders {
   constructor(onChosen) {
@@ -55,18 +54,23 @@ class Folders {
 
   /** A folder, open when it is to be or when there is nothing beside it. */
   item(folder, isOpen) {
+    const { problems } = folder;
+    const noun = make("span", { class: "for-ears" }, problems === 1 ? " problem" : " problems");
     const label = make(
       "span",
       { class: "label" },
       make("span", { class: "arrow", "aria-hidden": "true" }),
       make("span", { class: "name-of-folder" }, folder.name),
-      folder.problems ? badge(folder.problems, "problem", "error") : make("span", { class: "lines" }, counted(folder.files, "file")),
+      problems
+        ? badge("error", problems.toLocaleString("en"), noun)
+        : make("span", { class: "lines" }, counted(folder.files, "file")),
     );
     const item = make("li", { role: "treeitem", tabindex: "-1", "aria-selected": "false" }, label);
     item.dataset.path = folder.path;
     if (folder.folders.length) {
       item.setAttribute("aria-expanded", String(isOpen));
-      item.make = () => make("ul", { role: "group" }, ...folder.folders.map((each) => this.item(each, folder.folders.length === 1)));
+      const isAlone = folder.folders.length === 1;
+      item.make = () => make("ul", { role: "group" }, ...folder.folders.map((each) => this.item(each, isAlone)));
       if (isOpen) item.append(item.make());
     }
     return item;
@@ -91,8 +95,13 @@ class Folders {
     this.onChosen(item.dataset.path);
   }
 
-  /** Show which folder is chosen. */
+  /** Show which folder is chosen, and open those that it is in. */
   mark(path) {
+    const isAbove = (item) => !item.dataset.path || path.startsWith(`${item.dataset.path}/`);
+    for (let item = this.tree.firstChild; item && path; ) {
+      this.open(item, true);
+      item = [...(item.lastChild.children ?? [])].find((each) => each.matches("li") && isAbove(each));
+    }
     for (const item of this.tree.querySelectorAll("[role=treeitem]")) {
       item.setAttribute("aria-selected", String(item.dataset.path === path));
     }
@@ -109,13 +118,14 @@ class Folders {
     const seen = [...this.tree.querySelectorAll("[role=treeitem]")].filter((each) => each.offsetParent);
     const i = seen.indexOf(item);
     const isOpen = item.getAttribute("aria-expanded") === "true";
+    const parent = item.parentElement.closest("[role=treeitem]");
     const actions = {
       ArrowDown: () => this.focus(seen[i + 1] ?? item),
       ArrowUp: () => this.focus(seen[i - 1] ?? item),
       Home: () => this.focus(seen[0]),
       End: () => this.focus(seen.at(-1)),
       ArrowRight: () => (isOpen ? this.focus(seen[i + 1] ?? item) : this.open(item, true)),
-      ArrowLeft: () => (isOpen ? this.open(item, false) : this.focus(item.parentElement.closest("[role=treeitem]") ?? item)),
+      ArrowLeft: () => (isOpen ? this.open(item, false) : this.focus(parent ?? item)),
       Enter: () => this.choose(item),
       " ": () => this.choose(item),
     };

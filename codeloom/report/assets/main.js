@@ -2,7 +2,7 @@
 
 const list = new FileList();
 const folders = new Folders((folder) => {
-  history.replaceState(null, "", folder ? `#folder-${encodeURI(folder).replace(/#/g, "%23")}` : "#files");
+  history.replaceState(null, "", folder ? fragment("folder", folder) : "#files");
   chooseFolder(folder);
 });
 

@@ -22,8 +22,9 @@ function showTip(name) {
   hideTip();
   const { data, fact, records } = name.known;
   const [role, where] = fact < 0 ? ["", ""] : data.facts[fact];
+  const title = make("strong", {}, name.textContent);
   tip.replaceChildren(
-    make("p", {}, make("strong", {}, name.textContent), role ? ` ${role}` : "", where ? make("span", {}, ` in ${where}`) : null),
+    make("p", {}, title, role ? ` ${role}` : "", where ? make("span", {}, ` in ${where}`) : null),
     ...(data.records[records] ?? []).map((said) => make("p", { class: "said" }, said)),
   );
   tip.hidden = false;

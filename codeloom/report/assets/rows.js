@@ -3,7 +3,7 @@
 // Rows that become elements at once, as they come near the window.
 const CHUNK = 100;
 
-/** The rows of one file that are in the page. A row is {text, start, cutAfter, names, label}. */
+/** The rows of one file that are in the page. */
 class FileRows {
   constructor(data) {
     this.data = data;
@@ -33,15 +33,16 @@ class FileRows {
 
   labelOf(number) {
     const { cell, label } = this.row(number);
-    return cell ? `cell ${cell[0]}, row ${label}` : `row ${label}`;
+    return cell ? `cell ${cell}, row ${label}` : `row ${label}`;
   }
 
+  /** A row: its text with the characters cut before and after it, its names, its cell and its number there. */
   row(number) {
     const i = this.place.get(number);
     const row = this.data.rows[i];
     const [start, text, cutAfter] = typeof row === "string" ? [0, row, 0] : row;
-    const cell = this.data.cells?.[i];
-    return { number, start, text, cutAfter, names: this.data.names[i], cell, label: cell ? cell[1] : number };
+    const [cell, label] = this.data.cells?.[i] ?? [null, number];
+    return { number, start, text, cutAfter, names: this.data.names[i], cell, label };
   }
 }
 
@@ -72,44 +73,52 @@ function marksOf(file) {
   return marks;
 }
 
-/** A row's text as nodes: cut where a mark or a name begins or ends. */
-function rowNodes(data, row, marks) {
-  const characters = charactersOf(row.text);
-  const spans = marks.map(([first, end, kind]) => {
-    const start = Math.min(Math.max(first - row.start, 0), characters.length);
-    return [start, Math.max(Math.min(end - row.start, characters.length), start + 1), kind];
+/** The marks of a row as [start, end, kind] in its text, each of one character or more. */
+function marksIn(row, length, marks) {
+  return marks.map(([first, end, kind]) => {
+    const start = Math.min(Math.max(first - row.start, 0), length);
+    return [start, Math.max(Math.min(end - row.start, length), start + 1), kind];
   });
+}
+
+/** The names of a row as [start, end, fact, records] in its text. */
+function namesIn(row, length) {
   const names = [];
   for (let i = 0; i < row.names.length; i += 4) {
-    const start = row.names[i] - row.start;
-    const end = start + row.names[i + 1];
-    if (start >= 0 && end <= characters.length) names.push([start, end, row.names[i + 2], row.names[i + 3]]);
+    const [first, size, fact, records] = row.names.slice(i, i + 4);
+    const start = first - row.start;
+    if (start >= 0 && start + size <= length) names.push([start, start + size, fact, records]);
   }
-  const cuts = [...new Set([0, characters.length, ...spans.flatMap(([a, b]) => [a, b]), ...names.flatMap(([a, b]) => [a, b])])];
-  cuts.sort((a, b) => a - b);
-  const nodes = row.start ? ["…"] : [];
-  let nextName = 0;
-  for (let i = 0; i + 1 < cuts.length; i++) {
-    const [from, to] = [cuts[i], cuts[i + 1]];
+  return names;
+}
+
+/** A row's text as nodes: cut where a mark or a name begins or ends. */
+function rowNodes(data, row, allMarks) {
+  const characters = charactersOf(row.text);
+  const marks = marksIn(row, characters.length, allMarks);
+  const names = namesIn(row, characters.length);
+  const ends = [...marks, ...names].flatMap(([start, end]) => [start, end]);
+  const cuts = [...new Set([0, characters.length, ...ends])].sort((a, b) => a - b);
+  const nodes = cuts.slice(1).map((to, i) => {
+    const from = cuts[i];
+    const isIn = ([start, end]) => start <= from && to <= end;
     const text = textOf(characters, from, to).padEnd(to - from, " ");
-    while (nextName < names.length && names[nextName][1] <= from) nextName++;
-    const name = names[nextName];
-    const mark = spans.find(([start, end]) => start <= from && to <= end);
-    let node = name && name[0] <= from ? nameNode(data, text, name[2], name[3]) : text;
-    if (mark) node = make("mark", { class: mark[2] }, node);
-    nodes.push(node);
-  }
-  if (row.cutAfter) nodes.push("…");
-  return nodes;
+    const name = names.find(isIn);
+    const mark = marks.find(isIn);
+    const node = name ? nameNode(data, text, name[2], name[3]) : text;
+    return mark ? make("mark", { class: mark[2] }, node) : node;
+  });
+  return [row.start ? "…" : "", ...nodes, row.cutAfter ? "…" : ""];
 }
 
 /** One row of source, with its number. */
 function rowElement(file, data, row, marks) {
   const said = marks.map((mark) => mark[3]).filter(Boolean);
+  const link = { class: "number", href: fileLink(file, row.number), tabindex: "-1", "aria-label": `row ${row.label}` };
   return make(
     "div",
     { class: "row", "data-row": row.number },
-    make("a", { class: "number", href: fileLink(file, row.number), tabindex: "-1", "aria-label": `row ${row.label}` }, String(row.label)),
+    make("a", link, String(row.label)),
     make("code", {}, ...rowNodes(data, row, marks)),
     said.length ? make("span", { class: "said" }, said.join("; ")) : null,
   );
@@ -119,7 +128,10 @@ function rowElement(file, data, row, marks) {
 function problemElement(file, data, problem) {
   const related = (problem.related ?? [])
     .filter(([row]) => row !== problem.at[0]) // on its own row it is said there
-    .map(([row, , , , said]) => make("li", {}, `${said}: `, make("a", { href: fileLink(file, row) }, data.labelOf(row))));
+    .map(([row, , , , said]) => {
+      const link = make("a", { href: fileLink(file, row) }, data.labelOf(row));
+      return make("li", {}, `${said}: `, link);
+    });
   return make(
     "div",
     { class: `problem ${problem.severity}` },
@@ -182,7 +194,9 @@ class SourceView {
 
   chunks(first, last) {
     const chunks = [];
-    for (let row = first; row <= last; row += CHUNK) chunks.push(this.chunk(row, Math.min(row + CHUNK - 1, last)));
+    for (let row = first; row <= last; row += CHUNK) {
+      chunks.push(this.chunk(row, Math.min(row + CHUNK - 1, last)));
+    }
     return chunks;
   }
 
@@ -190,7 +204,8 @@ class SourceView {
   chunk(first, last) {
     const rows = [];
     for (let row = first; row <= last; row++) rows.push(this.data.row(row).text);
-    const element = make("pre", { class: "stretch plain", "data-first": first, "data-last": last }, rows.join("\n"));
+    const attributes = { class: "stretch plain", "data-first": first, "data-last": last };
+    const element = make("pre", attributes, rows.join("\n"));
     element.fill = () => {
       const rows = this.stretch(first, last);
       element.replaceWith(rows);
@@ -209,7 +224,10 @@ class SourceView {
     let cell = null;
     for (let number = first; number <= last; number++) {
       const row = this.data.row(number);
-      if (row.cell && row.cell[0] !== cell) element.append(make("p", { class: "cell" }, `cell ${(cell = row.cell[0])}`));
+      if (row.cell !== cell) {
+        cell = row.cell;
+        element.append(make("p", { class: "cell" }, `cell ${cell}`));
+      }
       element.append(rowElement(this.file, this.data, row, this.marks.get(number) ?? []));
       for (const problem of this.problems.get(number) ?? []) {
         element.append(problemElement(this.file, this.data, problem));
