@@ -82,7 +82,7 @@ asan-short: $(ASAN)/.built
 
 # Engines for many machines, which are too large to be installed for all tests. Spark needs Java.
 engines: build
-	$(BIN)/pip install --quiet "ray>=2.40" "pyspark>=4" "dask[dataframe]>=2025.1"
+	$(BIN)/pip install --quiet "ray[data]>=2.60" "pyspark>=4" "dask[dataframe]>=2025.1"
 	$(BIN)/pytest tests/ray_index.py tests/engine_recipes.py
 
 leaks: build
