@@ -122,3 +122,21 @@ class TestChange:
 def test_it_is_lazy_to_import():
     assert codeloom.Document is Document
     assert Document(TEXT).analysis.problems == analyze(TEXT).problems
+
+
+def test_a_fault_that_is_reported_once_in_a_block():
+    text = "return\n" + "x = 1\n" * 60 + "return\n"
+    assert len(Document(text).analysis.problems) == len(analyze(text).problems) == 1
+
+
+def test_a_method_of_a_long_class():
+    methods = "".join(f"    def m{i}(self):\n        return __x\n\n" for i in range(40))
+    document = Document(f"class C:\n{methods}\nx = 1\n")
+    for place, new_text in [
+        ((60, 5), "x"),
+        ((60, 5), "y = ("),
+        ((60, 9), "nonlocal m1\n"),
+        ((123, 1), "else:"),
+    ]:
+        document.edit(place, place, new_text)
+        compare(document.analysis, analyze(document.text))

@@ -70,6 +70,7 @@ CPiece::CPiece(std::string_view file_text, CFilePart part, uint32_t start, const
 std::unique_ptr<const CPieceNames> MakeNames(CFilePart part, uint32_t start) {
     auto made = std::make_unique<CPieceNames>();
     made->names = std::move(part.analysis.names);
+    made->open_scope = part.open_scope;
     COccurrences& found = made->names.occurrences;
     for (COccurrence& item : found.items) {
         item.start -= start;

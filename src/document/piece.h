@@ -15,6 +15,7 @@ namespace codeloom {
 // What a piece says of names.
 struct CPieceNames {
     CTextNames names;
+    uint32_t open_scope = 0;  // as CFilePart has it
     CSignatures signatures;
 };
 

@@ -237,7 +237,7 @@ void CPieces::_JoinNames(std::string_view text, CFileAnalysis& analysis) const {
             piece.names = MakeNames(AnalyzeNamesOfPart(text, _fSettings, literal_names, start,
                                                        start + piece.Length(), piece.state),
                                     start);
-        parts.push_back({&piece.names->names, start});
+        parts.push_back({&piece.names->names, start, piece.state.IsInClass(), piece.names->open_scope});
         signatures.Append(piece.names->signatures, start, place.line);
     });
     analysis.names = JoinNames(parts, _fSettings.names);

@@ -50,6 +50,16 @@ bool HasTellingName(const CRawLogical& logical) {
                        [&](const CRawToken& token) { return logical.Text(token) == "__future__"; });
 }
 
+// Of what a line with a fault may change, one right in the class around too.
+bool IsOfBinding(const CProblem& problem) {
+    return problem.code == ECode::kNonlocalWithoutBinding || problem.code == ECode::kNonlocalTypeParameter;
+}
+
+uint32_t RowStartOf(const CRawLogical& logical) {
+    const CRawToken& first = logical.tokens.front();
+    return logical.StartOf(first) - static_cast<uint32_t>(first.position.col);
+}
+
 const CUnreadable kAllReadable;
 
 class CEndAt final : public CPartEnd {
@@ -119,7 +129,8 @@ class CFileAnalyzer final : CTreeObserver {
     void _TakePrintFunction();
     void _BeginLine(const CRawLogical& logical);
     void _AnalyzeBegunLine(const CRawLogical& logical);
-    bool _EndsBefore(const CRawLogical& logical, CPartEnd& part_end);
+    bool _EndsBefore(const CRawLogical& logical, const CTokenizer& tokenizer, CPartEnd& part_end);
+    bool _DeclaresForOthers(uint32_t open_scope) const;
     CFilePart _EndPart(const CLexer& lexer, uint32_t end, uint32_t looked_at);
     CPartState _State() const {
         return {_fChecker.State(), _fHasPrintFunction,
@@ -157,6 +168,7 @@ class CFileAnalyzer final : CTreeObserver {
     bool _fDefersAnnotations = false;  // before the part
     bool _fIsFileTooLong = false;
     bool _fIsPart = false;
+    bool _fBeginsInClass = false;
     uint32_t _fPartStart = 0;
     std::vector<CLineFault> _fFaults;  // of a part
     bool _fIsCollecting = false;       // names of the line under way
@@ -196,15 +208,15 @@ CFilePart CFileAnalyzer::RunPart(uint32_t start, const CPartState& state, std::v
     _fChecker.Resume(state.check, std::move(closed));
     if (state.has_print_function) _TakePrintFunction();
     _fDefersAnnotations = state.defers_annotations;
-    if (_fNames) _fNames->SetDefersAnnotations(state.defers_annotations);
-    CTokenizer tokenizer(_fText, start);
+    _fBeginsInClass = state.IsInClass();
+    if (_fNames) _fNames->Resume(state.defers_annotations, _fBeginsInClass);
+    CTokenizer tokenizer(_fText, start, _fBeginsInClass);
     CRawLogical logical;
     for (bool is_fresh = false; tokenizer.NextLogical(logical); is_fresh = tokenizer.IsFresh()) {
         _BeginLine(logical);
-        if (is_fresh && _EndsBefore(logical, part_end)) {
+        if (is_fresh && _EndsBefore(logical, tokenizer, part_end)) {
             _fResult.lines.CutTo(_fResult.lines.size() - 1);
-            return _EndPart(tokenizer.Lexer(), logical.StartOf(logical.tokens.front()),
-                            logical.EndOf(logical.tokens.back()));
+            return _EndPart(tokenizer.Lexer(), RowStartOf(logical), logical.EndOf(logical.tokens.back()));
         }
         _AnalyzeBegunLine(logical);
     }
@@ -215,21 +227,24 @@ CFilePart CFileAnalyzer::RunPart(uint32_t start, const CPartState& state, std::v
 
 // Only before a line that is judged by itself. One that begins with a string may be judged by what is before
 // it, where its quotes are in doubt; a comment after a `def` may be the hint of that.
-bool CFileAnalyzer::_EndsBefore(const CRawLogical& logical, CPartEnd& part_end) {
+bool CFileAnalyzer::_EndsBefore(const CRawLogical& logical, const CTokenizer& tokenizer, CPartEnd& part_end) {
     const CRawToken& first = logical.tokens.front();
     const size_t line_count = _fResult.lines.size() - 1;
-    if (first.position.col != 0 || (first.type != kTokenId_NAME && first.type != kTokenId_AT)) return false;
+    if (first.type != kTokenId_NAME && first.type != kTokenId_AT) return false;
     if (line_count == 0 || _fResult.lines[line_count - 1].type == ELogicalType::kFunctionDef) return false;
-    if (!_fChecker.Blocks().BeginsAnew()) return false;
-    const uint32_t start = logical.StartOf(first);
+    const int32_t column = first.position.col;
+    if (column != 0 && (!logical.is_indented_by_spaces || !tokenizer.IsInClassOnly())) return false;
+    if (!_fChecker.Blocks().BeginsAnew(column)) return false;
+    const uint32_t start = RowStartOf(logical);
     const bool has_problem = std::any_of(_fResult.problems.begin(), _fResult.problems.end(),
                                          [&](const CProblem& problem) { return problem.end > start; });
     return !has_problem && part_end.EndsAt(start, _State(), line_count);
 }
 
 CFilePart CFileAnalyzer::_EndPart(const CLexer& lexer, uint32_t end, uint32_t looked_at) {
-    _fNeedsAllNames = _fNames && DeclaresInModule(_fResult.names);
     CFilePart part;
+    if (_fNames && end < _fText.size()) part.open_scope = _fNames->ScopeAround(_fChecker.Blocks());
+    _fNeedsAllNames = _fNames && _DeclaresForOthers(part.open_scope);
     _PlaceFaults();
     const size_t count = _fResult.problems.size();
     if (_fNames) _FinishNames();
@@ -237,6 +252,8 @@ CFilePart CFileAnalyzer::_EndPart(const CLexer& lexer, uint32_t end, uint32_t lo
     part.late_problems.assign(std::make_move_iterator(first_late),
                               std::make_move_iterator(_fResult.problems.end()));
     _fResult.problems.resize(count);
+    if (_fBeginsInClass || part.open_scope != 0)
+        _fNeedsAllNames |= std::any_of(part.late_problems.begin(), part.late_problems.end(), IsOfBinding);
     part.faults = std::move(_fFaults);
     part.end = end;
     part.state = _State();
@@ -250,9 +267,15 @@ CFilePart CFileAnalyzer::_EndPart(const CLexer& lexer, uint32_t end, uint32_t lo
     part.closed = blocks.Closed();
     part.may_have_reopened = _fPartStart > 0 && blocks.MayHaveReopened();
     part.needs_whole_text = _fNeedsAllNames || _fIsFileTooLong || blocks.TakenBackFrom() < _fPartStart ||
-                            (part.may_have_reopened && _fHasTellingNames);
+                            blocks.FollowsUnknown() || (part.may_have_reopened && _fHasTellingNames);
     part.analysis = std::move(_fResult);
     return part;
+}
+
+// A declaration concerns names of other parts: one in the module, or in a class that is in others too.
+bool CFileAnalyzer::_DeclaresForOthers(uint32_t open_scope) const {
+    return DeclaresIn(0, _fResult.names) || (_fBeginsInClass && DeclaresIn(1, _fResult.names)) ||
+           (open_scope != 0 && DeclaresIn(open_scope, _fResult.names));
 }
 
 // Storage that grew bit by bit would be copied more than once.
@@ -408,7 +431,7 @@ void CFileAnalyzer::_AddProblem(ECode code, uint32_t start, uint32_t end, std::s
 void CFileAnalyzer::_FinishNames() {
     _fNames->Finish();
     BuildScopes(_fResult.names);
-    _fNeedsAllNames |= !_fWantsAllNames && DeclaresInModule(_fResult.names);
+    _fNeedsAllNames |= !_fWantsAllNames && DeclaresIn(0, _fResult.names);
     if (_fMayDeclareNames) CheckDeclarations(_fResult.names, _fSettings.version, _fResult.problems);
     if (!_fSettings.wants_names) _fResult.names = {};
 }

@@ -1,5 +1,5 @@
-// A part of a text, from one statement of the module to a later one, so that the rest needn't be analysed
-// anew when the part changes.
+// A part of a text, from one statement to a later one, each of the module or right in a class of it, so that
+// the rest needn't be analysed anew when the part changes.
 #pragma once
 
 #include <cstdint>
@@ -17,13 +17,14 @@ struct CPartState {
     bool has_print_function = false;
     bool defers_annotations = false;
 
+    bool IsInClass() const { return check.blocks.IsInClass(); }
     bool operator==(const CPartState&) const = default;
 };
 
 // Says where a part ends.
 class CPartEnd {
   public:
-    // The part may end after `line_count` lines, before the line that begins at `start`.
+    // The part may end after `line_count` lines, before the row that begins at `start`.
     virtual bool EndsAt(uint32_t start, const CPartState& state, size_t line_count) = 0;
 
   protected:
@@ -53,6 +54,8 @@ struct CFilePart {
     bool has_asked_for_literals = false;  // which the whole text says
     std::vector<CBlock> closed;           // blocks, as CBlockTracker gives them
     bool may_have_reopened = false;       // a block, which may have been closed before
+    // The scope around its end, if names are wanted; 1 is the class that it began in.
+    uint32_t open_scope = 0;
     // What it says depends on more of the text before than its state: only an analysis of the whole text is
     // right.
     bool needs_whole_text = false;

@@ -289,6 +289,7 @@ void CBlockTracker::Leave(const CRawLogical& logical, bool has_fault) {
         _fPreviousHasFault |= has_fault;
         return;
     }
+    if (Depth() == 0) _fIsClassUnknown = false;
     if (block.bare_except_end != 0 && !IsContinuation(_fHead.clause))
         block.bare_except_start = block.bare_except_end = 0;
     if (_fHead.clause != EClause::kSimple) _NoteClause(block);
@@ -316,24 +317,35 @@ bool CBlockTracker::IsInDoubt() const {
     });
 }
 
-bool CBlockTracker::BeginsAnew() const {
-    const EClause before = _fBlocks.front().previous.clause;
-    return _fBlocks.size() == 1 && !_fIsMidRow && !_fHasPlaceProblem && !IsContinuation(_fHead.clause) &&
-           _fHead.clause != EClause::kCase && before != EClause::kTry && before != EClause::kDecorator;
+bool CBlockTracker::BeginsAnew(int32_t column) const {
+    const CBlock& block = _fBlocks.back();
+    const EClause before = block.previous.clause;
+    const bool is_in_class = Depth() == 1 && block.clause == EClause::kClass && !block.is_unknown;
+    return (Depth() == 0 || is_in_class) && block.indent == CIndent{column, column} && !_fIsMidRow &&
+           !_fHasPlaceProblem && !IsContinuation(_fHead.clause) && _fHead.clause != EClause::kCase &&
+           before != EClause::kTry && before != EClause::kDecorator;
 }
 
-CModuleState CBlockTracker::State() const {
-    CModuleState state{_fBlocks.front(), _fHasTooMany, _fHasTooManyFrames};
-    state.module.previous = {};
-    state.module.bare_except_start = state.module.bare_except_end = 0;
-    state.module.takes_all = {};
+CBlockState CBlockTracker::State() const {
+    CBlockState state{_fBlocks, _fHasTooMany, _fHasTooManyFrames};
+    for (CBlock& block : state.blocks) {
+        block.previous = {};
+        block.header = {};
+        block.bare_except_start = block.bare_except_end = 0;
+        block.takes_all = {};
+        block.is_of_try = block.is_first = block.may_follow_anything = false;
+        if (!block.lacks_block) block.lacking_clause = EClause::kSimple;
+    }
+    if (state.IsInClass()) state.blocks.front().previous.clause = EClause::kClass;
     return state;
 }
 
-void CBlockTracker::Resume(const CModuleState& state, std::vector<CBlock> closed) {
+void CBlockTracker::Resume(const CBlockState& state, std::vector<CBlock> closed) {
     _fClosedBefore = std::move(closed);
-    _fBlocks = {state.module};
-    _fAreInDoubt = state.module.is_in_doubt;
+    _fBlocks = state.blocks;
+    _fAreInDoubt =
+        std::any_of(_fBlocks.begin(), _fBlocks.end(), [](const CBlock& block) { return block.is_in_doubt; });
+    _fIsClassUnknown = state.IsInClass();
     _fHasTooMany = state.has_too_many;
     _fHasTooManyFrames = state.has_too_many_frames;
 }

@@ -58,13 +58,15 @@ struct CBlock {
     bool operator==(const CBlock&) const = default;
 };
 
-// What is left of the blocks where a statement of the module begins anew: no place in the text.
-struct CModuleState {
-    CBlock module = {};
+// What is left of the blocks where a statement begins anew, in the module or right in a class of it: no place
+// in the text.
+struct CBlockState {
+    std::vector<CBlock> blocks = {CBlock()};
     bool has_too_many = false;
     bool has_too_many_frames = false;
 
-    bool operator==(const CModuleState&) const = default;
+    bool IsInClass() const { return blocks.size() > 1; }
+    bool operator==(const CBlockState&) const = default;
 };
 
 class CBlockTracker {
@@ -102,16 +104,19 @@ class CBlockTracker {
     // Nothing can be said about what is around the line: a fault has put it there, or has lost a header.
     bool IsInDoubt() const;
 
-    // The line that was entered last begins a statement of the module, and no line before it matters from
-    // now on but for what State says, and for the blocks that it may reopen.
-    bool BeginsAnew() const;
-    CModuleState State() const;
+    // The line that was entered last, whose column is given, begins a statement of the module or of a class
+    // in it, and no line before it matters from now on but for what State says, and for the blocks that it
+    // may reopen.
+    bool BeginsAnew(int32_t column) const;
+    CBlockState State() const;
     // Goes on from there, at a line that begins anew. `closed` are the blocks that were closed before.
-    void Resume(const CModuleState& state, std::vector<CBlock> closed);
+    void Resume(const CBlockState& state, std::vector<CBlock> closed);
     // The blocks that were closed since, by depth of the stack the last one; at column 0 where there is none.
     const std::vector<CBlock>& Closed() const { return _fClosed; }
     // Some line has looked at what was closed, before too.
     bool MayHaveReopened() const { return _fMayHaveReopened; }
+    // Some line depends on whether a fault was in the class that it follows, and that was begun before.
+    bool FollowsUnknown() const { return _fFollowsUnknown; }
     // Problems from this byte on were taken back.
     uint32_t TakenBackFrom() const { return _fTakenBackFrom; }
 
@@ -162,6 +167,8 @@ class CBlockTracker {
     bool _fHasTooMany = false;
     bool _fHasTooManyFrames = false;
     bool _fMayHaveReopened = false;
+    bool _fIsClassUnknown = false;  // the statement before in the module is a class that was begun before
+    bool _fFollowsUnknown = false;
     uint32_t _fTakenBackFrom = UINT32_MAX;
 };
 

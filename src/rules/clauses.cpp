@@ -87,6 +87,7 @@ bool CBlockTracker::_MayBreakClause(const CBlock& block) const {
 }
 
 bool CBlockTracker::_BreaksClause(CBlock& block) {
+    _fFollowsUnknown |= _fIsClassUnknown && Depth() == 0;
     const size_t problem_count = _fProblems.size();
     _CheckClause(block);
     return _fProblems.size() > problem_count;

@@ -482,7 +482,7 @@ void CPlacementRules::_ReportMisplaced(ECode code, const CSpan& span, std::strin
                                         [](const CBlock& block) { return IsScope(block.clause); });
         const bool is_function = scope != _fBlocks->rend() && scope->clause == EClause::kDef;
         if (is_function && std::exchange(_fPlainFunction, scope->header.start) == scope->header.start) return;
-    } else if (std::exchange(_fMisplaced, code) == code) {
+    } else if (std::exchange(_fBeginning.misplaced, code) == code) {
         return;
     }
     _Report(code, span, std::move(message));

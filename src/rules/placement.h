@@ -51,6 +51,7 @@ struct CBeginning {
     bool has_statement = false;
     bool has_futures = false;  // an import from `__future__` came
     bool has_future_annotations = false;
+    ECode misplaced = ECode::kInvalidSyntax;  // reported in the block under way
 
     bool operator==(const CBeginning&) const = default;
 };
@@ -65,7 +66,8 @@ class CPlacementRules {
         if (!blocks.HaveChanged()) return;
         _fIsPlaceKnown = false;
         const EClause innermost = blocks.Innermost().clause;
-        if (_fMisplaced != ECode::kOutsideFunction || IsScope(innermost)) _fMisplaced = ECode::kInvalidSyntax;
+        ECode& misplaced = _fBeginning.misplaced;
+        if (misplaced != ECode::kOutsideFunction || IsScope(innermost)) misplaced = ECode::kInvalidSyntax;
         if (!_fFunctions.empty() || _OpensStrict(innermost)) _TrackFunctions(blocks.Blocks());
     }
 
@@ -89,7 +91,7 @@ class CPlacementRules {
     // Call once, after the last line.
     void Finish() { _TrackFunctions({}); }
 
-    // What to go on from in the module, where no function is under way.
+    // What to go on from where no function is under way.
     const CBeginning& Beginning() const { return _fBeginning; }
     void Resume(const CBeginning& beginning) { _fBeginning = beginning; }
 
@@ -151,7 +153,6 @@ class CPlacementRules {
     bool _fIsPlaceKnown = false;
     CBeginning _fBeginning;
     const std::vector<CBlock>* _fBlocks = nullptr;  // around the line
-    ECode _fMisplaced = ECode::kInvalidSyntax;      // reported in the block under way
     uint32_t _fPlainFunction = UINT32_MAX;          // the header of one that was to be asynchronous
 };
 

@@ -13,9 +13,9 @@
 
 namespace codeloom {
 
-// What of the lines before matters where a statement of the module begins anew.
+// What of the lines before matters where a statement begins anew, in the module or right in a class of it.
 struct CCheckState {
-    CModuleState blocks = {};
+    CBlockState blocks = {};
     CBeginning beginning = {};
 
     bool operator==(const CCheckState&) const = default;

@@ -14,6 +14,9 @@ class CBlockScopes {
     // A header that begins at the byte opens the scope. Call in the order of the file.
     void Add(uint32_t header_start, uint32_t scope) { _fHeaders.push_back({header_start, scope}); }
 
+    // The scope of the line before.
+    void Resume(uint32_t scope) { _fScope = scope; }
+
     // That of the innermost block whose header opens one; the module's, zero, for all others. Call for every
     // line from one of the module on.
     uint32_t ScopeOf(const CBlockTracker& tracker) {

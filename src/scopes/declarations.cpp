@@ -163,11 +163,11 @@ void CDeclarationCheck::_ReportEarlier(ECode code, uint32_t i, std::string_view 
 
 }  // namespace
 
-bool DeclaresInModule(const CTextNames& names) {
+bool DeclaresIn(uint32_t scope, const CTextNames& names) {
     const TPlainArray<COccurrence>& items = names.occurrences.items;
     for (uint32_t i = 0; i < items.size(); ++i)
         if ((items[i].role == ERole::kGlobal || items[i].role == ERole::kNonlocal) &&
-            names.ScopeOfOccurrence(i) == 0)
+            names.ScopeOfOccurrence(i) == scope)
             return true;
     return false;
 }

@@ -18,12 +18,17 @@ class CNameJoiner {
         const CTextNames& names = *part.names;
         _fStart = part.start;
         _fFirstOccurrence = static_cast<uint32_t>(_fJoined.occurrences.items.size());
-        _fFirstScope = static_cast<uint32_t>(_fJoined.occurrences.scopes.size());
+        // The class around is one of an earlier part.
+        const uint32_t left_out = part.begins_in_class ? 1 : 0;
+        _fClassBefore = part.begins_in_class ? _fOpenScope : 0;
+        _fFirstScope = static_cast<uint32_t>(_fJoined.occurrences.scopes.size()) - left_out;
         for (const COccurrence& occurrence : names.occurrences.items) _Append(occurrence);
-        for (const CInnerScope& scope : names.occurrences.scopes) _Append(scope);
+        for (size_t i = left_out; i < names.occurrences.scopes.size(); ++i)
+            _Append(names.occurrences.scopes[i]);
         for (const CLineNames& line : names.lines) _Append(line);
         for (const CLostBinding& binding : names.lost_bindings)
             _fJoined.lost_bindings.push_back({binding.name, _Moved(binding.scope)});
+        _fOpenScope = _Moved(part.open_scope);
         _fJoined.lost_names.insert(_fJoined.lost_names.end(), names.lost_names.begin(),
                                    names.lost_names.end());
     }
@@ -55,12 +60,17 @@ class CNameJoiner {
     }
 
     // The module is the same scope for all.
-    uint32_t _Moved(uint32_t scope) const { return scope == 0 ? 0 : scope + _fFirstScope; }
+    uint32_t _Moved(uint32_t scope) const {
+        if (scope == 0) return 0;
+        return scope == 1 && _fClassBefore != 0 ? _fClassBefore : scope + _fFirstScope;
+    }
 
     CTextNames& _fJoined;
     uint32_t _fStart = 0;
     uint32_t _fFirstOccurrence = 0;
     uint32_t _fFirstScope = 0;
+    uint32_t _fClassBefore = 0;  // that the part begins in, among all; zero for none
+    uint32_t _fOpenScope = 0;    // around the end of the part
 };
 
 }  // namespace

@@ -9,10 +9,13 @@
 
 namespace codeloom {
 
-// A part begins with a statement of the module. Its places count from its beginning; scopes needn't be built.
+// A part begins with a statement of the module, or right in a class, which is its scope 1 then. Its places
+// count from its beginning; scopes needn't be built.
 struct CNamePart {
     const CTextNames* names = nullptr;
     uint32_t start = 0;  // of the part, in bytes of the text
+    bool begins_in_class = false;
+    uint32_t open_scope = 0;  // around its end: the class that the next part begins in
 };
 
 // The names with their scopes, as those of the text in one go. All parts have their names in `table`.

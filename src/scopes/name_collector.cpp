@@ -70,6 +70,19 @@ uint32_t CNameCollector::_AddLostScope(const CRawLogical& line, const CStatement
     return 1;
 }
 
+// The header of the class is before the part, and has no place in it.
+void CNameCollector::Resume(bool defers_annotations, bool is_in_class) {
+    _fFinder.SetDefersAnnotations(defers_annotations);
+    if (!is_in_class) return;
+    COccurrences& found = _fNames.occurrences;
+    CInnerScope around;
+    around.kind = EScopeKind::kClass;
+    around.name = found.names->Number({});
+    found.scopes.push_back(around);
+    _fBlocks.Add(0, 1);
+    _fBlocks.Resume(1);
+}
+
 void CNameCollector::Finish() {
     std::vector<uint32_t>& lost = _fNames.lost_names;
     std::sort(lost.begin(), lost.end());

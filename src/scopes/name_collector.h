@@ -25,8 +25,12 @@ class CNameCollector {
     // Call once, after the last line. Scopes are then to be built.
     void Finish();
 
-    // Whether an import from the future defers annotations: what came before a part of a text says so.
-    void SetDefersAnnotations(bool defers) { _fFinder.SetDefersAnnotations(defers); }
+    // Goes on in a part of a text, before its first line: whether an import from the future defers
+    // annotations, and whether a class is around it, which is scope 1 then.
+    void Resume(bool defers_annotations, bool is_in_class);
+    // Around the line that was entered last.
+    uint32_t ScopeAround(const CBlockTracker& blocks) { return _fBlocks.ScopeOf(blocks); }
+    // Whether an import from the future defers annotations.
     bool DefersAnnotations() const { return _fFinder.HasDeferredAnnotations(); }
 
   private:

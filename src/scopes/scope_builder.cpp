@@ -89,6 +89,9 @@ void CScopeBuilder::_AddScopes() {
     TPlainArray<CScope>& scopes = _fScopes.scopes;
     scopes.Resize(inner.size() + 1, {});
     scopes[0].name = _fNames.occurrences.names->Number({});
+    // The class around a part of a text is on none of its lines.
+    const size_t first = _fNames.lines.empty() ? 0 : _fNames.lines[0].first_scope;
+    for (size_t i = 0; i < first; ++i) scopes[i + 1].kind = inner[i].kind;
     for (size_t line_i = 0; line_i < _fNames.lines.size(); ++line_i) {
         const CLineNames& line = _fNames.lines[line_i];
         const size_t end =

@@ -39,6 +39,12 @@ void CScopes::Visit(CRawLogical& logical, int32_t indent, bool is_mid_row) {
     }
 }
 
+// The row itself may have opened a scope.
+bool CScopes::IsInClassOnly(int32_t indent) const {
+    return !_fScopes.empty() && _fScopes[0].is_class && _fScopes[0].indent == 0 &&
+           (_fScopes.size() == 1 || _fScopes[1].indent >= indent);
+}
+
 // A comment ends no scope, since its indentation is free.
 bool CScopes::_IsInAsync(int32_t indent) const {
     for (auto scope = _fScopes.rbegin(); scope != _fScopes.rend(); ++scope) {

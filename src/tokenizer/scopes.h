@@ -14,6 +14,11 @@ class CScopes {
     // and opens the scope that it begins. `is_mid_row`: it comes after another logical of the same row.
     void Visit(CRawLogical& logical, int32_t indent, bool is_mid_row);
 
+    // Right within a class of the module, and nothing else, lies a row that is indented by `indent`.
+    bool IsInClassOnly(int32_t indent) const;
+    // Begins there.
+    void EnterClass() { _fScopes.push_back({0, false, true}); }
+
   private:
     struct CScope {
         int32_t indent;

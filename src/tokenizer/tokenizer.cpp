@@ -33,11 +33,13 @@ CRowToken LastRowToken(const CRawLogical& logical) {
 
 }  // namespace
 
-CTokenizer::CTokenizer(std::string_view text, size_t start) : _fLexer(text), _fEmbedded(text) {
+CTokenizer::CTokenizer(std::string_view text, size_t start, bool is_in_class)
+    : _fLexer(text), _fEmbedded(text) {
     if (text.size() > kMaxTextSize)
         throw std::length_error("a source text must be shorter than 2 GB; split it into several texts");
     if (start == 0 && text.starts_with(kByteOrderMark)) start = kByteOrderMark.size();
     _fPlace.pos = _fPlace.row_start = start;
+    if (is_in_class) _fScopes.EnterClass();
 }
 
 bool CTokenizer::NextLogical(CRawLogical& logical) {

@@ -38,8 +38,9 @@ class CTokenizer {
     // kMaxTextSize bytes.
     explicit CTokenizer(std::string_view text) : CTokenizer(text, 0) {}
 
-    // The same from `start` on, the beginning of a row without indentation before which IsFresh.
-    CTokenizer(std::string_view text, size_t start);
+    // The same from `start` on, the beginning of a row before which IsFresh; it isn't indented, or else
+    // IsInClassOnly was true for it.
+    CTokenizer(std::string_view text, size_t start, bool is_in_class = false);
 
     // The next logical line into `logical`, whose storage is reused; false at the end of the text.
     bool NextLogical(CRawLogical& logical);
@@ -49,6 +50,10 @@ class CTokenizer {
     bool IsFresh() const {
         return !_fMidRow && _fQuotesKnownUpTo <= _fPlace.pos && _fBrackets.KnowsNothingFrom(_fPlace.pos);
     }
+
+    // Around the line that was given last, which is indented, is a class of the module and no other
+    // definition.
+    bool IsInClassOnly() const { return _fScopes.IsInClassOnly(_fIndent); }
 
     const CLexer& Lexer() const { return _fLexer; }
 
