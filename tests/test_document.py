@@ -1,5 +1,10 @@
 """A text that changes says at any time what `analyze` says of it."""
 
+import contextlib
+import resource
+from concurrent.futures import ThreadPoolExecutor
+from pathlib import Path
+
 import pytest
 from document_edits import Editor, compare
 
@@ -57,6 +62,65 @@ class TestPositions:
             document = Document("\U0001f600", encoding=encoding)
             with pytest.raises(ValueError, match=r"start \(1, 2\) is within a character"):
                 document.edit((1, 2), document.end, "")
+
+
+ODD_TEXTS = {
+    "NUL": "x = 1\n\0y\nz = (\n",
+    "surrogates": "x = '\ud800\udc00'\ny\n",
+    "byte order mark": "\ufeffdef f():\n    pass\n",
+    "encoding declaration": "# -*- coding: latin-1 -*-\nx = 'é'\n",
+    "row ends": "a\rb\r\nc\n\rd\r\r\n",
+    "form feeds": "def f():\n    x\n\f\nclass C:\n\f    y\n",
+    "a long row": "x = [" + "'é', " * 20_000 + "]\ny\n",
+    "deep brackets": "x = " + "(" * 3_000 + "\ny\n",
+    "no row": "",
+}
+
+
+@pytest.mark.parametrize("text", ODD_TEXTS.values(), ids=ODD_TEXTS)
+def test_odd_texts(text):
+    """Each is edited at both ends and in the middle, by what may make it odd or mend it."""
+    for new_text in ("", "\n", "\r", "\0", "\ud800", "\ufeff", "'''"):
+        document = Document(text)
+        for share in (0.0, 0.5, 1.0):
+            row = 1 + int((document.row_count - 1) * share)
+            column = 1 + int(len(document.row(row)) * share)
+            document.edit((row, column), (row, column), new_text)
+            assert document.analysis.problems == analyze(document.text).problems
+        compare(document.analysis, analyze(document.text))
+
+
+def test_threads_that_edit_the_same_document():
+    """They may be refused a place that another one took away; nothing else happens."""
+    document = Document(TEXT * 20)
+
+    def edit(number):
+        for i in range(200):
+            with contextlib.suppress(ValueError):
+                change = document.edit((3 + number, 1), (3 + number, 1 + i % 2), "x = (\n"[i % 3 :])
+                assert change.lines_come is not None
+                assert len(document.analysis.occurrences) > 0
+
+    with ThreadPoolExecutor(4) as pool:
+        list(pool.map(edit, range(4)))
+    compare(document.analysis, analyze(document.text))
+
+
+def test_memory_after_many_edits():
+    """Nothing is kept of texts that are gone, not even the names in them."""
+
+    def edit(count):
+        for i in range(count):
+            end = 2, 1 + len(document.row(2))
+            document.edit((2, 5), end, f"{'name' * 100}_{i}_{count} = (a")
+            assert len(document.analysis.problems) == 1
+            if i % 10 == 0:
+                assert document.analysis.scopes
+        return int(Path("/proc/self/statm").read_text().split()[1]) * resource.getpagesize()
+
+    document = Document(TEXT * 20)
+    before = edit(2_000)
+    assert edit(8_000) - before < 2_000_000
 
 
 class TestArguments:
