@@ -113,7 +113,7 @@ CCause ConflictMarker(const CFaultyLine& line) {
         std::string_view row = RowAt(text, start);
         if (row.ends_with('\r')) row.remove_suffix(1);
         return line.ProblemAt(ECode::kConflictMarker, start, static_cast<uint32_t>(start + row.size()),
-                              "a conflict of a merge isn't resolved",
+                              "a merge conflict isn't resolved",
                               "keep what is meant, and remove the rows of the markers");
     }
     return {};
