@@ -128,7 +128,7 @@ def test_the_picture_is_what_the_command_prints():
 
 def test_every_page_is_in_the_site_and_names_the_newest_version():
     site = (ROOT / "mkdocs.yml").read_text()
-    assert [path.name for path in ROOT.glob("docs/*.md") if f"- {path.name}\n" not in site] == []
+    assert [path.name for path in ROOT.glob("docs/*.md") if f" {path.name}\n" not in site] == []
     for page in ("README.md", "docs/index.md", "docs/versions.md"):
         assert f"from {codeloom.VERSIONS[0]} to {codeloom.NEWEST}" in (ROOT / page).read_text(), page
 

@@ -201,6 +201,12 @@ def test_definitions_and_references():
         analysis.references(analyze("x").occurrences[0])
 
 
+def test_private_attributes_are_mangled():
+    text = "class _A:\n  def f(self):\n    self.__x = a.__b__ = g(lambda: self.__y)\nself.__z\n"
+    attributes = [one for one in analyze(text).occurrences if one.object]
+    assert [one.mangled for one in attributes] == ["_A__x", "__b__", "_A__y", "__z"]
+
+
 @pytest.mark.parametrize(
     ("text", "unused"),
     [

@@ -2,6 +2,7 @@
 
 #include "face/kinds.h"
 #include "host/text.h"
+#include "scopes/mangling.h"
 
 namespace codeloom {
 
@@ -52,11 +53,20 @@ nb::object COccurrenceItem::Object() const {
     return NewObject<CRange>(RangeOfBytes(*file, data.object_start, data.object_end));
 }
 
-std::string_view COccurrenceItem::Mangled() const {
-    const uint32_t symbol_i = file->Names().scopes.symbol_of[i];
-    if (symbol_i == kNoIndex) return Name();
+std::string COccurrenceItem::Mangled() const {
     const CTextNames& names = file->Names();
-    return names.occurrences.names->Text(names.scopes.symbols[symbol_i].name);
+    const CNameTable& texts = *names.occurrences.names;
+    const uint32_t symbol_i = names.scopes.symbol_of[i];
+    if (symbol_i != kNoIndex) return std::string(texts.Text(names.scopes.symbols[symbol_i].name));
+    // An attribute has no symbol, but is mangled too.
+    const std::string_view name = Name();
+    const bool is_attribute = Data().object_start != Data().object_end;
+    uint32_t scope_i = is_attribute && IsPrivate(name) ? names.ScopeOfOccurrence(i) : 0;
+    for (; scope_i != 0; scope_i = names.scopes.scopes[scope_i].parent) {
+        const CScope& scope = names.scopes.scopes[scope_i];
+        if (scope.kind == EScopeKind::kClass) return MangledName(name, texts.Text(scope.name));
+    }
+    return std::string(name);
 }
 
 nb::object COccurrenceItem::Symbol() const {

@@ -51,7 +51,7 @@ struct COccurrenceItem : CItem {
     // The range of what an attribute hangs on, else None.
     nb::object Object() const;
     // The name as a class around mangles it.
-    std::string_view Mangled() const;
+    std::string Mangled() const;
     nb::object Symbol() const;
     // The scope that binds it, else None.
     nb::object Home() const;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <string>
 
+#include "scopes/mangling.h"
 #include "scopes/symbol_table.h"
 
 namespace codeloom {
@@ -19,11 +20,6 @@ bool IsFunction(EScopeKind kind) {
 // Right in a class, these see its names.
 bool IsAnnotationScope(EScopeKind kind) {
     return kind >= EScopeKind::kTypeParameters;
-}
-
-// `__a`, which the interpreter mangles within a class.
-bool IsPrivate(std::string_view name) {
-    return name.starts_with("__") && !name.ends_with("__");
 }
 
 class CScopeBuilder {
@@ -142,10 +138,7 @@ uint32_t CScopeBuilder::_MangledByClass(uint32_t name, uint32_t scope) {
 
 uint32_t CScopeBuilder::_MangledBy(const CScope& named, uint32_t name) {
     CNameTable& names = *_fNames.occurrences.names;
-    std::string_view class_name = names.Text(named.name);
-    class_name.remove_prefix(std::min(class_name.find_first_not_of('_'), class_name.size()));
-    if (class_name.empty()) return name;
-    return names.Number("_" + std::string(class_name) + std::string(names.Text(name)));
+    return names.Number(MangledName(names.Text(name), names.Text(named.name)));
 }
 
 void CScopeBuilder::_AddOccurrences() {
