@@ -1,7 +1,5 @@
 """What a run is asked: settings, versions, files that are left out."""
 
-import os
-
 import pytest
 
 from codeloom.reading.languages import NEWEST, oldest_admitted, version_named
@@ -198,32 +196,3 @@ def test_colours(write_files, run_cli, cli_environment):
     assert "\033[" not in run_cli("check", "--format", "json", "a.py").stdout
     cli_environment["NO_COLOR"] = "1"
     assert "\033[" not in run_cli("check", "a.py").stdout
-
-
-@pytest.mark.skipif(not hasattr(os, "fork"), reason="needs a signal")
-def test_watching(write_files, tmp_path, cli_environment):
-    import signal
-    import subprocess
-    import sys
-
-    folder = write_files({"a.py": ")\n"})
-    command = [sys.executable, "-m", "codeloom", "check", "--watch", "--format", "concise", "a.py"]
-
-    def HeedInterrupts():  # which a shell lets its background jobs ignore
-        signal.signal(signal.SIGINT, signal.SIG_DFL)
-
-    process = subprocess.Popen(
-        command,
-        cwd=folder,
-        env=cli_environment,
-        stdout=subprocess.PIPE,
-        text=True,
-        preexec_fn=HeedInterrupts,
-    )
-    try:
-        assert process.stdout.readline() == "a.py:1:1: CL203 unmatched ')'\n"
-        (folder / "a.py").write_text("x = )\n")
-        assert process.stdout.readline() == "a.py:1:5: CL203 unmatched ')'\n"
-    finally:
-        process.send_signal(signal.SIGINT)
-        process.communicate(timeout=30)

@@ -27,6 +27,10 @@ from codeloom.cli.source_command import SourceCommand
 from codeloom.cli.tally import Tally
 from codeloom.reading.files import StandardInput
 
+TYPE_CHECKING = False  # it is loaded by those who watch
+if TYPE_CHECKING:
+    from codeloom.cli.watch import Watch
+
 _STDOUT = "-"
 _SOURCES = ("auto", "whole", "around")
 _MEGABYTE = 1_000_000
@@ -77,10 +81,11 @@ class ReportCommand(SourceCommand):
         group.add_argument("-q", "--quiet", action="store_const", const=1, help="no summary")
         add_verbose_argument(group)
 
-    def run_once(self, options: Options) -> ExitStatus:
+    def run_once(self, options: Options, watch: Watch | None = None) -> ExitStatus:
         """Write the page; WrongUseError where it can't be written."""
         console = Console()
-        return self.show(Run(options, console, records=True, names=True, output=PageFormat(console, options)))
+        page = PageFormat(console, options)
+        return self.show(Run(options, console, records=True, names=True, output=page, watch=watch))
 
     def items(self, source: Source, findings: list[Finding]) -> Iterable[Item]:
         """The problems."""

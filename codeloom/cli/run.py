@@ -30,8 +30,10 @@ from codeloom.reading.files import (
 
 TYPE_CHECKING = False  # `typing` takes long to import
 if TYPE_CHECKING:
+    from codeloom._analysis import Analysis
     from codeloom.cli.filters.changes import Changes
     from codeloom.cli.formats.base import Format
+    from codeloom.cli.watch import Watch
 
 STDIN_NAME = "<stdin>"
 
@@ -39,7 +41,7 @@ STDIN_NAME = "<stdin>"
 class Run:
     """What the options come to: files, filters, a format, counts.
 
-    `output` is a format that isn't one of those with a name.
+    `output` is a format that isn't one of those with a name; `watch` knows what earlier runs have read.
     """
 
     def __init__(
@@ -50,6 +52,7 @@ class Run:
         records: bool,
         names: bool,
         output: Format | None = None,
+        watch: Watch | None = None,
     ) -> None:
         self.options = options
         self.console = console
@@ -59,6 +62,7 @@ class Run:
         self._needs_fingerprints = self.format.NEEDS_FINGERPRINTS or options.baseline is not None
         self._filters, self._changes = _filters_of(options)
         self._version = options.version
+        self._watch = watch
         # What is printed on the terminal all the time shows well enough how far a run is.
         is_wanted = self.format.WRITES_AT_END or not ((records or names) and console.is_terminal)
         self._progress = Progress(console, self._count_files, is_wanted=is_wanted)
@@ -80,8 +84,11 @@ class Run:
     def sources(self) -> Iterator[tuple[Source, list[Finding]]]:
         """Each file with the problems that count; what can't be read is reported."""
         options = self.options
+        found: Iterator[str | OSError | Source] = self.files()
+        if self._watch is not None:
+            found = self._watch.recall(self.files())
         results = read_ahead(
-            self.files(),
+            found,
             jobs=options.jobs or processor_count(),
             python=self._version,
             false_hints=options.false_hints,
@@ -89,9 +96,9 @@ class Run:
             names=self._needs_names,
         )
         with self._progress as progress:
-            for path, analysis in results:
+            for one, analysis in results:
                 try:
-                    source = self._read(path) if analysis is None else Source(str(path), analysis)
+                    source = self._source(one, analysis)
                 except OSError as error:
                     self._on_error(error)
                     continue
@@ -101,10 +108,19 @@ class Run:
                 yield source, findings
                 progress.show(self.tally)
 
-    def _read(self, path: str | OSError) -> Source:
-        if isinstance(path, OSError):
-            raise path
-        return read_source(path, self.options, self._version)
+    def _source(self, found: str | OSError | Source, analysis: Analysis | None) -> Source:
+        """What was found, read if it isn't yet; OSError when it can't be."""
+        if isinstance(found, Source):
+            return found
+        if isinstance(found, OSError):
+            raise found
+        if analysis is None:
+            source = read_source(found, self.options, self._version)
+        else:
+            source = Source(found, analysis)
+        if self._watch is not None and not isinstance(found, StandardInput):
+            self._watch.keep(source)
+        return source
 
     def end(self) -> ExitStatus:
         """Write what goes after all files, and give the exit status."""

@@ -1,9 +1,7 @@
 """What commands share that go through files and show items of each, such as problems, lines or signatures."""
 
 import argparse
-import os
 import sys
-import time
 from abc import abstractmethod
 from collections.abc import Iterable, Sequence
 
@@ -12,11 +10,12 @@ from codeloom.cli.console import Console
 from codeloom.cli.formats import FOR_ALL_ITEMS
 from codeloom.cli.items import Finding, Item
 from codeloom.cli.options import Options, add_source_arguments
-from codeloom.cli.run import Run, files_of, opened_console, print_facts
+from codeloom.cli.run import Run, opened_console, print_facts
 from codeloom.cli.source import Source, printable_path
-from codeloom.reading.files import StandardInput
 
-_SECONDS_BETWEEN_LOOKS = 0.3
+TYPE_CHECKING = False  # it is loaded by those who watch
+if TYPE_CHECKING:
+    from codeloom.cli.watch import Watch
 
 
 class SourceCommand(Command):
@@ -44,10 +43,11 @@ class SourceCommand(Command):
             return self._watch(options)
         return self.run_once(options)
 
-    def run_once(self, options: Options) -> ExitStatus:
+    def run_once(self, options: Options, watch: "Watch | None" = None) -> ExitStatus:
         """Show all files one time."""
         with opened_console(options) as console:
-            return self.show(Run(options, console, records=self.NEEDS_RECORDS, names=self.NEEDS_NAMES))
+            run = Run(options, console, records=self.NEEDS_RECORDS, names=self.NEEDS_NAMES, watch=watch)
+            return self.show(run)
 
     def show(self, run: Run) -> ExitStatus:
         """Show what a run reads, or the names of its files."""
@@ -66,29 +66,14 @@ class SourceCommand(Command):
 
     def _watch(self, options: Options) -> ExitStatus:
         """Run again and again, until the user interrupts it."""
-        before: dict[str, tuple[int, int]] | None = None
+        from codeloom.cli.watch import Watch
+
+        watch = Watch(options)
         while True:
-            now = _stamps(options)
-            if now == before:
-                time.sleep(_SECONDS_BETWEEN_LOOKS)
-                continue
-            before = now
+            watch.wait()
             if options.output is None and sys.stdout is not None and sys.stdout.isatty():
                 print("\033[H\033[2J\033[3J", end="")
-            self.run_once(options)
-
-
-def _stamps(options: Options) -> dict[str, tuple[int, int]]:
-    """Time and size of each file that a run would read."""
-    found = {}
-    for path in files_of(options):
-        if isinstance(path, str) and not isinstance(path, StandardInput):
-            try:
-                status = os.stat(path)
-            except OSError:
-                continue
-            found[path] = status.st_mtime_ns, status.st_size
-    return found
+            self.run_once(options, watch)
 
 
 def _show_files(run: Run, console: Console) -> ExitStatus:

@@ -8,6 +8,12 @@ from codeloom._analysis import Analysis, FileReader
 from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput
 from codeloom.reading.languages import version_number
 
+TYPE_CHECKING = False  # `typing` takes longer to import than this module
+if TYPE_CHECKING:
+    from typing import TypeVar
+
+    Found = TypeVar("Found")
+
 # How many batches are read ahead for each further thread.
 _AHEAD_PER_JOB = 16
 # The first batches are small, so that the first result comes soon.
@@ -15,27 +21,27 @@ _MOST_IN_BATCH = 8
 
 
 def read_ahead(
-    found: Iterable[str | OSError],
+    found: "Iterable[Found]",
     *,
     jobs: int,
     python: str,
     false_hints: bool,
     records: bool = False,
     names: bool = False,
-) -> Iterator[tuple[str | OSError, Analysis | None]]:
-    """What is found with what it says, in its order; ahead, in `jobs` threads, this one included.
+) -> "Iterator[tuple[Found, Analysis | None]]":
+    """Each path with what its file says, in their order; ahead, in `jobs` threads, this one included.
 
-    With `records` and `names` what these are made of is worked out in the same pass. None goes with an error,
-    and with what takes more to read: notebooks, the standard input, what has to be decoded, what can't be
-    read.
+    With `records` and `names` what these are made of is worked out in the same pass. None goes with what
+    takes more to read: notebooks, the standard input, what has to be decoded, what can't be read; and with
+    whatever isn't a path.
     """
     reader = FileReader(jobs, python, version_number(python), false_hints, records, names)
     close = reader.close
     atexit.register(close)  # a thread that doesn't end with the interpreter may be in the midst of it
-    ahead: deque[list[str | OSError]] = deque()
+    ahead: deque[list[Found]] = deque()
     try:
         for batch in _batches(found):
-            reader.submit([_plain_path(path) for path in batch])
+            reader.submit([_plain_path(one) for one in batch])
             ahead.append(batch)
             if len(ahead) > _AHEAD_PER_JOB * (jobs - 1):
                 yield from zip(ahead.popleft(), reader.take(), strict=True)
@@ -46,11 +52,11 @@ def read_ahead(
         atexit.unregister(close)
 
 
-def _batches(found: Iterable[str | OSError]) -> Iterator[list[str | OSError]]:
+def _batches(found: "Iterable[Found]") -> "Iterator[list[Found]]":
     """Some of what is found at a time."""
-    batch: list[str | OSError] = []
-    for count, path in enumerate(found):
-        batch.append(path)
+    batch: list[Found] = []
+    for count, one in enumerate(found):
+        batch.append(one)
         if len(batch) > min(count // _MOST_IN_BATCH, _MOST_IN_BATCH - 1):
             yield batch
             batch = []
@@ -58,8 +64,8 @@ def _batches(found: Iterable[str | OSError]) -> Iterator[list[str | OSError]]:
         yield batch
 
 
-def _plain_path(path: str | OSError) -> str:
+def _plain_path(found: object) -> str:
     """The path of what may be plain text, an empty one for anything else."""
-    if isinstance(path, (StandardInput, OSError)) or path.lower().endswith(NOTEBOOK_SUFFIX):
+    if not isinstance(found, str) or isinstance(found, StandardInput):
         return ""
-    return path
+    return "" if found.lower().endswith(NOTEBOOK_SUFFIX) else found

@@ -1,0 +1,138 @@
+"""Files that are watched: what earlier runs have read, so that a run reads only what has changed since."""
+
+from __future__ import annotations
+
+import os
+import time
+from collections.abc import Iterator
+
+from codeloom._document import Document
+from codeloom.cli.options import Options
+from codeloom.cli.run import files_of
+from codeloom.cli.source import Source
+from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput, read_file
+from codeloom.reading.source import source_from_bytes
+
+_SECONDS_BETWEEN_LOOKS = 0.3
+# A look at many files takes long: how many times as long nothing is done afterwards.
+_REST = 4
+# Who types changes few files; when more change at once, such as to another branch, they are read anew.
+_MOST_DOCUMENTS = 16
+
+# What changes with a file: times, size, number.
+_Stamp = tuple[int, int, int, int]
+
+
+class Watch:
+    """The files of a run again and again.
+
+    What an unchanged file says is kept. One that has changed becomes a document, so that of the next change
+    only what it concerns is analysed.
+    """
+
+    def __init__(self, options: Options) -> None:
+        self._options = options
+        self._stamps: dict[str, _Stamp] | None = None  # of the last look
+        self._kept: dict[str, tuple[_Stamp, Source]] = {}
+        self._documents: dict[str, Document] = {}  # the last changed is last
+
+    def wait(self) -> None:
+        """Return when a file has changed; at once the first time."""
+        while True:
+            start = time.monotonic()
+            now = _stamps(self._options)
+            if now != self._stamps:
+                break
+            time.sleep(max(_SECONDS_BETWEEN_LOOKS, _REST * (time.monotonic() - start)))
+        self._stamps = now
+        self._kept = {path: kept for path, kept in self._kept.items() if path in now}
+        self._documents = {path: document for path, document in self._documents.items() if path in now}
+
+    def recall(self, found: Iterator[str | OSError]) -> Iterator[str | OSError | Source]:
+        """What is found, but in place of a path what its file says, where that is known or easy to know."""
+        stamps = self._stamps or {}
+        changed = {path for path, (stamp, _) in self._kept.items() if stamps.get(path) != stamp}
+        for path in found:
+            if isinstance(path, OSError) or path not in self._kept:
+                yield path
+            elif path not in changed:
+                yield self._kept[path][1]
+            else:
+                source = self._edited(path) if len(changed) <= _MOST_DOCUMENTS else None
+                if source is not None:
+                    self.keep(source)
+                yield source or path
+
+    def keep(self, source: Source) -> None:
+        """Keep what a file says, until it changes."""
+        stamp = (self._stamps or {}).get(source.path)
+        if stamp is not None:  # else the file is newer than the last look
+            self._kept[source.path] = stamp, source
+
+    def _edited(self, path: str) -> Source | None:
+        """What a changed file says; None for one that isn't plain text, or can't be read."""
+        document = self._documents.pop(path, None)
+        text = _plain_text(path)
+        if text is None:
+            return None
+        if document is None:
+            options = self._options
+            document = Document(text, path=path, python=options.version, false_hints=options.false_hints)
+        else:
+            change_text(document, text)
+        self._documents[path] = document
+        if len(self._documents) > _MOST_DOCUMENTS:
+            del self._documents[next(iter(self._documents))]
+        return Source(path, document.analysis)
+
+
+def change_text(document: Document, new: str) -> None:
+    """Give a document another text, as an edit of the rows that differ."""
+    old = document.text
+    start = old.rfind("\n", 0, _common(old, new)) + 1
+    end = len(old) - _common(old[start:][::-1], new[start:][::-1])
+    end = old.find("\n", end) + 1 or len(old)
+    place = document.end if end == len(old) else (_row_at(old, end), 1)
+    document.edit((_row_at(old, start), 1), place, new[start : len(new) - (len(old) - end)])
+
+
+def _common(one: str, other: str) -> int:
+    """How many characters two texts have in common at their beginnings."""
+    same, most = 0, min(len(one), len(other))
+    while same < most:
+        middle = (same + most + 1) // 2
+        if one[same:middle] == other[same:middle]:
+            same = middle
+        else:
+            most = middle - 1
+    return same
+
+
+def _row_at(text: str, row_start: int) -> int:
+    """The number of the row, from 1, that begins at an offset."""
+    counts = (text.count(row_end, 0, row_start) for row_end in ("\n", "\r", "\r\n"))
+    newlines, returns, both = counts
+    return 1 + newlines + returns - both
+
+
+def _plain_text(path: str) -> str | None:
+    if path.lower().endswith(NOTEBOOK_SUFFIX):
+        return None
+    try:
+        source = source_from_bytes(read_file(path))
+    except OSError:  # whoever reads it next says why
+        return None
+    return None if source.faults else source.utf8.decode()
+
+
+def _stamps(options: Options) -> dict[str, _Stamp]:
+    """What changes with each file that a run would read."""
+    found = {}
+    for path in files_of(options):
+        if isinstance(path, str) and not isinstance(path, StandardInput):
+            try:
+                status = os.stat(path)
+            except OSError:
+                continue
+            found[path] = status.st_mtime_ns, status.st_ctime_ns, status.st_size, status.st_ino
+    return found
