@@ -2,6 +2,7 @@
 
     python benchmarks/keystrokes.py                 milliseconds until the diagnostics of a new text are there
     python benchmarks/keystrokes.py --rows 1000     in files of so many rows alone
+    python benchmarks/keystrokes.py --beside        keystrokes while another request is worked on
     python benchmarks/keystrokes.py --flicker 200   problems elsewhere while so many functions are typed
 
 `pip install --group benchmark` installs the peers; one that isn't there is left out. Times of a shared
@@ -197,6 +198,67 @@ def _cell(times: list[float]) -> str:
     return f"{statistics.median(times) * 1000:,.2f} / {last * 1000:,.2f}"
 
 
+# What else is asked for
+
+# What editors ask for after each change.
+BESIDE: dict[str, dict[str, object]] = {
+    "documentSymbol": {},
+    "foldingRange": {},
+    "semanticTokens/full": {},
+    "semanticTokens/full/delta": {},
+    "semanticTokens/range": {},
+    "documentHighlight": {},
+    "completion": {},
+}
+# When the key is hit, as parts of the time that the request takes.
+MOMENTS = [i / 20 for i in range(21)]
+
+
+def show_beside(servers: list[Peer], sizes: list[int]) -> None:
+    """For each request what it takes alone, and the slowest keystroke while it is worked on."""
+    heads = " | ".join(f"{size:,} rows" for size in sizes)
+    print(f"| milliseconds alone, and the slowest keystroke meanwhile | {heads} |")
+    print(f"| --- |{' --- |' * len(sizes)}")
+    for peer in servers:
+        cells: dict[str, list[str]] = {}
+        for size in sizes:
+            with tempfile.TemporaryDirectory() as folder:
+                wire = Wire(peer.command, Path(folder), asks=peer.asks, seconds=3 * MOST_SECONDS)
+                wire.open(text_of(size).decode())
+                for method in BESIDE:
+                    cells.setdefault(method, []).append(_beside(wire, method, size // 2))
+                wire.close()
+        for method, found in cells.items():
+            print(f"| {peer.name}, {method} | {' | '.join(found)} |", flush=True)
+
+
+def _beside(wire: Wire, method: str, row: int) -> str:
+    place = {"line": row, "character": 0}
+    more = {"position": place, "range": {"start": place, "end": {"line": row + 60, "character": 0}}}
+    params = {**wire.document, **more}
+    alone = slowest = 0.0
+    try:
+        if method.endswith("delta"):
+            params["previousResultId"] = wire.request("textDocument/semanticTokens/full", params)["resultId"]
+        for moment in (None, *MOMENTS):
+            wire.edit((row, 0), (row, 0), "x")
+            start = time.perf_counter()
+            number = wire.begin(f"textDocument/{method}", params)
+            if moment is not None:
+                time.sleep(alone * moment)
+                start = time.perf_counter()
+                wire.edit((row, 0), (row, 1), "")
+                slowest = max(slowest, time.perf_counter() - start)
+            if "error" in wire.answer(number) and moment is None:
+                return "-"
+            if moment is None:
+                alone = time.perf_counter() - start
+                wire.edit((row, 0), (row, 1), "")
+    except (SilentError, EOFError, RuntimeError):
+        return "-"
+    return f"{alone * 1000:,.1f}, {slowest * 1000:,.1f}"
+
+
 # What flickers
 
 BEFORE = 'import os\n\nclass A:\n    """Doc."""\n\n    def f(self, x):\n        return [x, "y"]\n\n\n'
@@ -260,11 +322,14 @@ def main() -> None:
     parser = argparse.ArgumentParser(description=(__doc__ or "").partition("\n")[0])
     parser.add_argument("--rows", type=int, action="append", help="the size of a file; may be given again")
     parser.add_argument("--flicker", type=int, metavar="COUNT", help="type so many functions")
+    parser.add_argument("--beside", action="store_true", help="ask for more while a key is hit")
     parser.add_argument("--server", action="append", help="this server alone; may be given again")
     options = parser.parse_args()
     servers = [peer for peer in peers() if not options.server or peer.name in options.server]
     if options.flicker:
         show_flicker(servers, options.flicker)
+    elif options.beside:
+        show_beside(servers, options.rows or list(ROWS))
     else:
         show_times(servers, options.rows or list(ROWS))
 

@@ -36,13 +36,16 @@ class Wire:
         self._number = 0
         self._version = 0
         self._uri = (folder / "typed.py").as_uri()
+        self.document = {"textDocument": {"uri": self._uri}}
+        # Answers that came while another message was waited for.
+        self._answers: dict[int, Message] = {}
         self._process = subprocess.Popen(
             command, cwd=folder, stdin=subprocess.PIPE, stdout=subprocess.PIPE, stderr=subprocess.DEVNULL
         )
         capabilities = json.loads(json.dumps(_CAPABILITIES))
         if asks:
             capabilities["textDocument"]["diagnostic"] = {}
-        self._request(
+        self.request(
             "initialize",
             {
                 "processId": os.getpid(),
@@ -75,6 +78,25 @@ class Wire:
         self._notify("textDocument/didChange", {"textDocument": document, "contentChanges": [change]})
         return self._diagnostics()
 
+    def begin(self, method: str, params: Message) -> int:
+        """Send a request; the number of its answer."""
+        self._number += 1
+        self._send({"id": self._number, "method": method, "params": params})
+        return self._number
+
+    def answer(self, number: int) -> Message:
+        """The answer to a request."""
+        if number in self._answers:
+            return self._answers.pop(number)
+        return self._next(lambda one: one.get("id") == number and "method" not in one)
+
+    def request(self, method: str, params: Message) -> Any:
+        """What a request gives; RuntimeError for a server's error."""
+        answer = self.answer(self.begin(method, params))
+        if "error" in answer:
+            raise RuntimeError(f"{method}: {answer['error']}")
+        return answer["result"]
+
     def close(self) -> None:
         """End the server."""
         self._process.kill()
@@ -82,7 +104,7 @@ class Wire:
 
     def _diagnostics(self) -> list[Message]:
         if self._asks:
-            answer = self._request("textDocument/diagnostic", {"textDocument": {"uri": self._uri}})
+            answer = self.request("textDocument/diagnostic", self.document)
             return list((answer or {}).get("items", []))
         told = self._next(
             lambda one: (
@@ -92,15 +114,6 @@ class Wire:
             )
         )
         return list(told["params"]["diagnostics"])
-
-    def _request(self, method: str, params: Message) -> Any:
-        self._number += 1
-        number = self._number
-        self._send({"id": number, "method": method, "params": params})
-        answer = self._next(lambda one: one.get("id") == number and "method" not in one)
-        if "error" in answer:
-            raise RuntimeError(f"{method}: {answer['error']}")
-        return answer["result"]
 
     def _notify(self, method: str, params: Message) -> None:
         self._send({"method": method, "params": params})
@@ -119,6 +132,8 @@ class Wire:
                 self._send({"id": message["id"], "result": _answer(message)})
             elif is_wanted(message):
                 return message
+            elif "id" in message:
+                self._answers[message["id"]] = message
 
     def _read(self, end: float) -> Message:
         while (head := self._buffer.find(b"\r\n\r\n")) < 0:

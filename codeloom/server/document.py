@@ -89,10 +89,10 @@ class OpenDocument(PlacedText):
         row, column = self._own_place(position)
         return row + self.rows_before, column
 
-    def position(self, row: int, column: int) -> types.Position:
-        """A place of the analysis as the client counts."""
+    def counted(self, row: int, column: int) -> tuple[int, int]:
+        """As the base class says."""
         row, column = self.own.position(row, column)
-        return types.Position(row - 1, column - 1)
+        return row - 1, column - 1
 
     def occurrence_at(self, position: types.Position) -> Occurrence | None:
         """The name at a position, or that ends there."""

@@ -2,11 +2,13 @@
 
 import re
 from collections.abc import Iterable
+from operator import itemgetter
 from typing import TYPE_CHECKING
 
 from lsprotocol import types
 
 from codeloom._analysis import Line, LineKind
+from codeloom.server.json_text import JsonText, items_as_json
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -19,12 +21,14 @@ def register(server: "Server") -> None:
     """Answer what asks for parts to fold."""
 
     @server.feature(types.TEXT_DOCUMENT_FOLDING_RANGE)
-    async def folding_range(params: types.FoldingRangeParams) -> list[types.FoldingRange]:
+    async def folding_range(params: types.FoldingRangeParams) -> JsonText:
         document = server.documents[params.text_document.uri]
-        folds = _Folds(document.rows_before)
+        folds, parts = _Folds(document.rows_before), []
         async for lines in document.live.slices(document.lines):
             folds.add(lines)
-        return folds.end()
+            parts.append(folds.complete())
+        folds.end()
+        return JsonText.of_list([*parts, folds.complete()])
 
 
 class _Folds:
@@ -45,18 +49,34 @@ class _Folds:
         for line in lines:
             self._add(line)
 
-    def end(self) -> list[types.FoldingRange]:
-        """All folds, in the order of their rows."""
+    def end(self) -> None:
+        """There are no more lines."""
         self._close(-1)
         self._end_run()
+        self._regions.clear()
+        self._last_row += 1
+
+    def complete(self) -> str:
+        """As JSON those before all that is still open, by their rows; each is given once."""
+        first_open = min([self._last_row, *self._regions, *(row for _, row in self._open[:1])])
+        if self._run is not None:
+            first_open = min(first_open, self._run[1])
         kinds: dict[tuple[int, int], types.FoldingRangeKind | None] = {}
         for first, last, kind in self._found:
-            kinds[first, last] = kind or kinds.get((first, last))
+            if first < first_open:
+                kinds[first, -last] = kind or kinds.get((first, -last))
+        self._found = [fold for fold in self._found if fold[0] >= first_open]
         before = self._rows_before + 1
-        return [
-            types.FoldingRange(first - before, last - before, kind=kind)
-            for (first, last), kind in sorted(kinds.items(), key=lambda fold: (fold[0][0], -fold[0][1]))
-        ]
+        return items_as_json(
+            [
+                {
+                    "startLine": first - before,
+                    "endLine": -last - before,
+                    **({"kind": kind.value} if kind else {}),
+                }
+                for (first, last), kind in sorted(kinds.items(), key=itemgetter(0))
+            ]
+        )
 
     def _add(self, line: Line) -> None:
         place, indent = line.range, line.indent

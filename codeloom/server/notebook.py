@@ -55,15 +55,15 @@ class Cell(OpenDocument):
         """True for a row of this cell."""
         return self.rows_before < row <= self.rows_before + self.code.count("\n")
 
-    def position(self, row: int, column: int) -> types.Position:
+    def counted(self, row: int, column: int) -> tuple[int, int]:
         """As the base class says; the nearest one for a place that isn't in the cell."""
         row -= self.rows_before
         if row < 1:
-            return types.Position(0, 0)
+            return 0, 0
         rows = self._own.row_count
         row, column = (row, column) if row <= rows else (rows, len(self._own.row(rows)) + 1)
         row, column = self._own.position(row, min(column, len(self._own.row(row)) + 1))
-        return types.Position(row - 1, column - 1)
+        return row - 1, column - 1
 
     def location(self, place: Range) -> types.Location:
         """In the cell where it begins."""

@@ -19,14 +19,27 @@ class PlacedText(ABC):
         self.uri = uri
 
     @abstractmethod
+    def counted(self, row: int, column: int) -> tuple[int, int]:
+        """A place of the analysis as the client counts, from zero."""
+
     def position(self, row: int, column: int) -> types.Position:
-        """A place of the analysis as the client counts."""
+        """The same for the protocol."""
+        return types.Position(*self.counted(row, column))
 
     def range(self, place: Range) -> types.Range:
         """A range of the analysis as the client counts."""
         return types.Range(
             self.position(place.row, place.column), self.position(place.end_row, place.end_column)
         )
+
+    def range_fields(self, place: Range) -> dict[str, dict[str, int]]:
+        """The same as JSON, for answers with very many ranges."""
+        row, column = self.counted(place.row, place.column)
+        end_row, end_column = self.counted(place.end_row, place.end_column)
+        return {
+            "start": {"line": row, "character": column},
+            "end": {"line": end_row, "character": end_column},
+        }
 
     def location(self, place: Range) -> types.Location:
         """The same with the name of the text."""
@@ -49,7 +62,7 @@ class ClosedText(PlacedText):
         self._source = source
         self._codec, self._size = _UNITS[encoding]
 
-    def position(self, row: int, column: int) -> types.Position:
+    def counted(self, row: int, column: int) -> tuple[int, int]:
         """As the base class says."""
         before = self._source.row_text(row)[: column - 1]
-        return types.Position(row - 1, len(before.encode(self._codec, "surrogatepass")) // self._size)
+        return row - 1, len(before.encode(self._codec, "surrogatepass")) // self._size

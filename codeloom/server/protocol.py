@@ -1,6 +1,7 @@
 """Messages into calls. Whatever comes in, the client gets an error, and the server goes on."""
 
 import asyncio
+import json
 import logging
 import operator
 from collections.abc import Generator
@@ -19,6 +20,7 @@ from pygls.exceptions import (
 )
 from pygls.protocol import LanguageServerProtocol, default_converter, lsp_method
 
+from codeloom.server.json_text import JsonText
 from codeloom.server.transport import Inbox, is_identity
 
 if TYPE_CHECKING:
@@ -105,6 +107,17 @@ class Protocol(LanguageServerProtocol):
             self._send_data({_JSON_RPC: self.VERSION, "id": known, "error": answer})
         else:
             self._server.report_server_error(error, FeatureNotificationError)
+
+    def _send_response(self, msg_id: int | str, result: Any = None, error: Any = None) -> None:
+        """Send an answer; one that is JSON already as it is."""
+        if error is not None or not isinstance(result, JsonText):
+            super()._send_response(msg_id, result, error)
+            return
+        self._result_types.pop(msg_id, None)
+        head = f'{{"jsonrpc":"{self.VERSION}","id":{json.dumps(msg_id)},"result":'
+        body = b"%s%s}" % (head.encode(), result.encoded())
+        assert self.writer is not None
+        self.writer.write(b"Content-Length: %d\r\n\r\n%s" % (len(body), body))
 
     def _check_handler_result(self, future: "Future[Any]") -> None:
         """Report what went wrong with a notification in its own words."""

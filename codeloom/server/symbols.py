@@ -1,15 +1,20 @@
 """The outline: classes and functions with what lies in them, and the names that a module or a class binds."""
 
-from typing import TYPE_CHECKING
+from collections.abc import Sequence
+from typing import TYPE_CHECKING, Any
 
 from lsprotocol import types
 
 from codeloom._analysis import Line, LineKind, Range, Role, Scope, ScopeKind
 from codeloom.server.blocks import scope_of_header
 from codeloom.server.document import OpenDocument
+from codeloom.server.json_text import JsonText, items_as_json
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
+
+# With the fields that the protocol names.
+_Symbol = dict[str, Any]
 
 _BINDING_LINES = frozenset({LineKind.ASSIGNMENT, LineKind.TYPE})
 _HEADERS = frozenset({LineKind.DEF, LineKind.CLASS})
@@ -23,23 +28,25 @@ def register(server: "Server") -> None:
     """Answer what asks for an outline."""
 
     @server.feature(types.TEXT_DOCUMENT_DOCUMENT_SYMBOL)
-    async def document_symbol(params: types.DocumentSymbolParams) -> list[types.DocumentSymbol]:
+    async def document_symbol(params: types.DocumentSymbolParams) -> JsonText:
         document = server.documents[params.text_document.uri]
         outline = _Outline(document)
         async for lines in document.live.slices(document.lines):
             for line in lines:
                 outline.add(line)
-        return outline.symbols
+        return JsonText.of_list(outline.end())
 
 
 class _Outline:
-    """The symbols of a text, line by line."""
+    """The symbols of a text as JSON, line by line."""
 
     def __init__(self, document: OpenDocument) -> None:
-        self.symbols: list[types.DocumentSymbol] = []
+        # The symbols of the module that are complete, and the one that isn't.
+        self._parts: list[str] = []
+        self._last: list[_Symbol] = []
         self._document = document
         # The open blocks of classes and functions: their indentation, scope and symbol.
-        self._open: list[tuple[int, Scope, types.DocumentSymbol]] = []
+        self._open: list[tuple[int, Scope, _Symbol]] = []
         self._seen: set[tuple[int, str]] = set()
 
     def add(self, line: Line) -> None:
@@ -56,6 +63,11 @@ class _Outline:
                 if occurrence.role is Role.BIND and occurrence.scope.kind is not ScopeKind.TYPE_PARAMETERS:
                     self._add_name(occurrence.name, occurrence.range, line)
 
+    def end(self) -> Sequence[str]:
+        """The symbols of the module, in parts."""
+        self._complete()
+        return self._parts
+
     def _add_header(self, line: Line) -> None:
         scope = scope_of_header(self._document.analysis, line)
         if scope is None or len(self._open) >= _DEEPEST:
@@ -68,14 +80,7 @@ class _Outline:
         name = next(
             (one.range for one in line.occurrences if one.is_definition), _first_row(scope.range, line.range)
         )
-        symbol = types.DocumentSymbol(
-            name=scope.name or "?",
-            kind=kind,
-            range=self._document.range(scope.range),
-            selection_range=self._document.range(name),
-            children=[],
-        )
-        self._append(symbol)
+        symbol = self._append(scope.name or "?", kind, scope.range, name)
         self._open.append((line.indent or 0, scope, symbol))
 
     def _add_name(self, name: str, place: Range, line: Line) -> None:
@@ -86,16 +91,27 @@ class _Outline:
         kind = types.SymbolKind.Field if self._is_in_class() else types.SymbolKind.Variable
         if name.isupper():
             kind = types.SymbolKind.Constant
-        self._append(
-            types.DocumentSymbol(
-                name, kind, self._document.range(line.range), self._document.range(place), children=[]
-            )
-        )
+        self._append(name, kind, line.range, place)
 
-    def _append(self, symbol: types.DocumentSymbol) -> None:
-        children = self._open[-1][2].children if self._open else self.symbols
-        assert isinstance(children, list)
-        children.append(symbol)
+    def _append(self, name: str, kind: types.SymbolKind, whole: Range, place: Range) -> _Symbol:
+        symbol: _Symbol = {
+            "name": name,
+            "kind": kind.value,
+            "range": self._document.range_fields(whole),
+            "selectionRange": self._document.range_fields(place),
+            "children": [],
+        }
+        if self._open:
+            self._open[-1][2]["children"].append(symbol)
+        else:
+            self._complete()
+            self._last.append(symbol)
+        return symbol
+
+    def _complete(self) -> None:
+        if self._last:
+            self._parts.append(items_as_json(self._last))
+            self._last.clear()
 
     def _is_in_class(self) -> bool:
         return bool(self._open) and self._open[-1][1].kind is ScopeKind.CLASS

@@ -3,15 +3,16 @@
 import builtins
 import itertools
 from bisect import bisect_left, bisect_right
-from collections.abc import Sequence
+from collections.abc import Iterable, Sequence
 from typing import TYPE_CHECKING
 from weakref import WeakKeyDictionary
 
 from lsprotocol import types
 
-from codeloom._analysis import Analysis, Occurrence, Resolution, Role, Scope, ScopeKind
+from codeloom._analysis import Occurrence, Resolution, Role, Scope, ScopeKind
 from codeloom.server.blocks import start_of
 from codeloom.server.document import OpenDocument
+from codeloom.server.json_text import JsonText, items_as_json
 from codeloom.server.navigation import BINDINGS
 
 if TYPE_CHECKING:
@@ -34,6 +35,7 @@ _LEGEND = types.SemanticTokensLegend(list(_TYPES), list(_MODIFIERS))
 
 # Five numbers a token.
 _WIDTH = 5
+_COMPARED_AT_ONCE = 4096
 
 _CLASSES = frozenset(name for name, value in vars(builtins).items() if isinstance(value, type))
 _ROLE_TYPES = {
@@ -54,45 +56,49 @@ def register(server: "Server") -> None:
     kept = _Kept()
 
     @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_FULL, _LEGEND)
-    async def full(params: types.SemanticTokensParams) -> types.SemanticTokens:
+    async def full(params: types.SemanticTokensParams) -> JsonText:
         document = server.documents[params.text_document.uri]
-        return kept.keep(document, await _tokens(document, document.occurrences))
+        data, parts = await _tokens(document, document.occurrences)
+        return _answer(parts, kept.keep(document, data))
 
     @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_FULL_DELTA, _LEGEND)
-    async def delta(
-        params: types.SemanticTokensDeltaParams,
-    ) -> types.SemanticTokens | types.SemanticTokensDelta:
+    async def delta(params: types.SemanticTokensDeltaParams) -> JsonText | types.SemanticTokensDelta:
         document = server.documents[params.text_document.uri]
-        new = await _tokens(document, document.occurrences)
+        new, parts = await _tokens(document, document.occurrences)
         old = kept.known(document, params.previous_result_id)
-        answer = kept.keep(document, new)
+        result_id = kept.keep(document, new)
         if old is None:
-            return answer
-        return types.SemanticTokensDelta(_edits(old, new), answer.result_id)
+            return _answer(parts, result_id)
+        return types.SemanticTokensDelta(_edits(old, new), result_id)
 
     @server.feature(types.TEXT_DOCUMENT_SEMANTIC_TOKENS_RANGE, _LEGEND)
-    async def in_range(params: types.SemanticTokensRangeParams) -> types.SemanticTokens:
+    async def in_range(params: types.SemanticTokensRangeParams) -> JsonText:
         document = server.documents[params.text_document.uri]
-        return types.SemanticTokens(await _tokens(document, _within(document, params.range)))
+        return _answer((await _tokens(document, _within(document, params.range)))[1])
+
+
+def _answer(parts: Sequence[str], result_id: str | None = None) -> JsonText:
+    name = f'"resultId":"{result_id}",' if result_id is not None else ""
+    return JsonText([f'{{{name}"data":[', ",".join(part for part in parts if part), "]}"])
 
 
 class _Kept:
-    """The last answer for each text that is open."""
+    """The last answer for each text that is open, with its name."""
 
     def __init__(self) -> None:
-        self._known: WeakKeyDictionary[OpenDocument, types.SemanticTokens] = WeakKeyDictionary()
+        self._known: WeakKeyDictionary[OpenDocument, tuple[str, Sequence[int]]] = WeakKeyDictionary()
         self._numbers = itertools.count(1)
 
-    def keep(self, document: OpenDocument, data: list[int]) -> types.SemanticTokens:
-        """Keep an answer, and give it."""
-        answer = types.SemanticTokens(data, str(next(self._numbers)))
-        self._known[document] = answer
-        return answer
+    def keep(self, document: OpenDocument, data: Sequence[int]) -> str:
+        """Keep an answer, and give its name."""
+        result_id = str(next(self._numbers))
+        self._known[document] = result_id, data
+        return result_id
 
     def known(self, document: OpenDocument, result_id: str) -> Sequence[int] | None:
         """An answer by its name; None for one that isn't the last."""
-        answer = self._known.get(document)
-        return answer.data if answer is not None and answer.result_id == result_id else None
+        known, data = self._known.get(document, (None, ()))
+        return data if known == result_id else None
 
 
 def _within(document: OpenDocument, range: types.Range) -> Sequence[Occurrence]:
@@ -101,37 +107,54 @@ def _within(document: OpenDocument, range: types.Range) -> Sequence[Occurrence]:
     return occurrences[first : bisect_right(occurrences, document.place(range.end), key=start_of)]
 
 
-async def _tokens(document: OpenDocument, occurrences: Sequence[Occurrence]) -> list[int]:
-    """Five numbers a name: rows and columns from the one before, length, type and modifiers."""
-    kinds = _Kinds(document.analysis)
-    data: list[int] = []
-    row = column = 0
+async def _tokens(document: OpenDocument, occurrences: Sequence[Occurrence]) -> tuple[list[int], list[str]]:
+    """Five numbers a name: rows and columns from the one before, length, type and modifiers; and as JSON."""
+    kinds = _Kinds()
+    async for scopes in document.live.slices(document.analysis.scopes):
+        kinds.add(scopes)
+    encoder, parts = _Encoder(document, kinds), []
     async for part in document.live.slices(occurrences):
+        before = len(encoder.data)
         for occurrence in part:
-            place = document.range(occurrence.range)
-            start, end = place.start, place.end
-            if (start.line, start.character) < (row, column) or end.line != start.line:
-                continue  # `*`, or a name that stands within another one's hint
-            before = column if start.line == row else 0
-            number, modifiers = kinds.of(occurrence)
-            data += (
-                start.line - row,
-                start.character - before,
-                end.character - start.character,
-                number,
-                modifiers,
-            )
-            row, column = start.line, start.character
-    return data
+            encoder.add(occurrence)
+        parts.append(items_as_json(encoder.data[before:]))
+    return encoder.data, parts
+
+
+class _Encoder:
+    """Tokens as numbers, one after another."""
+
+    def __init__(self, document: OpenDocument, kinds: "_Kinds") -> None:
+        self.data: list[int] = []
+        self._document = document
+        self._kinds = kinds
+        self._row = self._column = 0
+
+    def add(self, occurrence: Occurrence) -> None:
+        """Take the next name; none for `*`, or for a name that is within another one's hint."""
+        place = occurrence.range
+        row, column = self._document.counted(place.row, place.column)
+        if place.end_row != place.row or (row, column) < (self._row, self._column):
+            return
+        name = occurrence.name
+        length = len(name)
+        if not name.isascii() or place.end_column - place.column != length:
+            length = self._document.counted(place.end_row, place.end_column)[1] - column
+        number, modifiers = self._kinds.of(occurrence)
+        before = self._column if row == self._row else 0
+        self.data += (row - self._row, column - before, length, number, modifiers)
+        self._row, self._column = row, column
 
 
 class _Kinds:
     """What the names of a text are."""
 
-    def __init__(self, analysis: Analysis) -> None:
+    def __init__(self) -> None:
         self._of_symbol: dict[tuple[Scope, str], str] = {}
-        self._analysis = analysis
-        for scope in analysis.scopes:
+
+    def add(self, scopes: Iterable[Scope]) -> None:
+        """Take the names of classes and functions by their scopes."""
+        for scope in scopes:
             if scope.parent is None or scope.kind not in (ScopeKind.CLASS, ScopeKind.FUNCTION):
                 continue
             owner = scope.parent
@@ -197,5 +220,8 @@ def _edits(old: Sequence[int], new: Sequence[int]) -> list[types.SemanticTokensE
 
 def _common(one: Sequence[int], other: Sequence[int], most: int) -> int:
     """How many numbers both begin with, in whole tokens."""
-    count = next((i for i in range(most) if one[i] != other[i]), most)
+    size, count = _COMPARED_AT_ONCE, 0
+    while count < most and one[count : count + size] == other[count : count + size]:
+        count += size
+    count = next((i for i in range(count, most) if one[i] != other[i]), most)
     return count // _WIDTH * _WIDTH
