@@ -110,6 +110,7 @@ def test_the_examples(run_cli):
         (["check", "--baseline", "absent.json"], "can't read absent.json: No such file or directory"),
         (["--verson"], "no option --verson: did you mean '--version'?"),
         (["completion", "csh"], "unknown value 'csh'"),
+        (["check", "--stdin-filename", "a.py", "."], "name - to read it"),
         (["check", "-o", "absent/a.txt", "."], "can't write absent/a.txt: No such file or directory"),
         (["tree", "f.py:1", "-c", "x"], "not allowed with"),
         (["tree", "-c", "x", "--format", "xml"], "unknown value 'xml'"),

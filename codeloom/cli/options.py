@@ -95,6 +95,8 @@ class Options:
         for name, value in given.items():
             setattr(self, name, value)
         self._check_output()
+        if self.stdin_filename is not None and StandardInput.NAME not in (*self.paths, self.place):
+            raise WrongUseError("--stdin-filename is for the standard input: name - to read it")
 
     @property
     def version(self) -> str:
