@@ -184,7 +184,9 @@ def _add_selecting(parser: argparse.ArgumentParser) -> None:
         "--select", **codes, help="report only these codes, such as CL301, or CL3 for all that begin with it"
     )
     group.add_argument(
-        "--ignore", **codes, help="don't report these codes; where a code matches both options, the longer match counts"
+        "--ignore",
+        **codes,
+        help="don't report these codes; where a code matches both options, the longer match counts",
     )
     group.add_argument(
         "--baseline",
