@@ -33,7 +33,7 @@ x = [1, 2}}
 BOOK = {
     "cells": [
         {"cell_type": "markdown", "source": "text"},
-        {"cell_type": "code", "source": "%magic\nfirst = 1\n"},
+        {"cell_type": "code", "source": "%magic\nfirst = 1\nitems = ("},
         {"cell_type": "code", "source": "ok = 1\nsecond = first +\n"},
     ]
 }
@@ -106,7 +106,16 @@ def test_what_the_page_holds(page_file):
         and len(text) == 1000
         and len(text) + cut_after == len(SOURCES["src/wide.py"].splitlines()[0])
     )
-    assert by_path["src/book.ipynb"][1]["problems"][0]["cell"] == [3, 2]
+    number, book = by_path["src/book.ipynb"]
+    assert [problem["cell"] for problem in book["problems"]] == [[2, 3], [3, 2]]
+    assert data(page_file, number)["rows"] == [
+        "%magic",
+        "first = 1",
+        "items = (",
+        "",
+        "ok = 1",
+        "second = first +",
+    ]
 
 
 def test_rows_around_problems(tmp_path):
@@ -118,10 +127,11 @@ def test_rows_around_problems(tmp_path):
 
 
 def test_more_problems_than_are_shown(tmp_path):
-    write(tmp_path, {"a.py": "x = )\n" * 1000})
+    write(tmp_path, {"a.py": "x = )\n" * 1000 + "y = (\n"})
     page = report_on(tmp_path, ".")
     (file,) = data(page)
-    assert file["errors"] == 1000 and len(file["problems"]) == 200
+    assert file["errors"] == 1001 and len(file["problems"]) == 200
+    assert file["more_codes"] == "CL202 CL203"
 
 
 def test_the_same_input_gives_the_same_page(tmp_path, monkeypatch):
@@ -334,7 +344,7 @@ def test_search(page_file, visit):
 
     assert found("pkg sound") == ["src/pkg/sound.py"]
     assert found("cl204") == ["src/pkg/box.py"]
-    assert found("never CLOSED") == ["src/pkg/box.py", "src/wide.py"]
+    assert found("never CLOSED") == ["src/book.ipynb", "src/pkg/box.py", "src/wide.py"]
     assert found("filler_299") == ["src/pkg/box.py"]
     summary_of(page, "box.py").click()
     page.locator(".note a", has_text="filler_299").click()
@@ -357,7 +367,7 @@ def test_links_lead_to_rows_and_codes(page_file, visit):
     assert row.locator("code").inner_text() == "filler_238 = 238" and row.is_visible()
     page.goto(f"{page_file.as_uri()}#file-src/book.ipynb")
     assert page.locator(".source .cell").all_text_contents() == ["cell 2", "cell 3"]
-    assert page.locator(".problem .place").last.inner_text() == "cell 3, 2:16"
+    assert page.locator(".problem .place", has_text="cell 3, 2:16").is_visible()
     page.goto(f"{page_file.as_uri()}#folder-src/pkg")
     page.locator("#found", has_text="in src/pkg").wait_for()
     assert page.locator("[role=treeitem][aria-selected=true] > .label").inner_text().split() == [
@@ -365,6 +375,26 @@ def test_links_lead_to_rows_and_codes(page_file, visit):
         "2",
         "problems",
     ]
+
+
+@IN_BROWSER
+def test_theme_and_opening_all(page_file, visit):
+    page = visit(page_file)
+    theme = page.locator("#theme")
+    theme.click()
+    theme.click()
+    assert theme.inner_text() == "Theme: dark"
+    page.reload()
+    assert page.evaluate("getComputedStyle(document.body).color") == "rgb(230, 234, 241)"
+    page.requested.pop()
+    page.get_by_text("Open or close all").click()
+    assert page.locator("#list details[open]").count() == len(SOURCES)
+    page.locator("#search").fill("box")
+    page.locator("#found", has_text="found: 1 file").wait_for()
+    assert page.locator(".source").count() == 1
+    page.get_by_text("Open or close all").click()
+    summary_of(page, "box.py").click()
+    assert page.url.endswith("#file-src/pkg/box.py")
 
 
 @IN_BROWSER

@@ -193,7 +193,7 @@ def read_source(path: str, options: Options, version: str) -> Source:
         notebook = read_notebook(data, name)
     text = data if notebook is None else notebook.text
     analysis = analyze(text, path=name, python=version, false_hints=options.false_hints)
-    return Source(name, analysis, notebook)
+    return Source(name, analysis, notebook, None if notebook is None else notebook.written_rows)
 
 
 def as_named(path: str) -> str:

@@ -4,6 +4,7 @@ from __future__ import annotations
 
 import os
 from bisect import bisect_right
+from collections.abc import Sequence
 from functools import cached_property
 
 from codeloom._analysis import Analysis, Problem, Range
@@ -26,12 +27,22 @@ _NOTEBOOK_FORMS = ("'await' outside function", "'async ", "asynchronous comprehe
 
 
 class Source:
-    """A file, or the standard input, with its analysis; for a notebook the one of its cells."""
+    """A file, or the standard input, with its analysis; for a notebook the one of its cells.
 
-    def __init__(self, path: str, analysis: Analysis, notebook: CellPlaces | None = None) -> None:
+    `written_rows` are the rows as the file has them, where the text isn't the same.
+    """
+
+    def __init__(
+        self,
+        path: str,
+        analysis: Analysis,
+        notebook: CellPlaces | None = None,
+        written_rows: Sequence[str] | None = None,
+    ) -> None:
         self.path = path
         self.analysis = analysis
         self._notebook = notebook
+        self._written_rows = written_rows
 
     @property
     def is_notebook(self) -> bool:
@@ -54,6 +65,11 @@ class Source:
     def row_text(self, row: int) -> str:
         """A row of the text; nothing for one after the last."""
         return self.rows[row - 1] if row <= len(self.rows) else ""
+
+    def written_row(self, row: int) -> str:
+        """The same as the file has it."""
+        rows = self.rows if self._written_rows is None else self._written_rows
+        return rows[row - 1] if row <= len(rows) else ""
 
     def holds(self, text: str) -> bool:
         """False when a text is nowhere in the source."""

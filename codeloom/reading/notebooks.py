@@ -38,12 +38,15 @@ class Notebook:
     """The text of the code cells, for `analyze`."""
     is_python: bool
     """False for a notebook in another language, whose text is empty."""
+    written_rows: list[str]
+    """The rows of `text` as the cells have them, with their magic; empty ones for those that no cell has."""
 
     def __init__(self, data: bytes) -> None:
         """Read a notebook from its JSON; ValueError when it isn't one."""
         cells, self.is_python = _code_cells(data)
         self._cells: list[int] = []
         self._first_rows: list[int] = []
+        self.written_rows: list[str] = []
         texts = []
         row = 1
         for number, source in cells if self.is_python else ():
@@ -51,7 +54,10 @@ class Notebook:
             self._cells.append(number)
             self._first_rows.append(row)
             texts.append(text)
-            row += text.count("\n")
+            count = text.count("\n")
+            row += count
+            written = _ROW_END.sub("\n", source).split("\n")
+            self.written_rows += [*written, ""][:count]
         self.text = "".join(texts)
 
     def place(self, row: int) -> tuple[int, int]:

@@ -28,6 +28,7 @@ def summary_fields(source: Source, findings: Sequence[Finding], shown: Sequence[
         "errors": severities["error"],
         "warnings": severities["warning"],
         "problems": [_problem_fields(finding) for finding in shown],
+        "more_codes": " ".join(sorted({finding.code for finding in findings[len(shown) :]})),
         "names": _names(source),
     }
     return {key: value for key, value in fields.items() if value or key == "path"}
@@ -50,7 +51,7 @@ def row_fields(source: Source, findings: Sequence[Finding], *, is_whole: bool) -
     fields = {
         "whole": is_whole,
         "shown": shown,
-        "rows": [shown_row(source.row_text(row), faults.get(row)) for row in rows],
+        "rows": [shown_row(source.written_row(row), faults.get(row)) for row in rows],
         **names.fields(rows),
     }
     if source.is_notebook:

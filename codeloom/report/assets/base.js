@@ -24,6 +24,7 @@ const allFiles = readData("data-files").map((file, number) => ({
   errors: 0,
   warnings: 0,
   problems: [],
+  more_codes: "", // of problems that aren't in the page
   names: "",
   ...file,
   count: (file.errors ?? 0) + (file.warnings ?? 0),

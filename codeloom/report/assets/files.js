@@ -7,7 +7,7 @@ const MOST_NAMES = 12;
 
 /** A file's texts to search, in lower case. */
 function haystackOf(file) {
-  file.haystack ??= [file.path, file.names, ...file.problems.map(problemText)].join("\n").toLowerCase();
+  file.haystack ??= [file.path, file.names, file.more_codes, ...file.problems.map(problemText)].join("\n").toLowerCase();
   return file.haystack;
 }
 const problemText = (problem) => `${problem.code} ${problem.message} ${problem.hint ?? ""}`;
@@ -33,6 +33,7 @@ class FileList {
     byId("sort").addEventListener("change", () => this.update());
     byId("faulty").addEventListener("change", () => this.update());
     byId("controls").addEventListener("submit", (event) => event.preventDefault());
+    byId("all").addEventListener("click", () => this.openAll());
     this.more.addEventListener("click", () => this.showMore());
     this.list.addEventListener("keydown", (event) => this.move(event));
   }
@@ -80,6 +81,13 @@ class FileList {
     this.list.children[start]?.querySelector("summary").focus();
   }
 
+  /** Open the files that are in the list, or close them if all are open. */
+  openAll() {
+    const all = [...this.list.querySelectorAll("details")];
+    const isOpening = all.some((details) => !details.open);
+    for (const details of all) details.open = isOpening;
+  }
+
   showCounts() {
     const { found, words, folder } = this;
     const problems = found.reduce((sum, file) => sum + file.count, 0);
@@ -103,9 +111,11 @@ class FileList {
         this.open.delete(file);
       }
     });
+    details.firstChild.addEventListener("click", () => {
+      if (!details.open) history.replaceState(null, "", fileLink(file)); // to be copied
+    });
     if (this.open.has(file)) this.fill(details, file);
     details.open = this.open.has(file);
-    details.file = file;
     return make("li", {}, details);
   }
 
@@ -188,7 +198,9 @@ class FileList {
     const element = row ? details.view?.reveal(row) : null;
     for (const old of this.list.querySelectorAll(".row.target")) old.classList.remove("target");
     element?.classList.add("target");
-    (element ?? details).scrollIntoView({ block: element ? "center" : "start" });
+    const goThere = () => (element ?? details).scrollIntoView({ block: element ? "center" : "start" });
+    goThere();
+    requestAnimationFrame(goThere); // what is now in view may take more room than it was given before
     (element?.querySelector(".number") ?? details.querySelector("summary")).focus({ preventScroll: true });
   }
 }

@@ -73,9 +73,10 @@ function marksOf(file) {
   return marks;
 }
 
-/** The marks of a row as [start, end, kind] in its text, each of one character or more. */
+/** The marks of a row as [start, end, kind] in its text, each of one character or more; not those of what is cut. */
 function marksIn(row, length, marks) {
-  return marks.map(([first, end, kind]) => {
+  const isHeld = ([first, end]) => end > row.start && (first < row.start + length || !row.cutAfter);
+  return marks.filter(isHeld).map(([first, end, kind]) => {
     const start = Math.min(Math.max(first - row.start, 0), length);
     return [start, Math.max(Math.min(end - row.start, length), start + 1), kind];
   });
