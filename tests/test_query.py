@@ -5,6 +5,7 @@ import io
 import json
 import os
 from pathlib import Path
+from xml.etree import ElementTree
 
 import pytest
 from tools_of_project import tool_named
@@ -68,9 +69,24 @@ def test_what_cannot_be_answered(capsys, index, tmp_path):
     assert Answer(capsys, "CREATE TABLE mine (x INTEGER)", index).err == ""
 
 
-def test_the_questions_of_the_page_can_be_asked(capsys, index):
+@pytest.fixture
+def folder_of_questions(tmp_path, monkeypatch):
+    """What the page's commands make, of the examples and as some versions only."""
+    monkeypatch.chdir(tmp_path)
+    (tmp_path / "python3.11").symlink_to(ROOT / "examples")
+    assert main(["index", "-q", "python3.11", "-o", "index"]) == 0
+    for version in ("2.7", "3.0", "3.14"):
+        arguments = ["index", "-q", "--python", version, "--tables", "problems", "python3.11"]
+        assert main([*arguments, "-o", f"versions/version={version}"]) == 0
+    return tmp_path
+
+
+def test_the_questions_of_the_page_can_be_asked(capsys, folder_of_questions):
     tool = tool_named("answer_questions")
     questions = tool.questions()
     assert len(questions) == 10
-    for sql in questions:
-        Answer(capsys, sql, index)
+    for sql, columns in questions:
+        out = Answer(capsys, sql, "index", "--format", "csv").out
+        assert out.splitlines()[0].split(",") == columns
+    years = {element.text for element in ElementTree.fromstring(tool.picture(folder_of_questions)).iter()}
+    assert years >= {"2025", "the library", "100%"}
