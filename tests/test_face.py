@@ -162,7 +162,7 @@ class TestPaths:
     def test_order_and_errors(self, write_files):
         folder = write_files({f"a/{i:03}.py": f"x{i} = )\n" * (i % 7) for i in range(60)})
         paths = [folder / "absent.py", folder]
-        for jobs in (1, 2, 5, None):
+        for jobs in (1, 2, 5, 10**20, None):
             errors = []
             found = list(analyze_paths(paths, jobs=jobs, on_error=errors.append))
             assert [os.path.basename(analysis.path) for analysis in found] == [

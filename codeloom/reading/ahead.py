@@ -14,6 +14,8 @@ if TYPE_CHECKING:
 
     Found = TypeVar("Found")
 
+# More threads than these would only wait for each other.
+_MOST_JOBS = 1024
 # How many batches are read ahead for each further thread.
 _AHEAD_PER_JOB = 16
 # The first batches are small, so that the first result comes soon.
@@ -35,6 +37,7 @@ def read_ahead(
     takes more to read: notebooks, the standard input, what has to be decoded, what can't be read; and with
     whatever isn't a path.
     """
+    jobs = min(jobs, _MOST_JOBS)
     reader = FileReader(jobs, python, version_number(python), false_hints, records, names)
     close = reader.close
     atexit.register(close)  # a thread that doesn't end with the interpreter may be in the midst of it
