@@ -111,6 +111,7 @@ def test_the_examples(run_cli):
         (["--verson"], "no option --verson: did you mean '--version'?"),
         (["completion", "csh"], "unknown value 'csh'"),
         (["check", "--stdin-filename", "a.py", "."], "name - to read it"),
+        (["index", "-o", "i", "--part-size", "inf"], "a number of more than 0, not inf"),
         (["check", "-o", "absent/a.txt", "."], "can't write absent/a.txt: No such file or directory"),
         (["tree", "f.py:1", "-c", "x"], "not allowed with"),
         (["tree", "-c", "x", "--format", "xml"], "unknown value 'xml'"),

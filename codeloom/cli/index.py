@@ -3,6 +3,7 @@
 import argparse
 import os
 from collections.abc import Iterator
+from math import inf, nan
 from typing import TYPE_CHECKING
 
 from codeloom._face import processor_count
@@ -229,7 +230,10 @@ def _table_names(text: str) -> list[str]:
 
 
 def _positive(text: str) -> float:
-    value = float(text)
-    if not value > 0:
-        raise ValueError(f"it must be more than 0, not {text}")
+    try:
+        value = float(text)
+    except ValueError:
+        value = nan
+    if not 0 < value < inf:
+        raise ValueError(f"it must be a number of more than 0, not {text}")
     return value

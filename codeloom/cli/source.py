@@ -129,7 +129,7 @@ class Source:
 
 def printable_path(path: str) -> str:
     """`path` as a row of a terminal can show it, whatever bytes it is made of."""
-    return printable(os.fsencode(path).decode(errors="backslashreplace"))
+    return printable(os.fsencode(path).decode(errors="backslashreplace")) or "''"
 
 
 def path_fields(path: str) -> dict[str, str]:
