@@ -151,7 +151,8 @@ class FileList {
       details.append(make("p", { class: "note" }, "The page holds the rows around problems, and there are none here."));
     }
     if (omitted) {
-      const text = `${counted(omitted, "problem")} more: run codeloom check on the file.`;
+      const verb = omitted === 1 ? "isn't" : "aren't";
+      const text = `${counted(omitted, "problem")} ${verb} in this page; codeloom check shows all.`;
       details.append(make("p", { class: "note" }, text));
     }
   }

@@ -20,13 +20,11 @@ class FileRows {
   /** The number of the first row that has a name; undefined when there is none in the page. */
   firstRowWith(name) {
     for (const number of this.place.keys()) {
-      const { text, start, names } = this.row(number);
-      if (!text.includes(name)) continue;
-      const characters = charactersOf(text);
-      for (let i = 0; i < names.length; i += 4) {
-        const first = names[i] - start;
-        if (names[i + 2] >= 0 && textOf(characters, first, first + names[i + 1]) === name) return number;
-      }
+      const row = this.row(number);
+      if (!row.text.includes(name)) continue;
+      const characters = charactersOf(row.text);
+      const isIt = ([start, end, fact]) => fact >= 0 && textOf(characters, start, end) === name;
+      if (namesIn(row, characters.length).some(isIt)) return number;
     }
     return undefined;
   }
