@@ -4,6 +4,7 @@ import csv
 import io
 import json
 import os
+import shutil
 from pathlib import Path
 from xml.etree import ElementTree
 
@@ -38,8 +39,15 @@ def test_a_table_for_people(capsys, index):
         "a\N{REPLACEMENT CHARACTER}b       12            0.25",
         "c          3            1.00",
     ]
-    wide = Answer(capsys, "SELECT repeat('x', 200) AS wide", index).out.splitlines()
-    assert wide[-1] == "x" * 77 + "..."
+    wide = Answer(capsys, "SELECT repeat('x', 200) AS wide, true AS yes", index).out.splitlines()
+    assert wide[-1] == "x" * 77 + "...  true"
+    assert Answer(capsys, "SELECT '\u4e00' AS a, 1234567.5::DOUBLE AS b", index).out.splitlines() == [
+        "a           b",
+        "--  ---------",
+        "\u4e00  1234567.5",
+    ]
+    numbers = Answer(capsys, "SELECT 10 ** (range // 1000) AS n FROM range(2000)", index).out.splitlines()
+    assert numbers[-1] == "10"
 
 
 def test_formats_for_programs(capsys, index):
@@ -48,6 +56,27 @@ def test_formats_for_programs(capsys, index):
     assert rows and all(set(row) == {"path", "state", "lines"} for row in rows)
     table = csv.DictReader(io.StringIO(Answer(capsys, sql, index, "--format", "csv").out))
     assert [row["path"] for row in table] == [row["path"] for row in rows]
+
+
+def test_values_that_a_format_does_not_have(capsys, index):
+    sql = (
+        "SELECT 1 AS a, 2 AS a, 'nan'::DOUBLE AS b, [1e999] AS c, 0.5::DECIMAL(3, 1) AS d, "
+        "DATE '2020-01-31' AS e, 'a\nb' || chr(0) AS f, MAP {1: true} AS g"
+    )
+    (row,) = Answer(capsys, sql, index, "--format", "jsonl").out.splitlines()
+    expected = {
+        "a": 1,
+        "a_1": 2,
+        "b": None,
+        "c": [None],
+        "d": 0.5,
+        "e": "2020-01-31",
+        "f": "a\nb\0",
+        "g": {"1": True},
+    }
+    assert json.loads(row, parse_constant=pytest.fail) == expected
+    out = Answer(capsys, "SELECT true AS a, NULL AS b, 'x,\ny' AS c", index, "--format", "csv").out
+    assert out == 'a,b,c\ntrue,,"x,\ny"\n'
 
 
 def test_more_rows_than_are_fetched_at_once(capsys, index):
@@ -60,6 +89,8 @@ def test_what_cannot_be_answered(capsys, index, tmp_path):
         ("SELECT nothing FROM files", "nothing"),
         ("SELEC", "syntax error"),
         ("SELECT CAST(path AS INTEGER) FROM files", "INT32"),
+        ("-- nothing", "there is no statement"),
+        ("SELECT '\udcff'", "isn't UTF-8"),
     ):
         told = Answer(capsys, sql, index, status=2)
         assert words in told.err and "Traceback" not in told.err
@@ -67,6 +98,24 @@ def test_what_cannot_be_answered(capsys, index, tmp_path):
     assert f"there is no index in {tmp_path}: make one with codeloom index" in told.err
     assert Answer(capsys, "SELECT 1", os.path.join(tmp_path, "void"), status=2).out == ""
     assert Answer(capsys, "CREATE TABLE mine (x INTEGER)", index).err == ""
+
+
+def test_folders_of_indexes(capsys, index, tmp_path):
+    """A name is no pattern and no column; what is damaged is named."""
+    for name in ("version=3[1]*", "version=311"):
+        shutil.copytree(index, tmp_path / name)
+    columns = Answer(capsys, "DESCRIBE files", str(tmp_path / "version=311"), "--format", "csv").out
+    assert "version" not in columns
+    counts = {
+        Answer(capsys, "SELECT count(*) FROM files", folder, "--format", "csv").out
+        for folder in (index, str(tmp_path / "version=3[1]*"))
+    }
+    assert len(counts) == 1
+    (tmp_path / "version=311/records/00000000.parquet").write_bytes(b"")
+    told = Answer(capsys, "SELECT 1", str(tmp_path / "version=311"), status=2).err
+    assert "is damaged" in told and "records" in told
+    os.rename(tmp_path / "version=311", os.fsencode(tmp_path) + b"/\xff")
+    assert "isn't UTF-8" in Answer(capsys, "SELECT 1", f"{tmp_path}/\udcff", status=2).err
 
 
 @pytest.fixture

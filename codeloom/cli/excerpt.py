@@ -70,6 +70,11 @@ def printable(text: str) -> str:
     )
 
 
+def width_of(text: str) -> int:
+    """How many columns of a terminal it takes."""
+    return len(text) if text.isascii() else sum(map(_width_of, text))
+
+
 def on_one_row(text: str) -> str:
     """`text` with a blank for each end of a row and the blanks around it, as hints in quotes may have."""
     return _ROW_END.sub(" ", text.strip())

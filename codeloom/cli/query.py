@@ -6,13 +6,15 @@ import argparse
 import csv
 import io
 import json
+from decimal import Decimal
 from itertools import chain, islice
+from math import isfinite
 from numbers import Number
 from typing import TYPE_CHECKING, Any
 
 from codeloom.cli.command import Command, ExitStatus
 from codeloom.cli.console import Console
-from codeloom.cli.excerpt import printable
+from codeloom.cli.excerpt import printable, width_of
 from codeloom.cli.extras import needing_extra
 from codeloom.cli.options import Options, WrongUseError
 
@@ -22,9 +24,10 @@ if TYPE_CHECKING:
     from codeloom.corpus.query import Answer
 
 _FORMATS = ("text", "csv", "jsonl")
-# The rows of a table for people are as wide as the widest of so many, and a cell isn't wider than this.
+# A column of a table for people is as wide as the widest of so many rows, and no cell is wider than this.
 _ROWS_MEASURED = 1000
 _MOST_WIDTH = 80
+_CUT = "..."
 
 
 class QueryCommand(Command):
@@ -65,8 +68,7 @@ class QueryCommand(Command):
 def _print(answer: Answer, style: str, console: Console) -> None:
     if style == "jsonl":
         for row in answer.rows:
-            fields = dict(zip(answer.columns, row, strict=True))
-            console.print_row(json.dumps(fields, ensure_ascii=False, default=str))
+            console.print_row(_json_row(dict(zip(answer.columns, row, strict=True))))
     elif style == "csv":
         for cells in chain([answer.columns] if answer.columns else [], answer.rows):
             console.write(_csv_row(cells))
@@ -74,9 +76,31 @@ def _print(answer: Answer, style: str, console: Console) -> None:
         _print_table(answer, console)
 
 
+def _json_row(fields: dict[str, Any]) -> str:
+    try:
+        return json.dumps(fields, ensure_ascii=False, allow_nan=False)
+    except (TypeError, ValueError):
+        return json.dumps(_json_value(fields), ensure_ascii=False)
+
+
+def _json_value(value: Any) -> Any:
+    """Null for numbers that aren't finite, and text for what else JSON doesn't have."""
+    if isinstance(value, dict):
+        return {str(key): _json_value(item) for key, item in value.items()}
+    if isinstance(value, list | tuple):
+        return [_json_value(item) for item in value]
+    if isinstance(value, Decimal):
+        value = float(value)
+    if isinstance(value, float):
+        return value if isfinite(value) else None
+    return value if value is None or isinstance(value, str | int) else str(value)
+
+
 def _csv_row(cells: Iterable[Any]) -> str:
     stream = io.StringIO()
-    csv.writer(stream, lineterminator="\n").writerow(cells)
+    csv.writer(stream, lineterminator="\n").writerow(
+        str(cell).lower() if isinstance(cell, bool) else cell for cell in cells
+    )
     return stream.getvalue()
 
 
@@ -84,7 +108,7 @@ def _print_table(answer: Answer, console: Console) -> None:
     """In columns; numbers go to the right."""
     measured = list(islice(answer.rows, _ROWS_MEASURED))
     widths = [
-        min(max(len(_shown(row[i])) for row in [answer.columns, *measured]), _MOST_WIDTH)
+        min(max(width_of(_shown(row[i])) for row in [answer.columns, *measured]), _MOST_WIDTH)
         for i in range(len(answer.columns))
     ]
     are_numbers = [
@@ -101,16 +125,26 @@ def _print_table(answer: Answer, console: Console) -> None:
 def _table_row(cells: Sequence[Any], widths: Sequence[int], are_numbers: Sequence[bool]) -> str:
     shown = []
     for cell, width, is_number in zip(cells, widths, are_numbers, strict=True):
-        text = _shown(cell)
-        if len(text) > width:
-            text = text[: width - 3] + "..."
-        shown.append(text.rjust(width) if is_number else text.ljust(width))
+        text = _fitted(_shown(cell))
+        room = " " * (width - width_of(text))
+        shown.append(room + text if is_number else text + room)
     return "  ".join(shown).rstrip()
+
+
+def _fitted(text: str) -> str:
+    """Cut where it is too wide for any column."""
+    if width_of(text) <= _MOST_WIDTH:
+        return text
+    while width_of(text) > _MOST_WIDTH - len(_CUT):
+        text = text[: min(_MOST_WIDTH, len(text) - 1)]
+    return text + _CUT
 
 
 def _shown(cell: Any) -> str:
     if cell is None:
         return ""
+    if isinstance(cell, bool):
+        return str(cell).lower()
     if isinstance(cell, float):
-        return f"{cell:.6g}"
+        return f"{cell:.6g}" if abs(cell) < 1e6 else f"{cell:.15g}"
     return printable(str(cell))

@@ -1,6 +1,8 @@
 """Questions in SQL about an index, answered by DuckDB."""
 
+import glob
 from collections.abc import Iterator, Sequence
+from itertools import chain, count
 from typing import Any
 
 import duckdb
@@ -16,7 +18,7 @@ class QueryError(Exception):
 
 
 class Answer:
-    """The columns of an answer, and its rows one after the other."""
+    """The columns of an answer, each with a name of its own, and its rows one after the other."""
 
     def __init__(self, columns: Sequence[str], rows: Iterator[tuple[Any, ...]]) -> None:
         self.columns = columns
@@ -29,23 +31,35 @@ def query(sql: str, folder: str) -> Answer:
     StoreError for what is no index, QueryError for SQL that can't be run, also while rows are fetched.
     """
     database = connect(folder)
+    if not _is_utf8(sql):
+        raise QueryError("the question isn't UTF-8")
     try:
         cursor = database.execute(sql)
-        columns = [column[0] for column in cursor.description or ()]
     except duckdb.Error as error:
         raise QueryError(str(error)) from None
-    return Answer(columns, _rows(cursor) if columns else iter(()))
+    if cursor is None:
+        raise QueryError("there is no statement in the question")
+    columns = [column[0] for column in cursor.description or ()]
+    return Answer(_distinct(columns), _rows(cursor) if columns else iter(()))
 
 
 def connect(folder: str) -> Any:
-    """A database in memory with a view for each table of the index in a folder."""
+    """A database in memory with a view for each table of the index in a folder; StoreError for what is none,
+    and for one that can't be read."""
     store = Store(folder)
     if not store.parts:
         raise StoreError(f"there is no index in {folder}: make one with codeloom index PATH -o {folder}")
+    if not _is_utf8(folder):
+        raise StoreError("the database reads nothing below a folder whose name isn't UTF-8")
     database = duckdb.connect()
     for table in store.tables:
-        files = ", ".join(_quoted(path) for path in store.files_of(table))
-        database.execute(f'CREATE VIEW "{table}" AS SELECT * FROM read_parquet([{files}])')
+        files = ", ".join(_quoted(glob.escape(path)) for path in store.files_of(table))
+        try:
+            database.execute(
+                f'CREATE VIEW "{table}" AS SELECT * FROM read_parquet([{files}], hive_partitioning = false)'
+            )
+        except duckdb.Error as error:
+            raise StoreError(f"the index in {folder} is damaged: {error}") from None
     return database
 
 
@@ -58,6 +72,20 @@ def _rows(cursor: Any) -> Iterator[tuple[Any, ...]]:
         if not rows:
             return
         yield from rows
+
+
+def _distinct(names: Sequence[str]) -> list[str]:
+    """The names of columns, numbered where there are several of one, as in a data frame: name, name_1."""
+    distinct: dict[str, None] = {}
+    for name in names:
+        choices = chain([name], (f"{name}_{i}" for i in count(1)))
+        distinct[next(choice for choice in choices if choice not in distinct)] = None
+    return list(distinct)
+
+
+def _is_utf8(text: str) -> bool:
+    """False for what comes from the command line in other bytes."""
+    return text == text.encode(errors="replace").decode()
 
 
 def _quoted(text: str) -> str:
