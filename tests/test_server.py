@@ -102,6 +102,18 @@ def test_settings(tmp_path):
         assert Brief(client.diagnostics())[0] == ("0:4-0:5", "CL203")
 
 
+def test_comments_that_ignore(client):
+    """One may come while the text is typed."""
+    client.open("x = 1 1\ny = )\n")
+    assert len(client.diagnostics()) == 2
+    for i, character in enumerate("  # codeloom: ignore"):
+        client.change(((0, 7 + i), (0, 7 + i), character))
+        found = Brief(client.diagnostics())
+    assert found == [("1:4-1:5", "CL203")]
+    client.change(((1, 5), (1, 5), "\n  # codeloom: ignore"), ((1, 5), (2, 0), ""))
+    assert Brief(client.diagnostics()) == []
+
+
 def test_files_that_are_not_open(tmp_path):
     (tmp_path / "sub").mkdir()
     files = {"a.py": "x = )\n", "sub/b.py": "x = 1\n", "sub/c.py": "x = (\n", "d.ipynb": "{", ".h/e.py": ")"}

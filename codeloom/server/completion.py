@@ -7,7 +7,7 @@ from typing import TYPE_CHECKING
 
 from lsprotocol import types
 
-from codeloom._analysis import Analysis, Role, Scope, ScopeKind, Symbol
+from codeloom._analysis import Analysis, Occurrence, Role, Scope, ScopeKind, Symbol
 from codeloom.reading.languages import language_of
 from codeloom.server.blocks import line_at, scope_at
 from codeloom.server.document import OpenDocument
@@ -29,27 +29,26 @@ def register(server: "Server") -> None:
     """Answer what completes names."""
 
     @server.feature(types.TEXT_DOCUMENT_COMPLETION, types.CompletionOptions(trigger_characters=["."]))
-    def completion(params: types.CompletionParams) -> types.CompletionList:
+    async def completion(params: types.CompletionParams) -> types.CompletionList:
         document = server.documents[params.text_document.uri]
-        items = list(_items(document, document.place(params.position)))
-        return types.CompletionList(False, items)
+        return types.CompletionList(False, await _items(document, document.place(params.position)))
 
 
-def _items(document: OpenDocument, place: tuple[int, int]) -> Iterator[types.CompletionItem]:
+async def _items(document: OpenDocument, place: tuple[int, int]) -> list[types.CompletionItem]:
     row, column = place
     before = document.row(row)[: column - 1]
     typed = _CHAIN.search(before)
     if typed is None or _NEW_NAME.search(before) or _is_text(document.analysis, place):
-        return
+        return []
     if typed["word"][:1].isdigit():
-        return
+        return []
     scope = scope_at(document.analysis, place, _indent(before))
     if typed["object"]:
-        yield from _attributes(document, scope, re.sub(r"\s", "", typed["object"]).rstrip("."), place)
-    elif not before[: typed.start()].rstrip().endswith("."):
-        for name in _names_of_loops(document.analysis, place):
-            yield _item(name, _KINDS.Variable, "of this line", "0")
-        yield from _names(document, scope)
+        return await _attributes(document, scope, re.sub(r"\s", "", typed["object"]).rstrip("."), place)
+    if before[: typed.start()].rstrip().endswith("."):
+        return []
+    loops = _names_of_loops(document.analysis, place)
+    return [*(_item(name, _KINDS.Variable, "of this line", "0") for name in loops), *_names(document, scope)]
 
 
 def _indent(before: str) -> int:
@@ -117,9 +116,9 @@ def _scopes_outwards(scope: Scope) -> Iterator[Scope]:
         around = around.parent
 
 
-def _attributes(
+async def _attributes(
     document: OpenDocument, scope: Scope, chain: str, place: tuple[int, int]
-) -> Iterator[types.CompletionItem]:
+) -> list[types.CompletionItem]:
     """What the text says of an object: the names of a class, and what hangs on the same words elsewhere."""
     analysis = document.analysis
     owner = _class_of(analysis, scope, chain)
@@ -129,10 +128,12 @@ def _attributes(
         for symbol in owner.symbols:
             if symbol.is_local:
                 names[symbol.name] = kinds.get((owner, symbol.name)) or _KINDS.Field
-    for name in _written_attributes(document, chain, place):
-        names.setdefault(name, _KINDS.Property)
-    for name, kind in names.items():
-        yield _item(name, kind, f"of {chain}", "1" if name.startswith("_") else "0")
+    async for occurrences in document.live.slices(analysis.occurrences):
+        for name in _written_attributes(document, chain, place, occurrences):
+            names.setdefault(name, _KINDS.Property)
+    return [
+        _item(name, kind, f"of {chain}", "1" if name.startswith("_") else "0") for name, kind in names.items()
+    ]
 
 
 def _class_of(analysis: Analysis, scope: Scope, chain: str) -> Scope | None:
@@ -157,17 +158,17 @@ def _class_named(analysis: Analysis, owner: Scope, name: str) -> Scope | None:
     return None
 
 
-def _written_attributes(document: OpenDocument, chain: str, place: tuple[int, int]) -> Iterable[str]:
-    found: dict[str, None] = {}
-    for occurrence in document.analysis.occurrences:
+def _written_attributes(
+    document: OpenDocument, chain: str, place: tuple[int, int], occurrences: Iterable[Occurrence]
+) -> Iterator[str]:
+    for occurrence in occurrences:
         if occurrence.role not in _ATTRIBUTES:
             continue
         whole, one = occurrence.object, occurrence.range
         if whole is None or (one.end_row, one.end_column) == place or whole.row != whole.end_row:
             continue
         if document.row(whole.row)[whole.column - 1 : whole.end_column - 1] == chain:
-            found[occurrence.name] = None
-    return found
+            yield occurrence.name
 
 
 def _definition_kinds(analysis: Analysis) -> dict[tuple[Scope, str], types.CompletionItemKind]:

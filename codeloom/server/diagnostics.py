@@ -10,6 +10,7 @@ from lsprotocol import types
 
 from codeloom.cli.items import Finding
 from codeloom.server.document import OpenDocument
+from codeloom.server.json_text import Fields, JsonText
 from codeloom.server.live_text import LiveText
 from codeloom.server.patience import SECONDS
 from codeloom.server.places import PlacedText
@@ -18,7 +19,10 @@ if TYPE_CHECKING:
     from codeloom.server.server import Server
 
 SOURCE = "codeloom"
-_SEVERITIES = {"error": types.DiagnosticSeverity.Error, "warning": types.DiagnosticSeverity.Warning}
+_SEVERITIES = {
+    "error": types.DiagnosticSeverity.Error.value,
+    "warning": types.DiagnosticSeverity.Warning.value,
+}
 
 
 def register(server: "Server") -> None:
@@ -30,13 +34,13 @@ def register(server: "Server") -> None:
             inter_file_dependencies=False, workspace_diagnostics=False, identifier=SOURCE
         ),
     )
-    def diagnostic(params: types.DocumentDiagnosticParams) -> types.DocumentDiagnosticReport:
+    def diagnostic(params: types.DocumentDiagnosticParams) -> JsonText:
         document = server.documents[params.text_document.uri]
         items = diagnostics_of(document, server.publisher.due(document.live))
         identity = result_id(items)
         if identity == params.previous_result_id:
-            return types.RelatedUnchangedDocumentDiagnosticReport(identity)
-        return types.RelatedFullDocumentDiagnosticReport(items, result_id=identity)
+            return JsonText.of({"kind": "unchanged", "resultId": identity})
+        return JsonText.of({"kind": "full", "items": items, "resultId": identity})
 
 
 class Publisher:
@@ -48,7 +52,7 @@ class Publisher:
         # Of each text with problems that wait.
         self._timers: dict[LiveText, asyncio.TimerHandle] = {}
         # What was said last of each text, and of which version.
-        self._said: dict[str, tuple[int, Sequence[types.Diagnostic]]] = {}
+        self._said: dict[str, tuple[int, Sequence[Fields]]] = {}
 
     @property
     def is_asked(self) -> bool:
@@ -113,36 +117,38 @@ class Publisher:
             timer.cancel()
         return timer is not None
 
-    def publish(self, uri: str, items: Sequence[types.Diagnostic], version: int | None = None) -> None:
+    def publish(self, uri: str, items: Sequence[Fields], version: int | None = None) -> None:
         """Publish the diagnostics of any text, unless the client asks for them."""
-        if self.is_asked:
-            return
-        self._server.text_document_publish_diagnostics(types.PublishDiagnosticsParams(uri, items, version))
+        if not self.is_asked:
+            known = {"version": version} if version is not None else {}
+            params = {"uri": uri, **known, "diagnostics": items}
+            self._server.protocol.notify_by_fields(types.TEXT_DOCUMENT_PUBLISH_DIAGNOSTICS, params)
 
 
-def diagnostics_of(document: OpenDocument, findings: Sequence[Finding]) -> list[types.Diagnostic]:
+def diagnostics_of(document: OpenDocument, findings: Sequence[Finding]) -> list[Fields]:
     """Those of the problems that are in a text."""
     return [diagnostic_of(document, finding) for finding in findings if document.holds(finding.range.row)]
 
 
-def diagnostic_of(text: PlacedText, finding: Finding) -> types.Diagnostic:
+def diagnostic_of(text: PlacedText, finding: Finding) -> Fields:
     """One problem, with its hint after the message."""
     hint = f" (hint: {finding.hint})" if finding.hint else ""
-    return types.Diagnostic(
-        range=text.range(finding.range),
-        message=finding.message + hint,
-        severity=_SEVERITIES[finding.severity],
-        code=finding.code,
-        code_description=types.CodeDescription(_page(finding.code)),
-        source=SOURCE,
-        related_information=[
-            types.DiagnosticRelatedInformation(text.location(place), said) for place, said in finding.related
+    fields = {
+        "range": text.range_fields(finding.range),
+        "message": finding.message + hint,
+        "severity": _SEVERITIES[finding.severity],
+        "code": finding.code,
+        "codeDescription": {"href": _page(finding.code)},
+        "source": SOURCE,
+    }
+    if finding.related:
+        fields["relatedInformation"] = [
+            {"location": text.location_fields(place), "message": said} for place, said in finding.related
         ]
-        or None,
-    )
+    return fields
 
 
-def result_id(items: Sequence[types.Diagnostic]) -> str:
+def result_id(items: Sequence[Fields]) -> str:
     """What is the same for the same diagnostics."""
     import hashlib
 

@@ -13,6 +13,7 @@ from codeloom._analysis import Analysis
 from codeloom.cli.items import Finding
 from codeloom.server.diagnostics import diagnostic_of
 from codeloom.server.document import OpenDocument
+from codeloom.server.json_text import Fields, JsonText
 from codeloom.server.remedies import Remedy, remedies_for
 
 if TYPE_CHECKING:
@@ -26,16 +27,16 @@ def register(server: "Server") -> None:
     """Answer what asks for fixes."""
 
     @server.feature(types.TEXT_DOCUMENT_CODE_ACTION, types.CodeActionOptions([types.CodeActionKind.QuickFix]))
-    async def code_action(params: types.CodeActionParams) -> list[types.CodeAction]:
+    async def code_action(params: types.CodeActionParams) -> JsonText:
         wanted = params.context.only
         if wanted is not None and not any(_covers(kind, types.CodeActionKind.QuickFix) for kind in wanted):
-            return []
+            return JsonText.of([])
         document = server.documents[params.text_document.uri]
-        actions = []
+        actions: list[Fields] = []
         async for findings in document.live.slices(_findings_in(document, params.range), 1):
             for finding in findings:
                 actions += [_action(document, finding, one) for one in sound_remedies(document, finding)]
-        return actions
+        return JsonText.of(actions)
 
 
 def sound_remedies(document: OpenDocument, finding: Finding) -> Iterator[Remedy]:
@@ -69,11 +70,12 @@ def _covers(kind: str | types.CodeActionKind, narrower: types.CodeActionKind) ->
     return name == "" or f"{narrower.value}.".startswith(f"{name}.")
 
 
-def _action(document: OpenDocument, finding: Finding, remedy: Remedy) -> types.CodeAction:
-    return types.CodeAction(
-        remedy.title,
-        kind=types.CodeActionKind.QuickFix,
-        diagnostics=[diagnostic_of(document, finding)],
-        is_preferred=remedy.is_sure or None,
-        edit=document.workspace_edit(remedy.edits),
-    )
+def _action(document: OpenDocument, finding: Finding, remedy: Remedy) -> Fields:
+    preferred = {"isPreferred": True} if remedy.is_sure else {}
+    return {
+        "title": remedy.title,
+        "kind": types.CodeActionKind.QuickFix.value,
+        "diagnostics": [diagnostic_of(document, finding)],
+        **preferred,
+        "edit": document.workspace_edit(remedy.edits),
+    }

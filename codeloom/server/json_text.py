@@ -1,7 +1,11 @@
-"""Long answers as JSON that is made in slices: other messages have their turn between them."""
+"""Answers with very many parts: JSON without an object for each, made in slices where they are long."""
 
 import json
 from collections.abc import Sequence
+from typing import Any
+
+# What the protocol calls an object, by the names of its fields.
+Fields = dict[str, Any]
 
 
 class JsonText:
@@ -13,6 +17,11 @@ class JsonText:
     def encoded(self) -> bytes:
         """As it is sent."""
         return "".join(self._parts).encode()
+
+    @classmethod
+    def of(cls, value: object) -> "JsonText":
+        """A value with the fields that the protocol names."""
+        return cls([json.dumps(value)])
 
     @classmethod
     def of_list(cls, parts: Sequence[str]) -> "JsonText":

@@ -32,17 +32,18 @@ _SLICE = 256
 class _LiveSource(Source):
     """A source whose rows are at hand."""
 
-    def __init__(self, path: str, document: Document, notebook: "CellPlaces | None") -> None:
-        super().__init__(path, document.analysis, notebook)
-        self._document = document
+    def __init__(self, live: "LiveText", notebook: "CellPlaces | None") -> None:
+        super().__init__(live.path, live.analysis, notebook)
+        self._document = live.document
+        self._live = live
 
     def row_text(self, row: int) -> str:
         """As the base class does, without splitting the text."""
         return self._document.row(row) if row <= self._document.row_count else ""
 
     def holds(self, text: str) -> bool:
-        """Whether it does is looked up on the rows of problems alone, which are few."""
-        return True
+        """As the base class does; True also where the text has been there before."""
+        return self._live.may_hold(text)
 
 
 class LiveText:
@@ -76,12 +77,18 @@ class LiveText:
     @cached_property
     def findings(self) -> Sequence[Finding]:
         """The problems that settings and comments let through."""
-        return self.settings.passed(_LiveSource(self.path, self.document, self._notebook))
+        return self.settings.passed(_LiveSource(self, self._notebook))
 
     @property
     def due(self) -> Sequence[Finding]:
         """Those of the problems that don't wait for the end of the typing."""
         return self.patience.due(self.findings)
+
+    def may_hold(self, text: str) -> bool:
+        """False for a part of a row that isn't in the text and hasn't been since it was asked for."""
+        if text not in self._held:
+            self._held[text] = text in self.document.text
+        return self._held[text]
 
     def edit(self, start: Position, end: Position, new_text: str, written: "Written | None" = None) -> None:
         """Put a text in the place of another one; `written` is what the client did, where that is less."""
@@ -89,6 +96,7 @@ class LiveText:
         self.patience.before_edit(*written[:2], lambda: self.findings)
         self._edit(start, end, new_text)
         self._forget()
+        self._look_for_held(start[0], start[0] + len(RowTexts(new_text)))
         self.patience.after_edit(*written)
 
     @contextmanager
@@ -123,6 +131,7 @@ class LiveText:
 
     def _take(self, text: str, settings: Settings) -> None:
         self.settings = settings
+        self._held: dict[str, bool] = {}
         self.document = Document(
             text,
             path=self.path,
@@ -134,6 +143,11 @@ class LiveText:
 
     def _edit(self, start: Position, end: Position, new_text: str) -> None:
         self.document.edit(self.document.position(*start), self.document.position(*end), new_text)
+
+    def _look_for_held(self, first: int, after: int) -> None:
+        rows = [self.document.row(row) for row in range(first, min(after, self.document.row_count + 1))]
+        for text, was_held in self._held.items():
+            self._held[text] = was_held or any(text in row for row in rows)
 
     def _forget(self) -> None:
         self._revision += 1

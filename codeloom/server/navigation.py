@@ -7,6 +7,7 @@ from lsprotocol import types
 
 from codeloom._analysis import Occurrence, Role
 from codeloom.server.document import OpenDocument
+from codeloom.server.json_text import JsonText
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -19,25 +20,31 @@ def register(server: "Server") -> None:
     """Answer what asks for places of names."""
 
     @server.feature(types.TEXT_DOCUMENT_DEFINITION)
-    def definition(params: types.DefinitionParams) -> list[types.Location] | None:
+    def definition(params: types.DefinitionParams) -> JsonText:
         document = server.documents[params.text_document.uri]
         found = bindings_of(same_names(document, params.position))
-        return [document.location(one.range) for one in found] or None
+        return _locations(document, found)
 
     @server.feature(types.TEXT_DOCUMENT_REFERENCES)
-    def references(params: types.ReferenceParams) -> list[types.Location] | None:
+    def references(params: types.ReferenceParams) -> JsonText:
         document = server.documents[params.text_document.uri]
         found = same_names(document, params.position)
         if not params.context.include_declaration:
             bindings = set(bindings_of(found))
             found = [one for one in found if one not in bindings]
-        return [document.location(one.range) for one in found] or None
+        return _locations(document, found)
 
     @server.feature(types.TEXT_DOCUMENT_DOCUMENT_HIGHLIGHT)
-    def highlight(params: types.DocumentHighlightParams) -> list[types.DocumentHighlight] | None:
+    def highlight(params: types.DocumentHighlightParams) -> JsonText:
         document = server.documents[params.text_document.uri]
         found = [one for one in same_names(document, params.position) if document.holds(one.range.row)]
-        return [types.DocumentHighlight(document.range(one.range), _kind(one)) for one in found] or None
+        return JsonText.of(
+            [{"range": document.range_fields(one.range), "kind": _kind(one).value} for one in found] or None
+        )
+
+
+def _locations(document: OpenDocument, found: Sequence[Occurrence]) -> JsonText:
+    return JsonText.of([document.location_fields(one.range) for one in found] or None)
 
 
 def same_names(document: OpenDocument, position: types.Position) -> Sequence[Occurrence]:

@@ -13,6 +13,7 @@ from codeloom._document import Document, Position
 from codeloom.reading.notebooks import code_of_cell
 from codeloom.server.blocks import start_of
 from codeloom.server.document import OpenDocument
+from codeloom.server.json_text import Fields
 from codeloom.server.live_text import LiveText, Written
 from codeloom.server.settings import Settings
 
@@ -65,10 +66,10 @@ class Cell(OpenDocument):
         row, column = self._own.position(row, min(column, len(self._own.row(row)) + 1))
         return row - 1, column - 1
 
-    def location(self, place: Range) -> types.Location:
+    def location_fields(self, place: Range) -> Fields:
         """In the cell where it begins."""
         cell = self._notebook.cell_at(place.row)
-        return types.Location(cell.uri, cell.range(place))
+        return {"uri": cell.uri, "range": cell.range_fields(place)}
 
     def row_in_words(self, row: int) -> str:
         """With the number of the cell."""

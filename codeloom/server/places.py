@@ -7,6 +7,7 @@ from lsprotocol import types
 
 from codeloom._analysis import Range
 from codeloom.cli.source import Source
+from codeloom.server.json_text import Fields
 
 # How a text is written of which the client counts the units, and how long one is.
 _UNITS = {"utf-8": ("utf-8", 1), "utf-16": ("utf-16-le", 2), "utf-32": ("utf-32-le", 4)}
@@ -32,8 +33,8 @@ class PlacedText(ABC):
             self.position(place.row, place.column), self.position(place.end_row, place.end_column)
         )
 
-    def range_fields(self, place: Range) -> dict[str, dict[str, int]]:
-        """The same as JSON, for answers with very many ranges."""
+    def range_fields(self, place: Range) -> Fields:
+        """The same as JSON."""
         row, column = self.counted(place.row, place.column)
         end_row, end_column = self.counted(place.end_row, place.end_column)
         return {
@@ -41,17 +42,17 @@ class PlacedText(ABC):
             "end": {"line": end_row, "character": end_column},
         }
 
-    def location(self, place: Range) -> types.Location:
-        """The same with the name of the text."""
-        return types.Location(self.uri, self.range(place))
+    def location_fields(self, place: Range) -> Fields:
+        """A range with the name of the text."""
+        return {"uri": self.uri, "range": self.range_fields(place)}
 
-    def workspace_edit(self, edits: Iterable[tuple[Range, str]]) -> types.WorkspaceEdit:
+    def workspace_edit(self, edits: Iterable[tuple[Range, str]]) -> Fields:
         """Edits of the text, or of the cells that it is analysed with."""
-        changes: dict[str, list[types.TextEdit]] = {}
+        changes: dict[str, list[Fields]] = {}
         for place, text in edits:
-            location = self.location(place)
-            changes.setdefault(location.uri, []).append(types.TextEdit(location.range, text))
-        return types.WorkspaceEdit(changes)
+            location = self.location_fields(place)
+            changes.setdefault(location["uri"], []).append({"range": location["range"], "newText": text})
+        return {"changes": changes}
 
 
 class ClosedText(PlacedText):

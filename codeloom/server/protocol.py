@@ -20,7 +20,7 @@ from pygls.exceptions import (
 )
 from pygls.protocol import LanguageServerProtocol, default_converter, lsp_method
 
-from codeloom.server.json_text import JsonText
+from codeloom.server.json_text import Fields, JsonText
 from codeloom.server.transport import Inbox, is_identity
 
 if TYPE_CHECKING:
@@ -118,6 +118,10 @@ class Protocol(LanguageServerProtocol):
         body = b"%s%s}" % (head.encode(), result.encoded())
         assert self.writer is not None
         self.writer.write(b"Content-Length: %d\r\n\r\n%s" % (len(body), body))
+
+    def notify_by_fields(self, method: str, params: Fields) -> None:
+        """Tell the client something, in the fields that the protocol names."""
+        self._send_data({_JSON_RPC: self.VERSION, "method": method, "params": params})
 
     def _check_handler_result(self, future: "Future[Any]") -> None:
         """Report what went wrong with a notification in its own words."""

@@ -12,6 +12,7 @@ from codeloom._analysis import Analysis, Occurrence, Resolution, Role
 from codeloom.reading.languages import language_of
 from codeloom.server.blocks import line_at
 from codeloom.server.document import OpenDocument
+from codeloom.server.json_text import JsonText
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
@@ -38,7 +39,7 @@ def register(server: "Server") -> None:
         return types.PrepareRenamePlaceholder(document.range(occurrence.range), occurrence.name)
 
     @server.feature(types.TEXT_DOCUMENT_RENAME)
-    def rename(params: types.RenameParams) -> types.WorkspaceEdit:
+    def rename(params: types.RenameParams) -> JsonText:
         document = server.documents[params.text_document.uri]
         occurrence, name = _named(document, params.position), params.new_name
         _check_name(name, document.analysis)
@@ -46,7 +47,7 @@ def register(server: "Server") -> None:
         _check_faults(document, occurrence)
         edits = [(one, _replacement(document, one, name)) for one in occurrences]
         _check_meaning(document, edits, name)
-        return document.workspace_edit([(one.range, text) for one, text in edits])
+        return JsonText.of(document.workspace_edit((one.range, text) for one, text in edits))
 
 
 def _named(document: OpenDocument, position: types.Position) -> Occurrence:

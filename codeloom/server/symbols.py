@@ -1,20 +1,17 @@
 """The outline: classes and functions with what lies in them, and the names that a module or a class binds."""
 
 from collections.abc import Sequence
-from typing import TYPE_CHECKING, Any
+from typing import TYPE_CHECKING
 
 from lsprotocol import types
 
 from codeloom._analysis import Line, LineKind, Range, Role, Scope, ScopeKind
 from codeloom.server.blocks import scope_of_header
 from codeloom.server.document import OpenDocument
-from codeloom.server.json_text import JsonText, items_as_json
+from codeloom.server.json_text import Fields, JsonText, items_as_json
 
 if TYPE_CHECKING:
     from codeloom.server.server import Server
-
-# With the fields that the protocol names.
-_Symbol = dict[str, Any]
 
 _BINDING_LINES = frozenset({LineKind.ASSIGNMENT, LineKind.TYPE})
 _HEADERS = frozenset({LineKind.DEF, LineKind.CLASS})
@@ -43,10 +40,10 @@ class _Outline:
     def __init__(self, document: OpenDocument) -> None:
         # The symbols of the module that are complete, and the one that isn't.
         self._parts: list[str] = []
-        self._last: list[_Symbol] = []
+        self._last: list[Fields] = []
         self._document = document
         # The open blocks of classes and functions: their indentation, scope and symbol.
-        self._open: list[tuple[int, Scope, _Symbol]] = []
+        self._open: list[tuple[int, Scope, Fields]] = []
         self._seen: set[tuple[int, str]] = set()
 
     def add(self, line: Line) -> None:
@@ -93,8 +90,8 @@ class _Outline:
             kind = types.SymbolKind.Constant
         self._append(name, kind, line.range, place)
 
-    def _append(self, name: str, kind: types.SymbolKind, whole: Range, place: Range) -> _Symbol:
-        symbol: _Symbol = {
+    def _append(self, name: str, kind: types.SymbolKind, whole: Range, place: Range) -> Fields:
+        symbol: Fields = {
             "name": name,
             "kind": kind.value,
             "range": self._document.range_fields(whole),

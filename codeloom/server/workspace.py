@@ -15,6 +15,7 @@ from codeloom._face import analyze_file
 from codeloom.cli.source import Source
 from codeloom.reading.files import MODULE_SUFFIXES, NOTEBOOK_SUFFIX, find_files
 from codeloom.server.diagnostics import diagnostic_of, result_id
+from codeloom.server.json_text import Fields, JsonText
 from codeloom.server.places import ClosedText
 from codeloom.server.settings import SETTINGS_FILES
 
@@ -56,9 +57,9 @@ def register(server: "Server") -> None:
         workspace.begin()
 
     @server.feature(types.WORKSPACE_DIAGNOSTIC)
-    async def diagnostic(params: types.WorkspaceDiagnosticParams) -> types.WorkspaceDiagnosticReport:
+    async def diagnostic(params: types.WorkspaceDiagnosticParams) -> JsonText:
         known = {one.uri: one.value for one in params.previous_result_ids}
-        return types.WorkspaceDiagnosticReport(await workspace.reports(known))
+        return JsonText.of({"items": await workspace.reports(known)})
 
 
 @dataclass(frozen=True)
@@ -66,7 +67,7 @@ class _Known:
     """What was said last of a file."""
 
     uri: str
-    items: Sequence[types.Diagnostic]
+    items: Sequence[Fields]
     result_id: str
 
 
@@ -110,7 +111,7 @@ class ClosedFiles:
         if known is not None and known.uri != document.uri and known.items:
             self._server.publisher.publish(known.uri, [])
 
-    async def reports(self, known: Mapping[str, str]) -> list[types.WorkspaceDocumentDiagnosticReport]:
+    async def reports(self, known: Mapping[str, str]) -> list[Fields]:
         """What has changed since the client has known of the files; waits until something has."""
         if self._scan is not None:
             await asyncio.wait([self._scan])
@@ -122,21 +123,16 @@ class ClosedFiles:
             self._waiting.append(change)
             await change
 
-    def _reports(
-        self, known: Mapping[str, str]
-    ) -> tuple[list[types.WorkspaceDocumentDiagnosticReport], bool]:
-        reports: list[types.WorkspaceDocumentDiagnosticReport] = []
+    def _reports(self, known: Mapping[str, str]) -> tuple[list[Fields], bool]:
+        reports: list[Fields] = []
         has_news = False
         for one in self._by_path.values():
+            name = {"uri": one.uri, "version": None, "resultId": one.result_id}
             if known.get(one.uri) == one.result_id:
-                reports.append(types.WorkspaceUnchangedDocumentDiagnosticReport(one.uri, one.result_id))
+                reports.append({**name, "kind": "unchanged"})
             elif one.items or one.uri in known:
                 has_news = True
-                reports.append(
-                    types.WorkspaceFullDocumentDiagnosticReport(
-                        one.uri, list(one.items), result_id=one.result_id
-                    )
-                )
+                reports.append({**name, "kind": "full", "items": one.items})
         return reports, has_news
 
     # In the background
@@ -173,7 +169,7 @@ class ClosedFiles:
             await asyncio.sleep(rest)
         return await loop.run_in_executor(self._server.thread_pool, work)
 
-    def _diagnostics(self, path: str, uri: str) -> list[types.Diagnostic]:
+    def _diagnostics(self, path: str, uri: str) -> list[Fields]:
         documents = self._server.documents
         settings = documents.settings.of_file(path)
         try:
