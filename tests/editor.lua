@@ -1,8 +1,7 @@
 -- A session of Neovim without a screen: it opens a file, breaks it, sees the diagnostics, mends it,
--- and renames a name. Given: the file, where to write what was seen, and the server's command.
+-- and renames a name. Given: the file, the settings, and where to write what was seen.
 
 local file, report = vim.env.EDITED_FILE, vim.env.EDITOR_REPORT
-local command = vim.fn.json_decode(vim.env.SERVER_COMMAND)
 local seen = {}
 
 local function wait(what, condition)
@@ -18,11 +17,12 @@ local function diagnostics()
 end
 
 local function session()
+  vim.cmd('luafile ' .. vim.fn.fnameescape(vim.env.EDITOR_SETTINGS))
   vim.cmd('edit ' .. vim.fn.fnameescape(file))
-  local client = vim.lsp.start_client({ name = 'codeloom', cmd = command, root_dir = vim.fn.fnamemodify(file, ':h') })
-  assert(vim.lsp.buf_attach_client(0, client))
+  local client
   wait('the server', function()
-    return vim.lsp.buf_is_attached(0, client) and vim.lsp.get_client_by_id(client).initialized
+    client = (vim.lsp.get_clients or vim.lsp.get_active_clients)()[1]
+    return client and client.initialized and vim.lsp.buf_is_attached(0, client.id)
   end)
 
   vim.api.nvim_buf_set_lines(0, 3, 3, false, { 'broken = (1' })
@@ -38,7 +38,7 @@ local function session()
   end)
   seen.rows = vim.api.nvim_buf_get_lines(0, 0, -1, false)
   vim.cmd('write')
-  vim.lsp.stop_client(client)
+  vim.lsp.stop_client(client.id)
 end
 
 local done, message = pcall(session)
