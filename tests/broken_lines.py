@@ -211,7 +211,7 @@ def IsBroken(line: str, after: tuple[str, ...] = AFTER_THE_GRAMMAR) -> bool:
     """
     line = line.strip().removesuffix("\\").rstrip()
     word = line.split(None, 1)[0] if line else ""
-    before, behind = "", ""
+    before, after_line = "", ""
     if re.match(r"elif\b", word):
         line = line[2:]
     elif re.match(r"else\b", word):
@@ -219,14 +219,14 @@ def IsBroken(line: str, after: tuple[str, ...] = AFTER_THE_GRAMMAR) -> bool:
     elif re.match(r"(except|finally)\b", word):
         before = "try: pass\n"
     elif re.match(r"try\b", word):
-        behind = "\nfinally: pass"
+        after_line = "\nfinally: pass"
     elif word == "case":
         before = "match x:\n "
     elif word.startswith("@"):
-        behind = "\ndef function(): pass"
+        after_line = "\ndef function(): pass"
     if line.endswith(":"):
         line += "\n case _: pass" if word == "match" else " pass"
-    return IsRefused(before + line + behind + "\n", after)
+    return IsRefused(before + line + after_line + "\n", after)
 
 
 def IsRefused(text: str, after: tuple[str, ...] = AFTER_THE_GRAMMAR) -> bool:

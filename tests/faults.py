@@ -51,7 +51,7 @@ class Line:
 
 @dataclass(frozen=True)
 class Edit:
-    """What stands from `start` up to `end` of a text is replaced."""
+    """What is from `start` up to `end` of a text is replaced."""
 
     start: int
     end: int

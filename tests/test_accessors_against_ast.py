@@ -146,7 +146,7 @@ def AstNames(node):
     return tuple((name.name, name.asname) for name in node.names)
 
 
-# No operator is told of the others.
+# Operators aren't distinguished.
 OPERATORS = {
     ast.Add: "+=",
     ast.Sub: "-=",

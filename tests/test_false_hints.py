@@ -83,7 +83,7 @@ def test_false_hints_are_no_problems(comment):
 @pytest.mark.parametrize(
     ("text", "place"),
     [
-        # What is missing at the end of a hint is told at its last token.
+        # What is missing at the end of a hint is reported at its last token.
         ("x = 1  # type: List[", (1, 20)),
         ("def f(a):  # type: (int] -> str\n  pass", (1, 24)),
         # The line's own fault beside a false hint.

@@ -1,4 +1,4 @@
-"""Language versions: what the engine is told of each."""
+"""Language versions: what the engine gets for each."""
 
 import keyword
 

@@ -35,7 +35,7 @@ STEPS = [
 ]
 STEP_OF = {folder: step for step, folders in enumerate(STEPS) for folder in folders}
 
-# The module's entry stands above all of them.
+# The module's entry is above all of them.
 ENTRY = "analysis/treesift.cpp"
 
 

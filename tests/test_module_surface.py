@@ -241,7 +241,7 @@ def test_the_stubs_are_up_to_date():
     for file_name, text in tool.all_stubs().items():
         written = (ROOT / "codeloom" / file_name).read_text(encoding="utf-8")
         assert ast.dump(ast.parse(written)) == ast.dump(ast.parse(text)), (
-            f"{file_name} is behind; run: python tools/make_stubs.py"
+            f"{file_name} is out of date; run: python tools/make_stubs.py"
         )
 
 

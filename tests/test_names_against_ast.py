@@ -115,8 +115,8 @@ class Facts(ast.NodeVisitor):
 
     def IsBracketed(self, name):
         row = self.rows[name.lineno - 1].encode()
-        before, behind = row[: name.col_offset].rstrip(), row[name.end_col_offset :].lstrip()
-        return before.endswith(b"(") and behind.startswith(b")")
+        before, after = row[: name.col_offset].rstrip(), row[name.end_col_offset :].lstrip()
+        return before.endswith(b"(") and after.startswith(b")")
 
     def visit_Assign(self, node):
         for target in node.targets:

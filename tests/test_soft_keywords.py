@@ -1,7 +1,7 @@
 """`match` and `case`: word of a statement or plain name. The interpreter says which it can be.
 
 One kind of line reads both ways: `case [x]: y` is a case, though it could be an annotation. The price is that
-an annotation of what no pattern can be, `case[x + 1]: y`, is taken for a bad case.
+an annotation that can't be a pattern, `case[x + 1]: y`, is taken for a bad case.
 """
 
 import ast

@@ -104,8 +104,8 @@ LINE_END = "the end of a line"
 
 
 def ExpectedTokens(text):
-    """(row, byte column, token) of each token as the interpreter's tokenizer has them, and LINE_END behind
-    each statement, or behind those that semicolons part.
+    """(row, byte column, token) of each token as the interpreter's tokenizer has them, and LINE_END after
+    each statement, or after those that semicolons separate.
     """
     rows = io.StringIO(text).readlines()
     for token in host_tokens(text):

@@ -77,7 +77,7 @@ def _is_text(analysis: Analysis, place: tuple[int, int]) -> bool:
 
 
 def _names_of_loops(analysis: Analysis, place: tuple[int, int]) -> Iterator[str]:
-    """What stands between `for` and `in` on a line with a fault, whose scopes aren't known."""
+    """What is between `for` and `in` on a line with a fault, whose scopes aren't known."""
     line = line_at(analysis, place)
     if line is None or not line.problems:
         return

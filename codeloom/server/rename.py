@@ -105,7 +105,7 @@ def _holds_word(text: str, word: str) -> bool:
 
 
 def _replacement(document: OpenDocument, occurrence: Occurrence, name: str) -> str:
-    """What stands in the place of one occurrence: a name that is imported as itself gets an `as`."""
+    """What replaces one occurrence: a name that is imported as itself gets an `as`."""
     if occurrence.role is not Role.IMPORT:
         return name
     place = occurrence.range

@@ -1,4 +1,4 @@
-// What a line has that is newer than the version that it is written in, and what no version has any longer.
+// What a line has that is newer than the version that it is written in, and what later versions have dropped.
 //   in     the version, each node that is made, and what is read by hand
 //   out    one SyntaxError which names the form, its place and the version that brought it
 #pragma once

@@ -71,7 +71,7 @@ nb::list DumpNames(nb::str text, int version, bool has_print_function, bool with
     return lines;
 }
 
-// All that is told of a text's names.
+// Everything about a text's names.
 std::string ShownNames(const CTextNames& names) {
     std::string shown;
     const auto add = [&](auto... numbers) { ((shown += std::to_string(numbers) + ' '), ...); };

@@ -81,7 +81,7 @@ bool CFollowUps::_EndsTriple(const CProblem& problem, std::string_view text) {
 
 //   f(          the line is broken off before `return`
 //       return
-//   )           stands where the line began
+//   )           is where the line began
 //   (def f():
 //       pass)   ends what the other one began
 bool CFollowUps::_ClosesEarlier(const CProblem& problem, const CRawLogical& line, CProblems& reported) {

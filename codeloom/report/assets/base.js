@@ -49,5 +49,5 @@ function placeOf(problem) {
 const fragment = (kind, text) => `#${kind}-${encodeURI(text).replaceAll("#", "%23")}`;
 const fileLink = (file, row) => fragment("file", file.path) + (row ? `:${row}` : "");
 
-/** A count that stands out by what it counts. */
+/** A count, set off by what it counts. */
 const badge = (kind, ...content) => make("span", { class: `badge ${kind}` }, ...content);
