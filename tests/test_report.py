@@ -198,10 +198,13 @@ def test_without_the_extra(write_files, run_cli):
 def browser():
     from playwright.sync_api import sync_playwright
 
-    with sync_playwright() as playwright:
-        browser = playwright.chromium.launch(executable_path=CHROMIUM)
-        yield browser
-        browser.close()
+    with pytest.MonkeyPatch.context() as patch:
+        patch.delenv("LD_PRELOAD", raising=False)  # sanitizers aren't for the browser
+        playwright = sync_playwright().start()
+    browser = playwright.chromium.launch(executable_path=CHROMIUM)
+    yield browser
+    browser.close()
+    playwright.stop()
 
 
 @pytest.fixture
