@@ -245,10 +245,10 @@ def main() -> None:
     seed = arguments.seed
     while done < arguments.edits:
         print(f"--seed {seed}: {done} edits", flush=True)
-        editor = Editor(seed, arguments.rows)
-        for _ in range(min(200, arguments.edits - done)):
+        editor = Editor(seed, arguments.rows * (10 if seed % 10 == 0 else 1))
+        while editor.count < min(1000, arguments.edits - done):
             editor.step()
-            done += 1
+        done += editor.count
         seed += 1
     print(f"{done} edits, and each time the document said what `analyze` says")
 

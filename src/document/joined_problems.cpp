@@ -15,6 +15,9 @@ void CJoinedProblems::Add(const CPiece& piece, uint32_t start) {
         if (is_fault && _FollowsFromOther(problem, fault++->line, start)) continue;
         _fProblems.push_back(std::move(problem));
     }
+}
+
+void CJoinedProblems::AddLate(const CPiece& piece, uint32_t start) {
     for (const CProblem& problem : piece.late_problems) Move(_fLate.emplace_back(problem), start);
 }
 

@@ -14,8 +14,11 @@ class CJoinedProblems {
     // `text` is that of all pieces.
     explicit CJoinedProblems(std::string_view text) : _fText(text) {}
 
-    // Call in their order for all pieces that have problems.
+    // Call in their order for all pieces that have problems, and with the late ones if these aren't known
+    // from elsewhere.
     void Add(const CPiece& piece, uint32_t start);
+    void AddLate(const CPiece& piece, uint32_t start);
+    CProblems& Late() { return _fLate; }
     // By place. Call once.
     CProblems Take();
 

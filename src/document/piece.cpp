@@ -55,6 +55,7 @@ CPiece::CPiece(std::string_view file_text, CFilePart part, uint32_t start, const
       has_asked_for_literals(part.has_asked_for_literals),
       closed(std::move(part.closed)),
       may_have_reopened(part.may_have_reopened),
+      declares_for_others(part.declares_for_others),
       needs_whole_text(part.needs_whole_text) {
     for (CProblem& problem : problems) Move(problem, -start);
     for (CProblem& problem : late_problems) Move(problem, -start);

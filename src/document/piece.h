@@ -44,6 +44,7 @@ struct CPiece {
     bool has_asked_for_literals = false;
     std::vector<CBlock> closed;
     bool may_have_reopened = false;
+    bool declares_for_others = false;
     bool needs_whole_text = false;
     mutable std::unique_ptr<const CPieceNames> names;  // once they have been asked for
 };

@@ -30,6 +30,7 @@ CPieceSums CPieceSums::Of(const CPiece& piece) {
             .has_limits = !piece.limits.empty(),
             .has_asked_for_literals = piece.has_asked_for_literals,
             .may_have_reopened = piece.may_have_reopened,
+            .declares_for_others = piece.declares_for_others,
             .needs_whole_text = piece.needs_whole_text};
 }
 
@@ -42,6 +43,7 @@ void CPieceSums::Add(const CPieceSums& next) {
     has_limits |= next.has_limits;
     has_asked_for_literals |= next.has_asked_for_literals;
     may_have_reopened |= next.may_have_reopened;
+    declares_for_others |= next.declares_for_others;
     needs_whole_text |= next.needs_whole_text;
 }
 

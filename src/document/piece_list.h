@@ -33,6 +33,7 @@ struct CPieceSums {
     bool has_limits = false;
     bool has_asked_for_literals = false;
     bool may_have_reopened = false;
+    bool declares_for_others = false;
     bool needs_whole_text = false;
 
     static CPieceSums Of(const CPiece& piece);

@@ -3,6 +3,7 @@
 #include <utility>
 
 #include "document/joined_problems.h"
+#include "scopes/declarations.h"
 #include "scopes/join_names.h"
 #include "signatures/join_signatures.h"
 
@@ -204,11 +205,14 @@ CLine CPieces::Line(uint32_t line_i) const {
 
 CProblems CPieces::Problems(std::string_view text) const {
     CJoinedProblems problems(text);
+    const bool are_late_known = !_fPieces.Sums().declares_for_others;
     _fPieces.ForEach(
         [&](const CPiece& piece, const CPiecePlace& place) {
             if (piece.HasProblems()) problems.Add(piece, place.start);
+            if (are_late_known) problems.AddLate(piece, place.start);
         },
         &CPieceSums::has_problems);
+    if (!are_late_known) CheckDeclarations(_Names(text), _fSettings.version, problems.Late());
     return problems.Take();
 }
 
@@ -223,14 +227,18 @@ std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text, bool wants
             analysis->limits.push_back({limit.line + place.line, limit.limit});
     });
     analysis->problems = Problems(text);
-    if (wants_names) _JoinNames(text, *analysis);
+    if (!wants_names) return analysis;
+    analysis->names = _Names(text);
+    CSignatureJoiner signatures(analysis->signatures);
+    _fPieces.ForEach([&](const CPiece& piece, const CPiecePlace& place) {
+        signatures.Append(piece.names->signatures, place.start, place.line);
+    });
     return analysis;
 }
 
-void CPieces::_JoinNames(std::string_view text, CFileAnalysis& analysis) const {
+CTextNames CPieces::_Names(std::string_view text) const {
     CLiteralNames literal_names(text);
     std::vector<CNamePart> parts;
-    CSignatureJoiner signatures(analysis.signatures);
     _fPieces.ForEach([&](const CPiece& piece, const CPiecePlace& place) {
         const uint32_t start = place.start;
         if (!piece.names)
@@ -238,9 +246,8 @@ void CPieces::_JoinNames(std::string_view text, CFileAnalysis& analysis) const {
                                                        start + piece.Length(), piece.state),
                                     start);
         parts.push_back({&piece.names->names, start, piece.state.IsInClass(), piece.names->open_scope});
-        signatures.Append(piece.names->signatures, start, place.line);
     });
-    analysis.names = JoinNames(parts, _fSettings.names);
+    return JoinNames(parts, _fSettings.names);
 }
 
 }  // namespace codeloom

@@ -72,7 +72,7 @@ class CPieces {
 
     explicit CPieces(const CFileSettings& settings) : _fSettings(settings) {}
 
-    void _JoinNames(std::string_view text, CFileAnalysis& analysis) const;
+    CTextNames _Names(std::string_view text) const;
 
     CFileSettings _fSettings;
     CPieceList _fPieces;

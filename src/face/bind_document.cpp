@@ -39,7 +39,7 @@ void BindChange(nb::module_& module) {
     change.def(
         "__init__",
         [](CChange* self, const CAnalysis& before, const CAnalysis& after, const CDocumentEdit& edit) {
-            new (self) CChange(before.file, after.file, edit.range, edit.new_range, edit.replaced);
+            new (self) CChange(before.file, after.file, edit);
         },
         "before"_a, "after"_a, "edit"_a);
     change.def("moved", &CChange::Moved, "range"_a,

@@ -6,24 +6,29 @@
 #pragma once
 
 #include <optional>
+#include <utility>
 #include <vector>
 
 #include "document/pieces.h"
-#include "face/source_file.h"
+#include "face/items.h"
 
 namespace codeloom {
 
+// What an edit replaced, where the new text is, and which lines are others: where that isn't known, all of
+// them.
+struct CDocumentEdit {
+    CRange range;
+    CRange new_range;
+    CTextEdit bytes;
+    std::optional<std::vector<CReplacedLines>> replaced;
+};
+
 class CChange {
   public:
-    // `range` was in the text before and `new_range` is there now; without `replaced` any line may be
-    // another.
-    CChange(CSourceFilePtr before, CSourceFilePtr after, const CRange& range, const CRange& new_range,
-            std::optional<std::vector<CReplacedLines>> replaced)
-        : _fBefore(std::move(before)),
-          _fAfter(std::move(after)),
-          _fRange(range),
-          _fNewRange(new_range),
-          _fReplaced(std::move(replaced)) {}
+    CChange(CSourceFilePtr before, CSourceFilePtr after, CDocumentEdit edit)
+        : _fBefore(std::move(before)), _fAfter(std::move(after)), _fEdit(std::move(edit)) {
+        if (!_fEdit.replaced) _fEdit.replaced = {{0, _fBefore->LineCount(), 0, _fAfter->LineCount()}};
+    }
 
     // Where a range of the text before is now; none where the edit has cut into it.
     std::optional<CRange> Moved(const CRange& range) const;
@@ -35,15 +40,24 @@ class CChange {
     nb::tuple Scopes() const;
 
   private:
+    // Items that may be gone, and those that may have come.
+    template <class Item>
+    struct TCandidates {
+        std::vector<Item> before;
+        std::vector<Item> after;
+    };
+
+    bool _IsMoved(uint32_t before, uint32_t after) const;
+    template <class Visit, class VisitSame>
+    void _ForEachRun(const Visit& visit, const VisitSame& visit_same) const;
+    template <class Item, class FirstOf, class IsSame>
+    TCandidates<Item> _Candidates(const FirstOf& first_of, const IsSame& is_same) const;
     template <class Item, class SaysSame>
-    nb::tuple _Differences(const std::vector<Item>& before, const std::vector<Item>& after,
-                           const SaysSame& says_same) const;
+    nb::tuple _Differences(const TCandidates<Item>& candidates, const SaysSame& says_same) const;
 
     CSourceFilePtr _fBefore;
     CSourceFilePtr _fAfter;
-    CRange _fRange;
-    CRange _fNewRange;
-    std::optional<std::vector<CReplacedLines>> _fReplaced;
+    CDocumentEdit _fEdit;
 };
 
 }  // namespace codeloom

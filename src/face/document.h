@@ -10,16 +10,10 @@
 
 #include "document/columns.h"
 #include "document/pieces.h"
+#include "face/change.h"
 #include "face/source_file.h"
 
 namespace codeloom {
-
-// What an edit replaced, where the new text is, and which lines are others; none where that isn't known.
-struct CDocumentEdit {
-    CRange range;
-    CRange new_range;
-    std::optional<std::vector<CReplacedLines>> replaced;
-};
 
 // For one thread at a time. A text that can't be analysed as it is, since it holds NUL or lone surrogates, is
 // edited here all the same.

@@ -266,7 +266,8 @@ CFilePart CFileAnalyzer::_EndPart(const CLexer& lexer, uint32_t end, uint32_t lo
     const CBlockTracker& blocks = _fChecker.Blocks();
     part.closed = blocks.Closed();
     part.may_have_reopened = _fPartStart > 0 && blocks.MayHaveReopened();
-    part.needs_whole_text = _fNeedsAllNames || _fIsFileTooLong || blocks.TakenBackFrom() < _fPartStart ||
+    part.declares_for_others = _fNeedsAllNames;
+    part.needs_whole_text = _fIsFileTooLong || blocks.TakenBackFrom() < _fPartStart ||
                             blocks.FollowsUnknown() || (part.may_have_reopened && _fHasTellingNames);
     part.analysis = std::move(_fResult);
     return part;

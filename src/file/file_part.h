@@ -54,6 +54,8 @@ struct CFilePart {
     bool has_asked_for_literals = false;  // which the whole text says
     std::vector<CBlock> closed;           // blocks, as CBlockTracker gives them
     bool may_have_reopened = false;       // a block, which may have been closed before
+    // Its late problems are to be found out from the names of all parts: a declaration concerns other parts.
+    bool declares_for_others = false;
     // The scope around its end, if names are wanted; 1 is the class that it began in.
     uint32_t open_scope = 0;
     // What it says depends on more of the text before than its state: only an analysis of the whole text is

@@ -49,6 +49,12 @@ struct CTextNames {
         return line_i < lines.size() ? lines[line_i].first_occurrence
                                      : static_cast<uint32_t>(occurrences.items.size());
     }
+    // The scopes that begin on a line are those from FirstScope(line_i) up to FirstScope(line_i + 1), among
+    // all.
+    uint32_t FirstScope(size_t line_i) const {
+        return line_i < lines.size() ? lines[line_i].first_scope + 1
+                                     : static_cast<uint32_t>(scopes.scopes.size());
+    }
     // Releases memory that isn't used.
     void Shrink();
 
