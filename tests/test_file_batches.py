@@ -17,6 +17,9 @@ ODD_FILES = {
     "mark.py": b"\xef\xbb\xbfx = 1\n",
     "latin.py": b"# coding: latin-1\n\xe9 = 1\n",
     "second_row.py": b"#!/bin/sh\n# -*- coding: cp1252 -*-\n\x80 = 1\n",
+    "says_utf8.py": "# -*- coding: utf-8 -*-\né = )\n".encode(),
+    "says_both.py": b"# coding: utf-8 coding: latin-1\n# coding=cp1252\n\xc3\xa9 = )\n",
+    "says_nothing.py": b"# decoding: \n# coding:\tLATIN_1 x\n\xe9 = 1\n",
     "cookie_too_late.py": b"a\nb\n# coding: latin-1\nx = 1\n",
     "no_text.py": b"x = '\xff'\ny = \xe9\n",
     "nul.py": b"x = 1\0\ny = 2\n",
@@ -67,6 +70,29 @@ def test_what_cannot_be_read(folder):
     assert read_natively(list(map(str, named))).count(None) == 5
     with pytest.raises(TypeError):
         read_natively([b"plain.py"])
+
+
+@pytest.mark.parametrize(
+    ("head", "is_plain"),
+    [
+        ("# -*- coding: utf-8 -*-\n", True),
+        ("#!/bin/sh\n# vim: set fileencoding=UTF_8 :\r\n", True),
+        ("# encoding: utf8\n", True),
+        ("'decoding'; x = coding; coding =1\n", True),
+        ("# coding: utf-8-sig\n", False),
+        ("# coding: utf-16\n", False),
+        ("# coding: utf-8\n# coding: ascii\n", False),
+        ("# coding:utf-8\xe9\n", True),
+        ("# coding: coding: cp1252\n", False),
+        ("\n\n# coding: latin-1\n", True),
+        ("# coding:", True),
+        ("# coding: \tl", False),
+    ],
+)
+def test_coding_comments_that_need_no_decoding(tmp_path, head, is_plain):
+    path = tmp_path / "a.py"
+    path.write_text(head, newline="")
+    assert (read_natively([str(path)])[0] is not None) == is_plain
 
 
 def test_what_counts_as_utf8(tmp_path):

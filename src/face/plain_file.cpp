@@ -1,5 +1,7 @@
 #include "face/plain_file.h"
 
+#include <string>
+
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -44,18 +46,40 @@ std::optional<CPlainFile> ReadAll(int descriptor, size_t size) {
     return std::nullopt;
 }
 
-// True when a coding comment may be in the first two rows.
-bool MayNameItsEncoding(std::string_view text) {
+constexpr std::string_view kCookie = "coding";
+
+// The name of an encoding in what follows `kCookie`, in lower case and with hyphens; empty when there is
+// none.
+std::string EncodingAfterCookie(std::string_view text) {
+    std::string name;
+    if (!text.starts_with(':') && !text.starts_with('=')) return name;
+    const size_t start = text.find_first_not_of(" \t", 1);
+    for (size_t i = start; i < text.size(); ++i) {
+        const char c = text[i] == '_' ? '-' : text[i];
+        const bool is_upper = c >= 'A' && c <= 'Z';
+        if (!is_upper && !(c >= 'a' && c <= 'z') && !(c >= '0' && c <= '9') && c != '-' && c != '.') break;
+        name += is_upper ? static_cast<char>(c - 'A' + 'a') : c;
+    }
+    return name;
+}
+
+// True when a coding comment in the first two rows may name something else than UTF-8.
+bool MayNameAnotherEncoding(std::string_view text) {
     const size_t first_end = text.find('\n');
     const size_t second_end =
         first_end == std::string_view::npos ? first_end : text.find('\n', first_end + 1);
-    return text.substr(0, second_end).find("coding") != std::string_view::npos;
+    const std::string_view head = text.substr(0, second_end);
+    for (size_t at = head.find(kCookie); at != std::string_view::npos; at = head.find(kCookie, at + 1)) {
+        const std::string name = EncodingAfterCookie(head.substr(at + kCookie.size()));
+        if (!name.empty() && name != "utf-8" && name != "utf8") return true;
+    }
+    return false;
 }
 
 }  // namespace
 
 bool IsPlainSource(std::string_view text) {
-    return !text.starts_with("\xEF\xBB\xBF") && !MayNameItsEncoding(text) && IsSourceText(text);
+    return !text.starts_with("\xEF\xBB\xBF") && !MayNameAnotherEncoding(text) && IsSourceText(text);
 }
 
 std::optional<CPlainFile> ReadPlainFile(const char* path) {

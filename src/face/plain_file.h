@@ -8,7 +8,8 @@
 
 namespace codeloom {
 
-// True for UTF-8 text as it is: no byte order mark, no coding comment (PEP 263), no NUL.
+// True for UTF-8 text as it is: no byte order mark, no NUL, no coding comment (PEP 263) that may name another
+// encoding.
 bool IsPlainSource(std::string_view text);
 
 struct CPlainFile {
@@ -19,8 +20,8 @@ struct CPlainFile {
 };
 
 // The bytes of a regular file of UTF-8 text, as they are. None for what the Python layer has to look at: what
-// isn't there or can't be read, no regular file, a byte order mark, a coding comment (PEP 263), a NUL,
-// another encoding, a text of more than kMaxTextSize bytes.
+// isn't there or can't be read, no regular file, a text of more than kMaxTextSize bytes, and what isn't
+// plain.
 std::optional<CPlainFile> ReadPlainFile(const char* path);
 
 }  // namespace codeloom
