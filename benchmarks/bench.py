@@ -80,7 +80,7 @@ def all_results() -> Results:
     add("cost of a row, by the rows of the text", map(str, timing.GROWTH), timing.Growth().of)
     kept_in_memory = ["problems", "records", *(name for name in peers if name != "parso")]
     add("bytes a row beyond the text", kept_in_memory, memory.bytes_per_row)
-    add("one thread", ["times two threads"], lambda _: timing.one_thread_against_two())
+    add("two jobs: times faster than one", timing.FOR_JOBS, timing.one_job_against_two)
     add("milliseconds of an import", timing.IMPORTED, timing.import_time)
     return results
 

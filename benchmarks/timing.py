@@ -2,6 +2,7 @@
 nothing, and what a clock shows says what others do."""
 
 import resource
+import shutil
 import statistics
 import subprocess
 import sys
@@ -10,6 +11,7 @@ import tempfile
 import time
 from collections.abc import Callable, Iterable
 from functools import partial
+from itertools import cycle, islice
 from pathlib import Path
 
 from corpus import files, text_of
@@ -30,13 +32,18 @@ def times_faster(ours: str, peer: str) -> float:
 
 def command_against_ruff(count: str) -> float:
     """How many times as long as our command ruff's takes, for so many files of the library at a time."""
-    library = sorted(Path(sysconfig.get_path("stdlib")).rglob("*.py"))
-    paths = [str(path) for path in library if "lib2to3/tests/data" not in str(path)][: int(count)]
+    paths = list(map(str, _library()[: int(count)]))
     environment = {"RAYON_NUM_THREADS": "1", "PATH": search_path()}
     return _ratio(
         lambda: subprocess.run([*RUFF, *paths], env=environment, check=True),
         lambda: subprocess.run([*COMMAND, *paths], stdout=subprocess.DEVNULL, check=False),
     )
+
+
+def _library() -> list[Path]:
+    """The interpreter's own files, and those that are installed."""
+    library = sorted(Path(sysconfig.get_path("stdlib")).rglob("*.py"))
+    return [path for path in library if "lib2to3/tests/data" not in str(path)]
 
 
 class Growth:
@@ -74,17 +81,38 @@ def _records(texts: Iterable[bytes]) -> None:
         _ = analyze(text).records
 
 
-def one_thread_against_two() -> float:
-    """How many times as long one thread takes as two, on files big enough to matter."""
+def one_job_against_two(what: str) -> float:
+    """How many times as long one job takes as two; other work on the machine makes it less."""
     with tempfile.TemporaryDirectory() as folder:
-        for i in range(24):
-            Path(folder, f"{i:02}.py").write_bytes(text_of(10_000))
-
-        def run(jobs: int) -> None:
-            for _ in analyze_paths([folder], jobs=jobs):
-                pass
-
+        run = FOR_JOBS[what](folder)
         return _ratio(lambda: run(1), lambda: run(2), time.perf_counter)
+
+
+def _large_files(folder: str) -> Callable[[int], None]:
+    for i in range(24):
+        Path(folder, f"{i:02}.py").write_bytes(text_of(10_000))
+
+    def run(jobs: int) -> None:
+        for _ in analyze_paths([folder], jobs=jobs):
+            pass
+
+    return run
+
+
+def _many_files(folder: str) -> Callable[[int], None]:
+    for i, path in enumerate(islice(cycle(_library()), 10_000)):
+        to = Path(folder, f"{i // 20}", f"{i:05}.py")
+        to.parent.mkdir(exist_ok=True)
+        shutil.copyfile(path, to)
+
+    def run(jobs: int) -> None:
+        command = [*COMMAND, "--jobs", str(jobs), folder]
+        subprocess.run(command, stdout=subprocess.DEVNULL, check=False)
+
+    return run
+
+
+FOR_JOBS = {"24 files of 10,000 rows": _large_files, "codeloom check, 10,000 files": _many_files}
 
 
 def import_time(module: str) -> float:
