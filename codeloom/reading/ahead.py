@@ -16,9 +16,10 @@ if TYPE_CHECKING:
 
 # More threads than these would only wait for each other.
 _MOST_JOBS = 1024
-# How many batches are read ahead for each further thread.
+# How many batches are read ahead for each thread but this one: so many that none is idle while this one is
+# at a long file.
 _AHEAD_PER_JOB = 16
-# The first batches are small, so that the first result comes soon.
+# The first batches have fewer files, so that the first result comes soon.
 _MOST_IN_BATCH = 8
 
 
@@ -43,10 +44,11 @@ def read_ahead(
     atexit.register(close)  # a thread that doesn't end with the interpreter may be in the midst of it
     ahead: deque[list[Found]] = deque()
     try:
-        for batch in _batches(found):
+        for count, batch in enumerate(_batches(found)):
             reader.submit([_plain_path(one) for one in batch])
             ahead.append(batch)
-            if len(ahead) > _AHEAD_PER_JOB * (jobs - 1):
+            # At first results are taken nearly as soon as they are asked for.
+            if len(ahead) > min(count // 2, _AHEAD_PER_JOB * (jobs - 1)):
                 yield from zip(ahead.popleft(), reader.take(), strict=True)
         while ahead:
             yield from zip(ahead.popleft(), reader.take(), strict=True)
