@@ -123,6 +123,15 @@ def test_memory_after_many_edits():
     assert edit(8_000) - before < 2_000_000
 
 
+def test_names_after_many_others():
+    document = Document(TEXT)
+    many = "".join(f"x = name_{i}\n" for i in range(70_000))
+    assert len(document.edit((1, 1), (1, 1), many).occurrences_come) == 140_000
+    document.edit((1, 1), (70_001, 1), "")
+    document.edit((1, 7), (1, 8), "b")
+    compare(document.analysis, analyze(document.text))
+
+
 class TestArguments:
     @pytest.mark.parametrize(
         "arguments, name",
@@ -162,6 +171,10 @@ class TestChange:
         assert undone.problems_gone == change.problems_come and not undone.problems_come
         assert undone.before is change.after
         compare(document.analysis, change.before)
+
+    def test_of_a_text_with_nul(self):
+        change = Document("\0\nx = )\ntry\n").edit((3, 4), (3, 4), "s")
+        assert [problem.range for problem in change.problems_gone] == [Range(3, 1, 3, 4)]
 
     def test_what_only_moves(self):
         change = Document(TEXT + "x = )\n").edit((4, 1), (4, 1), "\n\n")

@@ -46,7 +46,8 @@ struct CPiece {
     bool may_have_reopened = false;
     bool declares_for_others = false;
     bool needs_whole_text = false;
-    mutable std::unique_ptr<const CPieceNames> names;  // once they have been asked for
+    // Once they have been asked for, by the table of that time.
+    mutable std::unique_ptr<const CPieceNames> names;
 };
 
 using CPiecePtr = std::shared_ptr<const CPiece>;

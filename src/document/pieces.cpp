@@ -16,6 +16,10 @@ namespace {
 constexpr size_t kFewestLines = 16;
 constexpr size_t kMostLines = 48;
 
+// The table of names keeps those of texts before. It is made anew when it has this many more than a text can
+// have, in which a name takes two bytes at least, with what is after it.
+constexpr size_t kMostOldNames = size_t{1} << 16;
+
 }  // namespace
 
 // Makes the pieces of a text, out of those of the text before where they are the same.
@@ -186,6 +190,8 @@ CPieces::CPieces(std::string_view text, const CFileSettings& settings) : _fSetti
 CPieces CPieces::Edited(std::string_view old_text, std::string_view text, const CTextEdit& edit,
                         std::vector<CReplacedLines>& replaced) const {
     CPieces made(_fSettings);
+    if (_fSettings.names->Count() > text.size() / 2 + kMostOldNames)
+        made._fSettings.names = std::make_shared<CNameTable>();
     CPieceWork(text, made).MakeFrom(*this, old_text, edit, replaced);
     return made;
 }
@@ -241,7 +247,7 @@ CTextNames CPieces::_Names(std::string_view text) const {
     std::vector<CNamePart> parts;
     _fPieces.ForEach([&](const CPiece& piece, const CPiecePlace& place) {
         const uint32_t start = place.start;
-        if (!piece.names)
+        if (!piece.names || piece.names->names.occurrences.names != _fSettings.names)
             piece.names = MakeNames(AnalyzeNamesOfPart(text, _fSettings, literal_names, start,
                                                        start + piece.Length(), piece.state),
                                     start);

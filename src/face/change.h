@@ -15,11 +15,11 @@
 namespace codeloom {
 
 // What an edit replaced, where the new text is, and which lines are others: where that isn't known, all of
-// them.
+// them. The bytes are known if both texts are analysed as they are; else they stand for all of a text.
 struct CDocumentEdit {
     CRange range;
     CRange new_range;
-    CTextEdit bytes;
+    CTextEdit bytes = {0, UINT32_MAX, 0};
     std::optional<std::vector<CReplacedLines>> replaced;
 };
 

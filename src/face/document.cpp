@@ -49,8 +49,8 @@ CDocumentEdit CDocument::Edit(const CRowColumn& start, const CRowColumn& end, nb
     const std::string_view text = Text();
     CPlainFile joined = Spliced(text.substr(0, first), came, text.substr(last));
     const CTextEdit edit{first, last, static_cast<uint32_t>(came->size())};
-    done.bytes = edit;
     if (_fFile && IsSourceText(came)) {
+        done.bytes = edit;
         done.replaced = _TakeEdited(std::move(joined), edit);
     } else {
         _Take(std::move(joined));
