@@ -1,7 +1,7 @@
 # Made by tools/make_stubs.py; don't edit.
 import collections.abc
 import typing
-from collections.abc import Callable, Sequence
+from collections.abc import Sequence
 import enum
 from typing import Literal, Self, overload
 
@@ -1166,22 +1166,8 @@ class SourceBatch:
     def mark(self, state: str, reason: str) -> None:
         """What is wrong with the source that was taken last."""
 
-    def analyze(self, tables: list[str], false_hints: bool, max_seconds: float) -> dict[str, Table]:
+    def analyze(self, tables: list[str], false_hints: bool, with_source: bool, max_seconds: float) -> dict[str, Table]:
         ...
-
-class ParquetPart:
-    """For `codeloom.corpus`: what many sources say, as Parquet files."""
-
-    def __init__(self, tables: list[str], false_hints: bool, max_seconds: float, notes: dict[str, dict[str, str]], compress: Callable[[memoryview], bytes]) -> None:
-        """
-        `notes` are those of each table's file; `compress` is that of Zstandard.
-        """
-
-    def add(self, sources: SourceBatch) -> None:
-        """Analyses what was taken of a batch."""
-
-    def finish(self) -> dict[str, bytes]:
-        """The files by the names of their tables, once."""
 
 class Analysis:
     """What a text says. Each part is worked out when it is first asked for."""

@@ -60,6 +60,7 @@ class TestRows:
         for row, problem in zip(rows, analysis.problems, strict=True):
             assert (row["code"], row["severity"]) == (problem.code, problem.severity)
             assert (row["message"], row["hint"]) == (problem.message, problem.hint)
+            assert row["text"] == analysis.text.splitlines()[problem.range.row - 1]
             assert RangeOf(row) == problem.range
             assert problem in analysis.lines[row["line"]].problems
 

@@ -235,3 +235,9 @@ def test_threads_take_batches():
     for thread in threads:
         thread.join()
     assert found == [expected] * 4
+
+
+def test_the_row_of_a_problem_is_there_unless_it_is_long():
+    rows = ["x = (", f"y = {'1 + ' * 240}(", f"z = {'1 + ' * 250}("]
+    tables = analyze_batch(Batch({f"{i}.py": row for i, row in enumerate(rows)}), ("problems",))
+    assert [row["text"] for row in Rows(tables["problems"])] == [*rows[:2], None]

@@ -66,6 +66,9 @@ class TestRows:
         batch = {"path": [f"src/{name}" for name in FILES], "content": list(FILES.values())}
         tables = analyze_batch(pyarrow.table(batch))
         found = RowsOf("index")
+        assert "text" not in found["lines"].column_names
+        Index("src", "--text", output="whole")
+        found["lines"] = RowsOf("whole")["lines"]
         assert set(found) == {"files", *TABLES}
         for name, table in tables.items():
             expected = Plain(pyarrow.table(table))
@@ -204,7 +207,7 @@ class TestSources:
             {"cell_type": "markdown", "source": "#"},
         ]
         Write({"n.ipynb": json.dumps({"cells": cells}).encode(), "bad.ipynb": b"{"}, "notebooks")
-        Index("notebooks")
+        Index("notebooks", "--text")
         states = StatesOf()
         assert states == {"notebooks/n.ipynb": "ok", "notebooks/bad.ipynb": "missing"}
         assert "y = 2" in RowsOf("index")["lines"]["text"].to_pylist()

@@ -22,7 +22,6 @@ STEPS = [
     ["file"],
     ["document"],
     ["arrow"],
-    ["parquet"],
     ["host"],
     ["neighbours", "strutils", "_fastaccess", "symbolinfo"],
     ["tree"],

@@ -20,7 +20,7 @@ ROOT = Path(__file__).parent.parent
 def index(tmp_path_factory):
     """The index of the examples, in a folder whose name has a quote."""
     folder = tmp_path_factory.mktemp("corpus") / "the 'index'"
-    assert main(["index", "--quiet", str(ROOT / "examples"), "-o", str(folder)]) == 0
+    assert main(["index", "--quiet", "--text", str(ROOT / "examples"), "-o", str(folder)]) == 0
     return str(folder)
 
 
@@ -123,7 +123,7 @@ def folder_of_questions(tmp_path, monkeypatch):
     """What the page's commands make, of the examples and as some versions only."""
     monkeypatch.chdir(tmp_path)
     (tmp_path / "python3.11").symlink_to(ROOT / "examples")
-    assert main(["index", "-q", "python3.11", "-o", "index"]) == 0
+    assert main(["index", "-q", "--text", "python3.11", "-o", "index"]) == 0
     for version in ("2.7", "3.0", "3.14"):
         arguments = ["index", "-q", "--python", version, "--tables", "problems", "python3.11"]
         assert main([*arguments, "-o", f"versions/version={version}"]) == 0

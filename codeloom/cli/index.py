@@ -74,6 +74,9 @@ class IndexCommand(Command):
             "--dedup", action="store_true", help="analyse only the first of files with the same content"
         )
         parser.add_argument("--false-hints", action="store_true", help="as in check")
+        parser.add_argument(
+            "--text", action="store_true", help="with the text of each line, which nearly doubles the index"
+        )
         add_jobs_argument(parser)
         parser.add_argument(
             "--engine",
@@ -107,6 +110,7 @@ class IndexCommand(Command):
             options.version,
             options.tables or TABLES,
             false_hints=options.false_hints,
+            text=options.text,
             dedup=options.dedup,
             max_bytes=options.max_bytes * _MEGABYTE,
             max_seconds=options.max_seconds,

@@ -65,6 +65,7 @@ class Options:
     tables: Sequence[str] | None = None  # all
     resume: bool = False
     dedup: bool = False
+    text: bool = False
     git: bool = False
     path_column: str = "path"
     content_column: str = "content"

@@ -57,7 +57,7 @@ def analyze_batch(
     sources = SourceBatch(batch, path_column, content_column, python_column)
     for i in range(len(sources)):
         take(sources, i, sources.digest(i, sha256), python, max_bytes)
-    return sources.analyze(wanted, false_hints, max_seconds)
+    return sources.analyze(wanted, false_hints, True, max_seconds)
 
 
 def checked_tables(names: Iterable[str]) -> list[str]:

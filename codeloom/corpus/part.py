@@ -1,29 +1,35 @@
 """The Parquet files of a part of an index, made of sources."""
 
-from base64 import b64encode
 from collections.abc import Iterable, Iterator, Sequence
-from functools import cache, partial
+from contextlib import ExitStack
 from hashlib import sha256
 from typing import Any
 
 import pyarrow
+import pyarrow.parquet
+import pyarrow.types
 
 from codeloom import __version__
-from codeloom._analysis import ParquetPart, SourceBatch
+from codeloom._analysis import SourceBatch, Table
 from codeloom.corpus.batch import TABLES, file_id_of, take
 from codeloom.corpus.sources import Entry
 
-CODEC = "zstd"
 # Bytes of source that are analysed at once: what a thread needs in memory is some ten times that.
 _BATCH_BYTES = 4_000_000
-_FACTS = {"codeloom.version": __version__, "codeloom.schema": "1"}
 
 # Of an index; what it holds is in `settings_of`.
 Settings = dict[str, Any]
 
 
 def settings_of(
-    python: str, tables: Iterable[str], *, false_hints: bool, dedup: bool, max_bytes: int, max_seconds: float
+    python: str,
+    tables: Iterable[str],
+    *,
+    false_hints: bool,
+    text: bool,
+    dedup: bool,
+    max_bytes: int,
+    max_seconds: float,
 ) -> Settings:
     """What all runs over an index must have in common, so that their rows are of one kind."""
     return {
@@ -31,6 +37,7 @@ def settings_of(
         "python": python,
         "tables": [name for name in TABLES if name in set(tables)],
         "false_hints": false_hints,
+        "text": text,
         "dedup": dedup,
         "max_bytes": max_bytes,
         "max_seconds": max_seconds,
@@ -48,18 +55,38 @@ class Hashed:
         self.file_id = file_id_of(entry.path, self.digest)
 
 
+class PartFiles:
+    """The Parquet files of a part while they grow in memory, by the names of their tables."""
+
+    def __init__(self) -> None:
+        self._sinks: dict[str, pyarrow.BufferOutputStream] = {}
+        self._writers: dict[str, pyarrow.parquet.ParquetWriter] = {}
+
+    def add(self, name: str, table: pyarrow.Table) -> None:
+        """Add rows of a table, as a group."""
+        if name not in self._writers:
+            self._sinks[name] = pyarrow.BufferOutputStream()
+            self._writers[name] = _writer(self._sinks[name], name, table.schema)
+        self._writers[name].write_table(table, row_group_size=max(len(table), 1))
+
+    def finish(self) -> dict[str, bytes]:
+        """The files. Nothing can be added afterwards."""
+        with ExitStack() as stack:
+            for writer in self._writers.values():
+                stack.callback(writer.close)
+        return {name: sink.getvalue().to_pybytes() for name, sink in self._sinks.items()}
+
+
 def parquet_files(settings: Settings, sources: Sequence[Hashed]) -> dict[str, bytes]:
     """Analyse sources as the settings of an index say: Parquet files by the names of their tables."""
-    compress = partial(pyarrow.Codec(CODEC).compress, asbytes=True)
-    names = settings["tables"]
-    notes = {name: _notes_of(name) for name in (*names, "files")}
-    part = ParquetPart(names, settings["false_hints"], settings["max_seconds"], notes, compress)
+    files = PartFiles()
     for some in _batches(sources):
-        part.add(_taken(settings, some))
-    return part.finish()
+        for name, table in _analyzed(settings, some).items():
+            files.add(name, pyarrow.table(table))
+    return files.finish()
 
 
-def _taken(settings: Settings, sources: Sequence[Hashed]) -> SourceBatch:
+def _analyzed(settings: Settings, sources: Sequence[Hashed]) -> dict[str, Table]:
     entries = [one.entry for one in sources]
     batch = SourceBatch(
         [entry.path for entry in entries],
@@ -68,16 +95,26 @@ def _taken(settings: Settings, sources: Sequence[Hashed]) -> SourceBatch:
     )
     for i, one in enumerate(sources):
         take(batch, i, one.digest, settings["python"], settings["max_bytes"], one.entry.mark)
-    return batch
+    return batch.analyze(
+        settings["tables"], settings["false_hints"], settings["text"], settings["max_seconds"]
+    )
 
 
-@cache
-def _notes_of(name: str) -> dict[str, str]:
-    """What the file of a table says of itself; its types too, so that dictionaries are read as such."""
-    nothing = SourceBatch([], [], []).analyze([] if name == "files" else [name], False, 1.0)
-    facts = {**_FACTS, "codeloom.table": name}
-    schema = pyarrow.RecordBatchReader.from_stream(nothing[name]).schema.with_metadata(facts)
-    return {**facts, "ARROW:schema": b64encode(schema.serialize()).decode()}
+def _writer(sink: pyarrow.NativeFile, name: str, schema: pyarrow.Schema) -> pyarrow.parquet.ParquetWriter:
+    """What the analysis codes by a dictionary stays so. Numbers differ little from row to row, so that most
+    of their bytes are equal when the first bytes of all come first, then the second ones and so on."""
+    facts = {"codeloom.table": name, "codeloom.version": __version__, "codeloom.schema": "1"}
+    return pyarrow.parquet.ParquetWriter(
+        sink,
+        schema.with_metadata(facts),
+        compression="zstd",
+        compression_level=3,
+        use_dictionary=[field.name for field in schema if pyarrow.types.is_dictionary(field.type)],
+        column_encoding={
+            field.name: "BYTE_STREAM_SPLIT" for field in schema if pyarrow.types.is_integer(field.type)
+        },
+        write_statistics=["file_id"],
+    )
 
 
 def _batches(sources: Sequence[Hashed]) -> Iterator[Sequence[Hashed]]:

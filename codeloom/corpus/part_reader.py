@@ -6,7 +6,7 @@ import pyarrow
 import pyarrow.compute
 import pyarrow.parquet
 
-from codeloom.corpus.part import CODEC
+from codeloom.corpus.part import PartFiles
 
 
 def states_of(path: str) -> Iterable[tuple[int, str]]:
@@ -19,16 +19,15 @@ def without(paths: dict[str, str], gone: Sequence[int]) -> dict[str, bytes]:
     """The files of a part, by the names of their tables, without the rows of some sources; none at all when
     no source is left."""
     values = pyarrow.array(gone, pyarrow.int64())
-    kept = {}
+    files = PartFiles()
+    has_sources = False
     for name, path in paths.items():
-        table = pyarrow.parquet.read_table(path)
-        is_gone = pyarrow.compute.is_in(table["file_id"], value_set=values)
-        kept[name] = table.filter(pyarrow.compute.invert(is_gone))
-    return {name: _file_of(table) for name, table in kept.items()} if len(kept["files"]) else {}
-
-
-def _file_of(table: pyarrow.Table) -> bytes:
-    sink = pyarrow.BufferOutputStream()
-    pyarrow.parquet.write_table(table, sink, compression=CODEC, write_statistics=False)
-    data: bytes = sink.getvalue().to_pybytes()
-    return data
+        with pyarrow.parquet.ParquetFile(path) as file:
+            for group in range(file.num_row_groups):
+                table = file.read_row_group(group)
+                is_gone = pyarrow.compute.is_in(table["file_id"], value_set=values)
+                kept = table.filter(pyarrow.compute.invert(is_gone))
+                has_sources |= name == "files" and len(kept) > 0
+                files.add(name, kept)
+    made = files.finish()
+    return made if has_sources else {}

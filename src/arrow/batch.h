@@ -27,6 +27,7 @@ struct CBatchFile {
 struct CBatchSettings {
     std::vector<const CTableKind*> tables;
     bool false_hints = false;
+    bool with_source = true;  // as in CTableForm
     double most_seconds = 0;  // for a file
 };
 
@@ -34,25 +35,8 @@ struct CBatchSettings {
 inline constexpr std::string_view kFilesTable = "files";
 std::vector<CTableKind::CColumnInfo> FileColumnInfos();
 
-// Analyses texts one after the other, on any thread, and gathers what they say.
-class CBatchAnalyzer {
-  public:
-    explicit CBatchAnalyzer(CBatchSettings settings);
-
-    void Take(const CBatchFile& file);
-
-    // The tables that the settings name, in their order, and that of the files.
-    std::vector<std::pair<std::string_view, const CTable*>> Tables() const;
-    // Leaves no rows, but what was learned of names.
-    void ClearRows();
-    // The same tables to keep; nothing is left.
-    std::vector<std::shared_ptr<const CTable>> Finish();
-
-  private:
-    const CBatchSettings _fSettings;
-    CFileSettings _fFileSettings;
-    std::vector<std::unique_ptr<CTableBuilder>> _fBuilders;
-    TRows<CFileRow> _fFiles;
-};
+// The tables that the settings name, in their order, and that of the files. Any thread may call it.
+std::vector<std::shared_ptr<const CTable>> AnalyzeBatch(std::span<const CBatchFile> files,
+                                                        const CBatchSettings& settings);
 
 }  // namespace codeloom

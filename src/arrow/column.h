@@ -22,14 +22,39 @@ class CBits {
     }
     size_t Count() const { return _fCount; }
     const void* Data() const { return _fBytes.data(); }
-    void Clear() {
-        _fBytes.clear();
-        _fCount = 0;
-    }
 
   private:
     TPlainArray<uint8_t> _fBytes;
     size_t _fCount = 0;
+};
+
+inline constexpr uint32_t kUnknownName = UINT32_MAX;
+
+// The names of many texts, each of which has numbers of its own for them.
+class CNamePool {
+  public:
+    CNamePool() = default;
+    explicit CNamePool(const CNameTable& names) { BeginText(names); }
+
+    // What numbers are of from now on. `names` must stay as it is up to the next call.
+    void BeginText(const CNameTable& names) {
+        _fOfText = &names;
+        _fNumbers.clear();
+        _fNumbers.Resize(names.Count(), kUnknownName);
+    }
+
+    // The number in the pool.
+    uint32_t Number(uint32_t of_text) {
+        uint32_t& number = _fNumbers[of_text];
+        if (number == kUnknownName) number = _fNames.Number(_fOfText->Text(of_text));
+        return number;
+    }
+    std::string_view Text(uint32_t number) const { return _fNames.Text(number); }
+
+  private:
+    const CNameTable* _fOfText = nullptr;
+    TPlainArray<uint32_t> _fNumbers;  // by those of the text
+    CNameTable _fNames;
 };
 
 // What all columns have. `Buffers` gives those after the one that tells of nulls.
@@ -48,13 +73,8 @@ class CColumn {
     size_t NullCount() const { return _fNullCount; }
     const void* Validity() const { return _fNullCount == 0 ? nullptr : _fValidity.Data(); }
 
-    // Of names that come by number, the text's own; up to the next text.
-    virtual void BeginText(const CNameTable&) {}
-    // Leaves nothing but the dictionary.
-    virtual void ClearRows() {
-        _fCount = _fNullCount = 0;
-        _fValidity.Clear();
-    }
+    // For names that come by number.
+    virtual void UsePool(CNamePool&) {}
 
   protected:
     void _CountValue() {
@@ -87,10 +107,6 @@ class TNumberColumn final : public CColumn {
     }
     const char* Format() const override { return sizeof(Number_) == 8 ? "l" : "i"; }
     std::vector<const void*> Buffers() const override { return {_fNumbers.data()}; }
-    void ClearRows() override {
-        CColumn::ClearRows();
-        _fNumbers.clear();
-    }
 
   private:
     static_assert(sizeof(Number_) == 8 || sizeof(Number_) == 4);
@@ -106,10 +122,6 @@ class CBoolColumn final : public CColumn {
     }
     const char* Format() const override { return "b"; }
     std::vector<const void*> Buffers() const override { return {_fBits.Data()}; }
-    void ClearRows() override {
-        CColumn::ClearRows();
-        _fBits.Clear();
-    }
 
   private:
     CBits _fBits;
@@ -131,11 +143,6 @@ class CTextColumn final : public CColumn {
     }
     const char* Format() const override { return "U"; }
     std::vector<const void*> Buffers() const override { return {_fOffsets.data(), _fTexts.data()}; }
-    void ClearRows() override {
-        CColumn::ClearRows();
-        _fOffsets.CutTo(1);
-        _fTexts.clear();
-    }
 
   private:
     TPlainArray<int64_t> _fOffsets;
@@ -152,10 +159,6 @@ class CDictionaryColumn : public CColumn {
     const char* Format() const override { return "i"; }
     std::vector<const void*> Buffers() const override { return {_fIndexes.data()}; }
     const CColumn* Dictionary() const override { return &_fDictionary; }
-    void ClearRows() override {
-        CColumn::ClearRows();
-        _fIndexes.clear();
-    }
 
   protected:
     void _AddIndex(size_t i) {
@@ -181,32 +184,36 @@ class CWordColumn final : public CDictionaryColumn {
 // Names and other texts that come again and again.
 class CNameColumn final : public CDictionaryColumn {
   public:
-    void Add(std::string_view name) { _AddIndex(_NumberOf(name)); }
-
-    // Each text has numbers of its own for names, most of which come again.
-    void BeginText(const CNameTable& names) override {
-        _fTextNames = &names;
-        _fOfText.clear();
-        _fOfText.Resize(names.Count(), kUnknown);
-    }
-    void AddNumber(uint32_t number) {
-        uint32_t& known = _fOfText[number];
-        if (known == kUnknown) known = _NumberOf(_fTextNames->Text(number));
-        _AddIndex(known);
+    void Add(std::string_view name) {
+        const uint32_t number = _fNames.Number(name);
+        if (number == _fDictionary.Count()) _fDictionary.Add(name);
+        _AddIndex(number);
     }
 
   private:
-    static constexpr uint32_t kUnknown = UINT32_MAX;
+    CNameTable _fNames;
+};
 
-    uint32_t _NumberOf(std::string_view name) {
-        const uint32_t number = _fNames.Number(name);
-        if (number == _fDictionary.Count()) _fDictionary.Add(name);
-        return number;
+// Names that other columns have too.
+class CPooledColumn final : public CDictionaryColumn {
+  public:
+    void UsePool(CNamePool& pool) override { _fPool = &pool; }
+    // By its number in the text.
+    void Add(uint32_t number) {
+        const uint32_t pooled = _fPool->Number(number);
+        if (pooled >= _fIndexOf.size()) [[unlikely]]
+            _fIndexOf.Resize(2 * size_t{pooled} + 1, kUnknownName);
+        uint32_t& index = _fIndexOf[pooled];
+        if (index == kUnknownName) [[unlikely]] {
+            index = static_cast<uint32_t>(_fDictionary.Count());
+            _fDictionary.Add(_fPool->Text(pooled));
+        }
+        _AddIndex(index);
     }
 
-    CNameTable _fNames;
-    const CNameTable* _fTextNames = nullptr;
-    TPlainArray<uint32_t> _fOfText;
+  private:
+    CNamePool* _fPool = nullptr;
+    TPlainArray<uint32_t> _fIndexOf;  // by numbers of the pool
 };
 
 }  // namespace codeloom

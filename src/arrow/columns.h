@@ -74,8 +74,8 @@ struct TColumnOf<TRepeated<Text>> : TPlainColumnOf<CNameColumn> {
 };
 
 template <>
-struct TColumnOf<CNumbered> : TPlainColumnOf<CNameColumn> {
-    static void Add(CNameColumn& column, const CNumbered& name) { column.AddNumber(name.number); }
+struct TColumnOf<CNumbered> : TPlainColumnOf<CPooledColumn> {
+    static void Add(CPooledColumn& column, const CNumbered& name) { column.Add(name.number); }
 };
 
 template <class Field>
@@ -100,6 +100,7 @@ struct TColumnSpec {
     std::string name;
     const char* meaning;
     bool is_nullable;
+    bool is_source;  // source text at length, which a table may do without
     std::unique_ptr<CColumn> (*make)();
     void (*append)(CColumn& column, const std::vector<Row>& rows);
 };
@@ -110,6 +111,13 @@ class TColumns {
     template <auto kField>
     TColumns& Add(const char* name, const char* meaning) {
         return _Add(name, meaning, [](const Row& row) -> const auto& { return row.*kField; });
+    }
+
+    template <auto kField>
+    TColumns& AddSource(const char* name, const char* meaning) {
+        Add<kField>(name, meaning);
+        _fSpecs.back().is_source = true;
+        return *this;
     }
 
     // `prefix` comes before the names of the four columns.
@@ -141,7 +149,7 @@ class TColumns {
     TColumns& _Add(std::string name, const char* meaning, Take) {
         using Field = std::remove_cvref_t<std::invoke_result_t<Take, const Row&>>;
         using CMade = typename TColumnOf<Field>::CMade;
-        _fSpecs.push_back({std::move(name), meaning, kIsOptional<Field>,
+        _fSpecs.push_back({std::move(name), meaning, kIsOptional<Field>, false,
                            []() -> std::unique_ptr<CColumn> { return TColumnOf<Field>::Make(); },
                            [](CColumn& column, const std::vector<Row>& rows) {
                                auto& made = static_cast<CMade&>(column);

@@ -14,18 +14,24 @@ const TColumns<CProblemRow>& CProblemSource::Columns() {
             .Add<&CProblemRow::line>("line", "The index of its line; null in a text without lines.")
             .AddRange<&CProblemRow::range>("", "The row of what it is about, from 1.")
             .Add<&CProblemRow::message>("message", "What is wrong, in words.")
-            .Add<&CProblemRow::hint>("hint", "What may have been meant; null where that isn't known.");
+            .Add<&CProblemRow::hint>("hint", "What may have been meant; null where that isn't known.")
+            .Add<&CProblemRow::text>("text",
+                                     "The row of the source; null where that has more than 1,000 bytes.");
     return columns;
 }
 
 CProblemRow CProblemSource::Of(uint32_t i) const {
+    constexpr size_t kMostText = 1'000;
     const CProblem& problem = _fText.analysis.problems[i];
+    const CRange range = _fText.rows.RangeOf(problem.start, problem.end);
+    const std::string_view text = _fText.rows.Text(range.row - 1);
     return {.code = {CodeText(problem.code)},
             .severity = SeverityOf(problem.code),
             .line = _fText.analysis.LineAt(problem.start),
-            .range = _fText.rows.RangeOf(problem.start, problem.end),
+            .range = range,
             .message = problem.message,
-            .hint = problem.hint.empty() ? std::nullopt : std::optional<std::string_view>(problem.hint)};
+            .hint = problem.hint.empty() ? std::nullopt : std::optional<std::string_view>(problem.hint),
+            .text = text.size() > kMostText ? std::nullopt : std::optional(text)};
 }
 
 // Lines
@@ -39,7 +45,7 @@ const TColumns<CLineRow>& CLineSource::Columns() {
             .Add<&CLineRow::indent>("indent",
                                     "The width of the blanks before it; null after another line on "
                                     "the same row.")
-            .Add<&CLineRow::text>("text", "Its text, as written.");
+            .AddSource<&CLineRow::text>("text", "Its text, as written; in an index with `--text` only.");
     return columns;
 }
 
@@ -73,10 +79,8 @@ const TColumns<CRecordRow>& CRecordSource::Columns() {
 
 CRecordRow CRecordSource::Of(uint32_t i) {
     const CFileAnalysis& analysis = _fText.analysis;
-    if (!_fOfLine.Has(i)) {
-        _fLine = analysis.LineOfRecord(i);
-        _fOfLine = {analysis.FirstRecord(_fLine), analysis.FirstRecord(_fLine + 1)};
-    }
+    if (i < analysis.FirstRecord(_fLine)) _fLine = analysis.LineOfRecord(i);
+    while (i >= analysis.FirstRecord(_fLine + 1)) ++_fLine;
     const CRecord& record = analysis.records.records[i];
     const bool has_place = record.start < record.end;
     return {.line = _fLine,

@@ -13,6 +13,7 @@ struct CProblemRow {
     CRange range;
     std::string_view message;
     std::optional<std::string_view> hint;
+    std::optional<std::string_view> text;
 };
 
 struct CLineRow {
@@ -67,13 +68,11 @@ class CRecordSource {
     static const TColumns<CRow>& Columns();
     static size_t Count(const CFileAnalysis& analysis) { return analysis.records.records.size(); }
     explicit CRecordSource(const CTextFacts& text) : _fText(text) {}
-    const CNameTable& Names() const { return *_fText.analysis.records.names; }
     CRow Of(uint32_t i);
 
   private:
     const CTextFacts& _fText;
     uint32_t _fLine = 0;
-    CIndexRange _fOfLine;  // the records of that line
 };
 
 class CLimitSource {

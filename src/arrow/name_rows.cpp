@@ -32,10 +32,8 @@ const TColumns<COccurrenceRow>& COccurrenceSource::Columns() {
 
 COccurrenceRow COccurrenceSource::Of(uint32_t i) {
     const CTextNames& names = _fText.analysis.names;
-    if (!_fOfLine.Has(i)) {
-        _fLine = names.LineOfOccurrence(i);
-        _fOfLine = {names.FirstOccurrence(_fLine), names.FirstOccurrence(_fLine + 1)};
-    }
+    if (i < names.FirstOccurrence(_fLine)) _fLine = names.LineOfOccurrence(i);
+    while (i >= names.FirstOccurrence(_fLine + 1)) ++_fLine;
     const COccurrence& item = names.occurrences.items[i];
     const EResolution resolution = _fQueries.Resolution(i);
     const auto has = [&](COccurrence::EFlag flag) { return (item.flags & flag) != 0; };

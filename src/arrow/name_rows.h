@@ -53,14 +53,12 @@ class COccurrenceSource {
     static size_t Count(const CFileAnalysis& analysis) { return analysis.names.occurrences.items.size(); }
     explicit COccurrenceSource(const CTextFacts& text)
         : _fText(text), _fQueries(text.analysis.names, text.text, text.version) {}
-    const CNameTable& Names() const { return *_fText.analysis.names.occurrences.names; }
     CRow Of(uint32_t i);
 
   private:
     const CTextFacts& _fText;
     CNameQueries _fQueries;
     uint32_t _fLine = 0;
-    CIndexRange _fOfLine;  // the occurrences of that line
 };
 
 class CScopeSource {
@@ -69,7 +67,6 @@ class CScopeSource {
     static const TColumns<CRow>& Columns();
     static size_t Count(const CFileAnalysis& analysis) { return analysis.names.scopes.scopes.size(); }
     explicit CScopeSource(const CTextFacts& text) : _fText(text) {}
-    const CNameTable& Names() const { return *_fText.analysis.names.occurrences.names; }
     CRow Of(uint32_t i) const;
 
   private:
@@ -83,7 +80,6 @@ class CSymbolSource {
     static const TColumns<CRow>& Columns();
     static size_t Count(const CFileAnalysis& analysis);
     explicit CSymbolSource(const CTextFacts& text);
-    const CNameTable& Names() const { return *_fText.analysis.names.occurrences.names; }
     CRow Of(uint32_t i) const;
 
   private:

@@ -20,13 +20,14 @@ template <class Row>
 class TRows {
   public:
     // `columns` must outlive it.
-    TRows(const TColumns<Row>& columns, bool with_file_id) : _fColumns(columns), _fWithFileId(with_file_id) {
+    TRows(const TColumns<Row>& columns, CTableForm form) : _fWithFileId(form.with_file_id) {
+        for (const auto& spec : columns.Specs())
+            if (form.with_source || !spec.is_source) _fSpecs.push_back(&spec);
         _Begin();
     }
 
-    // What the columns of names go by, up to the next call.
-    void BeginText(const CNameTable& names) {
-        for (CTable::CField& field : _fTable.fields) field.column->BeginText(names);
+    void UsePool(CNamePool& pool) {
+        for (CTable::CField& field : _fTable.fields) field.column->UsePool(pool);
     }
 
     void Append(const std::vector<Row>& rows, int64_t file_id) {
@@ -35,15 +36,8 @@ class TRows {
             auto& ids = static_cast<TNumberColumn<int64_t>&>(*_fTable.fields[field_i++].column);
             for (size_t i = 0; i < rows.size(); ++i) ids.Add(file_id);
         }
-        for (const auto& spec : _fColumns.Specs()) spec.append(*_fTable.fields[field_i++].column, rows);
+        for (const auto* spec : _fSpecs) spec->append(*_fTable.fields[field_i++].column, rows);
         _fTable.count += rows.size();
-    }
-
-    const CTable& Table() const { return _fTable; }
-
-    void Clear() {
-        for (CTable::CField& field : _fTable.fields) field.column->ClearRows();
-        _fTable.count = 0;
     }
 
     std::shared_ptr<const CTable> Finish() {
@@ -57,23 +51,23 @@ class TRows {
         _fTable = {};
         if (_fWithFileId)
             _fTable.fields.push_back({kFileIdColumn, false, std::make_unique<TNumberColumn<int64_t>>()});
-        for (const auto& spec : _fColumns.Specs())
-            _fTable.fields.push_back({spec.name, spec.is_nullable, spec.make()});
+        for (const auto* spec : _fSpecs)
+            _fTable.fields.push_back({spec->name, spec->is_nullable, spec->make()});
     }
 
-    const TColumns<Row>& _fColumns;
     const bool _fWithFileId;
+    std::vector<const TColumnSpec<Row>*> _fSpecs;
     CTable _fTable;
 };
 
 template <class Source>
 class TTableBuilder final : public CTableBuilder {
   public:
-    explicit TTableBuilder(bool with_file_id) : _fTable(Source::Columns(), with_file_id) {}
+    explicit TTableBuilder(CTableForm form) : _fTable(Source::Columns(), form) {}
 
     void Append(const CTextFacts& text, const CSelection& selection) override {
         Source source(text);
-        if constexpr (requires { source.Names(); }) _fTable.BeginText(source.Names());
+        _fTable.UsePool(text.names);
         for (size_t done = 0; done < selection.count; done += _fRows.size()) {
             _fRows.clear();
             const size_t end = std::min(selection.count, done + kMostRows);
@@ -84,8 +78,6 @@ class TTableBuilder final : public CTableBuilder {
 
     void AppendAll(const CTextFacts& text) override { Append(text, {0, 1, Source::Count(text.analysis)}); }
 
-    const CTable& Rows() const override { return _fTable.Table(); }
-    void ClearRows() override { _fTable.Clear(); }
     std::shared_ptr<const CTable> Finish() override { return _fTable.Finish(); }
 
   private:
@@ -126,8 +118,8 @@ CTableKind TableKindOf(std::string_view name, std::string_view meaning, bool wan
             meaning,
             wants_records,
             wants_names,
-            [](bool with_file_id) -> std::unique_ptr<CTableBuilder> {
-                return std::make_unique<TTableBuilder<Source>>(with_file_id);
+            [](CTableForm form) -> std::unique_ptr<CTableBuilder> {
+                return std::make_unique<TTableBuilder<Source>>(form);
             },
             [] { return ColumnInfosOf(Source::Columns()); }};
 }

@@ -23,7 +23,8 @@ struct CTextFacts {
     std::string_view text;
     const CFileAnalysis& analysis;
     const CRowIndex& rows;
-    int version;  // 312 for 3.12
+    CNamePool& names;  // at this text
+    int version;       // 312 for 3.12
     int64_t file_id = 0;
 };
 
@@ -36,24 +37,19 @@ struct CSelection {
     uint32_t At(size_t i) const { return static_cast<uint32_t>(first + i * static_cast<size_t>(step)); }
 };
 
-struct CIndexRange {
-    uint32_t first = 0;
-    uint32_t end = 0;
-
-    bool Has(uint32_t i) const { return first <= i && i < end; }
-};
-
 class CTableBuilder {
   public:
     virtual ~CTableBuilder() = default;
     virtual void Append(const CTextFacts& text, const CSelection& selection) = 0;
     virtual void AppendAll(const CTextFacts& text) = 0;
-    // What was appended.
-    virtual const CTable& Rows() const = 0;
-    // Leaves no rows, but the dictionaries, so that further rows go by the same numbers.
-    virtual void ClearRows() = 0;
     // The builder is empty afterwards.
     virtual std::shared_ptr<const CTable> Finish() = 0;
+};
+
+// Which columns a table has.
+struct CTableForm {
+    bool with_file_id = false;  // for the rows of many texts
+    bool with_source = true;    // columns that are no more than pieces of the source
 };
 
 struct CTableKind {
@@ -69,8 +65,7 @@ struct CTableKind {
     // What the analysis must have been made with.
     bool wants_records;
     bool wants_names;
-    // The rows of many texts say which one they are of, in a column `file_id`.
-    std::unique_ptr<CTableBuilder> (*make)(bool with_file_id);
+    std::unique_ptr<CTableBuilder> (*make)(CTableForm form);
     std::vector<CColumnInfo> (*columns)();
 };
 

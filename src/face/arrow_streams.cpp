@@ -22,6 +22,16 @@ const CFileAnalysis& AnalysisFor(const CSourceFile& file, const CTableKind& kind
     return kind.wants_records ? file.WithRecords() : file.Analysis();
 }
 
+// The rows of a table, by a function of its builder.
+template <class Append>
+std::shared_ptr<const CTable> Built(const CSourceFile& file, const CTableKind& kind, Append append) {
+    const CFileAnalysis& analysis = AnalysisFor(file, kind);
+    CNamePool names(kind.wants_names ? *analysis.names.occurrences.names : *analysis.records.names);
+    const std::unique_ptr<CTableBuilder> builder = kind.make({});
+    append(*builder, CTextFacts{file.Text(), analysis, file.Rows(), names, file.Version()});
+    return builder->Finish();
+}
+
 nb::list ColumnsOf(const std::vector<CTableKind::CColumnInfo>& infos) {
     nb::list columns;
     for (const CTableKind::CColumnInfo& column : infos)
@@ -49,17 +59,16 @@ nb::object StreamCapsule(std::shared_ptr<const CTable> table) {
 }
 
 nb::object StreamOfRows(const CSourceFile& file, const char* table, const CSelection& selection) {
-    const CTableKind& kind = *FindTable(table);
-    const std::unique_ptr<CTableBuilder> builder = kind.make(false);
-    builder->Append({file.Text(), AnalysisFor(file, kind), file.Rows(), file.Version()}, selection);
-    return StreamCapsule(builder->Finish());
+    const auto append = [&](CTableBuilder& builder, const CTextFacts& text) {
+        builder.Append(text, selection);
+    };
+    return StreamCapsule(Built(file, *FindTable(table), append));
 }
 
 CHostTable TableOf(const CSourceFile& file, std::string_view name) {
     const CTableKind& kind = TableKindNamed(name);
-    const std::unique_ptr<CTableBuilder> builder = kind.make(false);
-    builder->AppendAll({file.Text(), AnalysisFor(file, kind), file.Rows(), file.Version()});
-    return {kind.name, builder->Finish()};
+    const auto append = [](CTableBuilder& builder, const CTextFacts& text) { builder.AppendAll(text); };
+    return {kind.name, Built(file, kind, append)};
 }
 
 void BindTables(nb::module_& module) {

@@ -12,7 +12,6 @@
 #include "face/bind_names.h"
 #include "face/items.h"
 #include "face/kinds.h"
-#include "face/parquet_part.h"
 #include "face/settings.h"
 #include "face/source_batch.h"
 #include "host/arguments.h"
@@ -256,7 +255,6 @@ void BindFace(nb::module_& module) {
     BindSignatureItems(module);
     BindTables(module);
     BindSourceBatch(module);
-    BindParquetPart(module);
     nb::class_<CAnalysis> analysis(module, "Analysis",
                                    "What a text says. Each part is worked out when it is first asked for.");
     BindAnalysis(analysis);

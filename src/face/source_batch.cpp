@@ -229,7 +229,7 @@ CFileRow CSourceBatch::CFile::Row() const {
     return row;
 }
 
-std::vector<CBatchFile> CSourceBatch::Files() const {
+std::vector<CBatchFile> CSourceBatch::_Files() const {
     std::vector<CBatchFile> files;
     for (const CFile& file : _fFiles) {
         CBatchFile& made = files.emplace_back(CBatchFile{.row = file.Row(), .text = std::nullopt});
@@ -241,28 +241,23 @@ std::vector<CBatchFile> CSourceBatch::Files() const {
     return files;
 }
 
-CBatchSettings BatchSettings(const std::vector<std::string>& tables, bool false_hints, double max_seconds) {
+nb::dict CSourceBatch::Analyze(const std::vector<std::string>& tables, bool false_hints, bool with_source,
+                               double max_seconds) const {
     CBatchSettings settings;
     settings.false_hints = false_hints;
+    settings.with_source = with_source;
     settings.most_seconds = max_seconds;
     for (const std::string& name : tables) settings.tables.push_back(&TableKindNamed(name));
-    return settings;
-}
-
-nb::dict CSourceBatch::Analyze(const std::vector<std::string>& tables, bool false_hints,
-                               double max_seconds) const {
-    CBatchAnalyzer analyzer(BatchSettings(tables, false_hints, max_seconds));
-    const std::vector<CBatchFile> files = Files();
+    const std::vector<CBatchFile> files = _Files();
     std::vector<std::shared_ptr<const CTable>> made;
     {
         const CWithoutLock released;
-        for (const CBatchFile& file : files) analyzer.Take(file);
-        made = analyzer.Finish();
+        made = AnalyzeBatch(files, settings);
     }
     nb::dict by_name;
     by_name[HostText(kFilesTable)] = CHostTable{kFilesTable, made.back()};
-    for (size_t i = 0; i + 1 < made.size(); ++i) {
-        const std::string_view name = FindTable(tables[i])->name;
+    for (size_t i = 0; i < settings.tables.size(); ++i) {
+        const std::string_view name = settings.tables[i]->name;
         by_name[HostText(name)] = CHostTable{name, made[i]};
     }
     return by_name;
@@ -299,8 +294,10 @@ void BindSourceBatch(nb::module_& module) {
     batch.def("mark", &CSourceBatch::Mark, "state"_a, "reason"_a,
               nb::sig("def mark(self, state: str, reason: str) -> None"),
               "What is wrong with the source that was taken last.");
-    batch.def("analyze", &CSourceBatch::Analyze, "tables"_a, "false_hints"_a, "max_seconds"_a,
-              nb::sig("def analyze(self, tables: list[str], false_hints: bool, max_seconds: float) -> "
+    batch.def("analyze", &CSourceBatch::Analyze, "tables"_a, "false_hints"_a, "with_source"_a,
+              "max_seconds"_a,
+              nb::sig("def analyze(self, tables: list[str], false_hints: bool, with_source: bool, "
+                      "max_seconds: float) -> "
                       "dict[str, Table]"));
 }
 

@@ -42,10 +42,9 @@ class CSourceBatch {
     // Of the source that was taken last, which has no rows in tables unless it is `unreadable`.
     void Mark(std::string_view state, nb::str reason);
 
-    // What was taken, as long as the batch is there.
-    std::vector<CBatchFile> Files() const;
-    // The tables of these names, and the table `files`.
-    nb::dict Analyze(const std::vector<std::string>& tables, bool false_hints, double max_seconds) const;
+    // The tables of these names, and the table `files`; `with_source` is that of CTableForm.
+    nb::dict Analyze(const std::vector<std::string>& tables, bool false_hints, bool with_source,
+                     double max_seconds) const;
 
   private:
     using CCells = std::vector<std::optional<std::string_view>>;
@@ -71,6 +70,8 @@ class CSourceBatch {
     CCells _Column(const char* name, bool may_lack) const;
     static nb::object _TextOrNone(const CCells& cells, size_t i);
     const std::optional<std::string_view>& _ContentAt(size_t i) const;
+    // What was taken, as long as the batch is there.
+    std::vector<CBatchFile> _Files() const;
 
     CTableInput _fInput;
     nb::list _fLists;  // what was given in place of a table
@@ -80,8 +81,6 @@ class CSourceBatch {
     bool _fHoldsText = false;
     std::vector<CFile> _fFiles;
 };
-
-CBatchSettings BatchSettings(const std::vector<std::string>& tables, bool false_hints, double max_seconds);
 
 void BindSourceBatch(nb::module_& module);
 

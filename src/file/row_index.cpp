@@ -61,7 +61,10 @@ CCharPlace CRowIndex::PlaceOf(uint32_t offset) const {
 
 CRange CRowIndex::RangeOf(uint32_t start, uint32_t end) const {
     const CCharPlace first = PlaceOf(start);
-    const CCharPlace last = end == start ? first : PlaceOf(end);
+    const bool ends_on_row = first.row + 1 == Count() || end < _fStarts[first.row + 1];
+    const CCharPlace last = ends_on_row && _fBeforeBlocks.empty()
+                                ? CCharPlace{first.row, first.column + end - start}
+                                : PlaceOf(end);
     return {first.row + 1, first.column + 1, last.row + 1, last.column + 1};
 }
 
@@ -87,6 +90,8 @@ uint32_t CRowIndex::_RowOf(uint32_t offset) const {
     if (!is_in(_fLastRow)) {
         if (is_in(_fLastRow + 1)) {
             ++_fLastRow;
+        } else if (is_in(_fLastRow + 2)) {  // after an empty row
+            _fLastRow += 2;
         } else {
             const auto next = std::upper_bound(_fStarts.begin(), _fStarts.end(), offset);
             _fLastRow = static_cast<uint32_t>(next - _fStarts.begin()) - 1;
