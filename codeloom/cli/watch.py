@@ -33,7 +33,8 @@ class Watch:
     def __init__(self, options: Options) -> None:
         self._options = options
         self._stamps: dict[str, _Stamp] | None = None  # of the last look
-        self._kept: dict[str, tuple[_Stamp, Source]] = {}
+        self._kept: dict[str, Source] = {}
+        self._changed: set[str] = set()  # what was kept before the last look
         self._documents: dict[str, Document] = {}  # the last changed is last
 
     def wait(self) -> None:
@@ -44,30 +45,28 @@ class Watch:
             if now != self._stamps:
                 break
             time.sleep(max(_SECONDS_BETWEEN_LOOKS, _REST * (time.monotonic() - start)))
-        self._stamps = now
-        self._kept = {path: kept for path, kept in self._kept.items() if path in now}
+        before = self._stamps or {}
+        self._changed = {path for path in self._kept if path in now and now[path] != before[path]}
+        self._kept = {path: source for path, source in self._kept.items() if now.get(path) == before[path]}
         self._documents = {path: document for path, document in self._documents.items() if path in now}
+        self._stamps = now
 
     def recall(self, found: Iterator[str | OSError]) -> Iterator[str | OSError | Source]:
         """What is found, but in place of a path what its file says, where that is known or easy to know."""
-        stamps = self._stamps or {}
-        changed = {path for path, (stamp, _) in self._kept.items() if stamps.get(path) != stamp}
-        for path in found:
-            if isinstance(path, OSError) or path not in self._kept:
-                yield path
-            elif path not in changed:
-                yield self._kept[path][1]
+        becomes_document = self._changed if len(self._changed) <= _MOST_DOCUMENTS else ()
+        for one in found:
+            if isinstance(one, OSError):
+                yield one
+            elif one in self._kept:
+                yield self._kept[one]
             else:
-                source = self._edited(path) if len(changed) <= _MOST_DOCUMENTS else None
-                if source is not None:
-                    self.keep(source)
-                yield source or path
+                source = self._edited(one) if one in becomes_document else None
+                yield source or one
 
     def keep(self, source: Source) -> None:
         """Keep what a file says, until it changes."""
-        stamp = (self._stamps or {}).get(source.path)
-        if stamp is not None:  # else the file is newer than the last look
-            self._kept[source.path] = stamp, source
+        if self._stamps is not None and source.path in self._stamps:  # else it is newer than the last look
+            self._kept[source.path] = source
 
     def _edited(self, path: str) -> Source | None:
         """What a changed file says; None for one that isn't plain text, or can't be read."""
@@ -83,7 +82,9 @@ class Watch:
         self._documents[path] = document
         if len(self._documents) > _MOST_DOCUMENTS:
             del self._documents[next(iter(self._documents))]
-        return Source(path, document.analysis)
+        source = Source(path, document.analysis)
+        self.keep(source)
+        return source
 
 
 def change_text(document: Document, new: str) -> None:
