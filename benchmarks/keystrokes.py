@@ -1,6 +1,7 @@
 """What a keystroke costs in an editor: the same typing, pasting and undoing for several language servers.
 
     python benchmarks/keystrokes.py                 milliseconds until the diagnostics of a new text are there
+    python benchmarks/keystrokes.py --processor     the same in processor time alone
     python benchmarks/keystrokes.py --rows 1000     in files of so many rows alone
     python benchmarks/keystrokes.py --beside        keystrokes while another request is worked on
     python benchmarks/keystrokes.py --flicker 200   problems elsewhere while so many functions are typed
@@ -99,12 +100,13 @@ def _undone(edit: Edit) -> Edit:
 # How long it takes
 
 
-def seconds_on_wire(peer: Peer, text: str, folder: Path) -> list[float]:
+def seconds_on_wire(peer: Peer, text: str, folder: Path, *, of_processor: bool) -> list[float]:
     """Until the diagnostics are there, for each edit."""
     wire = Wire(peer.command, folder, asks=peer.asks, seconds=MOST_SECONDS)
     try:
         wire.open(text)
-        return _seconds(text, lambda edit: wire.edit(*edit))
+        clock = wire.processor_seconds if of_processor else time.perf_counter
+        return _seconds(text, lambda edit: wire.edit(*edit), clock)
     except (SilentError, EOFError, RuntimeError) as error:
         print(f"{peer.name}: {str(error) or 'no answer in time'}", file=sys.stderr)
         return []
@@ -112,7 +114,7 @@ def seconds_on_wire(peer: Peer, text: str, folder: Path) -> list[float]:
         wire.close()
 
 
-def seconds_of_document(text: str) -> list[float]:
+def seconds_of_document(text: str, clock: Callable[[], float]) -> list[float]:
     """The same in one process: an edit of a `Document`, and its problems."""
     from codeloom import Document
 
@@ -124,10 +126,10 @@ def seconds_of_document(text: str) -> list[float]:
         document.edit(start, end, one.text)
         _ = len(document.analysis.problems)
 
-    return _seconds(text, edit)
+    return _seconds(text, edit, clock)
 
 
-def seconds_of_tree_sitter(text: str) -> list[float]:
+def seconds_of_tree_sitter(text: str, clock: Callable[[], float]) -> list[float]:
     """An incremental parse, and whether there is an error."""
     try:
         import tree_sitter
@@ -157,35 +159,36 @@ def seconds_of_tree_sitter(text: str) -> list[float]:
             for row in source.split(b"\n"):
                 starts.append(starts[-1] + len(row) + 1)
 
-    return _seconds(text, edit)
+    return _seconds(text, edit, clock)
 
 
-def _seconds(text: str, apply: Callable[[Edit], object]) -> list[float]:
+def _seconds(text: str, apply: Callable[[Edit], object], clock: Callable[[], float]) -> list[float]:
     found = []
     end = time.monotonic() + MOST_SECONDS
     for edit in replay(text):
-        start = time.perf_counter()
+        start = clock()
         apply(edit)
-        found.append(time.perf_counter() - start)
+        found.append(clock() - start)
         if time.monotonic() > end:
             break
     return found
 
 
-def show_times(servers: list[Peer], sizes: list[int]) -> None:
+def show_times(servers: list[Peer], sizes: list[int], *, of_processor: bool) -> None:
     """A table: for each size the median and the 99th hundredth, in milliseconds."""
     heads = " | ".join(f"{size:,} rows" for size in sizes)
     print(f"| milliseconds a keystroke, median / 99th hundredth | {heads} |")
     print(f"| --- |{' --- |' * len(sizes)}")
     columns: dict[str, list[str]] = {}
+    clock = time.process_time if of_processor else time.perf_counter
     for size in sizes:
         text = text_of(size).decode()
         with tempfile.TemporaryDirectory() as folder:
             for peer in servers:
-                times = seconds_on_wire(peer, text, Path(folder))
+                times = seconds_on_wire(peer, text, Path(folder), of_processor=of_processor)
                 columns.setdefault(f"{peer.name}, over the wire", []).append(_cell(times))
-        columns.setdefault("codeloom, in the process", []).append(_cell(seconds_of_document(text)))
-        columns.setdefault("tree-sitter, in the process", []).append(_cell(seconds_of_tree_sitter(text)))
+        for name, measure in (("codeloom", seconds_of_document), ("tree-sitter", seconds_of_tree_sitter)):
+            columns.setdefault(f"{name}, in the process", []).append(_cell(measure(text, clock)))
     for name, cells in columns.items():
         print(f"| {name} | {' | '.join(cells)} |")
 
@@ -321,6 +324,7 @@ def main() -> None:
     """Measure what is asked for."""
     parser = argparse.ArgumentParser(description=(__doc__ or "").partition("\n")[0])
     parser.add_argument("--rows", type=int, action="append", help="the size of a file; may be given again")
+    parser.add_argument("--processor", action="store_true", help="measure the processor's time alone")
     parser.add_argument("--flicker", type=int, metavar="COUNT", help="type so many functions")
     parser.add_argument("--beside", action="store_true", help="ask for more while a key is hit")
     parser.add_argument("--server", action="append", help="this server alone; may be given again")
@@ -331,7 +335,7 @@ def main() -> None:
     elif options.beside:
         show_beside(servers, options.rows or list(ROWS))
     else:
-        show_times(servers, options.rows or list(ROWS))
+        show_times(servers, options.rows or list(ROWS), of_processor=options.processor)
 
 
 if __name__ == "__main__":
