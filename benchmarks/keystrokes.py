@@ -57,7 +57,9 @@ class Peer(NamedTuple):
 
 def peers() -> Iterator[Peer]:
     """The servers that are installed."""
-    yield Peer("codeloom", [sys.executable, "-P", "-m", "codeloom", "serve"], False)
+    ours = [sys.executable, "-P", "-m", "codeloom", "serve"]
+    yield Peer("codeloom", ours, False)
+    yield Peer("codeloom, asked", ours, True)  # no problem waits: this client can't be made to ask again
     for name, program, arguments, asks in (
         ("ruff", "ruff", ["server"], True),
         ("basedpyright", "basedpyright-langserver", ["--stdio"], True),
