@@ -5,6 +5,8 @@ import io
 import json
 import os
 import shutil
+import signal
+import threading
 from pathlib import Path
 from xml.etree import ElementTree
 
@@ -98,6 +100,15 @@ def test_what_cannot_be_answered(capsys, index, tmp_path):
     assert f"there is no index in {tmp_path}: make one with codeloom index" in told.err
     assert Answer(capsys, "SELECT 1", os.path.join(tmp_path, "void"), status=2).out == ""
     assert Answer(capsys, "CREATE TABLE mine (x INTEGER)", index).err == ""
+
+
+def test_an_interruption_ends_a_question(capsys, index):
+    interrupt = threading.Timer(1, os.kill, (os.getpid(), signal.SIGINT))
+    interrupt.start()
+    endless = (
+        "SELECT count(*) FROM range(100000000000) AS a, range(100000) AS b WHERE a.range * b.range % 7 = 3"
+    )
+    Answer(capsys, endless, index, status=130)
 
 
 def test_folders_of_indexes(capsys, index, tmp_path):

@@ -1,7 +1,9 @@
 """Questions in SQL about an index, answered by DuckDB."""
 
 import glob
-from collections.abc import Iterator, Sequence
+from collections.abc import Callable, Iterator, Sequence
+from concurrent.futures import ThreadPoolExecutor
+from functools import partial
 from itertools import chain, count
 from typing import Any
 
@@ -10,7 +12,7 @@ import duckdb
 from codeloom.corpus.store import Store, StoreError
 
 # Rows that are fetched at once.
-_ROWS = 1000
+_ROWS = 10_000
 
 
 class QueryError(Exception):
@@ -33,14 +35,11 @@ def query(sql: str, folder: str) -> Answer:
     database = connect(folder)
     if not _is_utf8(sql):
         raise QueryError("the question isn't UTF-8")
-    try:
-        cursor = database.execute(sql)
-    except duckdb.Error as error:
-        raise QueryError(str(error)) from None
+    cursor = _awaited(database, partial(database.execute, sql))
     if cursor is None:
         raise QueryError("there is no statement in the question")
     columns = [column[0] for column in cursor.description or ()]
-    return Answer(_distinct(columns), _rows(cursor) if columns else iter(()))
+    return Answer(_distinct(columns), _rows(database, cursor) if columns else iter(()))
 
 
 def connect(folder: str) -> Any:
@@ -63,15 +62,23 @@ def connect(folder: str) -> Any:
     return database
 
 
-def _rows(cursor: Any) -> Iterator[tuple[Any, ...]]:
-    while True:
+def _rows(database: Any, cursor: Any) -> Iterator[tuple[Any, ...]]:
+    while rows := _awaited(database, partial(cursor.fetchmany, _ROWS)):
+        yield from rows
+
+
+def _awaited(database: Any, ask: Callable[[], Any]) -> Any:
+    """What the database gives; QueryError for what it says instead. It ends when the process is interrupted,
+    which the database doesn't notice by itself."""
+    with ThreadPoolExecutor(1) as thread:
+        answer = thread.submit(ask)
         try:
-            rows = cursor.fetchmany(_ROWS)
+            return answer.result()
         except duckdb.Error as error:
             raise QueryError(str(error)) from None
-        if not rows:
-            return
-        yield from rows
+        except KeyboardInterrupt:
+            database.interrupt()
+            raise
 
 
 def _distinct(names: Sequence[str]) -> list[str]:
