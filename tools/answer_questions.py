@@ -54,6 +54,7 @@ def commands() -> str:
 
 def make_indexes(folder: pathlib.Path) -> None:
     """Run the commands of the page."""
+    folder.mkdir(parents=True, exist_ok=True)
     library = folder / LIBRARY
     if not library.exists():
         library.symlink_to(sysconfig.get_path("stdlib"))
