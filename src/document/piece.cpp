@@ -49,7 +49,6 @@ CPiece::CPiece(std::string_view file_text, CFilePart part, uint32_t start, const
       faults(std::move(part.faults)),
       late_problems(std::move(part.late_problems)),
       lines(std::move(part.analysis.lines)),
-      limits(std::move(part.analysis.limits)),
       scanned_in_vain(part.scanned_in_vain),
       repeated_text(part.repeated_text),
       has_asked_for_literals(part.has_asked_for_literals),

@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "document/piece_records.h"
 #include "file/file_part.h"
 #include "file/row_index.h"
 
@@ -38,7 +39,6 @@ struct CPiece {
     std::vector<CLineFault> faults;
     CProblems late_problems;
     TPlainArray<CLine> lines;
-    std::vector<CLineLimit> limits;  // lines are counted from its first one
     size_t scanned_in_vain = 0;
     size_t repeated_text = 0;
     bool has_asked_for_literals = false;
@@ -48,6 +48,7 @@ struct CPiece {
     bool needs_whole_text = false;
     // Once they have been asked for, by the table of that time.
     mutable std::unique_ptr<const CPieceNames> names;
+    mutable std::unique_ptr<const CPieceRecords> records;
 };
 
 using CPiecePtr = std::shared_ptr<const CPiece>;

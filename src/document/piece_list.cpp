@@ -27,7 +27,6 @@ CPieceSums CPieceSums::Of(const CPiece& piece) {
             .scanned_in_vain = piece.scanned_in_vain,
             .repeated_text = piece.repeated_text,
             .has_problems = piece.HasProblems(),
-            .has_limits = !piece.limits.empty(),
             .has_asked_for_literals = piece.has_asked_for_literals,
             .may_have_reopened = piece.may_have_reopened,
             .declares_for_others = piece.declares_for_others,
@@ -40,7 +39,6 @@ void CPieceSums::Add(const CPieceSums& next) {
     scanned_in_vain += next.scanned_in_vain;
     repeated_text += next.repeated_text;
     has_problems |= next.has_problems;
-    has_limits |= next.has_limits;
     has_asked_for_literals |= next.has_asked_for_literals;
     may_have_reopened |= next.may_have_reopened;
     declares_for_others |= next.declares_for_others;

@@ -30,7 +30,6 @@ struct CPieceSums {
     size_t repeated_text = 0;
     // Of at least one of them.
     bool has_problems = false;
-    bool has_limits = false;
     bool has_asked_for_literals = false;
     bool may_have_reopened = false;
     bool declares_for_others = false;

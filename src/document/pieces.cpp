@@ -16,8 +16,8 @@ namespace {
 constexpr size_t kFewestLines = 16;
 constexpr size_t kMostLines = 48;
 
-// The table of names keeps those of texts before. It is made anew when it has this many more than a text can
-// have, in which a name takes two bytes at least, with what is after it.
+// The table of names keeps those of texts before. It is made anew when it has this many more than a text may
+// have, in which there are fewer names and chains of names than bytes.
 constexpr size_t kMostOldNames = size_t{1} << 16;
 
 }  // namespace
@@ -190,7 +190,7 @@ CPieces::CPieces(std::string_view text, const CFileSettings& settings) : _fSetti
 CPieces CPieces::Edited(std::string_view old_text, std::string_view text, const CTextEdit& edit,
                         std::vector<CReplacedLines>& replaced) const {
     CPieces made(_fSettings);
-    if (_fSettings.names->Count() > text.size() / 2 + kMostOldNames)
+    if (_fSettings.names->Count() > text.size() + kMostOldNames)
         made._fSettings.names = std::make_shared<CNameTable>();
     CPieceWork(text, made).MakeFrom(*this, old_text, edit, replaced);
     return made;
@@ -222,17 +222,17 @@ CProblems CPieces::Problems(std::string_view text) const {
     return problems.Take();
 }
 
-std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text, bool wants_names) const {
-    if (wants_names && _fPieces.Sums().may_have_reopened) return {};
+std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text, bool wants_records,
+                                               bool wants_names) const {
+    if ((wants_records || wants_names) && _fPieces.Sums().may_have_reopened) return {};
     std::optional<CFileAnalysis> analysis(std::in_place);
     analysis->lines.Reserve(LineCount());
     _fPieces.ForEach([&](const CPiece& piece, const CPiecePlace& place) {
         for (const CLine& line : piece.lines)
             analysis->lines.push_back({line.start + place.start, line.end + place.start, 0, line.type});
-        for (const CLineLimit& limit : piece.limits)
-            analysis->limits.push_back({limit.line + place.line, limit.limit});
     });
     analysis->problems = Problems(text);
+    if (wants_records) _AddRecords(text, *analysis);
     if (!wants_names) return analysis;
     analysis->names = _Names(text);
     CSignatureJoiner signatures(analysis->signatures);
@@ -240,6 +240,19 @@ std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text, bool wants
         signatures.Append(piece.names->signatures, place.start, place.line);
     });
     return analysis;
+}
+
+void CPieces::_AddRecords(std::string_view text, CFileAnalysis& analysis) const {
+    CLiteralNames literal_names(text);
+    analysis.records.names = _fSettings.names;
+    _fPieces.ForEach([&](const CPiece& piece, const CPiecePlace& place) {
+        const uint32_t start = place.start;
+        if (!piece.records || piece.records->records.names != _fSettings.names)
+            piece.records = MakeRecords(AnalyzeRecordsOfPart(text, _fSettings, literal_names, start,
+                                                             start + piece.Length(), piece.state),
+                                        start);
+        AppendRecords(*piece.records, start, place.line, analysis);
+    });
 }
 
 CTextNames CPieces::_Names(std::string_view text) const {

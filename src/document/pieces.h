@@ -5,6 +5,7 @@
 //   start  at CPieces
 //
 // piece.h            a part of a text, and what it says
+// piece_records.h    the records of pieces, one piece after the other
 // piece_list.h       pieces one after the other, found by byte, line and row
 // joined_problems.h  the problems of all pieces, without those that follow from others
 // columns.h          what the columns of a host count
@@ -55,9 +56,9 @@ class CPieces {
     // follows: true.
     bool SayAll() const;
 
-    // The same as AnalyzeFile says of the text, without records. None where the names, if wanted, take an
-    // analysis of the whole.
-    std::optional<CFileAnalysis> Analysis(std::string_view text, bool wants_names) const;
+    // The same as AnalyzeFile says of the text, limits if records are wanted. None where the records or
+    // names, if wanted, take an analysis of the whole.
+    std::optional<CFileAnalysis> Analysis(std::string_view text, bool wants_records, bool wants_names) const;
     CProblems Problems(std::string_view text) const;
     uint32_t LineCount() const { return _fPieces.Sums().size.line; }
     CLine Line(uint32_t line_i) const;
@@ -72,6 +73,7 @@ class CPieces {
 
     explicit CPieces(const CFileSettings& settings) : _fSettings(settings) {}
 
+    void _AddRecords(std::string_view text, CFileAnalysis& analysis) const;
     CTextNames _Names(std::string_view text) const;
 
     CFileSettings _fSettings;

@@ -54,8 +54,8 @@ CSourceFile::CSourceFile(CPlainFile text, nb::str path, nb::str python, const CF
       _fArePiecesAll(_fPieces->SayAll()) {}
 
 // What the pieces of a document say, which they all share: the interpreter's lock is kept.
-std::unique_ptr<const CFileAnalysis> CSourceFile::_FromPieces(bool wants_names) const {
-    std::optional<CFileAnalysis> analysis = _fPieces->Analysis(Text(), wants_names);
+std::unique_ptr<const CFileAnalysis> CSourceFile::_FromPieces(bool wants_records, bool wants_names) const {
+    std::optional<CFileAnalysis> analysis = _fPieces->Analysis(Text(), wants_records, wants_names);
     if (!analysis) return nullptr;
     return std::make_unique<const CFileAnalysis>(std::move(*analysis));
 }
@@ -67,7 +67,7 @@ nb::bytes CSourceFile::Utf8() const {
 const CFileAnalysis& CSourceFile::_Analyzed(std::shared_ptr<const CFileAnalysis>& kept, bool wants_records,
                                             bool wants_names) const {
     if (kept) return *kept;
-    if (_Pieces() != nullptr && !wants_records && (kept = _FromPieces(wants_names))) return *kept;
+    if (_Pieces() != nullptr && (kept = _FromPieces(wants_records, wants_names))) return *kept;
     CFileSettings settings = _fSettings;
     settings.wants_records = wants_records;
     settings.wants_names = wants_names;

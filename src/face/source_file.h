@@ -95,7 +95,7 @@ class CSourceFile {
     // The pieces, if they say all.
     const CPieces* _Pieces() const { return _fArePiecesAll ? _fPieces.get() : nullptr; }
     static nb::object _Named(const CNameTable& names, std::vector<nb::object>& made, uint32_t number);
-    std::unique_ptr<const CFileAnalysis> _FromPieces(bool wants_names) const;
+    std::unique_ptr<const CFileAnalysis> _FromPieces(bool wants_records, bool wants_names) const;
     const CFileAnalysis& _Analyzed(std::shared_ptr<const CFileAnalysis>& kept, bool wants_records,
                                    bool wants_names = false) const;
 

@@ -501,6 +501,16 @@ CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& setting
     return CFileAnalyzer(text, with_names, literal_names, true).RunPart(start, state, {}, same_end);
 }
 
+CFilePart AnalyzeRecordsOfPart(std::string_view text, const CFileSettings& settings,
+                               CLiteralNames& literal_names, uint32_t start, uint32_t end,
+                               const CPartState& state) {
+    CFileSettings with_records = settings;
+    with_records.wants_records = true;
+    with_records.wants_names = false;
+    CEndAt same_end(end);
+    return CFileAnalyzer(text, with_records, literal_names, false).RunPart(start, state, {}, same_end);
+}
+
 bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text) {
     return scanned_in_vain < CLexer::MostScannedInVain(text_size) &&
            repeated_text <= CLengthLimits::MostRepeatedText(text_size);

@@ -75,6 +75,11 @@ CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& setting
                              CLiteralNames& literal_names, uint32_t start, uint32_t end,
                              const CPartState& state);
 
+// The same with records instead.
+CFilePart AnalyzeRecordsOfPart(std::string_view text, const CFileSettings& settings,
+                               CLiteralNames& literal_names, uint32_t start, uint32_t end,
+                               const CPartState& state);
+
 // The parts of a text, whose shares come to these sums, say together what AnalyzeFile says.
 bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text);
 
