@@ -11,7 +11,7 @@ from codeloom.cli.command import ExitStatus
 from codeloom.cli.console import Console, say
 from codeloom.cli.excerpt import printable
 from codeloom.cli.filters import Filter
-from codeloom.cli.filters.codes import CodeFilter, not_ignored_by_comments
+from codeloom.cli.filters.codes import code_filters
 from codeloom.cli.formats import format_named
 from codeloom.cli.items import Finding
 from codeloom.cli.options import Options
@@ -220,10 +220,8 @@ def print_facts(options: Options) -> None:
 
 
 def _filters_of(options: Options) -> tuple[list[Filter], Changes | None]:
-    filters: list[Filter] = [not_ignored_by_comments]
+    filters = code_filters(options.select, options.ignore)
     changes = None
-    if options.select or options.ignore:
-        filters.append(CodeFilter(options.select, options.ignore))
     try:
         if options.diff is not None:
             from codeloom.cli.filters.changes import Changes

@@ -3,7 +3,7 @@
 import os
 from collections.abc import Sequence
 
-from codeloom.cli.filters.codes import CodeFilter, not_ignored_by_comments
+from codeloom.cli.filters.codes import code_filters
 from codeloom.cli.items import Finding
 from codeloom.cli.options import Options, WrongUseError
 from codeloom.cli.source import Source
@@ -43,11 +43,10 @@ class Settings:
     def passed(self, source: Source) -> Sequence[Finding]:
         """The problems of a source that settings and comments let through."""
         findings: Sequence[Finding] = [Finding.of(source, problem) for problem in source.problems]
-        if findings:
-            findings = not_ignored_by_comments(source, findings)
         options = self._options
-        if options is not None and (options.select or options.ignore):
-            findings = CodeFilter(options.select, options.ignore)(source, findings)
+        selected = (options.select, options.ignore) if options is not None else ((), ())
+        for passes in code_filters(*selected) if findings else ():
+            findings = passes(source, findings)
         return findings
 
 

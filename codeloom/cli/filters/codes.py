@@ -6,6 +6,7 @@ A selector is a code, the beginning of one such as "CL4", or "ALL".
 import re
 from collections.abc import Sequence
 
+from codeloom.cli.filters import Filter
 from codeloom.cli.items import Finding
 from codeloom.cli.project import nearest
 from codeloom.cli.source import Source
@@ -42,6 +43,11 @@ class CodeFilter:
 
     def _passes(self, code: str) -> bool:
         return _best_fit(code, self._select) > _best_fit(code, self._ignore)
+
+
+def code_filters(select: Sequence[str], ignore: Sequence[str]) -> list[Filter]:
+    """What every run passes problems through: comments, and what is selected if anything is."""
+    return [not_ignored_by_comments, *([CodeFilter(select, ignore)] if select or ignore else [])]
 
 
 def not_ignored_by_comments(source: Source, findings: Sequence[Finding]) -> Sequence[Finding]:
