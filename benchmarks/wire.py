@@ -80,12 +80,8 @@ class Wire:
         return self._diagnostics()
 
     def processor_seconds(self) -> float:
-        """What the threads of the server have worked until now."""
-        nanoseconds = 0
-        for task in Path(f"/proc/{self._process.pid}/task").iterdir():
-            with suppress(FileNotFoundError):  # a thread that has ended
-                nanoseconds += int((task / "schedstat").read_text().split()[0])
-        return nanoseconds / 1e9
+        """What the server and its processes have worked until now."""
+        return _nanoseconds(self._process.pid) / 1e9
 
     def begin(self, method: str, params: Message) -> int:
         """Send a request; the number of its answer."""
@@ -168,6 +164,16 @@ class Wire:
         if not data:
             raise EOFError("the server has ended")
         self._buffer += data
+
+
+def _nanoseconds(process: int) -> int:
+    """What all threads of a process, and of those that it has started, have worked."""
+    found = 0
+    for task in Path(f"/proc/{process}/task").iterdir():
+        with suppress(FileNotFoundError):  # a thread that has ended
+            found += int((task / "schedstat").read_text().split()[0])
+            found += sum(_nanoseconds(int(child)) for child in (task / "children").read_text().split())
+    return found
 
 
 def _answer(request: Message) -> Any:

@@ -121,6 +121,9 @@ def test_cells_come_and_go(tmp_path):
         )
         assert "the text of the cell" in client.note("window/logMessage").message
         client.notify(
+            "textDocument/didClose", {"textDocument": {"uri": client.uri("a")}}
+        )  # no editor does so
+        client.notify(
             "notebookDocument/didClose",
             {"notebookDocument": {"uri": client.uri(NOTEBOOK)}, "cellTextDocuments": []},
         )

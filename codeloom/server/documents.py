@@ -1,6 +1,6 @@
 """The texts and notebooks that are open in the client, by their names."""
 
-from collections.abc import Sequence
+from collections.abc import Iterable, Sequence
 from typing import TYPE_CHECKING
 
 from lsprotocol import types
@@ -9,7 +9,7 @@ from pygls.uris import to_fs_path
 
 from codeloom.server.document import OpenDocument
 from codeloom.server.live_text import LiveText
-from codeloom.server.notebook import OpenNotebook
+from codeloom.server.notebook import Cell, OpenNotebook
 from codeloom.server.settings import Settings, SettingsByFolder
 
 if TYPE_CHECKING:
@@ -79,7 +79,7 @@ class Documents:
         """Forget a notebook; its cells."""
         notebook = self.notebook(uri)
         del self._notebooks[uri]
-        return [self.close(cell.uri) for cell in notebook]
+        return self._close_cells(notebook)
 
     def read_settings_anew(self) -> None:
         """Take the settings of all texts as they are now."""
@@ -101,10 +101,15 @@ class Documents:
         opened: Sequence[types.TextDocumentItem],
     ) -> list[OpenDocument]:
         """Put cells into a notebook; those that are no more in it."""
-        before = {cell.uri for cell in notebook}
+        before = list(notebook)
         notebook.splice(change, {item.uri: item for item in opened})
-        self._by_uri.update((cell.uri, cell) for cell in notebook)
-        return [self.close(uri) for uri in before - {cell.uri for cell in notebook}]
+        now = {cell.uri: cell for cell in notebook}
+        self._by_uri.update(now)
+        return self._close_cells(cell for cell in before if cell.uri not in now)
+
+    def _close_cells(self, cells: Iterable[Cell]) -> list[OpenDocument]:
+        """Forget those of the cells that weren't closed by themselves."""
+        return [self._by_uri.pop(cell.uri) for cell in cells if cell.uri in self._by_uri]
 
     def _settings_of(self, uri: str) -> Settings:
         return self.settings.of_file(to_fs_path(uri))

@@ -119,13 +119,13 @@ class OpenNotebook:
         known: Mapping[str, Cell],
     ) -> Cell | None:
         item = opened.get(cell.document)
-        if item is None and cell.document in known:
-            return known[cell.document]
-        if cell.kind is not types.NotebookCellKind.Code:
+        if cell.kind is not types.NotebookCellKind.Code or (item and item.language_id != "python"):
             return None
-        if item is None:
+        if item is not None:
+            return Cell(item, self)
+        if cell.document not in known:
             raise JsonRpcInvalidParams(f"the text of the cell {cell.document} is missing")
-        return Cell(item, self) if item.language_id == "python" else None
+        return known[cell.document]
 
     def join(self, written: Written | None) -> None:
         """Take the code of the cells as it is now. `written` has the rows of the analysis."""
