@@ -1,5 +1,9 @@
 """What the language server answers: names, outlines, folds, completion, fixes."""
 
+import random
+import sysconfig
+from pathlib import Path
+
 import pytest
 from language_client import Client, Refused, apply, range_of, shown
 from tools_of_project import tool_named
@@ -144,6 +148,44 @@ def test_rename(client):
     edit = client.request("textDocument/rename", {**client.at(4, 6, "as.py"), "newName": "e"})
     (edits,) = edit.changes.values()
     assert apply(source, edits) == source.replace("as b", "as e").replace("print(b)", "print(e)")
+
+
+def Meanings(analysis):
+    """A number for each name that has a scope: the same for those that mean the same."""
+    known = {}
+    return [
+        known.setdefault((one.home, one.mangled), len(known))
+        for one in analysis.occurrences
+        if one.resolution is not None
+    ]
+
+
+def test_random_renames(tmp_path, seed):
+    """After each that isn't refused every name of the text means what it meant."""
+    chance = random.Random(seed)
+    folder = Path(sysconfig.get_path("stdlib"))
+    done = refused = 0
+    with Client(tmp_path, encodings=["utf-32"]) as client:
+        for name in ("textwrap.py", "contextlib.py", "bisect.py"):
+            source = (folder / name).read_text("utf-8")
+            client.open(source, name)
+            before = codeloom.analyze(source)
+            names = [one for one in before.occurrences if one.resolution is not None]
+            for _ in range(25):
+                one, other = chance.sample(names, 2)
+                new = chance.choice(("fresh_name", other.name))
+                place = client.at(one.range.row - 1, one.range.column - 1, name)
+                try:
+                    edit = client.request("textDocument/rename", {**place, "newName": new})
+                except Refused:
+                    refused += 1
+                    continue
+                (edits,) = edit.changes.values()
+                after = codeloom.analyze(apply(source, edits))
+                assert Meanings(after) == Meanings(before), (seed, name, one, new)
+                assert not after.problems, (seed, name, one, new)
+                done += 1
+    assert done > 10 and refused > 10
 
 
 def test_outline(client):
