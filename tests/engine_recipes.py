@@ -18,6 +18,7 @@ from codeloom.corpus import analyze_batch
 
 PAGE = Path(__file__).parent.parent / "docs/corpus.md"
 RECIPE = re.compile(r"(?:^    .*\n|^\n(?=    ))+", re.MULTILINE)
+pytestmark = pytest.mark.slow
 COLUMNS = ["file_id", "code", "row", "message"]
 
 

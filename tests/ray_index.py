@@ -1,6 +1,6 @@
 """An index by a cluster of Ray with two workers, of which one is killed in the middle.
 
-Not among the other tests, since Ray is large: `make engines` installs and runs it.
+Not among the other tests, since Ray is large: `make engines` installs it and runs them.
 """
 
 import os
@@ -15,6 +15,8 @@ from index_kills import Corpus, RowsOf
 
 from codeloom.cli import main
 from codeloom.corpus.store import MANIFEST
+
+pytestmark = pytest.mark.slow
 
 
 @pytest.fixture(scope="module")
@@ -87,6 +89,21 @@ def test_an_index_is_that_of_threads_though_a_process_dies(corpus, by_threads, t
     assert killed
     assert RowsOf(tmp_path / "index") == RowsOf(by_threads)
     assert FilesIn(tmp_path / "index") == FilesIn(by_threads)
+
+
+def test_a_part_that_kills_each_worker_ends_the_run(corpus, tmp_path, monkeypatch, capfd):
+    (tmp_path / "sitecustomize.py").write_text(
+        "import os, codeloom.corpus.part as part\n"
+        "made = part.parquet_files\n"
+        "def parquet_files(settings, sources):\n"
+        "    if any('/00500_' in one.entry.path for one in sources):\n"
+        "        os._exit(1)\n"
+        "    return made(settings, sources)\n"
+        "part.parquet_files = parquet_files\n"
+    )
+    monkeypatch.setenv("PYTHONPATH", f"{tmp_path}:{os.environ.get('PYTHONPATH', '')}")
+    assert IndexByRay(corpus, tmp_path / "index") == 2
+    assert "6 workers died of the files from" in capfd.readouterr().err
 
 
 def test_a_run_by_threads_is_gone_on_with(corpus, by_threads, tmp_path, monkeypatch):

@@ -103,7 +103,7 @@ class IndexCommand(Command):
     def run(self, options: Options) -> ExitStatus:
         """Bring the index up to date; WrongUseError where it can't be one."""
         with needing_extra("index", "arrow", "pyarrow"):
-            from codeloom.corpus.index import Indexer
+            from codeloom.corpus.index import Indexer, PoolError
             from codeloom.corpus.part import settings_of
             from codeloom.corpus.store import StoreError, WritableStore
         settings = settings_of(
@@ -124,6 +124,10 @@ class IndexCommand(Command):
             try:
                 indexer = Indexer(store, pool, part_bytes=int(options.part_size * _MEGABYTE))
                 return _Run(options, indexer).run()
+            except PoolError as error:
+                raise WrongUseError(
+                    f"{error}; go on with --resume when they are mended or excluded"
+                ) from None
             finally:
                 pool.close()
 

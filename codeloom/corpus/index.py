@@ -30,6 +30,10 @@ class Counts:
         self.removed = 0
 
 
+class PoolError(Exception):
+    """A part that can't be done. The parts before it are kept, and the run can be gone on with."""
+
+
 class Pool(Protocol):
     """What analyses parts, several at a time."""
 
@@ -37,7 +41,7 @@ class Pool(Protocol):
 
     def submit(self, part: int, sources: Sequence[Hashed]) -> Callable[[], None]:
         """Begin with a part. The call that is given returns when its files are on the disk, at their
-        temporary paths."""
+        temporary paths; PoolError when nobody can do it."""
 
     def close(self) -> None:
         """Begin no more parts."""

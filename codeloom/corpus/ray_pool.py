@@ -28,6 +28,7 @@ from ray.data.block import BlockMetadata
 from ray.data.datasource import Datasource, ReadTask
 from ray.util.scheduling_strategies import NodeAffinitySchedulingStrategy
 
+from codeloom.corpus.index import PoolError
 from codeloom.corpus.part import Hashed, Settings, parquet_files
 from codeloom.corpus.store import WritableStore
 
@@ -85,6 +86,8 @@ class RayPool:
     def _files_of(self, number: int) -> pyarrow.Table:
         while number not in self._files:
             files = next(self._results)
+            if "error" in files.column_names:
+                raise PoolError(files["error"][0].as_py())
             self._files[files["number"][0].as_py()] = files
         return self._files.pop(number)
 
@@ -144,12 +147,10 @@ class _Desk:
             await self._changed.wait_for(lambda: number < self._size or self._is_closed)
         return number < self._size
 
-    async def take(self, number: int) -> bytes:
-        """The sources of a part; RuntimeError when that was done too often."""
+    async def take(self, number: int) -> tuple[bytes, int]:
+        """The sources of a part, and how often they were taken before."""
         self._tries[number] += 1
-        if self._tries[number] > _TRIES:
-            raise RuntimeError(f"each worker that tried a part died, {_TRIES} of them")
-        return self._parts[number]
+        return self._parts[number], self._tries[number] - 1
 
     async def drop(self, number: int) -> None:
         """Forget a part that is done."""
@@ -187,9 +188,13 @@ def _numbers_on(desk: Any) -> Iterator[pyarrow.Table]:
 
 
 def _files_of(part: pyarrow.Table, desk: Any, settings: Settings) -> pyarrow.Table:
-    """The Parquet files of a part: a row with a column for each table."""
+    """The Parquet files of a part: a row with a column for each table, or with the column `error`."""
     number = part["number"][0].as_py()
-    sources = pickle.loads(ray.get(desk.take.remote(number)))
+    pickled, tries = ray.get(desk.take.remote(number))
+    sources = pickle.loads(pickled)
+    if tries == _TRIES:
+        error = f"{tries} workers died of the files from {sources[0].entry.path} to {sources[-1].entry.path}"
+        return pyarrow.table({"number": [number], "error": [error]})
     files = {
         name: pyarrow.array([data], pyarrow.large_binary())
         for name, data in parquet_files(settings, sources).items()
