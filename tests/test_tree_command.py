@@ -131,7 +131,8 @@ def test_a_row_of_a_cell(write_files, run_cli):
     ]
     write_files({"n.ipynb": json.dumps({"cells": cells})})
     assert run_cli("tree", "n.ipynb:cell 2:2:1:").stdout.startswith("n.ipynb:cell 2:2:1: b = 1\nCExprStmt")
-    for place in ("n.ipynb:2", "n.ipynb:cell 1:1"):
+    write_files({"a.py": "x\n"})
+    for place in ("n.ipynb:2", "n.ipynb:cell 1:1", "a.py:cell 1:1"):
         done = run_cli("tree", place)
         assert done.returncode == 2 and "name FILE:cell N:ROW" in done.stderr
 

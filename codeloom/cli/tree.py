@@ -74,10 +74,11 @@ class TreeCommand(Command):
             except OSError as error:
                 console.print_failure(error)
                 return ExitStatus.FAILURE
-            if source.is_notebook and row is not None:
+            if row is not None and (source.is_notebook or cell is not None):
                 row = source.row_in_text(cell, row)
                 if row is None:
-                    return _fail(f"there is no code in {options.place}: name FILE:cell N:ROW", console)
+                    place = printable_path(options.place or "")
+                    return _fail(f"there is no code in {place}: name FILE:cell N:ROW of a notebook", console)
             return _print(source, options, row, console)
 
 
