@@ -79,6 +79,12 @@ class Expected(ast.NodeVisitor):
         self.add(Role.PARAMETER, node.arg, node.lineno, node.col_offset)
         self.generic_visit(node)
 
+    def visit_TypeVar(self, node):
+        self.add(Role.TYPE_PARAMETER, node.name)
+        self.generic_visit(node)
+
+    visit_ParamSpec = visit_TypeVarTuple = visit_TypeVar
+
     def visit_keyword(self, node):
         if node.arg is not None:
             self.add(Role.KEYWORD, node.arg, node.lineno, node.col_offset)
@@ -198,6 +204,8 @@ SCOPE_KINDS = {
     "genexpr": ScopeKind.GENERATOR,
     "lambda": ScopeKind.LAMBDA,
 }
+# What 3.12 calls kinds of scopes that later versions call as we do.
+SCOPE_WORDS = {"type parameter": "type parameters", "TypeVar bound": "type variable"}
 FLAGS = (
     "is_local",
     "is_global",
@@ -214,8 +222,9 @@ FLAGS = (
 
 
 def their_scopes(table):
-    """(kind, name, row, symbols, scopes within) of a table, in a form that compares."""
-    name, kind = table.get_name(), ScopeKind[table.get_type().upper()]
+    """(kind, name, row, symbols, scopes within, names inlined, line) of a table, in a form that compares."""
+    word = table.get_type()
+    name, kind = table.get_name(), ScopeKind(SCOPE_WORDS.get(word, word))
     if kind is ScopeKind.FUNCTION and name in SCOPE_KINDS and is_nameless(table):
         kind, name = SCOPE_KINDS[name], ""
     if kind is ScopeKind.MODULE:
@@ -226,11 +235,20 @@ def their_scopes(table):
         for symbol in sorted(table.get_symbols(), key=lambda symbol: symbol.get_name())
         if symbol.get_name() not in IMPLICIT
     }
-    return kind, name, row, symbols, ordered(map(their_scopes, table.get_children()))
+    children = ordered(map(their_scopes, table.get_children()))
+    return kind, name, row, symbols, children, set(), table.get_lineno()
 
 
-# Parameters that the interpreter makes up.
-IMPLICIT = {".0"}
+# Names that the interpreter makes up, of comprehensions and around definitions with type parameters.
+IMPLICIT = {
+    ".0",
+    ".defaults",
+    ".generic_base",
+    ".kwdefaults",
+    ".type_params",
+    "__classdict__",
+    "__type_params__",
+}
 
 
 def is_nameless(table):
@@ -239,7 +257,7 @@ def is_nameless(table):
 
 
 def ordered(scopes):
-    return sorted(scopes, key=lambda scope: (scope[0].value, repr(scope[1:])))
+    return sorted(scopes, key=lambda scope: (scope[0].value, scope[6], repr(scope[1:4])))
 
 
 # From 3.12 on these are within the scope around them, and their names among its own (PEP 709).
@@ -270,7 +288,7 @@ def our_scopes(analysis):
                 inlined |= {*child[3], *child[5]}
             else:
                 children.append(child)
-        return scope.kind, normal(scope.name), row, symbols, ordered(children), inlined
+        return scope.kind, normal(scope.name), row, symbols, ordered(children), inlined, scope.range.row
 
     (module,) = within[None]
     return shown(module)
@@ -290,6 +308,8 @@ def differences(ours, theirs, where):
         for flag in {*mine} ^ {*flags}:
             if flag == "is_namespace" and name.startswith("_") and "__" in name[1:]:
                 continue  # the interpreter looks for the scope by the mangled name and finds none
+            if flag == "is_namespace" and where.endswith(f".{name}"):
+                continue  # the interpreter takes the definition for one among its type parameters
             if flag in ("is_global", "is_local") and where.endswith(".top"):
                 continue  # the interpreter takes a function of this name for the module
             yield f"{flag} is {flag in mine}", f"{where}.{name}"

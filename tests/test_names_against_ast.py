@@ -176,13 +176,14 @@ class Facts(ast.NodeVisitor):
             self.VisitAnnotation(arg.annotation)
         self.VisitAnnotation(node.returns)
         self.VisitAll(node.decorator_list, node.args.defaults, node.args.kw_defaults)
+        self.VisitAll(getattr(node, "type_params", []))
         self.VisitSuite(node)
 
     visit_AsyncFunctionDef = visit_FunctionDef
 
     def visit_ClassDef(self, node):
         self.Add("binds", node.name, node)
-        self.VisitAll(node.decorator_list, node.bases, node.keywords)
+        self.VisitAll(node.decorator_list, node.bases, node.keywords, getattr(node, "type_params", []))
         self.VisitSuite(node)
 
     def VisitSuite(self, node):
