@@ -123,6 +123,13 @@ def test_memory_after_many_edits():
     assert edit(8_000) - before < 2_000_000
 
 
+def test_annotations_deferred_by_an_edit():
+    document = Document("import a\n" + "x: b = 1\n" * 60, python="3.13")
+    assert document.analysis.scopes
+    document.edit((1, 1), (1, 9), "from __future__ import annotations")
+    compare(document.analysis, analyze(document.text, python="3.13"))
+
+
 def test_names_after_many_others():
     document = Document(TEXT)
     many = "".join(f"x = name_{i}\n" for i in range(70_000))

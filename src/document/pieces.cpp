@@ -37,6 +37,7 @@ class CPieceWork final : CPartEnd {
 
   private:
     bool EndsAt(uint32_t start, const CPartState& state, size_t line_count) override;
+    void Restart() override;
     void _TakeLiterals(const CPieces& old, std::string_view old_text);
     void _Replace(std::vector<CReplacedLines>& replaced);
     void _AnalyzeFrom(uint32_t start, CPartState state);
@@ -56,6 +57,7 @@ class CPieceWork final : CPartEnd {
     // The pieces of the text before, from which what is the same is taken: the next one, and whether the part
     // under way ends where that one begins.
     std::optional<CPieceCursor> _fOld;
+    std::optional<CPieceCursor> _fOldAtStart;  // of the part under way
     CTextEdit _fEdit;
     bool _fHasOtherLiterals = false;
     bool _fHasMetOld = false;
@@ -130,12 +132,16 @@ void CPieceWork::_AnalyzeFrom(uint32_t start, CPartState state) {
 
 // What was closed before matters for few pieces.
 CFilePart CPieceWork::_AnalyzePart(uint32_t start, const CPartState& state) {
-    const std::optional<CPieceCursor> old = _fOld;
+    _fOldAtStart = _fOld;
     CFilePart part = AnalyzePart(_fText, _fMade._fSettings, _fLiteralNames, start, state, {}, *this);
     if (!part.may_have_reopened) return part;
-    _fOld = old;
-    _fHasMetOld = false;
+    Restart();
     return AnalyzePart(_fText, _fMade._fSettings, _fLiteralNames, start, state, _ClosedBefore(), *this);
+}
+
+void CPieceWork::Restart() {
+    _fOld = _fOldAtStart;
+    _fHasMetOld = false;
 }
 
 // By depth the last block that the pieces so far have closed.

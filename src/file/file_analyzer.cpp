@@ -66,6 +66,7 @@ class CEndAt final : public CPartEnd {
   public:
     explicit CEndAt(uint32_t end) : _fEnd(end) {}
     bool EndsAt(uint32_t start, const CPartState&, size_t) override { return start == _fEnd; }
+    void Restart() override {}
 
   private:
     uint32_t _fEnd;
@@ -487,8 +488,8 @@ CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLit
     CFileAnalyzer analyzer(text, quick, literal_names, false);
     CFilePart part = analyzer.RunPart(start, state, closed, part_end);
     if (!analyzer.HasTellingNames()) return part;
-    CEndAt same_end(part.end);
-    return CFileAnalyzer(text, quick, literal_names, true).RunPart(start, state, closed, same_end);
+    part_end.Restart();
+    return CFileAnalyzer(text, quick, literal_names, true).RunPart(start, state, closed, part_end);
 }
 
 CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& settings,

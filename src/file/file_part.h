@@ -27,6 +27,9 @@ class CPartEnd {
     // The part may end after `line_count` lines, before the row that begins at `start`.
     virtual bool EndsAt(uint32_t start, const CPartState& state, size_t line_count) = 0;
 
+    // The part is analysed once more, from its beginning.
+    virtual void Restart() = 0;
+
   protected:
     ~CPartEnd() = default;
 };
