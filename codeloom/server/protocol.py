@@ -4,6 +4,7 @@ import asyncio
 import json
 import logging
 import operator
+import time
 from collections.abc import Generator
 from concurrent.futures import Future
 from functools import partial
@@ -60,13 +61,13 @@ class Protocol(LanguageServerProtocol):
     def __init__(self, server: "Server", converter: Any) -> None:
         super().__init__(server, converter)
         self.ended: asyncio.Future[int] | None = None
-        # When it came, in the time of the loop.
+        # When it came, by the monotonic clock.
         self.last_message = 0.0
         self._is_initialized = False
 
     def take(self, message: Any, is_cancelled: bool = False) -> None:
         """Handle what was read: a message, something else that is JSON, or an error of reading."""
-        self.last_message = asyncio.get_running_loop().time()
+        self.last_message = time.monotonic()
         try:
             if isinstance(message, Exception):
                 raise JsonRpcParseError(f"the message can't be read: {message}")

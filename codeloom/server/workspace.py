@@ -2,9 +2,10 @@
 
 import asyncio
 import os
+import time
 from collections.abc import Callable, Iterable, Iterator, Mapping, Sequence
 from dataclasses import dataclass
-from functools import partial
+from functools import cached_property, partial
 from itertools import islice
 from typing import TYPE_CHECKING, Any, TypeVar
 
@@ -14,6 +15,7 @@ from pygls.uris import from_fs_path, to_fs_path
 from codeloom._face import analyze_file
 from codeloom.cli.source import Source
 from codeloom.reading.files import MODULE_SUFFIXES, NOTEBOOK_SUFFIX, find_files
+from codeloom.rows import ROW_END
 from codeloom.server.diagnostics import diagnostic_of, result_id
 from codeloom.server.json_text import Fields, JsonText
 from codeloom.server.places import ClosedText
@@ -69,6 +71,19 @@ class _Known:
     uri: str
     items: Sequence[Fields]
     result_id: str
+
+
+class _ClosedSource(Source):
+    """A source in a thread that gives way to others."""
+
+    @cached_property
+    def rows(self) -> list[str]:
+        """As the base class does, though not in one step that no other thread can interrupt."""
+        text, rows, start = self.analysis.text, [], 0
+        for end in ROW_END.finditer(text):
+            rows.append(text[start : end.start()])
+            start = end.end()
+        return [*rows, text[start:]]
 
 
 class ClosedFiles:
@@ -158,27 +173,42 @@ class ClosedFiles:
         uri = from_fs_path(path)
         if uri is None or self._server.documents.is_open(path):
             return
-        items = await self._in_background(lambda: self._diagnostics(path, uri))
+        known = await self._in_background(lambda: self._look(path, uri))
         if not self._server.documents.is_open(path):
-            self._take(path, _Known(uri, items, result_id(items)))
+            self._take(path, known)
 
     async def _in_background(self, work: "Callable[[], Result]") -> "Result":
         """What `work` gives, done in a thread as soon as the client is quiet."""
-        loop = asyncio.get_running_loop()
-        while (rest := self._server.protocol.last_message + _QUIET_SECONDS - loop.time()) > 0:
-            await asyncio.sleep(rest)
-        return await loop.run_in_executor(self._server.thread_pool, work)
+        while (seconds := self._seconds_to_wait()) > 0:
+            await asyncio.sleep(seconds)
+        return await asyncio.get_running_loop().run_in_executor(self._server.thread_pool, work)
 
-    def _diagnostics(self, path: str, uri: str) -> list[Fields]:
+    def _seconds_to_wait(self) -> float:
+        """Until the client has been quiet for long enough."""
+        return self._server.protocol.last_message + _QUIET_SECONDS - time.monotonic()
+
+    # In the thread
+
+    def _look(self, path: str, uri: str) -> _Known:
+        items = []
+        for item in self._diagnostics(path, uri):
+            while (seconds := self._seconds_to_wait()) > 0:  # give way to whoever types again
+                time.sleep(seconds)
+            items.append(item)
+        return _Known(uri, items, result_id(items))
+
+    def _diagnostics(self, path: str, uri: str) -> Iterator[Fields]:
         documents = self._server.documents
         settings = documents.settings.of_file(path)
         try:
             analysis = analyze_file(path, python=settings.python, false_hints=settings.false_hints)
         except OSError:  # it is no more, or nobody may read it
-            return []
-        source = Source(path, analysis)
+            return
+        source = _ClosedSource(path, analysis)
         text = ClosedText(uri, source, documents.encoding)
-        return [diagnostic_of(text, finding) for finding in settings.passed(source)]
+        yield from (diagnostic_of(text, finding) for finding in settings.passed(source))
+
+    # In the loop again
 
     def _take(self, path: str, new: _Known) -> None:
         old = self._by_path.get(path)
