@@ -6,7 +6,7 @@ namespace codeloom {
 
 namespace {
 
-// Pages are as long as there are pages in a text of 100,000 rows, about.
+// A text of 100,000 rows has about as many pages as a page has pieces.
 constexpr size_t kFewestPieces = 16;
 constexpr size_t kMostPieces = 64;
 

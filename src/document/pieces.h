@@ -1,6 +1,6 @@
 // document/: a text that changes, and what it says after each change.
 //   in     a text, then edits of it
-//   out    for each text what AnalyzeFile says of it, and which pieces of it are others than before
+//   out    for each text what AnalyzeFile says of it, and which of its lines are others than before
 //   keeps  the text in pieces, each with what it says; an edit leaves most of them as they are
 //   start  at CPieces
 //
@@ -56,8 +56,8 @@ class CPieces {
     // follows: true.
     bool SayAll() const;
 
-    // The same as AnalyzeFile says of the text, limits if records are wanted. None where the records or
-    // names, if wanted, take an analysis of the whole.
+    // The same as AnalyzeFile says of the text, with limits if records are wanted. None where records or
+    // names are wanted and only an analysis of the whole text gives them.
     std::optional<CFileAnalysis> Analysis(std::string_view text, bool wants_records, bool wants_names) const;
     CProblems Problems(std::string_view text) const;
     uint32_t LineCount() const { return _fPieces.Sums().size.line; }

@@ -57,7 +57,7 @@ struct CFilePart {
     bool has_asked_for_literals = false;  // which the whole text says
     std::vector<CBlock> closed;           // blocks, as CBlockTracker gives them
     bool may_have_reopened = false;       // a block, which may have been closed before
-    // Its late problems are to be found out from the names of all parts: a declaration concerns other parts.
+    // A declaration concerns other parts, so late problems are to be found from the names of all parts.
     bool declares_for_others = false;
     // The scope around its end, if names are wanted; 1 is the class that it began in.
     uint32_t open_scope = 0;
