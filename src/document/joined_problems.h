@@ -14,9 +14,9 @@ class CJoinedProblems {
     // `text` is that of all pieces.
     explicit CJoinedProblems(std::string_view text) : _fText(text) {}
 
-    // Call in their order for all pieces that have problems, and with the late ones if these aren't known
-    // from elsewhere.
+    // Call in their order for all pieces that have problems.
     void Add(const CPiece& piece, uint32_t start);
+    // The problems of declarations: those that the pieces know, or else those that the caller puts there.
     void AddLate(const CPiece& piece, uint32_t start);
     CProblems& Late() { return _fLate; }
     // By place. Call once.
