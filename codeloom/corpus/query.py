@@ -2,7 +2,7 @@
 
 import glob
 from collections.abc import Callable, Iterator, Sequence
-from concurrent.futures import ThreadPoolExecutor
+from concurrent.futures import ThreadPoolExecutor, wait
 from functools import partial
 from itertools import chain, count
 from typing import Any
@@ -13,6 +13,8 @@ from codeloom.corpus.store import Store, StoreError
 
 # Rows that are fetched at once.
 _ROWS = 10_000
+# Seconds between two looks at a question that is being answered.
+_INTERVAL = 0.1
 
 
 class QueryError(Exception):
@@ -73,11 +75,16 @@ def _awaited(database: Any, ask: Callable[[], Any]) -> Any:
     with ThreadPoolExecutor(1) as thread:
         answer = thread.submit(ask)
         try:
+            # Piece by piece, since with some libraries in the process a signal doesn't end a wait.
+            while not wait([answer], _INTERVAL).done:
+                pass
             return answer.result()
         except duckdb.Error as error:
             raise QueryError(str(error)) from None
         except KeyboardInterrupt:
-            database.interrupt()
+            # A question that hasn't quite begun can't be interrupted yet.
+            while not wait([answer], _INTERVAL).done:
+                database.interrupt()
             raise
 
 
