@@ -250,26 +250,32 @@ std::optional<CFileAnalysis> CPieces::Analysis(std::string_view text, bool wants
 
 void CPieces::_AddRecords(std::string_view text, CFileAnalysis& analysis) const {
     CLiteralNames literal_names(text);
+    CFileSettings settings = _fSettings;
+    settings.wants_records = true;
+    settings.wants_names = false;
     analysis.records.names = _fSettings.names;
     _fPieces.ForEach([&](const CPiece& piece, const CPiecePlace& place) {
         const uint32_t start = place.start;
         if (!piece.records || piece.records->records.names != _fSettings.names)
-            piece.records = MakeRecords(AnalyzeRecordsOfPart(text, _fSettings, literal_names, start,
-                                                             start + piece.Length(), piece.state),
-                                        start);
+            piece.records = MakeRecords(
+                AnalyzeKnownPart(text, settings, literal_names, start, start + piece.Length(), piece.state),
+                start);
         AppendRecords(*piece.records, start, place.line, analysis);
     });
 }
 
 CTextNames CPieces::_Names(std::string_view text) const {
     CLiteralNames literal_names(text);
+    CFileSettings settings = _fSettings;
+    settings.wants_records = false;
+    settings.wants_names = true;
     std::vector<CNamePart> parts;
     _fPieces.ForEach([&](const CPiece& piece, const CPiecePlace& place) {
         const uint32_t start = place.start;
         if (!piece.names || piece.names->names.occurrences.names != _fSettings.names)
-            piece.names = MakeNames(AnalyzeNamesOfPart(text, _fSettings, literal_names, start,
-                                                       start + piece.Length(), piece.state),
-                                    start);
+            piece.names = MakeNames(
+                AnalyzeKnownPart(text, settings, literal_names, start, start + piece.Length(), piece.state),
+                start);
         parts.push_back({&piece.names->names, start, piece.state.IsInClass(), piece.names->open_scope});
     });
     return JoinNames(parts, _fSettings.names);

@@ -451,26 +451,6 @@ bool CFileAnalyzer::_IsUnreadable(const CLine& line) const {
 
 }  // namespace
 
-uint32_t CFileAnalysis::LineOfRecord(uint32_t record_i) const {
-    const auto next = std::upper_bound(lines.begin(), lines.end(), record_i,
-                                       [](uint32_t i, const CLine& line) { return i < line.first_record; });
-    return static_cast<uint32_t>(next - lines.begin()) - 1;
-}
-
-std::optional<uint32_t> CFileAnalysis::LineAt(uint32_t offset) const {
-    if (lines.empty()) return std::nullopt;
-    const auto after = std::upper_bound(lines.begin() + 1, lines.end(), offset,
-                                        [](uint32_t place, const CLine& line) { return place < line.start; });
-    return static_cast<uint32_t>(after - lines.begin()) - 1;
-}
-
-uint32_t FirstProblemFrom(const CProblems& problems, uint32_t start) {
-    const auto first =
-        std::lower_bound(problems.begin(), problems.end(), start,
-                         [](const CProblem& problem, uint32_t offset) { return problem.start < offset; });
-    return static_cast<uint32_t>(first - problems.begin());
-}
-
 CFileAnalysis AnalyzeFile(std::string_view text, const CFileSettings& settings,
                           const CUnreadable& unreadable) {
     assert(text.size() <= kMaxTextSize);
@@ -492,24 +472,11 @@ CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLit
     return CFileAnalyzer(text, quick, literal_names, true).RunPart(start, state, closed, part_end);
 }
 
-CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& settings,
-                             CLiteralNames& literal_names, uint32_t start, uint32_t end,
-                             const CPartState& state) {
-    CFileSettings with_names = settings;
-    with_names.wants_records = false;
-    with_names.wants_names = true;
+CFilePart AnalyzeKnownPart(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
+                           uint32_t start, uint32_t end, const CPartState& state) {
     CEndAt same_end(end);
-    return CFileAnalyzer(text, with_names, literal_names, true).RunPart(start, state, {}, same_end);
-}
-
-CFilePart AnalyzeRecordsOfPart(std::string_view text, const CFileSettings& settings,
-                               CLiteralNames& literal_names, uint32_t start, uint32_t end,
-                               const CPartState& state) {
-    CFileSettings with_records = settings;
-    with_records.wants_records = true;
-    with_records.wants_names = false;
-    CEndAt same_end(end);
-    return CFileAnalyzer(text, with_records, literal_names, false).RunPart(start, state, {}, same_end);
+    CFileAnalyzer analyzer(text, settings, literal_names, settings.wants_names);
+    return analyzer.RunPart(start, state, {}, same_end);
 }
 
 bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text) {

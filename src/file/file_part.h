@@ -73,15 +73,9 @@ CFilePart AnalyzePart(std::string_view text, const CFileSettings& settings, CLit
                       uint32_t start, const CPartState& state, const std::vector<CBlock>& closed,
                       CPartEnd& part_end);
 
-// The same up to a known end, with names, signatures and hints besides.
-CFilePart AnalyzeNamesOfPart(std::string_view text, const CFileSettings& settings,
-                             CLiteralNames& literal_names, uint32_t start, uint32_t end,
-                             const CPartState& state);
-
-// The same with records instead.
-CFilePart AnalyzeRecordsOfPart(std::string_view text, const CFileSettings& settings,
-                               CLiteralNames& literal_names, uint32_t start, uint32_t end,
-                               const CPartState& state);
+// The same up to a known end, with the records or the names that the settings ask for.
+CFilePart AnalyzeKnownPart(std::string_view text, const CFileSettings& settings, CLiteralNames& literal_names,
+                           uint32_t start, uint32_t end, const CPartState& state);
 
 // The parts of a text, whose shares come to these sums, say together what AnalyzeFile says.
 bool MayBeInParts(size_t text_size, size_t scanned_in_vain, size_t repeated_text);
