@@ -102,6 +102,8 @@ class IndexCommand(Command):
 
     def run(self, options: Options) -> ExitStatus:
         """Bring the index up to date; WrongUseError where it can't be one."""
+        # pyarrow's own pool keeps for each thread what that once needed.
+        os.environ.setdefault("ARROW_DEFAULT_MEMORY_POOL", "system")
         with needing_extra("index", "arrow", "pyarrow"):
             from codeloom.corpus.index import Indexer, PoolError
             from codeloom.corpus.part import settings_of
