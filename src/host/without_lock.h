@@ -3,7 +3,6 @@
 
 #include <nanobind/nanobind.h>
 
-#include <cxxabi.h>
 #include <unistd.h>
 
 namespace codeloom {
@@ -15,7 +14,7 @@ class CWithoutLock {
     ~CWithoutLock() {
         try {
             PyEval_RestoreThread(_fState);
-        } catch (const abi::__forced_unwind&) {
+        } catch (...) {
             // An interpreter that ends unwinds the threads that nobody waits for, which would end the process
             // in our midst. This one sleeps until the process has ended.
             while (true) pause();
