@@ -1,26 +1,13 @@
 #include "document/piece.h"
 
 #include "signatures/join_signatures.h"
+#include "text/move_bytes.h"
 
 namespace codeloom {
 
-namespace {
-
-void Move(CStatementHead& head, uint32_t shift) {
-    if (head.start == head.end) return;
-    head.start += shift;
-    head.end += shift;
-}
-
-}  // namespace
-
 void Move(CProblem& problem, uint32_t shift) {
-    problem.start += shift;
-    problem.end += shift;
-    for (CRelated& related : problem.related) {
-        related.start += shift;
-        related.end += shift;
-    }
+    MoveBytes(problem, shift);
+    for (CRelated& related : problem.related) MoveBytes(related, shift);
 }
 
 void Move(CRawLogical& line, uint32_t shift) {
@@ -28,13 +15,10 @@ void Move(CRawLogical& line, uint32_t shift) {
 }
 
 void Move(CBlock& block, uint32_t shift) {
-    Move(block.header, shift);
-    Move(block.previous, shift);
-    for (CSpan* const span : {&block.takes_all, &block.full_header}) {
-        if (span->start == span->end) continue;
-        span->start += shift;
-        span->end += shift;
-    }
+    MoveBytesIfAny(block.header, shift);
+    MoveBytesIfAny(block.previous, shift);
+    MoveBytesIfAny(block.takes_all, shift);
+    MoveBytesIfAny(block.full_header, shift);
     if (block.bare_except_start == block.bare_except_end) return;
     block.bare_except_start += shift;
     block.bare_except_end += shift;
@@ -59,10 +43,7 @@ CPiece::CPiece(std::string_view file_text, CFilePart part, uint32_t start, const
     for (CProblem& problem : problems) Move(problem, -start);
     for (CProblem& problem : late_problems) Move(problem, -start);
     for (CLineFault& fault : faults) Move(fault.line, -start);
-    for (CLine& line : lines) {
-        line.start -= start;
-        line.end -= start;
-    }
+    for (CLine& line : lines) MoveBytes(line, -start);
     for (CBlock& block : closed) Move(block, -start);
     lines.Shrink();
 }
@@ -72,19 +53,9 @@ std::unique_ptr<const CPieceNames> MakeNames(CFilePart part, uint32_t start) {
     made->names = std::move(part.analysis.names);
     made->open_scope = part.open_scope;
     COccurrences& found = made->names.occurrences;
-    for (COccurrence& item : found.items) {
-        item.start -= start;
-        item.end -= start;
-        if (item.object_start == item.object_end) continue;
-        item.object_start -= start;
-        item.object_end -= start;
-    }
-    for (CInnerScope& scope : found.scopes) {
-        scope.start -= start;
-        scope.end -= start;
-    }
-    for (CLineNames& line : made->names.lines)
-        if (line.end != 0) line.end -= start;
+    for (COccurrence& item : found.items) item.Move(-start);
+    for (CInnerScope& scope : found.scopes) MoveBytes(scope, -start);
+    for (CLineNames& line : made->names.lines) line.Move(-start);
     made->names.scopes = {};
     CSignatureJoiner(made->signatures).Append(part.analysis.signatures, -start, 0);
     return made;

@@ -2,23 +2,15 @@
 
 #include <utility>
 
+#include "text/move_bytes.h"
+
 namespace codeloom {
-
-namespace {
-
-void Move(CRecord& record, uint32_t shift) {
-    if (record.start == record.end) return;
-    record.start += shift;
-    record.end += shift;
-}
-
-}  // namespace
 
 std::unique_ptr<const CPieceRecords> MakeRecords(CFilePart part, uint32_t start) {
     auto made = std::make_unique<CPieceRecords>();
     made->records = std::move(part.analysis.records);
     made->limits = std::move(part.analysis.limits);
-    for (CRecord& record : made->records.records) Move(record, -start);
+    for (CRecord& record : made->records.records) MoveBytesIfAny(record, -start);
     for (const CLine& line : part.analysis.lines) made->first_records.push_back(line.first_record);
     return made;
 }
@@ -30,7 +22,7 @@ void AppendRecords(const CPieceRecords& piece, uint32_t start, uint32_t first_li
     for (size_t i = 0; i < piece.first_records.size(); ++i)
         analysis.lines[first_line + i].first_record = first_record + piece.first_records[i];
     for (CRecord record : piece.records.records) {
-        Move(record, start);
+        MoveBytesIfAny(record, start);
         record.value += first_value;
         joined.records.push_back(record);
     }

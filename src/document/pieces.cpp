@@ -6,6 +6,7 @@
 #include "scopes/declarations.h"
 #include "scopes/join_names.h"
 #include "signatures/join_signatures.h"
+#include "text/move_bytes.h"
 
 namespace codeloom {
 
@@ -210,8 +211,7 @@ bool CPieces::SayAll() const {
 CLine CPieces::Line(uint32_t line_i) const {
     const CPlacedPiece at = _fPieces.AtLine(line_i);
     CLine line = at.piece->lines[line_i - at.before.line];
-    line.start += at.before.start;
-    line.end += at.before.start;
+    MoveBytes(line, at.before.start);
     return line;
 }
 

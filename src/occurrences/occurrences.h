@@ -7,6 +7,7 @@
 #include <type_traits>
 
 #include "names/name_table.h"
+#include "text/move_bytes.h"
 #include "text/plain_array.h"
 
 namespace codeloom {
@@ -91,6 +92,14 @@ struct COccurrence {
         0;  // zero: that around the line; otherwise the count of the line's inner scopes up to it
     ERole role = ERole::kRead;
     uint8_t flags = 0;
+
+    // To other bytes, with what it hangs on.
+    void Move(uint32_t shift) {
+        MoveBytes(*this, shift);
+        if (object_start == object_end) return;
+        object_start += shift;
+        object_end += shift;
+    }
 };
 
 static_assert(std::is_trivially_copyable_v<COccurrence>);

@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "scopes/scope_builder.h"
+#include "text/move_bytes.h"
 
 namespace codeloom {
 
@@ -35,27 +36,20 @@ class CNameJoiner {
 
   private:
     void _Append(COccurrence occurrence) {
-        occurrence.start += _fStart;
-        occurrence.end += _fStart;
-        if (occurrence.object_start != occurrence.object_end) {
-            occurrence.object_start += _fStart;
-            occurrence.object_end += _fStart;
-        }
+        occurrence.Move(_fStart);
         _fJoined.occurrences.items.push_back(occurrence);
     }
 
     void _Append(CInnerScope scope) {
-        scope.start += _fStart;
-        scope.end += _fStart;
+        MoveBytes(scope, _fStart);
         _fJoined.occurrences.scopes.push_back(scope);
     }
 
-    // A comment has no end.
     void _Append(CLineNames line) {
         line.first_occurrence += _fFirstOccurrence;
         line.first_scope += _fFirstScope;
         line.scope = _Moved(line.scope);
-        if (line.end != 0) line.end += _fStart;
+        line.Move(_fStart);
         _fJoined.lines.push_back(line);
     }
 

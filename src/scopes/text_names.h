@@ -29,6 +29,11 @@ struct CLineNames {
     uint32_t end = 0;          // of the line in bytes; zero for a comment
     bool is_in_doubt = false;  // a fault may have moved what is around it
     bool has_fault = false;
+
+    // To other bytes.
+    void Move(uint32_t shift) {
+        if (end != 0) end += shift;
+    }
 };
 
 // What a line with a fault evidently binds.

@@ -1,14 +1,8 @@
 #include "signatures/join_signatures.h"
 
+#include "text/move_bytes.h"
+
 namespace codeloom {
-
-namespace {
-
-CSpan Moved(const CSpan& span, uint32_t shift) {
-    return span.start == span.end ? span : CSpan{span.start + shift, span.end + shift};
-}
-
-}  // namespace
 
 void CSignatureJoiner::Append(const CSignatures& part, uint32_t shift, uint32_t first_line) {
     const auto first_parameter = static_cast<uint32_t>(_fJoined.parameters.size());
@@ -17,21 +11,21 @@ void CSignatureJoiner::Append(const CSignatures& part, uint32_t shift, uint32_t 
         return hint == UINT32_MAX ? hint : hint + first_hint;
     };
     for (CSignature signature : part.items) {
-        signature.name = Moved(signature.name, shift);
+        MoveBytesIfAny(signature.name, shift);
         signature.line += first_line;
         signature.first_parameter += first_parameter;
         signature.return_hint = moved_hint(signature.return_hint);
         _fJoined.items.push_back(signature);
     }
     for (CSignatureParameter parameter : part.parameters) {
-        parameter.name = Moved(parameter.name, shift);
-        parameter.default_value = Moved(parameter.default_value, shift);
+        MoveBytesIfAny(parameter.name, shift);
+        MoveBytesIfAny(parameter.default_value, shift);
         parameter.hint = moved_hint(parameter.hint);
         _fJoined.parameters.push_back(parameter);
     }
     for (CHintInfo hint : part.hints) {
-        hint.hint = Moved(hint.hint, shift);
-        hint.target = Moved(hint.target, shift);
+        MoveBytesIfAny(hint.hint, shift);
+        MoveBytesIfAny(hint.target, shift);
         hint.line += first_line;
         _fJoined.hints.push_back(hint);
     }
