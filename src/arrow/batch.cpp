@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "arrow/table_builder.h"
 #include "file/time_limit.h"
 
 namespace codeloom {

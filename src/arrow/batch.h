@@ -6,11 +6,9 @@
 #include <span>
 #include <string>
 #include <string_view>
-#include <utility>
 #include <vector>
 
 #include "arrow/file_rows.h"
-#include "arrow/table_builder.h"
 #include "arrow/tables.h"
 #include "file/file_analyzer.h"
 

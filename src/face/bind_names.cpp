@@ -1,7 +1,10 @@
 #include "face/bind_names.h"
 
+#include <algorithm>
+
 #include <nanobind/stl/string.h>
 
+#include "document/columns.h"
 #include "face/kinds.h"
 #include "face/name_items.h"
 #include "host/arguments.h"
@@ -26,15 +29,11 @@ uint32_t OffsetOf(const CSourceFile& file, int row, int column) {
     if (row < 1) RaiseHost(PyExc_ValueError, "row must be at least 1");
     if (column < 1) RaiseHost(PyExc_ValueError, "column must be at least 1");
     if (static_cast<uint32_t>(row) > file.RowCount()) return static_cast<uint32_t>(file.Text().size());
-    const CPlacedRows around = file.RowsAround(static_cast<uint32_t>(row - 1));
-    const uint32_t row_i = static_cast<uint32_t>(row - 1) - around.first_row;
-    const std::string_view text = around.rows.Text(row_i);
-    size_t pos = 0;
-    for (; column > 1 && pos < text.size(); --column) {
-        ++pos;
-        while (pos < text.size() && (static_cast<unsigned char>(text[pos]) & 0xC0) == 0x80) ++pos;
-    }
-    return around.start + around.rows.Start(row_i) + static_cast<uint32_t>(pos);
+    const auto row_i = static_cast<uint32_t>(row - 1);
+    const CPlacedRows around = file.RowsAround(row_i);
+    const std::string_view text = around.TextOf(row_i);
+    const size_t before = *BytesBefore(text, column, EUnit::kCharacter);  // no column is within a character
+    return around.StartOf(row_i) + static_cast<uint32_t>(std::min(before, text.size()));
 }
 
 nb::object OccurrenceAt(const CAnalysis& analysis, nb::handle row, nb::handle column) {

@@ -93,13 +93,11 @@ CPlacedRows CDocument::_RowsAround(int64_t row) const {
 }
 
 std::string_view CDocument::_Row(int64_t row) const {
-    const CPlacedRows around = _RowsAround(row);
-    return around.rows.Text(static_cast<uint32_t>(row - 1) - around.first_row);
+    return _RowsAround(row).TextOf(static_cast<uint32_t>(row - 1));
 }
 
 uint32_t CDocument::_StartOf(int64_t row) const {
-    const CPlacedRows around = _RowsAround(row);
-    return around.start + around.rows.Start(static_cast<uint32_t>(row - 1) - around.first_row);
+    return _RowsAround(row).StartOf(static_cast<uint32_t>(row - 1));
 }
 
 CRowColumn CDocument::End() const {

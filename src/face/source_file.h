@@ -30,6 +30,10 @@ struct CPlacedRows {
     const CRowIndex& rows;
     uint32_t start = 0;
     uint32_t first_row = 0;
+
+    // Of a row of the whole text, counted from zero: its text, and the byte at which it begins there.
+    std::string_view TextOf(uint32_t row) const { return rows.Text(row - first_row); }
+    uint32_t StartOf(uint32_t row) const { return start + rows.Start(row - first_row); }
 };
 
 // One text with all that is known of it. Everything but the text is worked out when it is first asked for,
