@@ -10,6 +10,7 @@ from codeloom._document import Document
 from codeloom.cli.options import Options
 from codeloom.cli.run import files_of
 from codeloom.cli.source import Source
+from codeloom.common_start import common_start
 from codeloom.reading.files import NOTEBOOK_SUFFIX, StandardInput, read_file
 from codeloom.reading.source import source_from_bytes
 
@@ -90,23 +91,11 @@ class Watch:
 def change_text(document: Document, new: str) -> None:
     """Give a document another text, as an edit of the rows that differ."""
     old = document.text
-    start = old.rfind("\n", 0, _common(old, new)) + 1
-    end = len(old) - _common(old[start:][::-1], new[start:][::-1])
+    start = old.rfind("\n", 0, common_start(old, new)) + 1
+    end = len(old) - common_start(old[start:][::-1], new[start:][::-1])
     end = old.find("\n", end) + 1 or len(old)
     place = document.end if end == len(old) else (_row_at(old, end), 1)
     document.edit((_row_at(old, start), 1), place, new[start : len(new) - (len(old) - end)])
-
-
-def _common(one: str, other: str) -> int:
-    """How many characters two texts have in common at their beginnings."""
-    same, most = 0, min(len(one), len(other))
-    while same < most:
-        middle = (same + most + 1) // 2
-        if one[same:middle] == other[same:middle]:
-            same = middle
-        else:
-            most = middle - 1
-    return same
 
 
 def _row_at(text: str, row_start: int) -> int:

@@ -2,7 +2,6 @@
 
 from bisect import bisect_left, bisect_right
 from collections.abc import Iterator, Mapping, Sequence
-from itertools import takewhile
 from typing import TYPE_CHECKING, TypeVar
 
 from lsprotocol import types
@@ -10,6 +9,7 @@ from pygls.exceptions import JsonRpcInvalidParams
 
 from codeloom._analysis import Line, Occurrence, Range
 from codeloom._document import Document, Position
+from codeloom.common_start import common_start
 from codeloom.reading.notebooks import code_of_cell
 from codeloom.server.blocks import start_of
 from codeloom.server.document import OpenDocument
@@ -137,8 +137,8 @@ class OpenNotebook:
             cell.rows_before = row - 1
             row += cell.code.count("\n")
         old, new = _rows(self.live.document.text), _rows("".join(cell.code for cell in self))
-        first = _common(old, new)
-        last = _common(old[first:][::-1], new[first:][::-1])
+        first = common_start(old, new)
+        last = common_start(old[first:][::-1], new[first:][::-1])
         between = "".join(f"{row}\n" for row in new[first : len(new) - last])
         self.live.edit((first + 1, 1), (len(old) - last + 1, 1), between, written)
 
@@ -166,8 +166,3 @@ def _code(text: str) -> str:
 
 def _rows(text: str) -> list[str]:
     return text.split("\n")[:-1]
-
-
-def _common(one: Sequence[str], other: Sequence[str]) -> int:
-    """How many rows both begin with."""
-    return sum(1 for _ in takewhile(lambda pair: pair[0] == pair[1], zip(one, other, strict=False)))

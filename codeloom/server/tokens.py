@@ -10,6 +10,7 @@ from weakref import WeakKeyDictionary
 from lsprotocol import types
 
 from codeloom._analysis import Occurrence, Resolution, Role, Scope, ScopeKind
+from codeloom.common_start import common_start
 from codeloom.server.blocks import start_of
 from codeloom.server.document import OpenDocument
 from codeloom.server.json_text import JsonText, items_as_json
@@ -35,7 +36,6 @@ _LEGEND = types.SemanticTokensLegend(list(_TYPES), list(_MODIFIERS))
 
 # Five numbers a token.
 _WIDTH = 5
-_COMPARED_AT_ONCE = 4096
 
 _CLASSES = frozenset(name for name, value in vars(builtins).items() if isinstance(value, type))
 _ROLE_TYPES = {
@@ -211,17 +211,12 @@ def _edits(old: Sequence[int], new: Sequence[int]) -> list[types.SemanticTokensE
     """What turns one list of tokens into another: the part that differs, in whole tokens."""
     if old == new:
         return []
-    shorter = min(len(old), len(new))
-    first = _common(old, new, shorter)
-    last = _common(old[::-1], new[::-1], shorter - first)
+    first = _whole(common_start(old, new))
+    last = _whole(common_start(old[first:][::-1], new[first:][::-1]))
     end = len(new) - last
     return [types.SemanticTokensEdit(first, len(old) - last - first, new[first:end])]
 
 
-def _common(one: Sequence[int], other: Sequence[int], most: int) -> int:
-    """How many numbers both begin with, in whole tokens."""
-    size, count = _COMPARED_AT_ONCE, 0
-    while count < most and one[count : count + size] == other[count : count + size]:
-        count += size
-    count = next((i for i in range(count, most) if one[i] != other[i]), most)
+def _whole(count: int) -> int:
+    """So many numbers, but no part of a token."""
     return count // _WIDTH * _WIDTH
