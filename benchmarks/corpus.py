@@ -1,6 +1,8 @@
 """The files that everything is measured on: the interpreter's own, which every machine has."""
 
+import shutil
 import sysconfig
+from itertools import cycle, islice
 from pathlib import Path
 
 # What is counted is what the files after these cost: so start-up is left out.
@@ -16,6 +18,21 @@ def files() -> list[str]:
     library = Path(sysconfig.get_path("stdlib"))
     found = sorted(path for folder in (".", "asyncio", "email") for path in (library / folder).glob("*.py"))
     return [str(path) for path in found[::3]]
+
+
+def library() -> list[Path]:
+    """The interpreter's own files, and those that are installed."""
+    found = sorted(Path(sysconfig.get_path("stdlib")).rglob("*.py"))
+    return [path for path in found if "lib2to3/tests/data" not in str(path)]
+
+
+def copy_library(folder: Path, count: int) -> Path:
+    """So many of these files in folders of twenty, again and again where there are fewer."""
+    for i, path in enumerate(islice(cycle(library()), count)):
+        to = folder / f"{i // 20}" / f"{i:05}.py"
+        to.parent.mkdir(parents=True, exist_ok=True)
+        shutil.copyfile(path, to)
+    return folder
 
 
 def count_rows(paths: list[str]) -> int:

@@ -11,14 +11,14 @@ import shutil
 import statistics
 import subprocess
 import sys
-import sysconfig
 import tempfile
 import time
 import warnings
 from contextlib import suppress
-from itertools import cycle, islice
 from pathlib import Path
 from typing import NamedTuple
+
+from corpus import copy_library
 
 TABLES = ("problems", "lines", "records")
 # Files whose memory is measured.
@@ -33,17 +33,6 @@ class Spent(NamedTuple):
     clock: float
     processors: float
     memory: int
-
-
-def make_corpus(folder: Path, count: int) -> Path:
-    """So many files of the interpreter's library, again and again where it has fewer."""
-    library = Path(sysconfig.get_path("stdlib"))
-    paths = sorted(path for path in library.rglob("*.py") if path.is_file())
-    for i, path in enumerate(islice(cycle(paths), count)):
-        copy = folder / f"{i // 500:03}" / f"{i:05}_{path.name}"
-        copy.parent.mkdir(parents=True, exist_ok=True)
-        shutil.copyfile(path, copy)
-    return folder
 
 
 def run(*arguments: str) -> Spent:
@@ -145,11 +134,11 @@ def main() -> None:
     with tempfile.TemporaryDirectory() as name:
         folder = Path(name)
         output = folder / "index"
-        corpus = make_corpus(folder / "corpus", options.files)
+        corpus = copy_library(folder / "corpus", options.files)
         print_times(corpus, output, options.rounds)
         subprocess.run([sys.executable, "-P", __file__, "--batch-of", str(corpus)], check=True)
         for count in MEMORY_OF:
-            memory = index(make_corpus(folder / str(count), count), output).memory
+            memory = index(copy_library(folder / str(count), count), output).memory
             print(f"memory for {count:,} files: {memory / 1e6:.0f} MB", flush=True)
 
 

@@ -2,19 +2,16 @@
 nothing, and what a clock shows says what others do."""
 
 import resource
-import shutil
 import statistics
 import subprocess
 import sys
-import sysconfig
 import tempfile
 import time
 from collections.abc import Callable, Iterable
 from functools import partial
-from itertools import cycle, islice
 from pathlib import Path
 
-from corpus import files, text_of
+from corpus import copy_library, files, library, text_of
 from workloads import COMMAND, OURS, PEERS, RUFF, read, search_path
 
 from codeloom import analyze, analyze_paths
@@ -32,18 +29,12 @@ def times_faster(ours: str, peer: str) -> float:
 
 def command_against_ruff(count: str) -> float:
     """How many times as long as our command ruff's takes, for so many files of the library at a time."""
-    paths = list(map(str, _library()[: int(count)]))
+    paths = list(map(str, library()[: int(count)]))
     environment = {"RAYON_NUM_THREADS": "1", "PATH": search_path()}
     return _ratio(
         lambda: subprocess.run([*RUFF, *paths], env=environment, check=True),
         lambda: subprocess.run([*COMMAND, *paths], stdout=subprocess.DEVNULL, check=False),
     )
-
-
-def _library() -> list[Path]:
-    """The interpreter's own files, and those that are installed."""
-    library = sorted(Path(sysconfig.get_path("stdlib")).rglob("*.py"))
-    return [path for path in library if "lib2to3/tests/data" not in str(path)]
 
 
 class Growth:
@@ -100,10 +91,7 @@ def _large_files(folder: str) -> Callable[[int], None]:
 
 
 def _many_files(folder: str) -> Callable[[int], None]:
-    for i, path in enumerate(islice(cycle(_library()), 10_000)):
-        to = Path(folder, f"{i // 20}", f"{i:05}.py")
-        to.parent.mkdir(exist_ok=True)
-        shutil.copyfile(path, to)
+    copy_library(Path(folder), 10_000)
 
     def run(jobs: int) -> None:
         command = [*COMMAND, "--jobs", str(jobs), folder]
