@@ -11,8 +11,8 @@
 
 namespace codeloom {
 
-// Its owner is one thread, and works too: it does what no other thread has begun while it waits. So without
-// other threads the work is done when it is waited for.
+// Its owner is one thread, and works too: instead of waiting it does work that hasn't begun. So without other
+// threads the work is done when it is waited for.
 class COrderedWork {
   public:
     using CWork = std::function<void()>;
